@@ -1,0 +1,221 @@
+#pragma once
+
+#include "foundation/ManyToOneAssociation.h"
+
+#include <algorithm>
+#include <cassert>
+#include <cstdlib>
+#include <new>
+
+/// The list of an owner's elements; each element holds the counterpart, a `ManyToOneAssociation`.
+///
+/// Membership, addition and removal take constant time. A sorted list is put in order by the next read after a change
+/// that may have disturbed it; elements with equal keys keep the order in which they were added. An unsorted list does
+/// not keep its order on removal: the last element takes the free place.
+///
+/// The list does not own its elements. The owner empties it (`deleteAll` or `unlinkAll`) before it dies.
+template <class Owner, class Element>
+class OneToManyAssociation {
+public:
+    /// Compares two array places, as `qsort` does: negative, 0 or positive.
+    using Compare = int (*)(const void*, const void*);
+
+    /// `owner` is the object that holds this list. The list is sorted only when `sorted` is true and `compare` given.
+    explicit OneToManyAssociation(Owner* owner, bool sorted = false, Compare compare = nullptr)
+        : owner_(owner), compare_(sorted ? compare : nullptr)
+    {}
+    OneToManyAssociation(const OneToManyAssociation&) = delete;
+    OneToManyAssociation& operator=(const OneToManyAssociation&) = delete;
+    virtual ~OneToManyAssociation()
+    {
+        assert(count_ == 0); // the elements would keep a link to a list that is gone
+        std::free(elements_);
+    }
+
+    /// @return -1 for null; 0 without effect for an element that is here already; otherwise what linking the element
+    /// back to the owner gives, after a failure of which the element is not in the list.
+    int add(Element* e)
+    {
+        if (e == nullptr)
+            return -1;
+        if (contains(e))
+            return 0;
+        reserve(count_ + 1);
+        if (!dirty_ && isSorted() && count_ > 0 && compare_(&elements_[count_ - 1], &e) > 0)
+            dirty_ = true;
+        elements_[count_++] = e;
+        const int failure = backLink(*e).partner_ == owner_ ? 0 : xSet(e, owner_);
+        if (failure != 0)
+            --count_;
+        else
+            settle(e);
+        return failure;
+    }
+
+    /// @return 0 without effect for an element that is not here; otherwise what unlinking the element gives.
+    int remove(Element* e)
+    {
+        if (e == nullptr || !contains(e))
+            return 0;
+        const std::uint32_t place = placeOf(e);
+        if (--count_ != place) {
+            elements_[place] = elements_[count_];
+            backLink(*elements_[place]).place_ = place;
+            dirty_ = true;
+        }
+        shrink();
+        return xUnSet(e);
+    }
+
+    /// `*out` becomes element `i`, null with -1 when `i` is out of range.
+    int getAt(Element** out, unsigned i) const
+    {
+        if (i >= count_) {
+            *out = nullptr;
+            return -1;
+        }
+        sortWhenDirty();
+        *out = elements_[i];
+        return 0;
+    }
+    /// The element at `i`, null out of range.
+    Element* at(unsigned i) const
+    {
+        Element* e;
+        getAt(&e, i);
+        return e;
+    }
+    /// The list's own array, in order; valid until the next change. `*n` becomes the count; null when empty.
+    Element** getAll(unsigned* n) const
+    {
+        sortWhenDirty();
+        *n = count_;
+        return elements_;
+    }
+    unsigned getNbr() const { return count_; }
+    /// `*index` becomes the element's place. @return 0; -1 when it is not here.
+    int getElement(Element* e, unsigned* index) const
+    {
+        if (e == nullptr || !contains(e))
+            return -1;
+        sortWhenDirty();
+        *index = placeOf(e);
+        return 0;
+    }
+    bool contains(Element* e) const { return placeOf(e) < count_; }
+
+    /// Puts the list in order now; an unsorted list stays as it is.
+    void sort() const
+    {
+        if (!isSorted())
+            return;
+        // What stands in order at the front, often nearly all, is only merged with the rest.
+        const auto before = [this](Element* a, Element* b) { return isBefore(a, b); };
+        Element** end = elements_ + count_;
+        Element** rest = std::is_sorted_until(elements_, end, before);
+        std::sort(rest, end, before);
+        std::inplace_merge(elements_, rest, end, before);
+        for (std::uint32_t i = 0; i < count_; ++i)
+            backLink(*elements_[i]).place_ = i;
+    }
+    /// To be called when the sort key of an element has changed.
+    void changeNotice() { dirty_ = true; }
+
+    int xUnSet(Element* e) { return xSet(e, nullptr); }
+
+    /// Makes room for `count` elements at once; only a saving, never needed.
+    void reserve(std::uint32_t count)
+    {
+        if (count > capacity_)
+            setCapacity(std::max(count, capacity_ + capacity_ / 2 + 2));
+    }
+    /// Makes room for exactly `count` elements when there is less.
+    void reserveExactly(std::uint32_t count)
+    {
+        if (count > capacity_)
+            setCapacity(count);
+    }
+
+    /// Destroys every element; each unlinks itself. Goes from the end, so that nothing moves or needs sorting.
+    void deleteAll()
+    {
+        while (count_ > 0)
+            delete elements_[count_ - 1];
+    }
+    /// Unlinks every element and leaves it alone otherwise.
+    void unlinkAll()
+    {
+        while (count_ > 0)
+            remove(elements_[count_ - 1]);
+    }
+
+protected:
+    /// The link that `e` holds for this relation.
+    virtual ManyToOneAssociation<Element, Owner>& backLink(Element& e) const = 0;
+
+    /// Makes the back link of `e` point at `owner`, or clears it when `owner` is null.
+    virtual int xSet(Element* e, Owner* owner) { return backLink(*e).set(owner); }
+
+private:
+    bool isSorted() const { return compare_ != nullptr; }
+
+    /// The place of `e`, or a number from `count_` up when it is not here. While `add` is linking its element, that
+    /// stands at the end, but its link still remembers the place in the list it is leaving.
+    std::uint32_t placeOf(Element* e) const
+    {
+        const std::uint32_t place = backLink(*e).place_;
+        if (place < count_ && elements_[place] == e)
+            return place;
+        return count_ > 0 && elements_[count_ - 1] == e ? count_ - 1 : count_;
+    }
+
+    void settle(Element* e)
+    {
+        auto& link = backLink(*e);
+        link.place_ = count_ - 1;
+        link.sequence_ = nextSequence_++;
+    }
+
+    bool isBefore(Element* a, Element* b) const
+    {
+        const int order = compare_(&a, &b);
+        return order != 0 ? order < 0 : backLink(*a).sequence_ < backLink(*b).sequence_;
+    }
+
+    void sortWhenDirty() const
+    {
+        if (!dirty_)
+            return;
+        dirty_ = false;
+        sort();
+    }
+
+    void shrink()
+    {
+        if (count_ == 0) {
+            std::free(elements_);
+            elements_ = nullptr;
+            capacity_ = 0;
+            dirty_ = false;
+            nextSequence_ = 0;
+        } else if (capacity_ > 16 && count_ <= capacity_ / 4)
+            setCapacity(capacity_ / 2);
+    }
+
+    void setCapacity(std::uint32_t capacity)
+    {
+        void* moved = std::realloc(elements_, capacity * sizeof(Element*));
+        if (moved == nullptr)
+            throw std::bad_alloc();
+        elements_ = static_cast<Element**>(moved);
+        capacity_ = capacity;
+    }
+
+    Owner* owner_;
+    Element** elements_ = nullptr; // malloc'ed, owned; null when empty
+    std::uint32_t count_ = 0;
+    std::uint32_t capacity_ = 0;
+    Compare compare_; // null for an unsorted list
+    std::uint32_t nextSequence_ = 0;
+    mutable bool dirty_ = false;
+};

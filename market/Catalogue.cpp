@@ -1,0 +1,106 @@
+#include "market/Catalogue.h"
+
+#include "foundation/FieldIO.h"
+#include "market/Currency.h"
+#include "market/Market.h"
+
+namespace {
+
+void expressIn(const Currency& newReference, const Currency& currency)
+{
+    unsigned n;
+    CurrencyQuote** quotes = currency.getAllQuotes(&n);
+    for (unsigned i = 0; i < n; ++i) {
+        const double rate = newReference.getRealQuote(quotes[i]->getDate());
+        quotes[i]->setValue(static_cast<float>(quotes[i]->getValue() / rate));
+    }
+}
+
+} // namespace
+
+Catalogue::Catalogue() = default;
+
+Catalogue::~Catalogue()
+{
+    for (Currency* currency : currencies_)
+        delete currency;
+}
+
+int Catalogue::rd(FILE* file)
+{
+    String reference;
+    if (reference.rd(file) != 0)
+        return -1;
+    auto missing = static_cast<unsigned>(freadint(file));
+    for (; missing > 0 && !reachedEnd(file); --missing) {
+        auto currency = std::make_unique<Currency>();
+        const int result = currency->rd(file, nullptr);
+        // A currency cut short stays for the sake of what is whole in it.
+        if (result != 0 && currency->getNbrMarkets() + currency->getNbrQuotes() == 0)
+            return -1;
+        Currency* added = currency.release();
+        addCurrency(added);
+        if (!reference.isUndefined() && added->getRepresentation() == reference)
+            rebaseOn(added);
+        if (result != 0)
+            return -1;
+    }
+    return reachedEnd(file) ? -1 : 0;
+}
+
+int Catalogue::wrt(FILE* file, const Date& stamp) const
+{
+    const String reference = reference_ != nullptr ? reference_->getRepresentation() : String();
+    reference.wrt(file);
+    fwriteint(file, static_cast<int>(currencies_.size()));
+    for (const Currency* currency : currencies_)
+        if (currency->wrt(file, stamp) != 0)
+            return -1;
+    return std::ferror(file) == 0 ? 0 : -1;
+}
+
+void Catalogue::addCurrency(Currency* currency)
+{
+    currencies_.push_back(currency);
+}
+
+unsigned Catalogue::getNbrCurrencies() const
+{
+    return static_cast<unsigned>(currencies_.size());
+}
+
+Currency* Catalogue::getCurrencyByRepresentation(const String& representation) const
+{
+    for (Currency* currency : currencies_)
+        if (currency->getRepresentation() == representation)
+            return currency;
+    return nullptr;
+}
+
+std::vector<Market*> Catalogue::getMarkets() const
+{
+    std::vector<Market*> markets;
+    for (const Currency* currency : currencies_) {
+        unsigned n;
+        Market** own = currency->getAllMarkets(&n);
+        markets.insert(markets.end(), own, own + n);
+    }
+    return markets;
+}
+
+void Catalogue::rebaseOn(Currency* newReference)
+{
+    if (newReference == reference_)
+        return;
+    if (reference_ != nullptr) {
+        // The others first: the divisions need the new reference's rates as they were.
+        for (const Currency* currency : currencies_)
+            if (currency != newReference)
+                expressIn(*newReference, *currency);
+        unsigned n;
+        CurrencyQuote** quotes = newReference->getAllQuotes(&n);
+        for (unsigned i = 0; i < n; ++i)
+            quotes[i]->setValue(1);
+    }
+    reference_ = newReference;
+}

@@ -1,0 +1,100 @@
+#include "market/Company.h"
+
+#include "foundation/FieldIO.h"
+#include "market/CompanyEvent.h"
+#include "market/Market.h"
+#include "market/NoteCompanyEvent.h"
+#include "market/SplitCompanyEvent.h"
+
+#include <memory>
+
+namespace {
+
+/// An empty event of the file's type code; null for a code that no writer produces.
+std::unique_ptr<CompanyEvent> makeEvent(unsigned short type)
+{
+    if (type == NoteCompanyEvent::kType)
+        return std::make_unique<NoteCompanyEvent>();
+    if (type == SplitCompanyEvent::kType)
+        return std::make_unique<SplitCompanyEvent>();
+    return nullptr;
+}
+
+} // namespace
+
+Company::Company() : QuoteSeries(this), shares_(this), events_(this) {}
+
+Company::Company(Market* market, const String& name, const String& abbreviation) : Company()
+{
+    name_ = name;
+    abbreviation_ = abbreviation;
+    setMarket(market);
+}
+
+Company::~Company()
+{
+    shares_.deleteAll();
+    deleteQuotes();
+    events_.deleteAll();
+    setMarket(nullptr);
+}
+
+int Company::wrt(FILE* file) const
+{
+    name_.wrt(file);
+    abbreviation_.wrt(file);
+    if (writeQuotes(file) != 0)
+        return -1;
+    unsigned n;
+    CompanyEvent** events = getAllEvents(&n);
+    fwriteint(file, static_cast<int>(n));
+    for (unsigned i = 0; i < n; ++i) {
+        fwriteshort(file, static_cast<unsigned short>(events[i]->getType()));
+        if (events[i]->wrt(file) != 0)
+            return -1;
+    }
+    return 0;
+}
+
+int Company::rd(FILE* file)
+{
+    if (name_.rd(file) != 0 || abbreviation_.rd(file) != 0 || readQuotes(file) != 0)
+        return -1;
+    return readEvents(file);
+}
+
+int Company::readEvents(FILE* file)
+{
+    auto missing = static_cast<unsigned>(freadint(file));
+    for (; missing > 0 && !reachedEnd(file); --missing) {
+        std::unique_ptr<CompanyEvent> event = makeEvent(freadshort(file));
+        // Intended: the record behind an unknown type has no known length, so reading goes on right after the type.
+        if (event == nullptr)
+            continue;
+        if (event->rd(file) != 0)
+            return -1;
+        event.release()->setCompany(this);
+    }
+    return reachedEnd(file) ? -1 : 0;
+}
+
+String Company::getCurrencyRepresentation() const
+{
+    const Market* market = market_.partner();
+    return market != nullptr ? market->getCurrencyRepresentation() : String();
+}
+
+ManyToOneAssociation<Company, Market>& MarketToCompanies::backLink(Company& e) const
+{
+    return e.market_;
+}
+
+int CompaniesToMarket::xAdd(Market* partner)
+{
+    return partner->addCompany(owner());
+}
+
+int CompaniesToMarket::xRemove(Market* partner)
+{
+    return partner->removeCompany(owner());
+}

@@ -1,0 +1,56 @@
+#pragma once
+
+#include "foundation/Serializable.h"
+#include "foundation/String.h"
+#include "market/CompanyQuote.h"
+#include "market/CompanyToEvents.h"
+#include "market/CompanyToQuotes.h"
+#include "market/CompanyToShares.h"
+#include "market/MarketToCompanies.h"
+#include "market/QuoteSeries.h"
+
+/// A listed company with its dated quotes, in the currency of its market, its notes and splits.
+///
+/// Owns its quotes and events, and the portfolio's holdings of it: destroying the company destroys them all.
+class Company final : public Serializable, public QuoteSeries<Company, CompanyQuote, CompanyToQuotes> {
+public:
+    Company();
+    Company(Market* market, const String& name, const String& abbreviation);
+    virtual ~Company();
+
+    int wrt(FILE* file) const override;
+    int rd(FILE* file) override;
+
+    const String& getName() const { return name_; }
+    void setName(const String& name) { name_ = name; }
+    /// The ticker.
+    const String& getAbbreviation() const { return abbreviation_; }
+    void setAbbreviation(const String& abbreviation) { abbreviation_ = abbreviation; }
+
+    int getMarket(Market** out) const { return market_.get(out); }
+    int setMarket(Market* market) { return market_.set(market); }
+    /// The short symbol of the market's currency; a String without text when market or currency is missing.
+    String getCurrencyRepresentation() const;
+
+    int addShare(Share* share) { return shares_.add(share); }
+    int removeShare(Share* share) { return shares_.remove(share); }
+    unsigned getNbrShares() const { return shares_.getNbr(); }
+    Share** getAllShares(unsigned* n) const { return shares_.getAll(n); }
+    int getShare(Share** out, unsigned i) const { return shares_.getAt(out, i); }
+
+    int addEvent(CompanyEvent* event) { return events_.add(event); }
+    int removeEvent(CompanyEvent* event) { return events_.remove(event); }
+    unsigned getNbrEvents() const { return events_.getNbr(); }
+    CompanyEvent** getAllEvents(unsigned* n) const { return events_.getAll(n); }
+
+private:
+    friend class MarketToCompanies;
+
+    int readEvents(FILE* file);
+
+    String name_;
+    String abbreviation_;
+    CompanyToShares shares_;
+    CompanyToEvents events_;
+    CompaniesToMarket market_{this};
+};

@@ -1,0 +1,84 @@
+#include "market/Currency.h"
+
+#include "foundation/FieldIO.h"
+#include "market/Market.h"
+
+#include <memory>
+
+Currency::Currency() : QuoteSeries(this), accounts_(this), markets_(this) {}
+
+Currency::Currency(const String& name, const String& representation, Currency* reference) : Currency()
+{
+    name_ = name;
+    representation_ = representation;
+    reference_ = reference;
+}
+
+Currency::~Currency()
+{
+    accounts_.unlinkAll();
+    deleteQuotes();
+    markets_.deleteAll();
+}
+
+int Currency::wrt(FILE*) const
+{
+    return -1;
+}
+
+int Currency::rd(FILE*)
+{
+    return -1;
+}
+
+int Currency::wrt(FILE* file, const Date& stamp) const
+{
+    stamp.wrt(file);
+    name_.wrt(file);
+    representation_.wrt(file);
+    unsigned n;
+    Market** markets = getAllMarkets(&n);
+    fwriteint(file, static_cast<int>(n));
+    for (unsigned i = 0; i < n; ++i)
+        if (markets[i]->wrt(file) != 0)
+            return -1;
+    return writeQuotes(file) == 0 && std::ferror(file) == 0 ? 0 : -1;
+}
+
+int Currency::rd(FILE* file, Date* stamp)
+{
+    Date date;
+    date.rd(file);
+    if (stamp != nullptr)
+        *stamp = date;
+    if (name_.rd(file) != 0 || representation_.rd(file) != 0 || readMarkets(file) != 0)
+        return -1;
+    return readQuotes(file);
+}
+
+int Currency::readMarkets(FILE* file)
+{
+    auto missing = static_cast<unsigned>(freadint(file));
+    for (; missing > 0 && !reachedEnd(file); --missing) {
+        auto market = std::make_unique<Market>();
+        const int result = market->rd(file);
+        // A market cut short stays for the sake of the companies in it that are whole.
+        if (result == 0 || market->getNbrCompanies() > 0)
+            market.release()->setCurrency(this);
+        if (result != 0)
+            return -1;
+    }
+    return reachedEnd(file) ? -1 : 0;
+}
+
+int Currency::setReferenceCurrency(Currency* reference)
+{
+    reference_ = reference;
+    return 0;
+}
+
+int Currency::getReferenceCurrency(Currency** out)
+{
+    *out = reference_ != nullptr ? reference_ : this;
+    return 0;
+}

@@ -1,0 +1,83 @@
+#include "market/Market.h"
+
+#include "foundation/FieldIO.h"
+#include "market/Company.h"
+#include "market/Currency.h"
+
+#include <memory>
+
+Market::Market() : companies_(this) {}
+
+Market::Market(const String& name) : Market()
+{
+    name_ = name;
+}
+
+Market::~Market()
+{
+    companies_.deleteAll();
+    setCurrency(nullptr);
+}
+
+int Market::wrt(FILE* file) const
+{
+    name_.wrt(file);
+    unsigned n;
+    Company** companies = getAllCompanies(&n);
+    fwriteint(file, static_cast<int>(n));
+    for (unsigned i = 0; i < n; ++i)
+        if (companies[i]->wrt(file) != 0)
+            return -1;
+    return 0;
+}
+
+int Market::rd(FILE* file)
+{
+    if (name_.rd(file) != 0)
+        return -1;
+    auto missing = static_cast<unsigned>(freadint(file));
+    for (; missing > 0 && !reachedEnd(file); --missing) {
+        auto company = std::make_unique<Company>();
+        const int result = company->rd(file);
+        // A company cut short stays for the sake of what is whole in it.
+        if (result == 0 || company->getNbrQuotes() + company->getNbrEvents() > 0)
+            company.release()->setMarket(this);
+        if (result != 0)
+            return -1;
+    }
+    return reachedEnd(file) ? -1 : 0;
+}
+
+String Market::getCurrencyRepresentation() const
+{
+    const Currency* currency = currency_.partner();
+    return currency != nullptr ? currency->getRepresentation() : String();
+}
+
+int Market::getCompany(const String& abbreviation, Company** out) const
+{
+    unsigned n;
+    Company** companies = getAllCompanies(&n);
+    for (unsigned i = 0; i < n; ++i)
+        if (companies[i]->getAbbreviation() == abbreviation) {
+            *out = companies[i];
+            return 0;
+        }
+    *out = nullptr;
+    return -1;
+}
+
+ManyToOneAssociation<Market, Currency>& CurrencyToMarkets::backLink(Market& e) const
+{
+    return e.currency_;
+}
+
+int MarketsToCurrency::xAdd(Currency* partner)
+{
+    return partner->addMarket(owner());
+}
+
+int MarketsToCurrency::xRemove(Currency* partner)
+{
+    return partner->removeMarket(owner());
+}

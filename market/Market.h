@@ -1,0 +1,40 @@
+#pragma once
+
+#include "foundation/Serializable.h"
+#include "foundation/String.h"
+#include "market/CurrencyToMarkets.h"
+#include "market/MarketToCompanies.h"
+
+/// A stock exchange: trades in one currency and lists companies, which it owns.
+class Market final : public Serializable {
+public:
+    Market();
+    explicit Market(const String& name);
+    virtual ~Market();
+
+    /// The currency is not part of the record: it is the one whose record contains the market's.
+    int wrt(FILE* file) const override;
+    int rd(FILE* file) override;
+
+    const String& getName() const { return name_; }
+    void setName(const String& name) { name_ = name; }
+
+    int getCurrency(Currency** out) const { return currency_.get(out); }
+    int setCurrency(Currency* currency) { return currency_.set(currency); }
+    /// The currency's short symbol; a String without text when the market has no currency.
+    String getCurrencyRepresentation() const;
+
+    int addCompany(Company* company) { return companies_.add(company); }
+    int removeCompany(Company* company) { return companies_.remove(company); }
+    unsigned getNbrCompanies() const { return companies_.getNbr(); }
+    Company** getAllCompanies(unsigned* n) const { return companies_.getAll(n); }
+    /// `*out` becomes the first company with this ticker. @return 0; -1 and a null `*out` when there is none.
+    int getCompany(const String& abbreviation, Company** out) const;
+
+private:
+    friend class CurrencyToMarkets;
+
+    String name_;
+    MarketToCompanies companies_;
+    MarketsToCurrency currency_{this};
+};

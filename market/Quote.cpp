@@ -1,0 +1,52 @@
+#include "market/Quote.h"
+
+#include "foundation/FieldIO.h"
+
+#include <cstring>
+
+int Quote::wrt(FILE* file) const
+{
+    unsigned char bytes[kFileSize];
+    date_.encode(bytes);
+    encodeFloat(bytes + Date::kFileSize, value_);
+    return std::fwrite(bytes, sizeof bytes, 1, file) == 1 ? 0 : -1;
+}
+
+int Quote::rd(FILE* file)
+{
+    unsigned char bytes[kFileSize];
+    freadbytes(file, bytes, sizeof bytes);
+    decode(bytes);
+    notifyChange();
+    return reachedEnd(file) ? -1 : 0;
+}
+
+void Quote::decode(const unsigned char* bytes)
+{
+    date_.decode(bytes);
+    value_ = decodeFloat(bytes + Date::kFileSize);
+}
+
+void Quote::setDate(const Date& date)
+{
+    date_ = date;
+    notifyChange();
+}
+
+void Quote::setValue(float value)
+{
+    value_ = value;
+    notifyChange();
+}
+
+int sortQuotesByDate(const void* a, const void* b)
+{
+    // The arrays hold pointers to one of the quote classes; each begins with its Quote.
+    const Quote* left;
+    const Quote* right;
+    std::memcpy(&left, a, sizeof left);
+    std::memcpy(&right, b, sizeof right);
+    if (left->getDate() > right->getDate())
+        return 1;
+    return left->getDate() < right->getDate() ? -1 : 0;
+}

@@ -1,0 +1,266 @@
+#pragma once
+
+#include "foundation/Date.h"
+#include "foundation/FieldIO.h"
+
+#include <algorithm>
+#include <cmath>
+#include <vector>
+
+/// The dated quotes of a `Company` or a `Currency`, at most one a day where `addQuote` has its way, with the answers
+/// they give: the quote of a day, a value for any day, the extremes, and a least-squares trend line (the prevision).
+///
+/// `SeriesQuote` is the quote class, `ManyEnd` the sorted association that lists it; the owner derives from this class
+/// and so owns the quotes. Look-ups are binary searches. The trend is computed when it is read.
+template <class Owner, class SeriesQuote, class ManyEnd>
+class QuoteSeries {
+public:
+    /// Links `q` to this series; a quote that stood on the same day is destroyed.
+    int addQuote(SeriesQuote* q)
+    {
+        if (q == nullptr)
+            return -1;
+        if (quotes_.contains(q))
+            return 0;
+        if (SeriesQuote* existing = findQuote(q->getDate()))
+            delete existing;
+        const int result = quotes_.add(q);
+        updatePrevisions();
+        return result;
+    }
+    /// Unlinks `q`, which from then on belongs to the caller.
+    int removeQuote(SeriesQuote* q)
+    {
+        const int result = quotes_.remove(q);
+        updatePrevisions();
+        return result;
+    }
+    /// To be called when a quote's date or value has changed.
+    void quoteChanged()
+    {
+        quotes_.changeNotice();
+        updatePrevisions();
+    }
+
+    /// The first quote of day `d`. @return 0; -1 and a null `*out` when there is none.
+    int getQuote(const Date& d, SeriesQuote** out) const
+    {
+        *out = findQuote(d);
+        return *out != nullptr ? 0 : -1;
+    }
+    /// The i-th quote by date, null out of range.
+    SeriesQuote* getQuote(unsigned i) const { return quotes_.at(i); }
+    unsigned getNbrQuotes() const { return quotes_.getNbr(); }
+    /// The list's own array, by date.
+    SeriesQuote** getAllQuotes(unsigned* n) const { return quotes_.getAll(n); }
+
+    /// A value for any day: that of the last quote up to it; outside the series, the straight line through the first
+    /// and the last quote. A single quote holds for ever; without quotes 0.
+    ///
+    /// Between two quotes the value is a step, not a slope. Intended: a portfolio is worth the last known price.
+    float getRealQuote(const Date& d) const;
+
+    /// Date of the earliest and of the latest quote; the undefined date without quotes.
+    Date getFirstQuote() const { return quotes_.getNbr() > 0 ? quotes_.at(0)->getDate() : Date(); }
+    Date getLastQuote() const { return quotes_.getNbr() > 0 ? quotes_.at(quotes_.getNbr() - 1)->getDate() : Date(); }
+    /// Largest and smallest value; 0 without quotes.
+    float getHighestQuote() const;
+    float getLowestQuote() const;
+
+    /// Notes that the trend line has to be computed again; the next reader of it does so.
+    void updatePrevisions() { trendIsStale_ = true; }
+    /// Slope of the trend line, in value units per day; 0 for quotes of a single day, or none.
+    float getPente() const
+    {
+        fitTrend();
+        return slope_;
+    }
+    /// Value of the trend line on day `d`: slope * (d - first quote's day) + intercept.
+    float getPrevisionQuote(const Date& d) const
+    {
+        fitTrend();
+        return static_cast<float>(static_cast<double>(slope_) * (d - getFirstQuote()) + intercept_);
+    }
+
+protected:
+    explicit QuoteSeries(Owner* owner) : quotes_(owner) {}
+    ~QuoteSeries() = default;
+
+    void deleteQuotes() { quotes_.deleteAll(); }
+    /// File: count (i32), then the quotes by date. @return 0; -1 when a write failed.
+    int writeQuotes(FILE* file) const;
+    /// Reads a count and as many quotes as there are up to it. @return 0; -1 when the file ended before the last.
+    int readQuotes(FILE* file);
+
+private:
+    SeriesQuote* findQuote(const Date& d) const;
+    unsigned firstOnOrAfter(const Date& d) const;
+    void fitTrend() const;
+    void replaceWith(std::vector<SeriesQuote*>& late);
+
+    ManyEnd quotes_;
+    mutable float slope_ = 0;
+    mutable float intercept_ = 0; // of the trend line, on the day of the first quote
+    mutable bool trendIsStale_ = false;
+};
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+unsigned QuoteSeries<Owner, SeriesQuote, ManyEnd>::firstOnOrAfter(const Date& d) const
+{
+    unsigned n;
+    SeriesQuote** quotes = getAllQuotes(&n);
+    if (n == 0 || quotes[n - 1]->getDate() < d) // most often asked: a new quote, or a day after the last one
+        return n;
+    const auto isBefore = [&d](const SeriesQuote* q) { return q->getDate() < d; };
+    return static_cast<unsigned>(std::partition_point(quotes, quotes + n, isBefore) - quotes);
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+SeriesQuote* QuoteSeries<Owner, SeriesQuote, ManyEnd>::findQuote(const Date& d) const
+{
+    SeriesQuote* candidate = getQuote(firstOnOrAfter(d));
+    return candidate != nullptr && candidate->getDate() == d ? candidate : nullptr;
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getRealQuote(const Date& d) const
+{
+    unsigned n;
+    SeriesQuote** quotes = getAllQuotes(&n);
+    if (n == 0)
+        return 0;
+    const unsigned i = firstOnOrAfter(d);
+    if (i < n && quotes[i]->getDate() == d)
+        return quotes[i]->getValue();
+    if (i > 0 && i < n)
+        return quotes[i - 1]->getValue();
+
+    const SeriesQuote& first = *quotes[0];
+    const SeriesQuote& last = *quotes[n - 1];
+    const SeriesQuote& nearest = i == 0 ? first : last;
+    const int span = last.getDate() - first.getDate();
+    if (n == 1 || span == 0) // quotes of one and the same day have no direction
+        return nearest.getValue();
+    const double rise = static_cast<double>(last.getValue()) - first.getValue();
+    if (i == 0)
+        return static_cast<float>(first.getValue() - static_cast<double>(first.getDate() - d) / span * rise);
+    return static_cast<float>(last.getValue() + static_cast<double>(d - last.getDate()) / span * rise);
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getHighestQuote() const
+{
+    unsigned n;
+    SeriesQuote** quotes = getAllQuotes(&n);
+    float highest = n > 0 ? quotes[0]->getValue() : 0;
+    for (unsigned i = 1; i < n; ++i)
+        if (quotes[i]->getValue() > highest)
+            highest = quotes[i]->getValue();
+    return highest;
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getLowestQuote() const
+{
+    unsigned n;
+    SeriesQuote** quotes = getAllQuotes(&n);
+    float lowest = n > 0 ? quotes[0]->getValue() : 0;
+    for (unsigned i = 1; i < n; ++i)
+        if (quotes[i]->getValue() < lowest)
+            lowest = quotes[i]->getValue();
+    return lowest;
+}
+
+/// Ordinary least squares of value y against day number x, counted from the first quote:
+///     slope = (mean(xy) - mean(x) mean(y)) / (mean(x^2) - mean(x)^2)
+///     intercept = (mean(y) mean(x^2) - mean(x) mean(xy)) / (mean(x^2) - mean(x)^2)
+/// Source: Draper and Smith, Applied Regression Analysis, chapter 1. Sums are taken in double.
+template <class Owner, class SeriesQuote, class ManyEnd>
+void QuoteSeries<Owner, SeriesQuote, ManyEnd>::fitTrend() const
+{
+    if (!trendIsStale_)
+        return;
+    trendIsStale_ = false;
+    slope_ = intercept_ = 0;
+    unsigned n;
+    SeriesQuote** quotes = getAllQuotes(&n);
+    double sumX = 0, sumY = 0, sumXX = 0, sumXY = 0;
+    for (unsigned i = 0; i < n; ++i) {
+        const double x = quotes[i]->getDate() - quotes[0]->getDate();
+        const double y = quotes[i]->getValue();
+        sumX += x;
+        sumY += y;
+        sumXX += x * x;
+        sumXY += x * y;
+    }
+    if (n == 0)
+        return;
+    const double meanX = sumX / n, meanY = sumY / n, meanXX = sumXX / n, meanXY = sumXY / n;
+    const double variance = meanXX - meanX * meanX;
+    if (variance == 0) // a single day
+        return;
+    intercept_ = static_cast<float>((meanY * meanXX - meanX * meanXY) / variance);
+    slope_ = static_cast<float>((meanXY - meanX * meanY) / variance);
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+int QuoteSeries<Owner, SeriesQuote, ManyEnd>::writeQuotes(FILE* file) const
+{
+    unsigned n;
+    SeriesQuote** quotes = getAllQuotes(&n);
+    fwriteint(file, static_cast<int>(n));
+    for (unsigned i = 0; i < n; ++i)
+        if (quotes[i]->wrt(file) != 0)
+            return -1;
+    return 0;
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
+{
+    constexpr unsigned kQuotesInBlock = 2048;
+    unsigned char block[kQuotesInBlock * SeriesQuote::kFileSize];
+    std::vector<SeriesQuote*> late;
+    auto missing = static_cast<unsigned>(freadint(file));
+    while (missing > 0 && !reachedEnd(file)) {
+        const unsigned wanted = std::min(missing, kQuotesInBlock);
+        const auto whole = static_cast<unsigned>(std::fread(block, SeriesQuote::kFileSize, wanted, file));
+        quotes_.reserveExactly(quotes_.getNbr() + whole);
+        for (unsigned i = 0; i < whole; ++i) {
+            auto* q = new SeriesQuote;
+            q->decode(block + i * SeriesQuote::kFileSize);
+            if (firstOnOrAfter(q->getDate()) == quotes_.getNbr())
+                addQuote(q);
+            else
+                late.push_back(q);
+        }
+        missing -= whole;
+    }
+    replaceWith(late);
+    return missing == 0 && !reachedEnd(file) ? 0 : -1;
+}
+
+/// Adds quotes that did not come in date order, with the outcome of one `addQuote` after the other: of each day the
+/// last one stays. Looking up all of them before the first is added keeps the list from being sorted again each time.
+template <class Owner, class SeriesQuote, class ManyEnd>
+void QuoteSeries<Owner, SeriesQuote, ManyEnd>::replaceWith(std::vector<SeriesQuote*>& late)
+{
+    std::stable_sort(late.begin(), late.end(),
+                     [](const SeriesQuote* a, const SeriesQuote* b) { return a->getDate() < b->getDate(); });
+    std::vector<SeriesQuote*> added;
+    std::vector<SeriesQuote*> replaced;
+    for (std::size_t i = 0; i < late.size(); ++i) {
+        if (i + 1 < late.size() && late[i + 1]->getDate() == late[i]->getDate()) {
+            replaced.push_back(late[i]);
+            continue;
+        }
+        if (SeriesQuote* existing = findQuote(late[i]->getDate()))
+            replaced.push_back(existing);
+        added.push_back(late[i]);
+    }
+    for (SeriesQuote* q : replaced)
+        delete q;
+    for (SeriesQuote* q : added)
+        quotes_.add(q);
+    updatePrevisions();
+}
