@@ -121,6 +121,14 @@ public:
     /// To be called when the sort key of an element has changed.
     void changeNotice() { dirty_ = true; }
 
+    /// Keeps a turn in the order of equal keys for an element that is added later and then given it by `setTurn`.
+    std::uint32_t reserveTurn() { return nextSequence_++; }
+    void setTurn(Element* e, std::uint32_t turn)
+    {
+        backLink(*e).sequence_ = turn;
+        dirty_ = true;
+    }
+
     int xUnSet(Element* e) { return xSet(e, nullptr); }
 
     /// Makes room for `count` elements at once; only a saving, never needed.

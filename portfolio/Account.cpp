@@ -1,0 +1,166 @@
+#include "portfolio/Account.h"
+
+#include "foundation/FieldIO.h"
+#include "market/Currency.h"
+#include "portfolio/DepositAccountOperation.h"
+#include "portfolio/ShareOperation.h"
+#include "portfolio/TransferAccountOperation.h"
+#include "portfolio/Wallet.h"
+
+#include <memory>
+
+namespace {
+
+constexpr unsigned char kLetters[] = {'?', 'D', 'T', 'B', 'S'}; // by type code
+
+} // namespace
+
+Account::Account() : operations_(this), transfers_(this), states_(this) {}
+
+Account::Account(const String& name) : Account()
+{
+    name_ = name;
+}
+
+Account::~Account()
+{
+    operations_.deleteAll();
+    transfers_.deleteAll();
+    states_.deleteAll();
+    setWallet(nullptr);
+    setCurrency(nullptr);
+}
+
+int Account::wrt(FILE* file) const
+{
+    name_.wrt(file);
+    fwritechar(file, defaultTransfer_ ? 'Y' : 'N');
+    unsigned n;
+    Operation** operations = getAllOperations(&n);
+    fwriteint(file, static_cast<int>(n));
+    for (unsigned i = 0; i < n; ++i) {
+        const short type = operations[i]->getType();
+        fwritechar(file, kLetters[type]);
+        // A transfer names its recipient, which may be an account that comes later: it waits for the transfer block.
+        if (type != Operation::kTransfer && operations[i]->wrt(file) != 0)
+            return -1;
+    }
+    return 0;
+}
+
+int Account::rd(FILE* file)
+{
+    if (name_.rd(file) != 0)
+        return -1;
+    defaultTransfer_ = freadchar(file) == 'Y';
+    auto missing = static_cast<unsigned>(freadint(file));
+    for (; missing > 0 && !reachedEnd(file); --missing)
+        if (readOperation(file) != 0)
+            return -1;
+    return reachedEnd(file) ? -1 : 0;
+}
+
+int Account::readOperation(FILE* file)
+{
+    const unsigned char letter = freadchar(file);
+    if (letter == kLetters[Operation::kTransfer]) {
+        // Its body comes later; its turn among the operations of its day is kept, so that the next save writes the
+        // same order again.
+        transferTurns_.push_back(operations_.reserveTurn());
+        return reachedEnd(file) ? -1 : 0;
+    }
+    std::unique_ptr<Operation> operation;
+    if (letter == kLetters[Operation::kDeposit])
+        operation = std::make_unique<DepositAccountOperation>();
+    else
+        operation = std::make_unique<ShareOperation>();
+    operation->setAccount(this);
+    if (operation->rd(file) != 0)
+        return -1;
+    operation.release(); // the account owns it
+    return 0;
+}
+
+int Account::writeTransferOperations(FILE* file) const
+{
+    unsigned n;
+    Operation** operations = getAllOperations(&n);
+    const auto isTransfer = [](const Operation* operation) { return operation->getType() == Operation::kTransfer; };
+    fwriteint(file, static_cast<int>(std::count_if(operations, operations + n, isTransfer)));
+    for (unsigned i = 0; i < n; ++i)
+        if (isTransfer(operations[i]) && operations[i]->wrt(file) != 0)
+            return -1;
+    return 0;
+}
+
+int Account::readTransferOperations(FILE* file)
+{
+    const std::vector<std::uint32_t> turns = std::move(transferTurns_);
+    transferTurns_.clear();
+    const auto count = static_cast<unsigned>(freadint(file));
+    for (unsigned i = 0; i < count && !reachedEnd(file); ++i) {
+        auto transfer = std::make_unique<TransferAccountOperation>();
+        transfer->setAccount(this);
+        if (i < turns.size())
+            operations_.setTurn(transfer.get(), turns[i]);
+        if (transfer->rd(file) != 0) {
+            // Intended: a transfer to an unknown account is not dropped, the person shall see that it is there.
+            if (!reachedEnd(file))
+                transfer.release();
+            return -1;
+        }
+        transfer.release(); // the account owns it
+    }
+    return reachedEnd(file) ? -1 : 0;
+}
+
+String Account::getCurrencyName() const
+{
+    return currency_.partner() != nullptr ? currency_.partner()->getName() : String();
+}
+
+String Account::getCurrencyRepresentation() const
+{
+    return currency_.partner() != nullptr ? currency_.partner()->getRepresentation() : String();
+}
+
+int Account::getShare(const String& market, const String& abbreviation, Share** out) const
+{
+    *out = nullptr;
+    return wallet_.partner() != nullptr ? wallet_.partner()->getShare(market, abbreviation, out) : -1;
+}
+
+Account* Account::getAccountByName(const String& name) const
+{
+    return wallet_.partner() != nullptr ? wallet_.partner()->getAccountByName(name) : nullptr;
+}
+
+ManyToOneAssociation<Account, Currency>& CurrencyToAccounts::backLink(Account& e) const
+{
+    return e.currency_;
+}
+
+int AccountsToCurrency::xAdd(Currency* partner)
+{
+    return partner->addAccount(owner());
+}
+
+int AccountsToCurrency::xRemove(Currency* partner)
+{
+    return partner->removeAccount(owner());
+}
+
+ManyToOneAssociation<Account, Wallet>& WalletToAccounts::backLink(Account& e) const
+{
+    return e.wallet_;
+}
+
+int AccountsToWallet::xAdd(Wallet* partner)
+{
+    return partner->addAccount(owner());
+}
+
+int AccountsToWallet::xRemove(Wallet* partner)
+{
+    return partner->removeAccount(owner());
+}

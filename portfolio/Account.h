@@ -1,0 +1,91 @@
+#pragma once
+
+#include "foundation/Serializable.h"
+#include "foundation/String.h"
+#include "market/CurrencyToAccounts.h"
+#include "portfolio/AccountToAccountStates.h"
+#include "portfolio/AccountToOperations.h"
+#include "portfolio/AccountToTransferOperations.h"
+#include "portfolio/WalletToAccounts.h"
+
+#include <cstdint>
+#include <vector>
+
+class Share;
+
+/// A cash account in one currency. Its balance at a day is computed by an `AccountState`.
+///
+/// Owns its operations and its states; destroying it also destroys the transfers it receives, wherever they came from.
+class Account final : public Serializable {
+public:
+    Account();
+    explicit Account(const String& name);
+    virtual ~Account();
+
+    /// File: name, flag for the default transfer account, number of operations, then a type letter for each with its
+    /// body; a transfer's body stands in the transfer block instead. The currency's name is written by the wallet.
+    int wrt(FILE* file) const override;
+    /// @return 0; -1 when the file ends inside the record or a holding is unknown: the operations before it stay.
+    int rd(FILE* file) override;
+    /// The transfer block: number of transfers sent, then their bodies in the order of their letters.
+    int writeTransferOperations(FILE* file) const;
+    /// @return 0; -1 at a transfer whose recipient is unknown, which stays as a new one without recipient, and when
+    /// the file ends inside the block. All accounts of the wallet have been read before.
+    int readTransferOperations(FILE* file);
+
+    const String& getName() const { return name_; }
+    void setName(const String& name) { name_ = name; }
+    /// True when the profits of automatic sales in this account's currency are transferred here.
+    bool isDefaultTransferAccount() const { return defaultTransfer_; }
+    void setDefaultTransferAccount(bool isDefault) { defaultTransfer_ = isDefault; }
+
+    int getWallet(Wallet** out) const { return wallet_.get(out); }
+    int setWallet(Wallet* wallet) { return wallet_.set(wallet); }
+    int getCurrency(Currency** out) const { return currency_.get(out); }
+    int setCurrency(Currency* currency) { return currency_.set(currency); }
+    /// Of its currency; Strings without text when it has none.
+    String getCurrencyName() const;
+    String getCurrencyRepresentation() const;
+
+    int addOperation(Operation* operation) { return operations_.add(operation); }
+    int removeOperation(Operation* operation) { return operations_.remove(operation); }
+    unsigned getNbrOperations() const { return operations_.getNbr(); }
+    Operation** getAllOperations(unsigned* n) const { return operations_.getAll(n); }
+    Operation* getOperation(unsigned i) const { return operations_.at(i); }
+    /// To be called when the date of one of the operations has changed.
+    void operationChanged() { operations_.changeNotice(); }
+
+    int addTransferOperation(TransferAccountOperation* transfer) { return transfers_.add(transfer); }
+    int removeTransferOperation(TransferAccountOperation* transfer) { return transfers_.remove(transfer); }
+    unsigned getNbrTransferOperations() const { return transfers_.getNbr(); }
+    TransferAccountOperation** getAllTransferOperations(unsigned* n) const { return transfers_.getAll(n); }
+    TransferAccountOperation* getTransferOperation(unsigned i) const { return transfers_.at(i); }
+    /// To be called when the date of one of the received transfers has changed.
+    void transferOperationChanged() { transfers_.changeNotice(); }
+
+    int addAccountState(AccountState* state) { return states_.add(state); }
+    int removeAccountState(AccountState* state) { return states_.remove(state); }
+    unsigned getNbrAccountStates() const { return states_.getNbr(); }
+    AccountState** getAllAccountStates(unsigned* n) const { return states_.getAll(n); }
+    AccountState* getAccountState(unsigned i) const { return states_.at(i); }
+
+    /// The wallet's holding of that market name and ticker. @return 0; -1 and a null `*out` when there is none.
+    int getShare(const String& market, const String& abbreviation, Share** out) const;
+    /// The first account of that name in the wallet, null when there is none.
+    Account* getAccountByName(const String& name) const;
+
+private:
+    friend class CurrencyToAccounts;
+    friend class WalletToAccounts;
+
+    int readOperation(FILE* file);
+
+    String name_;
+    bool defaultTransfer_ = false;
+    AccountsToWallet wallet_{this};
+    AccountsToCurrency currency_{this};
+    AccountToOperations operations_;
+    AccountToTransferOperations transfers_;
+    AccountToAccountStates states_;
+    std::vector<std::uint32_t> transferTurns_; // between the two halves of reading: the turns of the letters "T"
+};

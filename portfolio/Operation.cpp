@@ -1,0 +1,61 @@
+#include "portfolio/Operation.h"
+
+#include "portfolio/Account.h"
+
+#include <cstring>
+
+Operation::~Operation()
+{
+    setAccount(nullptr);
+}
+
+void Operation::setDate(const Date& date)
+{
+    date_ = date;
+    notifyChange();
+}
+
+void Operation::notifyChange()
+{
+    if (account() != nullptr)
+        account()->operationChanged();
+}
+
+String Operation::getCurrencyRepresentation() const
+{
+    return account() != nullptr ? account()->getCurrencyRepresentation() : String();
+}
+
+Account* Operation::getAccountByName(const String& name) const
+{
+    return account() != nullptr ? account()->getAccountByName(name) : nullptr;
+}
+
+int sortOperationByDate(const void* a, const void* b)
+{
+    // The arrays hold pointers to one of the operation classes; each begins with its Operation.
+    const Operation* left;
+    const Operation* right;
+    std::memcpy(&left, a, sizeof left);
+    std::memcpy(&right, b, sizeof right);
+    if (left->getDate() > right->getDate())
+        return 1;
+    return left->getDate() < right->getDate() ? -1 : 0;
+}
+
+AccountToOperations::AccountToOperations(Account* owner) : OneToManyAssociation(owner, true, sortOperationByDate) {}
+
+ManyToOneAssociation<Operation, Account>& AccountToOperations::backLink(Operation& e) const
+{
+    return e.account_;
+}
+
+int OperationsToAccount::xAdd(Account* partner)
+{
+    return partner->addOperation(owner());
+}
+
+int OperationsToAccount::xRemove(Account* partner)
+{
+    return partner->removeOperation(owner());
+}

@@ -1,0 +1,106 @@
+#include "portfolio/Share.h"
+
+#include "market/Company.h"
+#include "market/Market.h"
+#include "portfolio/ShareOperation.h"
+#include "portfolio/Wallet.h"
+
+Share::Share() : operations_(this), states_(this) {}
+
+Share::Share(Wallet* wallet, Company* company) : Share()
+{
+    setWallet(wallet);
+    setCompany(company);
+}
+
+Share::~Share()
+{
+    operations_.deleteAll();
+    states_.deleteAll();
+    setWallet(nullptr);
+    setCompany(nullptr);
+}
+
+int Share::wrt(FILE*) const
+{
+    return 0;
+}
+
+int Share::rd(FILE*)
+{
+    return 0;
+}
+
+String Share::getMarketName() const
+{
+    Market* market = nullptr;
+    const Company* company = company_.partner();
+    return company != nullptr && company->getMarket(&market) == 0 ? market->getName() : String();
+}
+
+String Share::getCompanyAbbreviation() const
+{
+    const Company* company = company_.partner();
+    return company != nullptr ? company->getAbbreviation() : String();
+}
+
+String Share::getCompanyName() const
+{
+    const Company* company = company_.partner();
+    return company != nullptr ? company->getName() : String();
+}
+
+int Share::getQuote(const Date& date, float* out) const
+{
+    const Company* company = company_.partner();
+    *out = company != nullptr ? company->getRealQuote(date) : 0;
+    return company != nullptr ? 0 : -1;
+}
+
+float Share::getPrevisionQuote(const Date& date) const
+{
+    const Company* company = company_.partner();
+    return company != nullptr ? company->getPrevisionQuote(date) : 0;
+}
+
+void Share::removeAutomaticShareOperations()
+{
+    for (unsigned i = getNbrShareOperations(); i-- > 0;)
+        if (getShareOperation(i)->isAutomatic())
+            delete getShareOperation(i);
+}
+
+ManyToOneAssociation<Share, Company>& CompanyToShares::backLink(Share& e) const
+{
+    return e.company_;
+}
+
+void CompanyToShares::deleteAll()
+{
+    OneToManyAssociation::deleteAll();
+}
+
+int SharesToCompany::xAdd(Company* partner)
+{
+    return partner->addShare(owner());
+}
+
+int SharesToCompany::xRemove(Company* partner)
+{
+    return partner->removeShare(owner());
+}
+
+ManyToOneAssociation<Share, Wallet>& WalletToShares::backLink(Share& e) const
+{
+    return e.wallet_;
+}
+
+int SharesToWallet::xAdd(Wallet* partner)
+{
+    return partner->addShare(owner());
+}
+
+int SharesToWallet::xRemove(Wallet* partner)
+{
+    return partner->removeShare(owner());
+}

@@ -1,0 +1,67 @@
+#pragma once
+
+#include "foundation/Date.h"
+#include "foundation/Serializable.h"
+#include "foundation/String.h"
+#include "market/CompanyToShares.h"
+#include "portfolio/ShareToShareOperations.h"
+#include "portfolio/ShareToShareStates.h"
+#include "portfolio/WalletToShares.h"
+
+/// The wallet's holding of one company: ties the wallet to the company and lists the buys and sells, manual and
+/// automatic. Quantity, average price and value at a day are computed by a `ShareState`.
+///
+/// Owns its operations and its states.
+class Share final : public Serializable {
+public:
+    Share();
+    Share(Wallet* wallet, Company* company);
+    virtual ~Share();
+
+    /// A holding has no record of its own: the wallet writes its names. Both do nothing and return 0.
+    int wrt(FILE* file) const override;
+    int rd(FILE* file) override;
+
+    int getWallet(Wallet** out) const { return wallet_.get(out); }
+    int setWallet(Wallet* wallet) { return wallet_.set(wallet); }
+    int getCompany(Company** out) const { return company_.get(out); }
+    int setCompany(Company* company) { return company_.set(company); }
+
+    int addShareOperation(ShareOperation* operation) { return operations_.add(operation); }
+    int removeShareOperation(ShareOperation* operation) { return operations_.remove(operation); }
+    unsigned getNbrShareOperations() const { return operations_.getNbr(); }
+    ShareOperation** getAllShareOperations(unsigned* n) const { return operations_.getAll(n); }
+    ShareOperation* getShareOperation(unsigned i) const { return operations_.at(i); }
+    /// To be called when the date of one of the operations has changed.
+    void shareOperationChanged() { operations_.changeNotice(); }
+
+    int addShareState(ShareState* state) { return states_.add(state); }
+    int removeShareState(ShareState* state) { return states_.remove(state); }
+    unsigned getNbrShareStates() const { return states_.getNbr(); }
+    ShareState** getAllShareStates(unsigned* n) const { return states_.getAll(n); }
+    ShareState* getShareState(unsigned i) const { return states_.at(i); }
+    /// Makes room for as many states; only a saving.
+    void reserveShareStates(unsigned n) { states_.reserveExactly(n); }
+
+    /// Names of the company and its market; Strings without text where the link is missing.
+    String getMarketName() const;
+    String getCompanyAbbreviation() const;
+    String getCompanyName() const;
+
+    /// The company's price for any day, 0 without a company. @return 0; -1 without a company.
+    int getQuote(const Date& date, float* out) const;
+    /// The company's trend on that day, 0 without a company.
+    float getPrevisionQuote(const Date& date) const;
+
+    /// Destroys the automatic operations of this holding.
+    void removeAutomaticShareOperations();
+
+private:
+    friend class CompanyToShares;
+    friend class WalletToShares;
+
+    SharesToWallet wallet_{this};
+    SharesToCompany company_{this};
+    ShareToShareOperations operations_;
+    ShareToShareStates states_;
+};

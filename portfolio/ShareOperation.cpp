@@ -1,0 +1,85 @@
+#include "portfolio/ShareOperation.h"
+
+#include "foundation/FieldIO.h"
+#include "portfolio/Account.h"
+#include "portfolio/Share.h"
+#include "portfolio/Wallet.h"
+
+ShareOperation::ShareOperation(const Date& date, Share* share, bool buy, int quantity, float quote, bool automatic,
+                               float operationCost)
+    : Operation(date, automatic), buy_(buy), quantity_(quantity), quote_(quote), operationCost_(operationCost)
+{
+    setShare(share);
+}
+
+ShareOperation::~ShareOperation()
+{
+    setShare(nullptr);
+}
+
+int ShareOperation::wrt(FILE* file) const
+{
+    const Share* share = share_.partner();
+    if (share == nullptr)
+        return -1;
+    fwritechar(file, buy_ ? 'Y' : 'N');
+    share->getMarketName().wrt(file);
+    share->getCompanyAbbreviation().wrt(file);
+    fwriteint(file, quantity_);
+    fwritefloat(file, quote_);
+    getDate().wrt(file);
+    fwritefloat(file, operationCost_);
+    return 0;
+}
+
+int ShareOperation::rd(FILE* file)
+{
+    buy_ = freadchar(file) == 'Y';
+    String market;
+    String abbreviation;
+    if (market.rd(file) != 0 || abbreviation.rd(file) != 0)
+        return -1;
+    Share* share = nullptr;
+    if (account() == nullptr || account()->getShare(market, abbreviation, &share) != 0)
+        return -1;
+    setShare(share);
+    quantity_ = freadint(file);
+    quote_ = freadfloat(file);
+    Date date;
+    date.rd(file);
+    setDate(date);
+    operationCost_ = freadfloat(file);
+    return reachedEnd(file) ? -1 : 0;
+}
+
+float ShareOperation::getOperationRateCost() const
+{
+    Wallet* wallet = nullptr;
+    if (share_.partner() == nullptr || share_.partner()->getWallet(&wallet) != 0)
+        return 0;
+    return buy_ ? wallet->getBuyRateCost() : wallet->getSellRateCost();
+}
+
+void ShareOperation::notifyChange()
+{
+    Operation::notifyChange();
+    if (share_.partner() != nullptr)
+        share_.partner()->shareOperationChanged();
+}
+
+ShareToShareOperations::ShareToShareOperations(Share* owner) : OneToManyAssociation(owner, true, sortOperationByDate) {}
+
+ManyToOneAssociation<ShareOperation, Share>& ShareToShareOperations::backLink(ShareOperation& e) const
+{
+    return e.share_;
+}
+
+int ShareOperationsToShare::xAdd(Share* partner)
+{
+    return partner->addShareOperation(owner());
+}
+
+int ShareOperationsToShare::xRemove(Share* partner)
+{
+    return partner->removeShareOperation(owner());
+}

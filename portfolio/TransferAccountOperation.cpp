@@ -1,0 +1,81 @@
+#include "portfolio/TransferAccountOperation.h"
+
+#include "foundation/FieldIO.h"
+#include "portfolio/Account.h"
+
+TransferAccountOperation::TransferAccountOperation(const Date& date, Account* from, Account* to, float amount,
+                                                   bool automatic)
+    : AccountOperation(date, from, amount, automatic)
+{
+    setRecepientAccount(to);
+}
+
+TransferAccountOperation::~TransferAccountOperation()
+{
+    setRecepientAccount(nullptr);
+}
+
+int TransferAccountOperation::wrt(FILE* file) const
+{
+    const Account* recipient = recipient_.partner();
+    const String name = recipient != nullptr ? recipient->getName() : String();
+    name.wrt(file);
+    fwritefloat(file, getAmount());
+    fwritefloat(file, rateCost_);
+    fwritefloat(file, cost_);
+    fwritefloat(file, fromCurrencyQuote_);
+    fwritefloat(file, toCurrencyQuote_);
+    return getDate().wrt(file);
+}
+
+int TransferAccountOperation::rd(FILE* file)
+{
+    String name;
+    if (name.rd(file) != 0)
+        return -1;
+    Account* recipient = getAccountByName(name);
+    if (recipient == nullptr)
+        return -1;
+    setRecepientAccount(recipient);
+    setAmount(freadfloat(file));
+    rateCost_ = freadfloat(file);
+    cost_ = freadfloat(file);
+    fromCurrencyQuote_ = freadfloat(file);
+    toCurrencyQuote_ = freadfloat(file);
+    Date date;
+    date.rd(file);
+    setDate(date);
+    return reachedEnd(file) ? -1 : 0;
+}
+
+float TransferAccountOperation::getTotalCost() const
+{
+    return static_cast<float>(static_cast<double>(getAmount()) * rateCost_ + cost_);
+}
+
+void TransferAccountOperation::notifyChange()
+{
+    AccountOperation::notifyChange();
+    if (recipient_.partner() != nullptr)
+        recipient_.partner()->transferOperationChanged();
+}
+
+AccountToTransferOperations::AccountToTransferOperations(Account* owner)
+    : OneToManyAssociation(owner, true, sortOperationByDate)
+{}
+
+ManyToOneAssociation<TransferAccountOperation, Account>&
+AccountToTransferOperations::backLink(TransferAccountOperation& e) const
+{
+    return e.recipient_;
+}
+
+int TransferOperationsToAccount::xAdd(Account* partner)
+{
+    return partner->addTransferOperation(owner());
+}
+
+int TransferOperationsToAccount::xRemove(Account* partner)
+{
+    return partner->removeTransferOperation(owner());
+}

@@ -1,0 +1,66 @@
+#include "portfolio/WalletNames.h"
+
+#include "market/Company.h"
+#include "market/Market.h"
+#include "portfolio/Account.h"
+#include "portfolio/Share.h"
+
+std::size_t WalletNames::PairHash::operator()(const Pair& pair) const
+{
+    const std::hash<std::string_view> hash;
+    return hash(pair.first) * 31 + hash(pair.second);
+}
+
+WalletNames::WalletNames(const std::vector<Market*>& markets)
+{
+    for (const Market* market : markets) {
+        unsigned n;
+        Company** companies = market->getAllCompanies(&n);
+        for (unsigned i = 0; i < n; ++i)
+            if (market->getName().hasText() && companies[i]->getAbbreviation().hasText())
+                companies_.try_emplace(
+                    {market->getName().comparedBytes(), companies[i]->getAbbreviation().comparedBytes()}, companies[i]);
+    }
+}
+
+void WalletNames::add(Share* share)
+{
+    Company* company = nullptr;
+    Market* market = nullptr;
+    if (share->getCompany(&company) == 0 && company->getMarket(&market) == 0)
+        shares_.try_emplace({market->getName().comparedBytes(), company->getAbbreviation().comparedBytes()}, share);
+}
+
+void WalletNames::add(Account* account)
+{
+    accounts_.try_emplace(account->getName().comparedBytes(), account);
+}
+
+template <class T>
+int WalletNames::find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out)
+{
+    *out = nullptr;
+    if (!market.hasText() || !abbreviation.hasText())
+        return -1;
+    const auto found = map.find({market.comparedBytes(), abbreviation.comparedBytes()});
+    if (found == map.end())
+        return -1;
+    *out = found->second;
+    return 0;
+}
+
+int WalletNames::getCompany(const String& market, const String& abbreviation, Company** out) const
+{
+    return find(companies_, market, abbreviation, out);
+}
+
+int WalletNames::getShare(const String& market, const String& abbreviation, Share** out) const
+{
+    return find(shares_, market, abbreviation, out);
+}
+
+Account* WalletNames::getAccount(const String& name) const
+{
+    const auto found = name.hasText() ? accounts_.find(name.comparedBytes()) : accounts_.end();
+    return found != accounts_.end() ? found->second : nullptr;
+}

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "foundation/Date.h"
+#include "foundation/Pooled.h"
+#include "foundation/String.h"
+#include "portfolio/AccountToAccountStates.h"
+#include "valuation/StateToAccountStates.h"
+
+/// The cash of one account at the day of a state, in the account's own currency.
+class AccountState final : public Pooled<AccountState> {
+public:
+    /// Replays the account's manual deposits and transfers up to and including `date`; purchases and sales reach the
+    /// cash through the states of the holdings. The last argument makes no difference.
+    AccountState(Account* account, State* state, const Date& date, bool automatic);
+    ~AccountState();
+    AccountState(const AccountState&) = delete;
+    AccountState& operator=(const AccountState&) = delete;
+
+    /// Replays the account's automatic deposits and transfers up to and including `date`.
+    void processAutomaticOperations(const Date& date);
+
+    float getCash() const { return cash_; }
+    void setCash(float cash) { cash_ = cash; }
+    /// The state's day, undefined without a state.
+    Date getDate() const;
+    String getAccountName() const;
+    String getCurrencyRepresentation() const;
+
+    int getAccount(Account** out) const { return account_.get(out); }
+    /// The linked account, null without one.
+    const Account* listed() const { return account_.partner(); }
+    int setAccount(Account* account) { return account_.set(account); }
+    int getState(State** out) const { return state_.get(out); }
+    int setState(State* state) { return state_.set(state); }
+
+private:
+    friend class AccountToAccountStates;
+    friend class StateToAccountStates;
+    friend class DailyStates;
+
+    /// With its cash known already.
+    AccountState(Account* account, State* state, float cash);
+
+    void replay(const Date& date, bool automatic);
+
+    AccountStatesToAccount account_{this};
+    AccountStatesToState state_{this};
+    float cash_ = 0;
+};

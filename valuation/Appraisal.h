@@ -1,0 +1,43 @@
+#pragma once
+
+#include <vector>
+
+class Catalogue;
+class Currency;
+class State;
+class String;
+
+/// The worth of states in the catalogue's reference currency.
+///
+/// Amounts in a currency count at its rate of the state's day, divided by the reference currency's own rate of that
+/// day; currencies are found by symbol. Sums are rounded to float after every addition. An appraisal remembers which
+/// currency each holding is in, so it serves for many states of a wallet while catalogue and wallet stay as they are.
+class Appraisal {
+public:
+    explicit Appraisal(const Catalogue& catalogue);
+
+    /// False without a reference currency: nothing has a value then.
+    bool hasReference() const { return reference_ != nullptr; }
+
+    /// Value of holdings and cash; 0 without a reference currency, and when its rate is 0.
+    float totalValue(const State& state);
+
+private:
+    /// What stood at a place of the states met so far, and the index of its currency in `rates_`, or kUnknown.
+    struct Line {
+        const void* item = nullptr;
+        unsigned currency = 0;
+    };
+
+    float sharesValue(const State& state, double referenceRate);
+    float cashValue(const State& state, double referenceRate);
+    template <class Item>
+    unsigned currencyOf(std::vector<Line>& lines, unsigned place, const Item* item) const;
+    unsigned findCurrency(const String& representation) const;
+
+    const Catalogue& catalogue_;
+    Currency* reference_;
+    std::vector<double> rates_; // of each currency of the catalogue, on the day of the state at hand
+    std::vector<Line> shares_;  // by place in the state
+    std::vector<Line> accounts_;
+};

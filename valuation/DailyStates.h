@@ -1,0 +1,66 @@
+#pragma once
+
+#include "foundation/Date.h"
+#include "valuation/Holding.h"
+#include "valuation/Ledger.h"
+
+#include <unordered_map>
+#include <utility>
+#include <vector>
+
+class Account;
+class Operation;
+class Share;
+class ShareOperation;
+class Wallet;
+
+/// Builds a wallet's state of every day of an evolution in one sweep, each bit for bit what `State(wallet, day, false)`
+/// gives.
+///
+/// From one day to the next a holding only takes in the operations of that day. A balance is the sum, rounded after
+/// each move, of the account's own moves, then the transfers it received, then the purchases and sales of one holding
+/// after the other. A day's operation therefore stands in the middle of the sum; only what follows it is summed again,
+/// and on a day without operations nothing.
+class DailyStates {
+public:
+    /// For the days from `first` up to, but not including, `end`; both are valid dates. As for every state, automatic
+    /// operations that accounts list are destroyed first.
+    DailyStates(Wallet& wallet, const Date& first, const Date& end);
+
+    /// The states are added to the wallet's list, day by day, and owned by it.
+    void build();
+
+private:
+    /// A move that happens on a day.
+    struct Event {
+        Ledger* ledger;
+        std::size_t segment;
+    };
+    /// A holding on its way through the days.
+    struct Line {
+        Share* share;
+        std::vector<std::pair<std::size_t, const ShareOperation*>> operations; // with the day each counts from
+        std::size_t replayed = 0;
+        Holding holding;
+        std::vector<float> quotes; // of each day
+    };
+
+    void takeOwnMoves(std::size_t account);
+    void takeReceivedTransfers(std::size_t account, bool automatic);
+    void takeShare(Share& share);
+    void takeQuotes(Line& line) const;
+    void takeMove(const Operation& operation, Ledger& ledger, double amount);
+    std::size_t dayOf(const Date& date) const;
+    void buildDay(std::size_t day);
+
+    Wallet& wallet_;
+    std::vector<Date> days_;
+    Date firstOperationDate_;
+    std::vector<Account*> accounts_;
+    std::unordered_map<const Account*, std::size_t> accountIndex_;
+    std::vector<Ledger> cash_;               // of each account
+    std::vector<const Share*> lastShare_;    // whose moves the last segment of each account's ledger holds
+    Ledger deposits_;                        // in the reference currency, a segment per account
+    std::vector<std::vector<Event>> events_; // of each day
+    std::vector<Line> lines_;                // of each holding
+};

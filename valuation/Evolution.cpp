@@ -1,0 +1,55 @@
+#include "valuation/Evolution.h"
+
+#include "portfolio/Wallet.h"
+#include "valuation/Appraisal.h"
+#include "valuation/DailyStates.h"
+#include "valuation/State.h"
+
+#include <cstdint>
+
+namespace {
+
+// A mistyped year, 99 for 1999, would ask for the states of two thousand years. Two centuries of days, and some 40
+// years of a thousand holdings (about 2 gigabytes), are more than a person's portfolio has.
+constexpr std::int64_t kMostDays = 100000;
+constexpr std::int64_t kMostHoldingDays = 20000000;
+
+EvolutionOutcome buildDailyStates(Wallet& wallet, const Date& first, const Date& end)
+{
+    if (first >= end)
+        return EvolutionOutcome::Built;
+    if (!first.isValid() || !end.isValid())
+        return EvolutionOutcome::BadFirstDay;
+    const std::int64_t days = end - first;
+    if (days > kMostDays || days * (wallet.getNbrShares() + wallet.getNbrAccounts()) > kMostHoldingDays)
+        return EvolutionOutcome::TooLong;
+    DailyStates(wallet, first, end).build();
+    return EvolutionOutcome::Built;
+}
+
+} // namespace
+
+State* refreshStates(Wallet& wallet, const Date& date, bool previsions, EvolutionOutcome* outcome)
+{
+    wallet.removeAllStates();
+    if (date.isUndefined())
+        return nullptr;
+    auto* current = new State(&wallet, date, previsions); // owned by the wallet
+    if (outcome != nullptr)
+        *outcome = buildDailyStates(wallet, current->getFirstOperationDate(), date);
+    return current;
+}
+
+std::vector<EvolutionPoint> evolutionPoints(const Wallet& wallet, const Catalogue& catalogue)
+{
+    std::vector<EvolutionPoint> points;
+    Appraisal appraisal(catalogue);
+    if (!appraisal.hasReference())
+        return points;
+    unsigned n;
+    State** states = wallet.getAllStates(&n);
+    points.reserve(n);
+    for (unsigned i = 0; i < n; ++i)
+        points.push_back({states[i]->getDate(), appraisal.totalValue(*states[i])});
+    return points;
+}

@@ -1,0 +1,32 @@
+#pragma once
+
+#include "foundation/Date.h"
+
+#include <vector>
+
+class Catalogue;
+class State;
+class Wallet;
+
+/// What came of an evolution.
+enum class EvolutionOutcome {
+    Built,       ///< a state for every day from the first operation up to the current state's day
+    BadFirstDay, ///< the first operation has no real date to begin at: no daily states
+    TooLong,     ///< too many days for that many holdings: no daily states
+};
+
+/// Recomputes the states of `wallet`: destroys all of them, builds the current one for `date`, with automatic sales
+/// when `previsions` is set, and, when `outcome` is given, the daily ones of the evolution behind it. The daily states
+/// remove the automatic operations of the accounts again, as every state does.
+/// @return the current state, owned by the wallet; null when `date` is undefined.
+State* refreshStates(Wallet& wallet, const Date& date, bool previsions, EvolutionOutcome* outcome);
+
+/// One point of the evolution chart.
+struct EvolutionPoint {
+    Date date;
+    float totalValue; // in the reference currency
+};
+
+/// The total value of every state of the wallet, in the order of its list: the current state first, then the daily
+/// ones. Empty without a reference currency.
+std::vector<EvolutionPoint> evolutionPoints(const Wallet& wallet, const Catalogue& catalogue);

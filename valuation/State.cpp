@@ -1,0 +1,89 @@
+#include "valuation/State.h"
+
+#include "portfolio/Account.h"
+#include "portfolio/Wallet.h"
+#include "valuation/AccountState.h"
+#include "valuation/ShareState.h"
+
+State::State(Wallet* wallet, const Date& date) : shareStates_(this), accountStates_(this), date_(date)
+{
+    setWallet(wallet);
+}
+
+State::State(Wallet* wallet, const Date& date, bool automatic) : State(wallet, date)
+{
+    automatic_ = automatic;
+    if (wallet == nullptr || date.isUndefined())
+        return;
+    wallet->removeAutomaticOperations();
+    firstOperationDate_ = afterAllOperations();
+
+    // Accounts first: the replay of the holdings moves their cash. The states link themselves in and are owned here.
+    unsigned nAccounts;
+    Account** accounts = wallet->getAllAccounts(&nAccounts);
+    for (unsigned i = 0; i < nAccounts; ++i)
+        new AccountState(accounts[i], this, date, automatic);
+    unsigned nShares;
+    Share** shares = wallet->getAllShares(&nShares);
+    for (unsigned i = 0; i < nShares; ++i)
+        new ShareState(shares[i], this, date, automatic);
+    for (unsigned i = 0; i < getNbrAccountStates(); ++i)
+        getAccountState(i)->processAutomaticOperations(date);
+}
+
+State::~State()
+{
+    accountStates_.deleteAll();
+    shareStates_.deleteAll();
+    setWallet(nullptr);
+}
+
+void State::noteOperationDate(const Date& date)
+{
+    if (date < firstOperationDate_)
+        firstOperationDate_ = date;
+}
+
+AccountState* State::findAccountState(const Account* account) const
+{
+    unsigned n;
+    AccountState** states = getAllAccountStates(&n);
+    for (unsigned i = 0; i < n; ++i) {
+        Account* candidate;
+        if (states[i]->getAccount(&candidate) == 0 && candidate == account)
+            return states[i];
+    }
+    return nullptr;
+}
+
+void State::BuyShares(const Account* account, float amount)
+{
+    if (AccountState* state = findAccountState(account))
+        state->setCash(state->getCash() - amount);
+}
+
+void State::SellShares(const Account* account, float amount)
+{
+    if (AccountState* state = findAccountState(account))
+        state->setCash(state->getCash() + amount);
+}
+
+ManyToOneAssociation<State, Wallet>& WalletToStates::backLink(State& e) const
+{
+    return e.wallet_;
+}
+
+void WalletToStates::deleteAll()
+{
+    OneToManyAssociation::deleteAll();
+}
+
+int StatesToWallet::xAdd(Wallet* partner)
+{
+    return partner->addState(owner());
+}
+
+int StatesToWallet::xRemove(Wallet* partner)
+{
+    return partner->removeState(owner());
+}

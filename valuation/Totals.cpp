@@ -1,0 +1,34 @@
+#include "valuation/Totals.h"
+
+#include "market/Catalogue.h"
+#include "market/Currency.h"
+#include "valuation/Appraisal.h"
+#include "valuation/State.h"
+
+namespace {
+
+constexpr double kDaysInYear = 365.25;
+
+float annualRevenueOf(const State& state, double profit)
+{
+    if (state.getDate() <= state.getFirstOperationDate() || state.getTotalDeposit() == 0)
+        return 0;
+    const int days = state.getDate() - state.getFirstOperationDate();
+    return static_cast<float>(kDaysInYear / days * profit / state.getTotalDeposit());
+}
+
+} // namespace
+
+Totals::Totals(const State& state, const Catalogue& catalogue)
+{
+    Appraisal appraisal(catalogue);
+    if (!appraisal.hasReference())
+        return;
+    isKnown = true;
+    totalDeposit = state.getTotalDeposit();
+    if (catalogue.getReferenceCurrency()->getRealQuote(state.getDate()) == 0)
+        return;
+    totalValue = appraisal.totalValue(state);
+    profit = totalValue - totalDeposit;
+    annualRevenue = annualRevenueOf(state, profit);
+}
