@@ -13,7 +13,6 @@
 #include "valuation/State.h"
 
 #include <algorithm>
-#include <utility>
 
 DailyStates::DailyStates(Wallet& wallet, const Date& first, const Date& end)
     : wallet_(wallet), firstOperationDate_(State::afterAllOperations())
@@ -26,7 +25,6 @@ DailyStates::DailyStates(Wallet& wallet, const Date& first, const Date& end)
     unsigned nAccounts;
     Account** accounts = wallet.getAllAccounts(&nAccounts);
     accounts_.assign(accounts, accounts + nAccounts);
-    lastShare_.resize(nAccounts);
     cash_.resize(nAccounts); // the events point into it: it must not grow later
     // The order in which a state moves cash: every account's own moves, then holding by holding, then what is
     // automatic.
@@ -59,8 +57,7 @@ void DailyStates::takeMove(const Operation& operation, Ledger& ledger, double am
     const std::size_t day = dayOf(operation.getDate());
     if (day == days_.size())
         return;
-    ledger.addMove(amount);
-    events_[day].push_back({&ledger, ledger.getNbrSegments() - 1});
+    events_[day].push_back({&ledger, ledger.addMove(amount)});
 }
 
 void DailyStates::takeOwnMoves(std::size_t account)
@@ -68,8 +65,6 @@ void DailyStates::takeOwnMoves(std::size_t account)
     Currency* currency;
     if (accounts_[account]->getCurrency(&currency) != 0)
         return;
-    cash_[account].addSegment();
-    deposits_.addSegment();
     unsigned n;
     Operation** operations = accounts_[account]->getAllOperations(&n);
     for (unsigned i = 0; i < n; ++i) {
@@ -88,7 +83,6 @@ void DailyStates::takeReceivedTransfers(std::size_t account, bool automatic)
     Currency* currency;
     if (accounts_[account]->getCurrency(&currency) != 0)
         return;
-    cash_[account].addSegment();
     unsigned n;
     TransferAccountOperation** transfers = accounts_[account]->getAllTransferOperations(&n);
     for (unsigned i = 0; i < n; ++i) {
@@ -113,11 +107,8 @@ void DailyStates::takeShare(Share& share)
         const auto found = accountIndex_.find(account);
         if (found == accountIndex_.end()) // none, or one of another wallet: it moves no cash here
             continue;
-        Ledger& ledger = cash_[found->second];
-        if (std::exchange(lastShare_[found->second], &share) != &share)
-            ledger.addSegment();
         const float amount = operation.isBuy() ? -purchaseCost(operation, wallet_) : saleProceeds(operation, wallet_);
-        takeMove(operation, ledger, amount);
+        takeMove(operation, cash_[found->second], amount);
     }
     takeQuotes(line);
     share.reserveShareStates(share.getNbrShareStates() + static_cast<unsigned>(days_.size()));
@@ -155,7 +146,7 @@ void DailyStates::build()
 void DailyStates::buildDay(std::size_t day)
 {
     for (const Event& event : events_[day])
-        event.ledger->advance(event.segment);
+        event.ledger->happen(event.rank);
 
     auto* state = new State(&wallet_, days_[day]); // owned by the wallet, and the others by it
     state->setFirstOperationDate(firstOperationDate_);

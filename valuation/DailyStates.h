@@ -34,7 +34,7 @@ private:
     /// A move that happens on a day.
     struct Event {
         Ledger* ledger;
-        std::size_t segment;
+        Ledger::Rank rank;
     };
     /// A holding on its way through the days.
     struct Line {
@@ -59,8 +59,7 @@ private:
     std::vector<Account*> accounts_;
     std::unordered_map<const Account*, std::size_t> accountIndex_;
     std::vector<Ledger> cash_;               // of each account
-    std::vector<const Share*> lastShare_;    // whose moves the last segment of each account's ledger holds
-    Ledger deposits_;                        // in the reference currency, a segment per account
+    Ledger deposits_;                        // in the reference currency
     std::vector<std::vector<Event>> events_; // of each day
     std::vector<Line> lines_;                // of each holding
 };

@@ -1,40 +1,32 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
 #include <limits>
 #include <vector>
 
-/// A sum of moves, rounded to float after every addition, that can be taken again as more and more of them happen.
+/// A sum of moves, rounded to float after every addition, as more and more of the moves happen.
 ///
-/// The moves stand in segments, in the order in which they are added up; within a segment they happen one after the
-/// other. When one happens, everything behind it has to be added up again, because each rounding depends on the sum so
-/// far; what stands before it is remembered.
+/// The moves are added up in a fixed order that is not the order in which they happen. Because each rounding depends on
+/// the sum so far, a move that happens makes everything behind it be added up again; what stands before it is
+/// remembered.
 class Ledger {
 public:
-    /// Starts a new segment behind the others. @return its number.
-    std::size_t addSegment();
-    /// Adds a move to the last segment; it has not happened yet.
-    void addMove(double amount) { moves_.push_back(amount); }
-    std::size_t getNbrSegments() const { return segments_.size(); }
+    /// The place of a move in the order of addition.
+    using Rank = std::uint32_t;
 
-    /// The next move of the segment happens.
-    void advance(std::size_t segment);
-    /// The sum of all moves that have happened.
+    /// Adds a move behind the others. It has not happened yet.
+    Rank addMove(double amount);
+    void happen(Rank rank);
+    /// The sum of the moves that have happened.
     float balance();
 
 private:
-    struct Segment {
-        std::size_t begin;        // its first move
-        std::size_t happened = 0; // number of its moves that count
-        std::size_t summed = 0;   // number of those that are in `sum`
-        float sum = 0;            // of everything up to the last summed move of this segment
-    };
-
     static constexpr std::size_t kNone = std::numeric_limits<std::size_t>::max();
 
-    void takeIn(Segment& segment);
-
-    std::vector<double> moves_;
-    std::vector<Segment> segments_;
-    std::size_t stale_ = kNone; // the first segment with a move that is not summed
+    std::vector<double> amounts_; // of all moves, by rank
+    // The moves that have happened, in order:
+    std::vector<Rank> happened_;
+    std::vector<float> sums_;   // up to and including each; right before `stale_`
+    std::size_t stale_ = kNone; // from here on the sums have to be taken again
 };
