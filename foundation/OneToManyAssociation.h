@@ -52,11 +52,15 @@ public:
         return failure;
     }
 
-    /// @return 0 without effect for an element that is not here; otherwise what unlinking the element gives.
+    /// @return 0 without effect for an element that is not here; otherwise what unlinking the element gives, after a
+    /// failure of which nothing has changed.
     int remove(Element* e)
     {
         if (e == nullptr || !contains(e))
             return 0;
+        // The link goes first and comes back here once it is free, so that a refusal leaves both ends as they were.
+        if (backLink(*e).partner_ == owner_)
+            return xUnSet(e);
         const std::uint32_t place = placeOf(e);
         if (--count_ != place) {
             elements_[place] = elements_[count_];
@@ -64,7 +68,7 @@ public:
             dirty_ = true;
         }
         shrink();
-        return xUnSet(e);
+        return 0;
     }
 
     /// `*out` becomes element `i`, null with -1 when `i` is out of range.
@@ -90,7 +94,7 @@ public:
     {
         sortWhenDirty();
         *n = count_;
-        return elements_;
+        return count_ > 0 ? elements_ : nullptr; // a refused addition leaves room behind
     }
     unsigned getNbr() const { return count_; }
     /// `*index` becomes the element's place. @return 0; -1 when it is not here.
@@ -150,11 +154,11 @@ public:
         while (count_ > 0)
             delete elements_[count_ - 1];
     }
-    /// Unlinks every element and leaves it alone otherwise.
+    /// Unlinks every element and leaves it alone otherwise; stops at one that will not be unlinked.
     void unlinkAll()
     {
-        while (count_ > 0)
-            remove(elements_[count_ - 1]);
+        while (count_ > 0 && remove(elements_[count_ - 1]) == 0) {
+        }
     }
 
 protected:
