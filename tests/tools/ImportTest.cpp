@@ -1,0 +1,292 @@
+#include "market/Catalogue.h"
+#include "market/Company.h"
+#include "market/Currency.h"
+#include "market/Market.h"
+#include "tools/AtomicFile.h"
+#include "tools/CsvReader.h"
+#include "tools/DateText.h"
+#include "tools/DecimalReader.h"
+#include "tools/Importer.h"
+
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <gmock/gmock.h>
+#include <sstream>
+#include <sys/wait.h>
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+
+namespace {
+
+namespace fs = std::filesystem;
+
+class ImportTest : public testing::Test {
+protected:
+    ImportTest() { fs::create_directory(folder_); }
+    ~ImportTest() override { fs::remove_all(folder_); }
+
+    std::string path(const std::string& name) const { return folder_ / name; }
+    std::string file(const std::string& name, const std::string& content) const
+    {
+        std::ofstream(path(name), std::ios::binary) << content;
+        return path(name);
+    }
+    std::string content(const std::string& name) const
+    {
+        std::ostringstream text;
+        text << std::ifstream(path(name), std::ios::binary).rdbuf();
+        return text.str();
+    }
+    std::string zipped(const std::string& name, const std::string& content) const
+    {
+        gzFile out = gzopen(path(name).c_str(), "wb");
+        gzwrite(out, content.data(), static_cast<unsigned>(content.size()));
+        gzclose(out);
+        return path(name);
+    }
+    /// "line:field|field" of every record; "line:!" for a malformed one.
+    std::vector<std::string> records(const std::string& csv) const
+    {
+        std::vector<std::string> result;
+        CsvReader reader(file("t.csv", csv));
+        for (auto outcome = reader.next(); outcome != CsvReader::Outcome::kEnd; outcome = reader.next()) {
+            std::string text = outcome == CsvReader::Outcome::kMalformed ? "!|" : "";
+            for (const auto field : reader.fields())
+                (text += field) += '|';
+            text.pop_back();
+            result.push_back(std::to_string(reader.line()) + ":" + text);
+        }
+        return result;
+    }
+    /// "market/ticker/name/currency date=value ..." of every company.
+    std::vector<std::string> companies() const
+    {
+        std::vector<std::string> result;
+        for (const Market* market : catalogue_.getMarkets()) {
+            unsigned n;
+            Company** all = market->getAllCompanies(&n);
+            for (const Company* company : std::vector<Company*>(all, all + n)) {
+                std::ostringstream text;
+                text << market->getName().bytes() << '/' << company->getAbbreviation().bytes() << '/'
+                     << company->getName().bytes() << '/' << market->getCurrencyRepresentation().bytes();
+                result.push_back(text.str() + quotes(*company));
+            }
+        }
+        return result;
+    }
+    std::string rates(const char* symbol) const { return quotes(*catalogue_.getCurrencyByRepresentation(symbol)); }
+    template <class Series>
+    static std::string quotes(const Series& series)
+    {
+        std::ostringstream text;
+        for (unsigned i = 0; i < series.getNbrQuotes(); ++i)
+            text << ' ' << series.getQuote(i)->getDate().toString().bytes() << '=' << series.getQuote(i)->getValue();
+        return text.str();
+    }
+    std::string log() const { return log_.str(); }
+    int run(const std::string& arguments) const
+    {
+        const std::string command = "cd '" + folder_.string() + "' && '" PELORIN_IMPORT "' " + arguments + " 2>log";
+        return WEXITSTATUS(std::system(command.c_str()));
+    }
+
+    fs::path folder_ = fs::temp_directory_path() / ("pelorin-import-test-" + std::to_string(getpid()));
+    std::ostringstream log_;
+    ImportOptions options_;
+    Catalogue catalogue_;
+};
+
+TEST_F(ImportTest, CsvRecordsFollowRfc4180WithLineNumbers)
+{
+    EXPECT_THAT(records("a,b\n\n,,\nc,d"), ElementsAre("1:a|b", "4:c|d")) << "blank lines are left out";
+    EXPECT_THAT(records("\xEF\xBB\xBFx;1,5\r\nb;\"2\"\r\n"), ElementsAre("1:x|1,5", "2:b|2"));
+    EXPECT_THAT(records("a\tx;y,z\n"), ElementsAre("1:a|x;y,z"));
+    EXPECT_THAT(records("\"a;b\",c\n"), ElementsAre("1:a;b|c")) << "a quoted semicolon separates nothing";
+    EXPECT_THAT(records("\"a \"\"b\"\"\",\"c\nd\",\ne,f\"g\n"), ElementsAre("1:a \"b\"|c\nd|", "3:e|f\"g"));
+    EXPECT_THAT(records("\"a\"b,c\nd,e\n"), ElementsAre("1:!", "2:d|e")) << "text behind the closing quote";
+    EXPECT_THAT(records("a,\"b\nc,d\ne,f\n"), ElementsAre("1:!", "2:c|d", "3:e|f")) << "an open quote costs one line";
+    const std::string longLine(CsvReader::kLongestRecord + 1, 'x');
+    EXPECT_THAT(records("a,b\n" + longLine + "\nc,d\n"), ElementsAre("1:a|b", "2:!", "3:c|d"));
+    EXPECT_THAT(records("a,\"" + longLine + "\"\nc,d\n"), ElementsAre("1:!", "2:c|d"));
+    const std::string widest(CsvReader::kLongestRecord - 4, 'x');
+    EXPECT_THAT(records("a\n" + widest + ",\"y\nz"), ElementsAre("1:a", "2:!", "3:z"))
+        << "full in the middle of a field";
+}
+
+TEST_F(ImportTest, GzippedDataThatEndTooEarlyAreAnError)
+{
+    zipped("t.gz", "2005-01-03,A,1\n2005-01-04,A,2\n");
+    fs::resize_file(path("t.gz"), fs::file_size(path("t.gz")) - 9);
+    Importer importer(options_, log_);
+    EXPECT_THROW(importer.addQuotes(path("t.gz")), std::runtime_error);
+    EXPECT_THROW(importer.addQuotes(path("none")), std::runtime_error);
+    EXPECT_THROW(importer.addQuotes(folder_), std::runtime_error);
+}
+
+TEST_F(ImportTest, DatesAreIsoOrDayMonthYear)
+{
+    for (const char* good : {"2004-02-29", "29/02/2004", "29/2/2004", "2004-2-29"})
+        EXPECT_EQ(parseDate(good).value_or(Date()), Date(29, 2, 2004)) << good;
+    for (const char* bad :
+         {"", "2005-02-29", "12/25/2005", "05-01-03", "03/01/05", "2005/01/03", "03-01-2005", "2005-01", "2005-01-03 ",
+          "2005-01-03T00", "2005-001-3", "12005-01-03", "2005-01--3", "0/1/2005", "//"})
+        EXPECT_FALSE(parseDate(bad)) << bad;
+}
+
+TEST_F(ImportTest, TheFirstDecimalMarkOfAFileHoldsForAll)
+{
+    DecimalReader numbers(true);
+    EXPECT_EQ(numbers.read("1234"), 1234);
+    EXPECT_FALSE(numbers.read("1.234,5")) << "a number with both settles nothing";
+    EXPECT_EQ(numbers.read("12,5"), 12.5);
+    EXPECT_FALSE(numbers.read("1.234")) << "could be thousands";
+    EXPECT_EQ(numbers.read("1e-3"), 0.001);
+    DecimalReader pointOnly(false);
+    EXPECT_FALSE(pointOnly.read("12,5"));
+    for (const char* bad : {"", "-", "1x", "0x10", "1 000", "1e999"})
+        EXPECT_FALSE(pointOnly.read(bad)) << bad;
+}
+
+TEST_F(ImportTest, QuotesAreOrderedAndTheLaterLineOfADayCounts)
+{
+    Importer importer(options_, log_);
+    importer.addQuotes(file("a.csv", "2005-01-04,A,2\n2005-01-03,A,1\n04/01/2005,A,3\n2005-01-03,B,.5\n"));
+    importer.addQuotes(
+        zipped("b.csv.gz", "VOLUME;Closing Price;Symbol;date\n9;1,5;A;2005-01-03\n;8,25;A;05/01/2005\n"));
+    EXPECT_EQ(importer.fill(&catalogue_), Date(5, 1, 2005));
+    EXPECT_THAT(companies(),
+                ElementsAre("NYSE/A/A/USD 03/01/2005=1.5 04/01/2005=3 05/01/2005=8.25", "NYSE/B/B/USD 03/01/2005=0.5"));
+    EXPECT_EQ(importer.counts().replaced, 2U);
+    EXPECT_EQ(importer.counts().quotes, 4U);
+    EXPECT_THAT(log(), HasSubstr("no rate of USD")) << "EUR is the reference";
+    EXPECT_EQ(rates("EUR"), " 03/01/2005=1");
+}
+
+TEST_F(ImportTest, LinesThatCannotBeUsedAreCountedWithTheirNumbers)
+{
+    const char* bad[] = {"2005-13-03,A,1",    "2005-01-03,,1",      "2005-01-03,A",     "2005-01-03,A,0",
+                         "2005-01-03,A,-1",   "2005-01-03,A,x",     "2005-01-03,A,nan", "2005-01-03,A,inf",
+                         "2005-01-03,A,1e39", "2005-01-03,A,1e-60", "2005-01-03,A,1,5", "2005-01-03,\"A,1"};
+    std::string csv;
+    for (const char* line : bad)
+        (csv += line) += '\n';
+    Importer importer(options_, log_);
+    importer.addQuotes(file("a.csv", csv));
+    for (std::size_t i = 1; i <= std::size(bad); ++i)
+        EXPECT_THAT(log(), HasSubstr("a.csv, line " + std::to_string(i) + ": ")) << bad[i - 1];
+    EXPECT_EQ(importer.counts().skipped, std::size(bad));
+    EXPECT_THROW(importer.fill(&catalogue_), std::runtime_error) << "nothing usable";
+
+    for (std::size_t i = std::size(bad); i < 23; ++i)
+        csv += "2005-01-03,A,x\n";
+    importer.addQuotes(file("b.csv", csv));
+    EXPECT_THAT(log(), HasSubstr("b.csv, line 20: "));
+    EXPECT_THAT(log(), HasSubstr("b.csv: ... and 3 more\n"));
+    EXPECT_THAT(log(), testing::Not(HasSubstr("b.csv, line 21: ")));
+}
+
+TEST_F(ImportTest, RatesBecomePricesInTheReference)
+{
+    const char* rows = "2005-01-03,USD,1.25\n2005-01-04,CHF,0.5\n2005-01-05,EUR,1\n2005-01-05,EUR,2\n";
+    const struct {
+        const char* heading;
+        std::optional<RateMeaning> option;
+        const char* usd;
+        const char* why;
+    } cases[] = {
+        {"", {}, " 03/01/2005=0.8", "units unless said otherwise"},
+        {"date,currency,rate\n", RateMeaning::kValueInReference, " 03/01/2005=1.25", "the option"},
+        {"Date,Symbol,Value in EUR\n", {}, " 03/01/2005=1.25", "the heading"},
+        {"date,currency,units_per_eur\n", RateMeaning::kUnitsPerReference, " 03/01/2005=0.8", "both, in agreement"},
+        {"date,currency,units_per_eur\n", RateMeaning::kValueInReference, nullptr, "both, in contradiction"},
+        {"date,currency,units_per_gbp\n", {}, nullptr, "of another reference"},
+        {"date,currency\n", {}, nullptr, "no column for the rate"},
+    };
+    for (const auto& c : cases) {
+        options_.ratesAre = c.option;
+        Importer importer(options_, log_);
+        const std::string table = file("r.csv", std::string(c.heading) + rows);
+        if (c.usd == nullptr) {
+            EXPECT_THROW(importer.addRates(table), std::runtime_error) << c.why;
+            continue;
+        }
+        importer.addRates(table);
+        Catalogue made;
+        importer.fill(&made);
+        EXPECT_EQ(quotes(*made.getCurrencyByRepresentation("USD")), c.usd) << c.why;
+        EXPECT_EQ(quotes(*made.getReferenceCurrency()), " 03/01/2005=1 04/01/2005=1 05/01/2005=1") << c.why;
+        EXPECT_EQ(importer.counts().skipped, 1U) << "a reference is not worth 2";
+    }
+}
+
+TEST_F(ImportTest, TheRowComesBeforeTheListingAndThatBeforeTheOptions)
+{
+    options_.currencyNames["EUR"] = "Euro";
+    Importer importer(options_, log_);
+    importer.addListing(
+        file("l.csv", "SAP,XETRA,,SAP SE\nBMW,XETRA,EUR,BMW AG\nVOW,XETRA,USD,VW\nABB,,CHF,ABB\n,X,,\nIBM\n"));
+    importer.addQuotes(file("q.csv", "date,ticker,close,market,currency,name\n3/1/2005,SAP,1,,,\n3/1/2005,BMW,2,,,BMW\n"
+                                     "3/1/2005,IBM,3,,,\n3/1/2005,BMW,4,Wien,,\n3/1/2005,ABB,5,SIX,CHF,\n"
+                                     "3/1/2005,ABB,6,SIX,EUR,\n3/1/2005,VOW,7,XETRA,EUR,\n"));
+    importer.fill(&catalogue_);
+    EXPECT_THAT(companies(), ElementsAre("XETRA/SAP/SAP SE/EUR 03/01/2005=1", "XETRA/BMW/BMW/EUR 03/01/2005=2",
+                                         "XETRA/VOW/VOW/EUR 03/01/2005=7", "NYSE/IBM/IBM/USD 03/01/2005=3",
+                                         "Wien/BMW/BMW AG/USD 03/01/2005=4", "SIX/ABB/ABB/CHF 03/01/2005=5"));
+    EXPECT_EQ(importer.counts().skipped, 4U) << "XETRA in USD, CHF without a market, no ticker, SIX in EUR";
+    EXPECT_EQ(catalogue_.getReferenceCurrency()->getName(), "Euro");
+}
+
+TEST_F(ImportTest, AnAtomicFileIsWholeOrNotThere)
+{
+    {
+        AtomicFile abandoned(path("new"), AtomicFile::Existing::kKeep);
+    }
+    EXPECT_TRUE(fs::is_empty(folder_));
+
+    file("old", "old");
+    fs::permissions(path("old"), fs::perms::owner_read | fs::perms::owner_write);
+    fs::create_symlink("old", path("link"));
+    EXPECT_THROW(AtomicFile(path("link"), AtomicFile::Existing::kKeep), std::runtime_error);
+    AtomicFile replacing(path("link"), AtomicFile::Existing::kReplace);
+    std::fputs("new", replacing.stream());
+    EXPECT_EQ(content("old"), "old") << "before the commit";
+    replacing.commit();
+    EXPECT_EQ(content("old"), "new");
+    EXPECT_TRUE(fs::is_symlink(path("link")));
+    EXPECT_EQ(fs::status(path("old")).permissions(), fs::perms::owner_read | fs::perms::owner_write);
+
+    AtomicFile late(path("late"), AtomicFile::Existing::kKeep);
+    file("late", "somebody else's");
+    EXPECT_THROW(late.commit(), std::runtime_error);
+    EXPECT_EQ(content("late"), "somebody else's");
+    EXPECT_THROW(AtomicFile::check("/dev/null", AtomicFile::Existing::kReplace), std::runtime_error);
+}
+
+TEST_F(ImportTest, TheProgramWritesAFileThatTheCatalogueReads)
+{
+    file("IBM.csv", "Date,Close\n2005-01-03,97.75\n");
+    file("r.csv", "2005-01-03,USD,1.25\n");
+    EXPECT_EQ(run("out --quotes IBM.csv --ticker-from-name --rates r.csv --market AMEX"), 0) << content("log");
+    const std::string once = content("out");
+    FILE* written = std::fopen(path("out").c_str(), "rb");
+    EXPECT_EQ(catalogue_.rd(written), 0);
+    std::fclose(written);
+    EXPECT_THAT(companies(), ElementsAre("AMEX/IBM/IBM/USD 03/01/2005=97.75"));
+    EXPECT_EQ(catalogue_.getReferenceCurrency()->getRepresentation(), "EUR");
+    EXPECT_EQ(rates("USD"), " 03/01/2005=0.8");
+
+    EXPECT_EQ(run("out --rates r.csv"), 1);
+    EXPECT_EQ(content("out"), once) << "nothing is overwritten unasked";
+    EXPECT_EQ(run("out --rates r.csv --force"), 0);
+    EXPECT_NE(content("out"), once);
+    for (const char* bad : {"", "new", "new --rates r.csv --rates-are odd", "new --rates r.csv --currency-name USD",
+                            "new --rates r.csv --reference ''", "new --rates r.csv --what"})
+        EXPECT_EQ(run(bad), 2) << bad;
+    for (const char* failing : {"new --rates none.csv", "none/new --rates r.csv", "new --quotes IBM.csv"})
+        EXPECT_EQ(run(failing), 1) << failing;
+    EXPECT_FALSE(fs::exists(path("new")));
+}
+
+} // namespace
