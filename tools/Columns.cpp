@@ -19,6 +19,16 @@ bool isCalled(std::string_view heading, std::string_view name)
     return name.ends_with('*') ? heading.starts_with(name.substr(0, name.size() - 1)) : heading == name;
 }
 
+/// The place of the heading that has the foremost of `names`; the number of headings when there is none.
+std::size_t findPreferred(const std::vector<std::string>& headings, const std::vector<std::string_view>& names)
+{
+    for (const std::string_view name : names)
+        for (std::size_t i = 0; i < headings.size(); ++i)
+            if (isCalled(headings[i], name))
+                return i;
+    return headings.size();
+}
+
 bool isDate(std::string_view field)
 {
     return parseDate(trimmed(field)).has_value();
@@ -36,7 +46,8 @@ Columns::Columns(const TableForm& form, const Record& first)
 {
     constexpr std::size_t kFewestNames = 2; // a ticker may look like a heading
     const bool dated = std::any_of(first.begin(), first.end(), isDate);
-    header_ = !dated && recognize(form, first) >= kFewestNames;
+    const std::size_t named = dated ? 0 : recognize(form, first);
+    header_ = named >= kFewestNames || (named > 0 && has(Column::kDate));
     if (!header_) {
         places_.fill(kNowhere);
         valueHeading_.clear();
@@ -45,10 +56,10 @@ Columns::Columns(const TableForm& form, const Record& first)
         mostFields_ = form.plain.size();
     }
     for (const Column column : form.required) {
-        if (!has(column))
-            missing_ = describe(column);
-        else
+        if (has(column))
             fewestFields_ = std::max(fewestFields_, place(column) + 1);
+        else if (missing_ == nullptr)
+            missing_ = describe(column);
     }
 }
 
@@ -59,14 +70,13 @@ std::size_t Columns::recognize(const TableForm& form, const Record& record)
     std::vector<std::string> headings;
     std::transform(record.begin(), record.end(), std::back_inserter(headings), headingOf);
     std::size_t found = 0;
-    for (const ColumnName& known : form.names) {
-        const auto called = [&known](const std::string& heading) { return isCalled(heading, known.name); };
-        const auto heading = std::find_if(headings.begin(), headings.end(), called);
-        if (heading == headings.end() || has(known.column))
+    for (const ColumnNames& known : form.known) {
+        const std::size_t i = findPreferred(headings, known.names);
+        if (i == headings.size())
             continue;
-        place(known.column) = static_cast<std::size_t>(heading - headings.begin());
+        place(known.column) = i;
         if (known.column == Column::kValue)
-            valueHeading_ = *heading;
+            valueHeading_ = headings[i];
         ++found;
     }
     return found;

@@ -7,17 +7,17 @@
 
 enum class Column { kDate, kTicker, kValue, kMarket, kCurrency, kName };
 
-/// A heading under which a column is known: lower case, without spaces, '_', '-' and '.'. One with '*' at its end
-/// stands for all that begin so.
-struct ColumnName {
-    std::string_view name;
+/// The headings under which a column is known, the preferred one first: lower case, without spaces, '_', '-' and '.'.
+/// One with '*' at its end stands for all that begin so.
+struct ColumnNames {
     Column column;
+    std::vector<std::string_view> names;
 };
 
 /// How a kind of table is laid out.
 struct TableForm {
-    std::vector<ColumnName> names; // where two columns of a table mean the same, the name that comes first here counts
-    std::vector<Column> plain;     // the columns of a table without a header line
+    std::vector<ColumnNames> known;
+    std::vector<Column> plain; // the columns of a table without a header line
     std::vector<Column> required;
 };
 
@@ -26,13 +26,14 @@ class Columns {
 public:
     using Record = std::vector<std::string_view>;
 
-    /// Looks at a table's first record. It is a header line when it names two columns or more and has no date in it.
+    /// Looks at a table's first record. It is a header line when it has no date in it and names a column of dates,
+    /// or any two columns.
     Columns(const TableForm& form, const Record& first);
 
     bool hasHeader() const { return header_; }
     /// What the header line should name and does not, in words; null when nothing is missing.
     const char* missing() const { return missing_; }
-    /// The heading of the value column, as in `ColumnName`; empty without a header line.
+    /// The heading of the value column, as in `ColumnNames`; empty without a header line.
     const std::string& valueHeading() const { return valueHeading_; }
     bool has(Column column) const { return place(column) != kNowhere; }
     /// Why `record` does not belong into this table, in words: it does not reach to the last required column, or
@@ -41,7 +42,7 @@ public:
     /// The field under `column` without blanks around it; empty when the column or the field is missing.
     std::string_view cell(const Record& record, Column column) const;
 
-    /// A heading as in `ColumnName`.
+    /// A heading as in `ColumnNames`.
     static std::string headingOf(std::string_view text);
 
 private:

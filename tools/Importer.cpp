@@ -15,29 +15,20 @@
 namespace {
 
 // Where several columns could be the price, the one as traded is better than one that the source has adjusted.
-const std::vector<ColumnName> kQuoteNames = {
-    {"date", Column::kDate},          {"day", Column::kDate},
-    {"tradedate", Column::kDate},     {"ticker", Column::kTicker},
-    {"symbol", Column::kTicker},      {"abbreviation", Column::kTicker},
-    {"code", Column::kTicker},        {"close", Column::kValue},
-    {"closingprice", Column::kValue}, {"closeprice", Column::kValue},
-    {"price", Column::kValue},        {"last", Column::kValue},
-    {"quote", Column::kValue},        {"value", Column::kValue},
-    {"adjclose", Column::kValue},     {"adjustedclose", Column::kValue},
-    {"market", Column::kMarket},      {"exchange", Column::kMarket},
-    {"currency", Column::kCurrency},  {"currencycode", Column::kCurrency},
-    {"ccy", Column::kCurrency},       {"name", Column::kName},
-    {"company", Column::kName},       {"companyname", Column::kName},
+const std::vector<ColumnNames> kQuoteNames = {
+    {Column::kDate, {"date", "tradedate"}},
+    {Column::kTicker, {"ticker", "symbol", "abbreviation", "code"}},
+    {Column::kValue,
+     {"close", "closingprice", "closeprice", "price", "last", "quote", "value", "adjclose", "adjustedclose"}},
+    {Column::kMarket, {"market", "exchange"}},
+    {Column::kCurrency, {"currency", "currencycode", "ccy"}},
+    {Column::kName, {"name", "company", "companyname"}},
 };
 
-const std::vector<ColumnName> kRateNames = {
-    {"date", Column::kDate},          {"day", Column::kDate},
-    {"currency", Column::kCurrency},  {"currencycode", Column::kCurrency},
-    {"ccy", Column::kCurrency},       {"symbol", Column::kCurrency},
-    {"code", Column::kCurrency},      {"unitsper*", Column::kValue},
-    {"valuein*", Column::kValue},     {"rate", Column::kValue},
-    {"exchangerate", Column::kValue}, {"value", Column::kValue},
-    {"quote", Column::kValue},        {"price", Column::kValue},
+const std::vector<ColumnNames> kRateNames = {
+    {Column::kDate, {"date"}},
+    {Column::kCurrency, {"currency", "currencycode", "ccy", "symbol", "code"}},
+    {Column::kValue, {"unitsper*", "valuein*", "rate", "exchangerate", "value", "quote", "price"}},
 };
 
 const TableForm kQuotes = {

@@ -153,8 +153,7 @@ TEST_F(ImportTest, QuotesAreOrderedAndTheLaterLineOfADayCounts)
 {
     Importer importer(options_, log_);
     importer.addQuotes(file("a.csv", "2005-01-04,A,2\n2005-01-03,A,1\n04/01/2005,A,3\n2005-01-03,B,.5\n"));
-    importer.addQuotes(
-        zipped("b.csv.gz", "VOLUME;Closing Price;Symbol;date\n9;1,5;A;2005-01-03\n;8,25;A;05/01/2005\n"));
+    importer.addQuotes(zipped("b.csv.gz", "Adj. Close;CLOSE;Symbol;date\n9;1,5;A;2005-01-03\n;8,25;A;05/01/2005\n"));
     EXPECT_EQ(importer.fill(&catalogue_), Date(5, 1, 2005));
     EXPECT_THAT(companies(),
                 ElementsAre("NYSE/A/A/USD 03/01/2005=1.5 04/01/2005=3 05/01/2005=8.25", "NYSE/B/B/USD 03/01/2005=0.5"));
@@ -203,6 +202,7 @@ TEST_F(ImportTest, RatesBecomePricesInTheReference)
         {"date,currency,units_per_eur\n", RateMeaning::kValueInReference, nullptr, "both, in contradiction"},
         {"date,currency,units_per_gbp\n", {}, nullptr, "of another reference"},
         {"date,currency\n", {}, nullptr, "no column for the rate"},
+        {"date,ticker,close\n", {}, nullptr, "a table of quotes"},
     };
     for (const auto& c : cases) {
         options_.ratesAre = c.option;
