@@ -21,7 +21,7 @@ public:
     const Columns& columns() const { return columns_; }
     /// The field of the row under `column` without blanks around it; empty when there is none.
     std::string_view cell(Column column) const { return columns_.cell(reader_.fields(), column); }
-    /// The price or rate of the row, rounded to float by the caller. Several numbers of a file share a decimal mark.
+    /// For the numbers of this file, in the order of its rows.
     DecimalReader& numbers() { return numbers_; }
 
     /// Counts the row out as unusable.
