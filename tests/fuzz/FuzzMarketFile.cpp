@@ -1,0 +1,110 @@
+// Any bytes as a market data file: the reader neither crashes nor hangs, what it made answers every question, and what
+// is written of it reads back to the same bytes.
+
+#include "market/Catalogue.h"
+#include "market/Company.h"
+#include "market/CompanyEvent.h"
+#include "market/Currency.h"
+#include "market/Market.h"
+#include "tests/fuzz/Require.h"
+#include "tests/support/Bytes.h"
+
+#include <climits>
+#include <cstdint>
+#include <cstring>
+
+namespace {
+
+bool areSameBits(float a, float b)
+{
+    return std::memcmp(&a, &b, sizeof a) == 0;
+}
+
+template <class Series>
+void askOnDay(const Series& series, const Date& day)
+{
+    (void)series.getRealQuote(day);
+    (void)series.getPrevisionQuote(day);
+    (void)series.getPrevisionQuote(day.getPrevious());
+}
+
+template <class Series>
+void askSeries(const Series& series)
+{
+    const Date oddDays[] = {Date(),       {31, 12, 1998},  {29, 2, 2000},     {31, 2, 1999},
+                            {-7, 13, -5}, {1, 1, INT_MIN}, {31, 12, INT_MAX}, {SHRT_MAX, SHRT_MAX, INT_MAX}};
+    for (const Date& day : oddDays)
+        askOnDay(series, day);
+    unsigned n;
+    auto** quotes = series.getAllQuotes(&n);
+    for (unsigned i = 0; i < n; ++i) {
+        const Date day = quotes[i]->getDate();
+        require(i == 0 || quotes[i - 1]->getDate() < day, "quotes are in date order, one a day");
+        require(areSameBits(series.getRealQuote(day), quotes[i]->getValue()), "the value of a quoted day is its quote");
+        Date next = day;
+        askOnDay(series, next.moveBy(1));
+    }
+    (void)series.getPente();
+    (void)series.getHighestQuote();
+    (void)series.getLowestQuote();
+    require(n == 0 || series.getFirstQuote() <= series.getLastQuote(), "the first quote is not after the last");
+}
+
+void askMarket(const Market& market)
+{
+    unsigned n;
+    Company** companies = market.getAllCompanies(&n);
+    for (unsigned i = 0; i < n; ++i) {
+        askSeries(*companies[i]);
+        Company* found = nullptr;
+        market.getCompany(companies[i]->getAbbreviation(), &found);
+        require(found == nullptr || found->getAbbreviation() == companies[i]->getAbbreviation(),
+                "a company is found by its ticker");
+        unsigned events;
+        CompanyEvent** event = companies[i]->getAllEvents(&events);
+        for (unsigned k = 0; k < events; ++k)
+            event[k]->setDate(event[k]->getDate().getNext());
+    }
+}
+
+void askEverything(const Catalogue& catalogue)
+{
+    for (const Currency* currency : catalogue.getCurrencies())
+        askSeries(*currency);
+    for (const Market* market : catalogue.getMarkets())
+        askMarket(*market);
+}
+
+std::string fileOf(const Catalogue& catalogue)
+{
+    return written([&](FILE* file) { require(catalogue.wrt(file, Date(3, 5, 1999)) == 0, "a catalogue is written"); });
+}
+
+void checkRereading(const Catalogue& catalogue)
+{
+    const std::string bytes = fileOf(catalogue);
+    Catalogue again;
+    require(again.rd(BytesFile(bytes)) == 0, "a written catalogue is read whole");
+    // A second currency with the reference's symbol makes the reader rebase all rates, every time anew.
+    unsigned candidates = 0;
+    for (const Currency* currency : catalogue.getCurrencies())
+        if (catalogue.getReferenceCurrency() != nullptr &&
+            currency->getRepresentation() == catalogue.getReferenceCurrency()->getRepresentation())
+            ++candidates;
+    require(candidates > 1 || fileOf(again) == bytes, "writing, reading and writing gives the same bytes");
+}
+
+} // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
+{
+    Catalogue catalogue;
+    catalogue.rd(BytesFile(std::string(reinterpret_cast<const char*>(data), size)));
+    checkRereading(catalogue);
+    askEverything(catalogue);
+    if (catalogue.getNbrCurrencies() > 0) {
+        catalogue.rebaseOn(catalogue.getCurrencies().back());
+        askEverything(catalogue);
+    }
+    return 0;
+}
