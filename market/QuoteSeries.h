@@ -93,10 +93,16 @@ protected:
     int readQuotes(FILE* file);
 
 private:
+    /// A quote read behind one of a later or the same day, with the turn of its addition.
+    struct LateQuote {
+        SeriesQuote* quote;
+        std::uint32_t turn;
+    };
+
     SeriesQuote* findQuote(const Date& d) const;
     unsigned firstOnOrAfter(const Date& d) const;
     void fitTrend() const;
-    void replaceWith(std::vector<SeriesQuote*>& late);
+    void replaceWith(std::vector<LateQuote>& late);
 
     ManyEnd quotes_;
     mutable float slope_ = 0;
@@ -220,7 +226,7 @@ int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
 {
     constexpr unsigned kQuotesInBlock = 2048;
     unsigned char block[kQuotesInBlock * SeriesQuote::kFileSize];
-    std::vector<SeriesQuote*> late;
+    std::vector<LateQuote> late;
     auto missing = static_cast<unsigned>(freadint(file));
     while (missing > 0 && !reachedEnd(file)) {
         const unsigned wanted = std::min(missing, kQuotesInBlock);
@@ -232,7 +238,7 @@ int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
             if (firstOnOrAfter(q->getDate()) == quotes_.getNbr())
                 quotes_.add(q); // nothing of its day to replace
             else
-                late.push_back(q);
+                late.push_back({q, quotes_.reserveTurn()});
         }
         missing -= whole;
     }
@@ -243,24 +249,26 @@ int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
 /// Adds quotes that did not come in date order, with the outcome of one `addQuote` after the other: of each day the
 /// last one stays. Looking up all of them before the first is added keeps the list from being sorted again each time.
 template <class Owner, class SeriesQuote, class ManyEnd>
-void QuoteSeries<Owner, SeriesQuote, ManyEnd>::replaceWith(std::vector<SeriesQuote*>& late)
+void QuoteSeries<Owner, SeriesQuote, ManyEnd>::replaceWith(std::vector<LateQuote>& late)
 {
     std::stable_sort(late.begin(), late.end(),
-                     [](const SeriesQuote* a, const SeriesQuote* b) { return a->getDate() < b->getDate(); });
-    std::vector<SeriesQuote*> added;
+                     [](const LateQuote& a, const LateQuote& b) { return a.quote->getDate() < b.quote->getDate(); });
+    std::vector<LateQuote> added;
     std::vector<SeriesQuote*> replaced;
     for (std::size_t i = 0; i < late.size(); ++i) {
-        if (i + 1 < late.size() && late[i + 1]->getDate() == late[i]->getDate()) {
-            replaced.push_back(late[i]);
+        if (i + 1 < late.size() && late[i + 1].quote->getDate() == late[i].quote->getDate()) {
+            replaced.push_back(late[i].quote);
             continue;
         }
-        if (SeriesQuote* existing = findQuote(late[i]->getDate()))
+        if (SeriesQuote* existing = findQuote(late[i].quote->getDate()))
             replaced.push_back(existing);
         added.push_back(late[i]);
     }
+    for (const LateQuote& l : added) {
+        quotes_.add(l.quote);
+        quotes_.setTurn(l.quote, l.turn);
+    }
     for (SeriesQuote* q : replaced)
         delete q;
-    for (SeriesQuote* q : added)
-        quotes_.add(q);
     updatePrevisions();
 }

@@ -2,8 +2,8 @@
 
 #include "market/CompanyEvent.h"
 
-/// A share split on a day: `numerator` old shares became `divider` new ones. Stored and shown as it is; no quote,
-/// valuation or chart is adjusted by it.
+/// A share split on a day, as a numerator and a divider. Stored and shown as it is; no quote, valuation or chart is
+/// adjusted by it.
 class SplitCompanyEvent final : public CompanyEvent {
 public:
     static constexpr short kType = 1;
