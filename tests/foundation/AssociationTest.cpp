@@ -6,6 +6,7 @@
 #include <memory>
 #include <random>
 #include <string>
+#include <tuple>
 #include <vector>
 
 namespace {
@@ -102,12 +103,11 @@ TEST(AssociationTest, WhatIsNotThereHasNoEffect)
 {
     Box box;
     Item a('a'), b('b');
-    EXPECT_EQ(box.items.add(&a), 0);
-    EXPECT_EQ(box.items.add(&a), 0) << "again";
-    EXPECT_EQ(a.box.set(&box), 0);
+    for (const char* turn : {"new", "again"})
+        EXPECT_EQ(box.items.add(&a), 0) << turn;
+    EXPECT_EQ(box.items.add(nullptr), -1);
     EXPECT_EQ(box.items.remove(&b), 0);
     EXPECT_EQ(box.items.remove(nullptr), 0);
-    EXPECT_EQ(box.items.add(nullptr), -1);
     EXPECT_EQ(names(box), "a");
     Item* item = &a;
     EXPECT_EQ(box.items.getAt(&item, 1), -1);
@@ -126,8 +126,6 @@ TEST(AssociationTest, RemovalFromAnUnsortedListMovesTheLastElementIntoTheHole)
     auto d = std::make_unique<Item>('d');
     for (Item* item : {&a, &b, &c, d.get()})
         box.items.add(item);
-    box.items.changeNotice();
-    EXPECT_EQ(names(box), "abcd") << "nothing to sort by";
     box.items.remove(&a);
     EXPECT_EQ(names(box), "dbc");
     d.reset();
@@ -152,95 +150,79 @@ TEST(AssociationTest, EqualKeysKeepTheOrderOfAddition)
 
 TEST(AssociationTest, ARefusalIsPassedUpAndLeavesBothEndsConsistent)
 {
-    enum End { kOne, kMany };
-    const struct {
-        int entry, exit; // what the new box and the old one answer
-        bool removal;
-        int result;
-        const char *left, *right;
-    } cases[] = {{0, 0, false, 0, "cb", "xa"}, {7, 0, false, 7, "cb", "x"}, {0, 9, false, 9, "abc", "x"},
-                 {7, 9, false, 9, "abc", "x"}, {7, 0, true, 0, "cb", "x"},  {0, 9, true, 9, "abc", "x"}};
-    for (const auto& c : cases)
-        for (const End end : {kOne, kMany}) {
+    // What the new box and the old one answer, whether there is a new one, the result, and what the boxes hold then.
+    const std::tuple<int, int, bool, int, const char*> cases[] = {{0, 0, true, 0, "cb|xa"}, {7, 0, true, 7, "cb|x"},
+                                                                  {0, 9, true, 9, "abc|x"}, {7, 9, true, 9, "abc|x"},
+                                                                  {7, 0, false, 0, "cb|x"}, {0, 9, false, 9, "abc|x"}};
+    for (const auto& [entry, exit, moves, result, hold] : cases)
+        for (const bool fromOneEnd : {true, false}) {
             Box left, right;
-            Item a('a'), b('b'), inLeft('c'), x('x');
-            for (Item* item : {&a, &b, &inLeft})
+            Item a('a'), b('b'), c('c'), x('x');
+            for (Item* item : {&a, &b, &c})
                 left.items.add(item);
             right.items.add(&x);
-            right.entry = c.entry;
-            left.exit = c.exit;
-            Box* target = c.removal ? nullptr : &right;
-            const int result = end == kOne ? a.box.set(target)
-                               : c.removal ? left.items.remove(&a)
-                                           : right.items.add(&a);
-            EXPECT_EQ(result, c.result) << c.entry << c.exit << c.removal << end;
-            EXPECT_EQ(names(left) + "|" + names(right), std::string(c.left) + "|" + c.right)
-                << c.entry << c.exit << c.removal << end;
-            EXPECT_EQ(a.box.partner(), *c.left == 'a' ? &left : right.items.contains(&a) ? &right : nullptr);
+            right.entry = entry;
+            left.exit = exit;
+            const auto change = [&, toRight = moves] {
+                if (fromOneEnd)
+                    return a.box.set(toRight ? &right : nullptr);
+                return toRight ? right.items.add(&a) : left.items.remove(&a);
+            };
+            EXPECT_EQ(change(), result) << entry << exit << fromOneEnd << hold;
+            EXPECT_EQ(names(left) + "|" + names(right), hold) << entry << exit << fromOneEnd;
+            EXPECT_EQ(a.box.partner(), *hold == 'a' ? &left : right.items.contains(&a) ? &right : nullptr) << hold;
             left.exit = 0;
         }
     Box empty;
     Item a('a');
     empty.entry = 7;
     EXPECT_EQ(empty.items.add(&a), 7);
-    EXPECT_EQ(names(empty), "") << "a refused addition to an empty list leaves it empty";
+    EXPECT_EQ(names(empty), "");
 }
 
-TEST(AssociationTest, RandomChangesAgreeWithAPlainList)
+TEST(AssociationTest, RandomChangesFromBothEndsAgreeWithPlainLists)
 {
-    struct Entry {
-        Item* item;
-        int turn;
-    };
     std::mt19937 random(5);
-    const auto below = [&random](int n) { return static_cast<int>(random() % static_cast<unsigned>(n)); };
+    const auto below = [&random](std::size_t n) { return random() % n; };
     Box boxes[] = {Box(true), Box(false), Box(true)};
-    std::vector<Entry> expected[3];
+    std::vector<std::pair<Item*, int>> expected[3]; // each with the turn in which it was added
     std::vector<std::unique_ptr<Item>> items;
     for (char name = '0'; name < '0' + 70; ++name)
         items.push_back(std::make_unique<Item>(name));
-    const auto takeOut = [&expected](Item* item) {
-        for (auto& list : expected)
-            for (Entry& entry : list)
-                if (entry.item == item) {
-                    entry = list.back();
-                    list.pop_back();
-                    return;
-                }
-    };
     for (int turn = 0; turn < 20'000; ++turn) {
-        Item* item = items[static_cast<std::size_t>(below(70))].get();
-        const int to = below(3);
+        Item* item = items[below(70)].get();
         Box* now = item->box.partner();
-        switch (below(4)) {
-        case 0: // the lists fill and empty in turns of 1000
-            if (turn / 1000 % 2 == 0)
-                break;
-            takeOut(item);
-            ASSERT_EQ(now != nullptr && below(2) == 0 ? now->items.remove(item) : item->box.set(nullptr), 0);
-            break;
-        case 1:
-            item->key = below(9);
+        // The lists fill and empty in turns.
+        Box* next = below(8) != 0 && turn / 1000 % 2 != 0 ? nullptr : &boxes[below(3)];
+        if (below(4) == 0) {
+            item->key = static_cast<int>(below(9));
             if (now != nullptr)
                 now->items.changeNotice();
-            break;
-        default:
-            if (now != &boxes[to]) {
-                takeOut(item);
-                expected[to].push_back({item, turn});
-            }
-            ASSERT_EQ(below(2) == 0 ? boxes[to].items.add(item) : item->box.set(&boxes[to]), 0);
+        } else {
+            for (auto& list : expected)
+                for (auto& entry : list)
+                    if (entry.first == item && now != next) {
+                        entry = list.back();
+                        list.pop_back();
+                        break;
+                    }
+            if (now != next && next != nullptr)
+                expected[next - boxes].emplace_back(item, turn);
+            if (below(2) == 0)
+                item->box.set(next);
+            else if (next != nullptr)
+                next->items.add(item);
+            else if (now != nullptr)
+                now->items.remove(item);
         }
-        if (below(3) != 0)
-            continue;
-        for (int i = 0; i < 3; ++i) {
+        for (int i = 0; i < 3 && turn % 3 == 0; ++i) {
             if (i != 1)
-                std::sort(expected[i].begin(), expected[i].end(), [](const Entry& a, const Entry& b) {
-                    return a.item->key != b.item->key ? a.item->key < b.item->key : a.turn < b.turn;
+                std::sort(expected[i].begin(), expected[i].end(), [](const auto& a, const auto& b) {
+                    return std::pair(a.first->key, a.second) < std::pair(b.first->key, b.second);
                 });
             std::string want;
-            for (const Entry& entry : expected[i])
-                want += entry.item->name;
+            for (const auto& entry : expected[i])
+                want += entry.first->name;
             ASSERT_EQ(names(boxes[i]), want) << "after change " << turn;
         }
     }

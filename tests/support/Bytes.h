@@ -1,30 +1,23 @@
 #pragma once
 
-#include <cctype>
 #include <cstdio>
 #include <cstdlib>
 #include <string>
 #include <string_view>
 #include <utility>
 
-/// The bytes that `text` spells: pairs of hex digits, and 'characters' between apostrophes; the rest only separates.
+/// The bytes that `text` spells: pairs of hex digits, and 'characters' between apostrophes; blanks only separate.
 inline std::string bytesOf(std::string_view text)
 {
     std::string bytes;
-    std::string digits;
     bool quoted = false;
-    for (const char c : text) {
-        if (c == '\'')
+    for (std::size_t i = 0; i < text.size(); ++i)
+        if (text[i] == '\'')
             quoted = !quoted;
         else if (quoted)
-            bytes += c;
-        else if (std::isxdigit(static_cast<unsigned char>(c)) != 0)
-            digits += c;
-        if (digits.size() == 2) {
-            bytes += static_cast<char>(std::stoi(digits, nullptr, 16));
-            digits.clear();
-        }
-    }
+            bytes += text[i];
+        else if (text[i] != ' ')
+            bytes += static_cast<char>(std::stoi(std::string(text.substr(i++, 2)), nullptr, 16));
     return bytes;
 }
 

@@ -1,0 +1,90 @@
+#include "market/Currency.h"
+#include "market/Catalogue.h"
+#include "market/Company.h"
+#include "market/Market.h"
+#include "portfolio/Account.h"
+#include "portfolio/Share.h"
+#include "portfolio/Wallet.h"
+#include "tests/support/Bytes.h"
+
+#include <cmath>
+#include <gtest/gtest.h>
+
+namespace {
+
+using Rates = std::vector<float>;
+
+/// The rates in date order.
+Rates rates(const Currency& currency)
+{
+    Rates result;
+    for (unsigned i = 0; i < currency.getNbrQuotes(); ++i)
+        result.push_back(currency.getQuote(i)->getValue());
+    return result;
+}
+
+Currency* addCurrency(Catalogue& catalogue, const char* symbol, const std::vector<std::pair<short, float>>& rates)
+{
+    auto* currency = new Currency(symbol, symbol, catalogue.getReferenceCurrency());
+    for (const auto& [day, value] : rates)
+        new CurrencyQuote(currency, Date(day, 5, 1999), value);
+    catalogue.addCurrency(currency);
+    return currency;
+}
+
+} // namespace
+
+TEST(CurrencyTest, WithoutAStoredReferenceACurrencyIsItsOwn)
+{
+    Currency euro, dollar("Dollar", "USD", &euro);
+    Currency *ofEuro, *ofDollar;
+    EXPECT_EQ(euro.getReferenceCurrency(&ofEuro), 0);
+    EXPECT_EQ(dollar.getReferenceCurrency(&ofDollar), 0);
+    EXPECT_TRUE(ofEuro == &euro && ofDollar == &euro);
+    BytesFile file(std::string(40, '\0'));
+    EXPECT_EQ(euro.rd(file), -1) << "undated records do not exist";
+    EXPECT_EQ(file.position(), 0);
+    EXPECT_EQ(written([&euro](FILE* out) { EXPECT_EQ(euro.wrt(out), -1); }), "");
+}
+
+TEST(CurrencyTest, ANewReferenceDividesTheOtherRatesByItsOwnOfTheDay)
+{
+    Catalogue catalogue;
+    Currency* a = addCurrency(catalogue, "A", {{1, 1}, {3, 1}, {5, 1}});
+    catalogue.rebaseOn(a);
+    EXPECT_EQ(catalogue.getReferenceCurrency(), a);
+    Currency* b = addCurrency(catalogue, "B", {{1, 2}, {3, 3}});
+    Currency* c = addCurrency(catalogue, "C", {{2, 6}, {3, 7}});
+    EXPECT_EQ(a->getPente(), 0);
+    catalogue.rebaseOn(a);
+    EXPECT_EQ(rates(*a), Rates(3, 1.0F)) << "the first reference changes no rate";
+    EXPECT_EQ(rates(*b), (Rates{2, 3})) << "nor does the present one";
+
+    catalogue.rebaseOn(b);
+    EXPECT_EQ(catalogue.getReferenceCurrency(), b);
+    EXPECT_EQ(rates(*a), (Rates{0.5F, 1.0F / 3, 0.25F})) << "B is at 2, 3, and by its line at 4";
+    EXPECT_EQ(rates(*b), Rates(2, 1.0F));
+    EXPECT_EQ(rates(*c), (Rates{3, 7.0F / 3})) << "between its rates B keeps the last, 2";
+    EXPECT_FLOAT_EQ(a->getPente(), -0.0625F) << "the trend follows";
+
+    catalogue.rebaseOn(addCurrency(catalogue, "D", {}));
+    EXPECT_EQ(rates(*b), Rates(2, INFINITY)) << "a rate of 0 is not guarded against";
+}
+
+TEST(CurrencyTest, ADestroyedCurrencyTakesItsMarketsAlongAndLeavesItsAccounts)
+{
+    Wallet wallet;
+    auto* account = new Account("cash");
+    account->setWallet(&wallet);
+    auto* currency = new Currency("Euro", "EUR", nullptr);
+    account->setCurrency(currency);
+    new CurrencyQuote(currency, Date(1, 5, 1999), 1);
+    auto* market = new Market("NYSE");
+    market->setCurrency(currency);
+    new Share(&wallet, new Company(market, "Big", "BG"));
+    EXPECT_EQ(wallet.getNbrShares(), 1U);
+    delete currency;
+    EXPECT_EQ(account->getCurrency(&currency), -1);
+    EXPECT_EQ(wallet.getNbrAccounts(), 1U);
+    EXPECT_EQ(wallet.getNbrShares(), 0U) << "the holding has gone with its company, and that with its market";
+}
