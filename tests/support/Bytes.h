@@ -1,12 +1,13 @@
 #pragma once
 
+#include <cctype>
 #include <cstdio>
 #include <cstdlib>
 #include <string>
 #include <string_view>
 #include <utility>
 
-/// The bytes that `text` spells: pairs of hex digits, and 'characters' between apostrophes; blanks only separate.
+/// The bytes that `text` spells: pairs of hex digits, and 'characters' between apostrophes; the rest separates.
 inline std::string bytesOf(std::string_view text)
 {
     std::string bytes;
@@ -16,7 +17,7 @@ inline std::string bytesOf(std::string_view text)
             quoted = !quoted;
         else if (quoted)
             bytes += text[i];
-        else if (text[i] != ' ')
+        else if (std::isxdigit(static_cast<unsigned char>(text[i])) != 0)
             bytes += static_cast<char>(std::stoi(std::string(text.substr(i++, 2)), nullptr, 16));
     return bytes;
 }
