@@ -33,6 +33,8 @@ public:
     /// @return 0; -1 at a company, currency or holding that is not known, and at the end of the file: what was read
     /// whole before that stays. The unknown company is reported on standard output.
     int rd(FILE* file, Date* stamp);
+    /// The ticker or currency name for which the last `rd` failed; undefined when that was not the reason.
+    const String& getUnknownName() const { return unknownName_; }
 
     int addAccount(Account* account) { return accounts_.add(account); }
     int removeAccount(Account* account) { return accounts_.remove(account); }
@@ -109,6 +111,7 @@ private:
     std::vector<Market*> markets_;      // not owned
     std::vector<Currency*> currencies_; // not owned
     WalletNames* names_ = nullptr;      // only while a file is read
+    String unknownName_;
 
     float buyCost_ = 29.95F;
     float sellCost_ = 29.95F;

@@ -69,6 +69,7 @@ int Wallet::rd(FILE* file, Date* stamp)
     for (unsigned i = 0; isRead && i < n; ++i)
         accounts[i]->readTransferOperations(file);
     names_ = nullptr;
+    unknownName_ = isRead ? String() : names.getUnknown();
     if (!isRead)
         return -1;
     readParameters(file);
@@ -99,8 +100,12 @@ int Wallet::readAccounts(FILE* file)
     for (; missing > 0 && !reachedEnd(file); --missing) {
         String currencyName;
         Currency* currency;
-        if (currencyName.rd(file) != 0 || getCurrency(currencyName, &currency) != 0)
+        if (currencyName.rd(file) != 0)
             return -1;
+        if (getCurrency(currencyName, &currency) != 0) {
+            names_->setUnknown(currencyName);
+            return -1;
+        }
         auto account = std::make_unique<Account>();
         account->setWallet(this);
         account->setCurrency(currency);

@@ -39,22 +39,20 @@ void WalletNames::add(Account* account)
 template <class T>
 int WalletNames::find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out)
 {
-    *out = nullptr;
-    if (!market.hasText() || !abbreviation.hasText())
-        return -1;
-    const auto found = map.find({market.comparedBytes(), abbreviation.comparedBytes()});
-    if (found == map.end())
-        return -1;
-    *out = found->second;
-    return 0;
+    const bool canMatch = market.hasText() && abbreviation.hasText();
+    const auto found = canMatch ? map.find({market.comparedBytes(), abbreviation.comparedBytes()}) : map.end();
+    *out = found != map.end() ? found->second : nullptr;
+    if (*out == nullptr)
+        unknown_ = abbreviation;
+    return *out != nullptr ? 0 : -1;
 }
 
-int WalletNames::getCompany(const String& market, const String& abbreviation, Company** out) const
+int WalletNames::getCompany(const String& market, const String& abbreviation, Company** out)
 {
     return find(companies_, market, abbreviation, out);
 }
 
-int WalletNames::getShare(const String& market, const String& abbreviation, Share** out) const
+int WalletNames::getShare(const String& market, const String& abbreviation, Share** out)
 {
     return find(shares_, market, abbreviation, out);
 }

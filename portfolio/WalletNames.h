@@ -25,10 +25,14 @@ public:
     void add(Account* account);
 
     /// @return 0; -1 and a null `*out` when there is none.
-    int getCompany(const String& market, const String& abbreviation, Company** out) const;
-    int getShare(const String& market, const String& abbreviation, Share** out) const;
+    int getCompany(const String& market, const String& abbreviation, Company** out);
+    int getShare(const String& market, const String& abbreviation, Share** out);
     /// Null when there is none.
     Account* getAccount(const String& name) const;
+
+    /// The ticker or currency name that a look-up did not find last; undefined when all were found.
+    const String& getUnknown() const { return unknown_; }
+    void setUnknown(const String& name) { unknown_ = name; }
 
 private:
     using Pair = std::pair<std::string_view, std::string_view>;
@@ -39,9 +43,10 @@ private:
     using PairMap = std::unordered_map<Pair, T*, PairHash>;
 
     template <class T>
-    static int find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out);
+    int find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out);
 
     PairMap<Company> companies_;
     PairMap<Share> shares_;
     std::unordered_map<std::string_view, Account*> accounts_;
+    String unknown_;
 };
