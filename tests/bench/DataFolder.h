@@ -1,0 +1,39 @@
+#pragma once
+
+#include <filesystem>
+#include <map>
+
+/// How much is in a pair of generated files: a market data file with a quote of each company for every weekday and a
+/// rate of each of four currencies for every day, and a portfolio on it.
+struct DataSize {
+    int companies;
+    int years;
+    int holdings;
+    int accounts;
+    int operations; // a tenth deposits, a tenth transfers, half of them purchases, the rest sales
+
+    auto operator<=>(const DataSize&) const = default;
+};
+
+/// A temporary folder with generated files, which are the same in every run. It is removed in the end.
+class DataFolder {
+public:
+    struct Files {
+        std::filesystem::path market;
+        std::filesystem::path wallet;
+    };
+
+    static constexpr int kCurrencies = 4; // with a market each
+
+    DataFolder();
+    ~DataFolder();
+    DataFolder(const DataFolder&) = delete;
+    DataFolder& operator=(const DataFolder&) = delete;
+
+    /// Generates the files when they are asked for the first time.
+    const Files& files(const DataSize& size);
+
+private:
+    std::filesystem::path folder_;
+    std::map<DataSize, Files> files_;
+};

@@ -1,0 +1,82 @@
+#include "tests/bench/FigureReporter.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <ostream>
+
+namespace {
+
+/// With `lower`, the cost of an item of `upper` in terms of that of an item of `lower`; otherwise as the unit says.
+struct Figure {
+    const char* what;
+    const char* upper;
+    const char* lower;
+    const char* unit;
+    const char* aim;
+};
+
+constexpr Figure kFigures[] = {
+    {"Load of a market file / walk of its bytes", "BM_Files/load_market", "BM_Files/walk_market", "", "< 20"},
+    {"Memory of a loaded quote", "BM_Files/load_market", nullptr, "B", "< 120"},
+    {"Evolution of 20 years", "BM_Files/evolve_20_years", nullptr, "ms", "< 1000"},
+    {"Evolution, cost of a day, 20 / 10 years", "BM_Files/evolve_20_years", "BM_Files/evolve_10_years", "", "about 1"},
+    {"Evolution, cost of a day, 40 / 20 years", "BM_Files/evolve_40_years", "BM_Files/evolve_20_years", "", "about 1"},
+    {"Full replay of a day / a day of the evolution", "BM_Files/replay", "BM_Files/evolve_20_years", "", ""},
+    {"Memory of an evolution, per holding and day", "BM_Files/evolve_20_years", nullptr, "B", "< 250"},
+    {"Removal of states, cost of a day, 20 / 10 years", "BM_Files/remove_20_years", "BM_Files/remove_10_years", "",
+     "about 1"},
+    {"Removal of states, cost of a day, 40 / 20 years", "BM_Files/remove_40_years", "BM_Files/remove_20_years", "",
+     "about 1"},
+    {"Files to chart, small portfolio", "BM_Files/chart_small", nullptr, "ms", "< 80"},
+    {"Files to chart, large portfolio", "BM_Files/chart_large", nullptr, "ms", "< 640"},
+    {"Removal from a list, cost of an element, 4 n / n", "BM_RemoveQuotes/40000", "BM_RemoveQuotes/10000", "",
+     "about 1"},
+    {"Load of quotes, shuffled / by date", "BM_LoadQuotes/shuffled", "BM_LoadQuotes/by_date", "", ""},
+};
+
+double medianOf(std::vector<double> values)
+{
+    std::sort(values.begin(), values.end());
+    return values[values.size() / 2];
+}
+
+} // namespace
+
+void FigureReporter::ReportRuns(const std::vector<Run>& runs)
+{
+    ConsoleReporter::ReportRuns(runs);
+    for (const Run& run : runs) {
+        if (run.error_occurred || run.run_type != Run::RT_Iteration)
+            continue;
+        const auto counter = [&run](const char* name, double otherwise) {
+            const auto found = run.counters.find(name);
+            return found != run.counters.end() ? found->second.value : otherwise;
+        };
+        const std::string arguments = run.run_name.args;
+        Result& result = results_[run.run_name.function_name + (arguments.empty() ? "" : "/" + arguments)];
+        const bool isManual = !run.run_name.time_type.empty(); // set by the benchmark, as processor time, too
+        const double seconds = isManual ? run.real_accumulated_time : run.cpu_accumulated_time;
+        result.seconds.push_back(seconds / static_cast<double>(run.iterations));
+        result.items = counter("items", 1);
+        result.bytesPerItem = counter("bytes_per_item", 0);
+    }
+}
+
+void FigureReporter::Finalize()
+{
+    GetOutputStream() << std::endl;
+    for (const Figure& figure : kFigures) {
+        const auto upper = results_.find(figure.upper);
+        const auto lower = results_.find(figure.lower != nullptr ? figure.lower : figure.upper);
+        if (upper == results_.end() || lower == results_.end())
+            continue; // filtered out
+        const Result& result = upper->second;
+        double value = medianOf(result.seconds);
+        if (figure.lower != nullptr)
+            value = value / result.items / (medianOf(lower->second.seconds) / lower->second.items);
+        else
+            value = *figure.unit == 'B' ? result.bytesPerItem : value * 1000;
+        std::printf("%-50s %8.3g %-2s  %s %s\n", figure.what, value, figure.unit, *figure.aim != '\0' ? "aim:" : "",
+                    figure.aim);
+    }
+}
