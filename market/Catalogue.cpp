@@ -6,13 +6,18 @@
 
 namespace {
 
+// Each currency with the reference's symbol makes all quotes read so far be expressed anew. A file saved after the same
+// data was loaded several times has a few of them; one with many is corrupt, and its reading would never end.
+constexpr int kMostReferences = 100;
+
 void expressIn(const Currency& newReference, const Currency& currency)
 {
     unsigned n;
     CurrencyQuote** quotes = currency.getAllQuotes(&n);
     for (unsigned i = 0; i < n; ++i) {
         const double rate = newReference.getRealQuote(quotes[i]->getDate());
-        quotes[i]->setValue(static_cast<float>(quotes[i]->getValue() / rate));
+        if (rate != 1)
+            quotes[i]->setValue(static_cast<float>(quotes[i]->getValue() / rate));
     }
 }
 
@@ -31,6 +36,7 @@ int Catalogue::rd(FILE* file)
     String reference;
     if (reference.rd(file) != 0)
         return -1;
+    int references = 0;
     auto missing = static_cast<unsigned>(freadint(file));
     for (; missing > 0 && !reachedEnd(file); --missing) {
         auto currency = std::make_unique<Currency>();
@@ -40,9 +46,10 @@ int Catalogue::rd(FILE* file)
             return -1;
         Currency* added = currency.release();
         addCurrency(added);
-        if (!reference.isUndefined() && added->getRepresentation() == reference)
+        const bool isReference = !reference.isUndefined() && added->getRepresentation() == reference;
+        if (isReference && references++ < kMostReferences)
             rebaseOn(added);
-        if (result != 0)
+        if (result != 0 || references > kMostReferences)
             return -1;
     }
     return reachedEnd(file) ? -1 : 0;

@@ -23,7 +23,7 @@ public:
 
     /// Adds the currencies of a market data file behind those that are here. A currency with the symbol of the file's
     /// reference becomes the reference, by `rebaseOn`.
-    /// @return 0; -1 when the file ends early: what was read whole stays.
+    /// @return 0; -1 when the file ends early, or has over 100 currencies of that symbol: what was read whole stays.
     int rd(FILE* file);
     /// `stamp` is the date at the head of every currency record. @return 0; -1 when a write failed.
     int wrt(FILE* file, const Date& stamp) const;
