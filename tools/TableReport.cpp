@@ -1,0 +1,247 @@
+#include "tools/TableReport.h"
+
+#include "market/Company.h"
+#include "market/Currency.h"
+#include "portfolio/Account.h"
+#include "portfolio/Share.h"
+#include "portfolio/ShareOperation.h"
+#include "portfolio/TransferAccountOperation.h"
+#include "tools/TextTable.h"
+#include "tools/Valuation.h"
+#include "valuation/AccountState.h"
+#include "valuation/ShareState.h"
+#include "valuation/State.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstdio>
+#include <vector>
+
+namespace {
+
+constexpr auto kRight = TextTable::Align::kRight;
+constexpr std::size_t kGroup = 3; // digits between thousands separators
+
+std::string withSeparators(std::string digits, std::size_t end)
+{
+    const std::size_t begin = digits.front() == '-' ? 1 : 0;
+    for (std::size_t i = end; i > begin + kGroup; i -= kGroup)
+        digits.insert(i - kGroup, 1, ',');
+    return digits;
+}
+
+/// "1,234.50"; a number that is not finite is "?".
+std::string amountText(double amount)
+{
+    if (!std::isfinite(amount))
+        return "?";
+    char digits[64];
+    std::snprintf(digits, sizeof digits, "%.2f", amount);
+    const std::string text(digits);
+    return withSeparators(text == "-0.00" ? "0.00" : text, text.find('.'));
+}
+
+std::string percentText(double fraction, const char* format)
+{
+    if (!std::isfinite(fraction))
+        return "?";
+    char text[64];
+    std::snprintf(text, sizeof text, format, fraction * 100);
+    return text;
+}
+
+std::string countText(int count)
+{
+    const std::string digits = std::to_string(count);
+    return withSeparators(digits, digits.size());
+}
+
+std::string dateText(const Date& date)
+{
+    return date.isUndefined() ? std::string() : date.toString().getCharacterArray();
+}
+
+std::string plain(const String& text)
+{
+    return printable(text.bytes());
+}
+
+/// An operation that the valuation has generated.
+struct AutomaticLine {
+    Date date;
+    const char* type;
+    std::string amount;
+    std::string text;
+};
+
+void takeSales(const Share& share, std::vector<AutomaticLine>* lines)
+{
+    Company* company;
+    if (share.getCompany(&company) != 0)
+        return;
+    for (unsigned i = 0; i < share.getNbrShareOperations(); ++i) {
+        const ShareOperation& sale = *share.getShareOperation(i);
+        if (!sale.isAutomatic())
+            continue;
+        const std::string text = plain(company->getAbbreviation()) + " at " + amountText(sale.getQuote()) + ' ' +
+                                 plain(company->getCurrencyRepresentation());
+        lines->push_back({sale.getDate(), "sell", countText(sale.getQuantity()), text});
+    }
+}
+
+void takeTransfers(const Account& account, std::vector<AutomaticLine>* lines)
+{
+    for (unsigned i = 0; i < account.getNbrOperations(); ++i) {
+        const auto* transfer = dynamic_cast<const TransferAccountOperation*>(account.getOperation(i));
+        Account* recipient;
+        if (transfer == nullptr || !transfer->isAutomatic() || transfer->getRecepientAccount(&recipient) != 0)
+            continue;
+        const std::string text = plain(account.getCurrencyRepresentation()) + " from " + plain(account.getName()) +
+                                 " to " + plain(recipient->getName());
+        lines->push_back({transfer->getDate(), "transfer", amountText(transfer->getAmount()), text});
+    }
+}
+
+class Report {
+public:
+    explicit Report(const Valuation& valuation)
+        : valuation_(valuation), reference_(valuation.catalogue().getReferenceCurrency())
+    {
+        if (reference_ != nullptr)
+            referenceSymbol_ = plain(reference_->getRepresentation());
+    }
+
+    std::string make() const
+    {
+        std::string text = header() + totals() + accounts() + holdings() + automaticOperations();
+        return valuation_.hasEvolution() ? text + evolution() : text;
+    }
+
+private:
+    std::string header() const;
+    std::string totals() const;
+    std::string accounts() const;
+    std::string holdings() const;
+    std::string automaticOperations() const;
+    std::string evolution() const;
+    std::string inReference(double amount, const String& symbol) const;
+    std::string valueHeading() const { return reference_ != nullptr ? "Value in " + referenceSymbol_ : std::string(); }
+
+    const Valuation& valuation_;
+    const Currency* reference_;
+    std::string referenceSymbol_;
+};
+
+std::string Report::header() const
+{
+    const std::string day = "Portfolio on " + dateText(valuation_.state().getDate());
+    if (reference_ == nullptr)
+        return day + ", without totals: the market file has no reference currency\n";
+    return day + ", in " + plain(reference_->getName()) + " (" + referenceSymbol_ + ")\n";
+}
+
+std::string Report::totals() const
+{
+    const Totals totals = valuation_.totals();
+    TextTable table({{""}, {"", kRight}, {""}});
+    if (totals.isKnown) {
+        table.addRow({"Total Deposit", amountText(totals.totalDeposit), referenceSymbol_});
+        table.addRow({"Total Value", amountText(totals.totalValue), referenceSymbol_});
+        table.addRow({"Profit", amountText(totals.profit), referenceSymbol_});
+        table.addRow({"Annual Revenu", percentText(totals.annualRevenue, "%.2f"), "%"});
+    }
+    const Date first = valuation_.state().getFirstOperationDate();
+    table.addRow({"First operation", first == State::afterAllOperations() ? "none" : dateText(first), ""});
+    return table.toString();
+}
+
+/// An amount in the currency of that symbol, in the reference currency; empty when that has no answer.
+std::string Report::inReference(double amount, const String& symbol) const
+{
+    const Currency* currency = valuation_.catalogue().getCurrencyByRepresentation(symbol);
+    if (reference_ == nullptr || currency == nullptr)
+        return {};
+    const Date& day = valuation_.state().getDate();
+    return amountText(amount * currency->getRealQuote(day) / reference_->getRealQuote(day));
+}
+
+std::string Report::accounts() const
+{
+    TextTable table({{"Account"}, {"Cash", kRight}, {""}, {valueHeading(), kRight}, {""}});
+    unsigned n;
+    AccountState** states = valuation_.state().getAllAccountStates(&n);
+    for (unsigned i = 0; i < n; ++i) {
+        const String symbol = states[i]->getCurrencyRepresentation();
+        const Account* account = states[i]->listed();
+        const bool isDefault = account != nullptr && account->isDefaultTransferAccount();
+        table.addRow({plain(states[i]->getAccountName()), amountText(states[i]->getCash()), plain(symbol),
+                      inReference(states[i]->getCash(), symbol), isDefault ? "default transfer account" : ""});
+    }
+    return table.isEmpty() ? "" : '\n' + table.toString();
+}
+
+std::string Report::holdings() const
+{
+    TextTable table({{"Holding"},
+                     {"Ticker"},
+                     {"Market"},
+                     {"Quantity", kRight},
+                     {"Bought at", kRight},
+                     {"Quote", kRight},
+                     {""},
+                     {"Gain", kRight},
+                     {valueHeading(), kRight},
+                     {"End date"}});
+    unsigned n;
+    ShareState** states = valuation_.state().getAllShareStates(&n);
+    for (unsigned i = 0; i < n; ++i) {
+        const ShareState& state = *states[i];
+        const Share* share = state.listed();
+        const String symbol = state.getCurrencyRepresentation();
+        const double quote = state.getQuote();
+        const bool isHeld = state.getQuantity() != 0;
+        table.addRow({plain(state.getCompanyName()), plain(state.getCompanyAbbreviation()),
+                      share != nullptr ? plain(share->getMarketName()) : "", countText(state.getQuantity()),
+                      isHeld ? amountText(state.getBuyQuote()) : "", amountText(quote), plain(symbol),
+                      isHeld ? percentText(quote / state.getBuyQuote() - 1, "%+.1f%%") : "",
+                      isHeld ? inReference(quote * state.getQuantity(), symbol) : "",
+                      isHeld ? dateText(state.getEndDate()) : ""});
+    }
+    return table.isEmpty() ? "" : '\n' + table.toString();
+}
+
+/// What the search for automatic sales came to: the sales, and the transfers of their gains.
+std::string Report::automaticOperations() const
+{
+    std::vector<AutomaticLine> lines;
+    unsigned n;
+    Share** shares = valuation_.wallet().getAllShares(&n);
+    for (unsigned i = 0; i < n; ++i)
+        takeSales(*shares[i], &lines);
+    Account** accounts = valuation_.wallet().getAllAccounts(&n);
+    for (unsigned i = 0; i < n; ++i)
+        takeTransfers(*accounts[i], &lines);
+    const auto isEarlier = [](const AutomaticLine& a, const AutomaticLine& b) { return a.date < b.date; };
+    std::stable_sort(lines.begin(), lines.end(), isEarlier);
+
+    TextTable table({{"Automatic"}, {""}, {"", kRight}, {""}});
+    for (const AutomaticLine& line : lines)
+        table.addRow({dateText(line.date), line.type, line.amount, line.text});
+    return table.isEmpty() ? "" : '\n' + table.toString();
+}
+
+std::string Report::evolution() const
+{
+    TextTable table({{"Day"}, {valueHeading(), kRight}});
+    for (const EvolutionPoint& point : valuation_.evolution())
+        table.addRow({dateText(point.date), amountText(point.totalValue)});
+    return table.isEmpty() ? "" : '\n' + table.toString();
+}
+
+} // namespace
+
+void writeTableReport(const Valuation& valuation, FILE* out)
+{
+    const std::string text = Report(valuation).make();
+    std::fwrite(text.data(), 1, text.size(), out);
+}

@@ -1,0 +1,85 @@
+#include "tools/TextTable.h"
+
+#include <algorithm>
+#include <cwchar>
+
+namespace {
+
+constexpr int kGap = 2;      // between columns
+constexpr int kLongest = 60; // columns of a text; a damaged file can hold one of megabytes
+constexpr std::size_t kLongestBytes = 240;
+
+/// Takes one character off the front of `text`, which is not empty. @return its width, -1 when it is not printable.
+int takeCharacter(std::string_view& text, std::string_view* character)
+{
+    std::mbstate_t state{};
+    wchar_t code = 0;
+    const std::size_t length = std::mbrtowc(&code, text.data(), text.size(), &state);
+    const bool isCharacter = length > 0 && length <= text.size(); // errors are larger than any size
+    *character = text.substr(0, isCharacter ? length : 1);
+    text.remove_prefix(character->size());
+    return isCharacter ? wcwidth(code) : -1;
+}
+
+} // namespace
+
+std::string printable(std::string_view bytes)
+{
+    std::string result;
+    std::string_view character;
+    for (int width = 0; !bytes.empty();) {
+        const int taken = takeCharacter(bytes, &character);
+        width += taken >= 0 ? taken : 1;
+        if (width > kLongest || result.size() > kLongestBytes) // of characters without width there may be any number
+            return result + "...";
+        result += taken >= 0 ? character : "?";
+    }
+    return result;
+}
+
+int displayWidth(std::string_view text)
+{
+    int width = 0;
+    std::string_view character;
+    while (!text.empty())
+        width += std::max(takeCharacter(text, &character), 0);
+    return width;
+}
+
+TextTable::TextTable(std::vector<Column> columns)
+{
+    std::vector<std::string> headings;
+    for (Column& column : columns) {
+        aligns_.push_back(column.align);
+        headings.push_back(std::move(column.heading));
+    }
+    rows_.push_back(std::move(headings));
+}
+
+void TextTable::addRow(std::vector<std::string> cells)
+{
+    rows_.push_back(std::move(cells));
+}
+
+std::string TextTable::toString() const
+{
+    std::vector<int> widths(aligns_.size(), 0);
+    for (const auto& row : rows_)
+        for (std::size_t i = 0; i < row.size(); ++i)
+            widths[i] = std::max(widths[i], displayWidth(row[i]));
+    std::string text;
+    for (const auto& row : rows_)
+        text += lineOf(row, widths) + '\n';
+    return text;
+}
+
+std::string TextTable::lineOf(const std::vector<std::string>& cells, const std::vector<int>& widths) const
+{
+    std::string line;
+    for (std::size_t i = 0; i < cells.size(); ++i) {
+        const std::string blanks(static_cast<std::size_t>(widths[i] - displayWidth(cells[i])), ' ');
+        line += aligns_[i] == Align::kRight ? blanks + cells[i] : cells[i] + blanks;
+        line.append(kGap, ' ');
+    }
+    return line.erase(line.find_last_not_of(' ') + 1);
+}

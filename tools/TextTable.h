@@ -1,0 +1,35 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+/// `bytes` as one line of UTF-8 for a terminal: what is no printable character of UTF-8 becomes '?', and what would
+/// take more than 60 columns is cut with "...". Needs a UTF-8 locale for what lies outside ASCII.
+std::string printable(std::string_view bytes);
+
+/// Columns the text takes on a terminal; `text` is printable.
+int displayWidth(std::string_view text);
+
+/// A table in columns as wide as their widest cell, for a terminal.
+class TextTable {
+public:
+    enum class Align { kLeft, kRight };
+    struct Column {
+        std::string heading;
+        Align align = Align::kLeft;
+    };
+
+    explicit TextTable(std::vector<Column> columns);
+    /// One cell for each column, printable.
+    void addRow(std::vector<std::string> cells);
+    bool isEmpty() const { return rows_.size() == 1; }
+    /// The headings and the rows, a line each, without blanks at their ends.
+    std::string toString() const;
+
+private:
+    std::string lineOf(const std::vector<std::string>& cells, const std::vector<int>& widths) const;
+
+    std::vector<Align> aligns_;
+    std::vector<std::vector<std::string>> rows_; // the headings first
+};

@@ -1,0 +1,6 @@
+#pragma once
+
+#include "foundation/Date.h"
+
+/// Today's date, local time.
+Date today();

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "market/Catalogue.h"
+#include "portfolio/Wallet.h"
+#include "valuation/Evolution.h"
+#include "valuation/Totals.h"
+
+#include <string>
+#include <vector>
+
+class State;
+
+/// A portfolio file valued on a day with a market file: what the reports show.
+///
+/// Whatever fails throws std::runtime_error with one line for the user that names the file and what is wrong with it.
+class Valuation {
+public:
+    /// Reads both files.
+    Valuation(const std::string& marketPath, const std::string& portfolioPath);
+
+    /// Values the portfolio on `date`, a valid one: with automatic sales when `previsions` is set, with every day from
+    /// the first operation on when `evolution` is set. Comes before the queries below.
+    void compute(const Date& date, bool previsions, bool evolution);
+
+    const Catalogue& catalogue() const { return catalogue_; }
+    const Wallet& wallet() const { return wallet_; }
+    const State& state() const { return *state_; }
+    Totals totals() const { return {*state_, catalogue_}; }
+    bool hasEvolution() const { return hasEvolution_; }
+    /// By ascending date; empty without a reference currency.
+    const std::vector<EvolutionPoint>& evolution() const { return evolution_; }
+
+    /// One line on a portfolio file that could be read but cannot be right; empty without a doubt.
+    std::string doubt() const;
+
+private:
+    void readMarket();
+    void readPortfolio();
+    void checkOutcome(EvolutionOutcome outcome) const;
+    const Account* senderToNowhere() const;
+
+    std::string marketPath_;
+    std::string portfolioPath_;
+    Catalogue catalogue_; // outlives the wallet, which refers to it
+    Wallet wallet_;
+    const State* state_ = nullptr; // owned by the wallet
+    bool hasEvolution_ = false;
+    std::vector<EvolutionPoint> evolution_;
+};

@@ -1,0 +1,106 @@
+#include "tools/DateArgument.h"
+#include "tools/JsonReport.h"
+#include "tools/TableReport.h"
+#include "tools/Valuation.h"
+
+#include <CLI/CLI.hpp>
+#include <cerrno>
+#include <clocale>
+#include <csignal>
+#include <cstdio>
+#include <cstring>
+#include <exception>
+#include <iostream>
+#include <stdexcept>
+#include <string>
+
+namespace {
+
+constexpr int kBadArguments = 2;
+constexpr int kFailure = 1;
+
+const char* const kPurpose = "Values a Pelorin portfolio on a day.\n"
+                             "Example: pelorin-value Companies/Sample PortoFolios/Sample --date 31/12/2024";
+
+const char* const kOutput = R"(The JSON is one object; dates are DD/MM/YYYY, and what has no value is null:
+  {"date", "reference", "totalDeposit", "totalValue", "profit", "annualRevenue", "firstOperationDate",
+   "accounts": [{"name", "currency", "cash", "defaultTransfer"}],
+   "shares": [{"market", "ticker", "name", "quantity", "buyQuote", "quote", "endDate", "currency"}],
+   "operations": [{"account", "type", "date", "automatic", and by type
+       deposit:   "amount"
+       transfer:  "recipient", "amount", "rateCost", "cost", "fromCurrencyQuote", "toCurrencyQuote"
+       buy, sell: "market", "ticker", "quantity", "quote", "operationCost"}],
+   "evolution": [{"date", "totalValue"}]}
+The totals are in the reference currency, annualRevenue is a fraction per year; reference and currency
+are symbols. Transfers that --previsions has suggested are gone again with --evolution.
+
+Exit status: 0, 1 when a file cannot be read or the result not be written, 2 for bad arguments.)";
+
+struct Arguments {
+    std::string market;
+    std::string portfolio;
+    std::string date;
+    bool previsions = false;
+    bool evolution = false;
+    bool json = false;
+};
+
+void describe(CLI::App& app, Arguments& arguments)
+{
+    app.footer(kOutput);
+    app.set_version_flag("--version", PELORIN_VERSION);
+    app.add_option("MARKET_FILE", arguments.market, "Currencies, markets and companies with their quotes")->required();
+    app.add_option("PORTFOLIO_FILE", arguments.portfolio, "Accounts and holdings with their operations")->required();
+    app.add_option("--date", arguments.date, "Day to value the portfolio on; without it today")
+        ->type_name("DD/MM/YYYY")
+        ->check(checkDateArgument);
+    app.add_flag("--previsions", arguments.previsions, "Search the automatic sales that the trend lines suggest");
+    app.add_flag("--evolution", arguments.evolution,
+                 "Also give the total value of every day since the first operation");
+    app.add_flag("--json", arguments.json, "Write JSON instead of tables");
+}
+
+void checkOutput()
+{
+    if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0)
+        throw std::runtime_error(std::string("standard output: ") + std::strerror(errno));
+}
+
+void run(const Arguments& arguments)
+{
+    const Date date = dateArgument(arguments.date);
+    Valuation valuation(arguments.market, arguments.portfolio);
+    valuation.compute(date, arguments.previsions, arguments.evolution);
+    if (arguments.json)
+        writeJsonReport(valuation, stdout);
+    else
+        writeTableReport(valuation, stdout);
+    checkOutput();
+    if (const std::string doubt = valuation.doubt(); !doubt.empty())
+        std::cerr << "pelorin-value: " << doubt << '\n';
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    // A reader that leaves early is to be a failed write like any other.
+    std::signal(SIGPIPE, SIG_IGN);
+    // Names are UTF-8 whatever the user's locale; without it they lose what is not ASCII in the tables.
+    std::setlocale(LC_CTYPE, "C.UTF-8");
+    Arguments arguments;
+    CLI::App app(kPurpose, "pelorin-value");
+    describe(app, arguments);
+    try {
+        app.parse(argc, argv);
+    } catch (const CLI::ParseError& error) {
+        return app.exit(error) == 0 ? 0 : kBadArguments;
+    }
+    try {
+        run(arguments);
+        return 0;
+    } catch (const std::exception& error) {
+        std::cerr << "pelorin-value: " << error.what() << '\n';
+        return kFailure;
+    }
+}
