@@ -82,7 +82,8 @@ Account* Wallet::findDefaultTransferAccount(const String& currencyRepresentation
     Account** accounts = getAllAccounts(&n);
     Account* first = nullptr;
     for (unsigned i = 0; i < n; ++i) {
-        if (accounts[i]->getCurrencyRepresentation() != currencyRepresentation)
+        Currency* currency;
+        if (accounts[i]->getCurrency(&currency) != 0 || currency->getRepresentation() != currencyRepresentation)
             continue;
         if (accounts[i]->isDefaultTransferAccount())
             return accounts[i];
