@@ -40,16 +40,23 @@ public:
             return -1;
         if (contains(e))
             return 0;
-        reserve(count_ + 1);
-        if (!dirty_ && isSorted() && count_ > 0 && compare_(&elements_[count_ - 1], &e) > 0)
-            dirty_ = true;
-        elements_[count_++] = e;
+        append(e);
         const int failure = backLink(*e).partner_ == owner_ ? 0 : xSet(e, owner_);
         if (failure != 0)
             --count_;
         else
             settle(e);
         return failure;
+    }
+
+    /// The same for an element that has just been made: it is in no list, and nobody refuses it. `add` would ask, which
+    /// counts where there are millions.
+    void addNew(Element* e)
+    {
+        assert(backLink(*e).partner_ == nullptr);
+        append(e);
+        backLink(*e).partner_ = owner_;
+        settle(e);
     }
 
     /// @return 0 without effect for an element that is not here; otherwise what unlinking the element gives, after a
@@ -179,6 +186,14 @@ private:
         if (place < count_ && elements_[place] == e)
             return place;
         return count_ > 0 && elements_[count_ - 1] == e ? count_ - 1 : count_;
+    }
+
+    void append(Element* e)
+    {
+        reserve(count_ + 1);
+        if (!dirty_ && isSorted() && count_ > 0 && compare_(&elements_[count_ - 1], &e) > 0)
+            dirty_ = true;
+        elements_[count_++] = e;
     }
 
     void settle(Element* e)

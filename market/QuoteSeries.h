@@ -236,7 +236,7 @@ int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
             auto* q = new SeriesQuote;
             q->decode(block + i * SeriesQuote::kFileSize);
             if (firstOnOrAfter(q->getDate()) == quotes_.getNbr())
-                quotes_.add(q); // nothing of its day to replace
+                quotes_.addNew(q); // nothing of its day to replace
             else
                 late.push_back({q, quotes_.reserveTurn()});
         }

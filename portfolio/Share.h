@@ -36,6 +36,7 @@ public:
     void shareOperationChanged() { operations_.changeNotice(); }
 
     int addShareState(ShareState* state) { return states_.add(state); }
+    void addNewShareState(ShareState* state) { states_.addNew(state); }
     int removeShareState(ShareState* state) { return states_.remove(state); }
     unsigned getNbrShareStates() const { return states_.getNbr(); }
     ShareState** getAllShareStates(unsigned* n) const { return states_.getAll(n); }

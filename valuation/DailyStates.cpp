@@ -162,6 +162,6 @@ void DailyStates::buildDay(std::size_t day)
             else
                 line.holding.sell(operation);
         }
-        new ShareState(line.share, state, line.holding, line.quotes[day]);
+        new ShareState(*line.share, *state, line.holding, line.quotes[day]);
     }
 }

@@ -8,16 +8,17 @@
 #include "valuation/CashMoves.h"
 #include "valuation/State.h"
 
-ShareState::ShareState(Share* share, State* state, const Holding& holding, float quote)
+ShareState::ShareState(Share& share, State& state, const Holding& holding, float quote)
     : holding_(holding), quote_(quote)
 {
-    setShare(share);
-    setState(state);
+    share.addNewShareState(this);
+    state.addNewShareState(this);
 }
 
 ShareState::ShareState(Share* share, State* state, const Date& date, bool automatic)
-    : ShareState(share, state, Holding(), 0)
 {
+    setShare(share);
+    setState(state);
     Wallet* wallet = nullptr;
     if (share == nullptr || state == nullptr || state->getWallet(&wallet) != 0)
         return;

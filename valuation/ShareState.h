@@ -46,7 +46,7 @@ private:
     friend class DailyStates;
 
     /// With everything known already.
-    ShareState(Share* share, State* state, const Holding& holding, float quote);
+    ShareState(Share& share, State& state, const Holding& holding, float quote);
 
     bool replay(const Date& date, Account** sellingAccount);
 

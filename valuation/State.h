@@ -49,6 +49,7 @@ public:
     AccountState* getAccountState(unsigned i) const { return accountStates_.at(i); }
 
     int addShareState(ShareState* state) { return shareStates_.add(state); }
+    void addNewShareState(ShareState* state) { shareStates_.addNew(state); }
     int removeShareState(ShareState* state) { return shareStates_.remove(state); }
     unsigned getNbrShareStates() const { return shareStates_.getNbr(); }
     ShareState** getAllShareStates(unsigned* n) const { return shareStates_.getAll(n); }

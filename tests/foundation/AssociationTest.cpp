@@ -132,6 +132,17 @@ TEST(AssociationTest, RemovalFromAnUnsortedListMovesTheLastElementIntoTheHole)
     EXPECT_EQ(names(box), "cb") << "an element leaves as it dies";
 }
 
+TEST(AssociationTest, ANewElementIsAddedLikeAnyOther)
+{
+    Box box(true);
+    Item a('a', 2), b('b', 1), c('c', 2);
+    for (Item* item : {&a, &b, &c})
+        box.items.addNew(item);
+    EXPECT_EQ(names(box), "bac");
+    a.box.set(nullptr);
+    EXPECT_EQ(names(box), "bc");
+}
+
 TEST(AssociationTest, EqualKeysKeepTheOrderOfAddition)
 {
     Box box(true);
