@@ -1,0 +1,41 @@
+#include "portfolio/Share.h"
+#include "tests/support/SmallPortfolio.h"
+
+TEST(ShareTest, WithoutCompanyThereAreNoNamesAndNoQuotes)
+{
+    const Share share;
+    float quote = 5;
+    share.getQuote(kStart, &quote);
+    EXPECT_EQ(quote, 0);
+    EXPECT_EQ(share.getPrevisionQuote(kStart), 0);
+    for (const String& name : {share.getMarketName(), share.getCompanyAbbreviation(), share.getCompanyName()})
+        EXPECT_TRUE(name.isUndefined());
+}
+
+TEST(ShareTest, TheRateCostIsThePresentOneOfTheWallet)
+{
+    SmallPortfolio p;
+    auto* share = new Share(&p.wallet, p.alpha);
+    const ShareOperation* bought = trade(share, nullptr, 0, 1, 10);
+    EXPECT_EQ(bought->getOperationRateCost(), 0.0017F);
+    p.wallet.setSellRateCost(0.25F);
+    EXPECT_EQ(trade(share, nullptr, 0, -1, 10)->getOperationRateCost(), 0.25F);
+    share->setWallet(nullptr);
+    EXPECT_EQ(bought->getOperationRateCost(), 0);
+    EXPECT_EQ(ShareOperation().getOperationRateCost(), 0);
+}
+
+TEST(ShareTest, OnlyTheAutomaticOperationsCanBeRemovedAtOnce)
+{
+    for (const char* pattern : {"ama", "aaa", "aamm", "mmaa", ""}) {
+        Share share;
+        std::vector<ShareOperation*> manual;
+        for (int day = 0; pattern[day] != '\0'; ++day) {
+            auto* operation = new ShareOperation(daysAfterStart(day), &share, true, 1, 1, pattern[day] == 'a', 0);
+            if (!operation->isAutomatic())
+                manual.push_back(operation);
+        }
+        share.removeAutomaticShareOperations();
+        EXPECT_EQ(all(share, &Share::getAllShareOperations), manual) << pattern;
+    }
+}

@@ -1,0 +1,203 @@
+#include "portfolio/Wallet.h"
+#include "tests/support/Links.h"
+
+TEST(WalletTest, ProfitsGoToTheFirstFlaggedAccountOfTheCurrencyOtherwiseToItsFirst)
+{
+    const struct {
+        const char* accounts; // a letter for the currency of each, E, D or - for none; in capitals when it is flagged
+        int expected;
+        const char* why;
+    } cases[] = {{"", -1, "no account at all"},
+                 {"dD-", -1, "none in the currency"},
+                 {"dee", 1, "none flagged: the first"},
+                 {"eE", 1, "the flagged one, though later"},
+                 {"eEE", 1, "the first of two flagged ones"},
+                 {"De-", 1, "a flag in another currency does not count"}};
+    for (const auto& c : cases) {
+        SmallPortfolio p;
+        for (const char letter : std::string(c.accounts)) {
+            Currency* currency = letter == '-' ? nullptr : std::tolower(letter) == 'e' ? p.euro : p.dollar;
+            addAccount(p.wallet, "A", currency)->setDefaultTransferAccount(std::isupper(letter) != 0);
+        }
+        const Account* expected = c.expected >= 0 ? p.wallet.getAccount(static_cast<unsigned>(c.expected)) : nullptr;
+        EXPECT_EQ(p.wallet.findDefaultTransferAccount("EUR"), expected) << c.why;
+        EXPECT_EQ(p.wallet.findDefaultTransferAccount(String()), nullptr) << "no account without a currency is meant";
+    }
+}
+
+TEST(WalletTest, LookUpsNeedEveryNameAndGiveTheFirstMatch)
+{
+    SmallPortfolio p;
+    auto* twin = new Market("York"); // lists what the first market of its name does not
+    twin->setCurrency(p.dollar);
+    auto* gamma = new Company(twin, "Gamma", "GA");
+    new Company(twin, "Twin of Beta", "AC");
+    p.tell(p.wallet);
+    auto* share = new Share(&p.wallet, p.beta);
+    new Share(&p.wallet, p.beta);
+    const Account* account = addAccount(p.wallet, "A", p.euro);
+    addAccount(p.wallet, "A", p.dollar);
+
+    const struct {
+        const char *market, *ticker;
+        Company* company;
+        Share* holding;
+    } cases[] = {{"Paris", "AC", p.alpha, nullptr}, {"York", "AC", p.beta, share},
+                 {"York", "GA", gamma, nullptr},    {"york", "AC", nullptr, nullptr},
+                 {"York", "Ac", nullptr, nullptr},  {"Paris", "GA", nullptr, nullptr}};
+    for (const auto& c : cases) {
+        Company* company;
+        Share* holding;
+        EXPECT_EQ(p.wallet.getCompany(c.market, c.ticker, &company), c.company != nullptr ? 0 : -1);
+        EXPECT_EQ(company, c.company) << c.market << ' ' << c.ticker;
+        EXPECT_EQ(p.wallet.getShare(c.market, c.ticker, &holding), c.holding != nullptr ? 0 : -1);
+        EXPECT_EQ(holding, c.holding) << c.market << ' ' << c.ticker;
+    }
+    EXPECT_EQ(p.wallet.getAccountByName("A"), account);
+    EXPECT_EQ(p.wallet.getAccountByName("a"), nullptr);
+}
+
+TEST(WalletTest, CurrenciesAndMarketsAreCopiedAndNotOwned)
+{
+    SmallPortfolio p;
+    {
+        Wallet other;
+        Currency* currencies[] = {p.euro};
+        Market* markets[] = {p.paris};
+        Currency* found = p.euro;
+        EXPECT_EQ(other.getCurrency("Euro", &found), -1) << "none were set";
+        EXPECT_EQ(found, nullptr);
+        other.setCurrencies(1, currencies);
+        other.setMarkets(1, markets);
+        currencies[0] = nullptr;
+        markets[0] = nullptr;
+        Company* company;
+        EXPECT_EQ(other.getCurrency("Euro", &found), 0);
+        EXPECT_EQ(other.getCompany("Paris", "AC", &company), 0);
+    }
+    EXPECT_EQ(p.alpha->getName(), "Alpha") << "it outlives the wallet";
+}
+
+TEST(WalletTest, RemovingAutomaticOperationsSkipsNoNeighbour)
+{
+    for (const char* pattern : {"m", "a", "aaaa", "amaam", "maama"}) {
+        SmallPortfolio p;
+        Account* from = addAccount(p.wallet, "from", p.euro);
+        Account* to = addAccount(p.wallet, "to", p.euro);
+        auto* share = new Share(&p.wallet, p.alpha);
+        new ShareOperation(kStart, share, false, 1, 1, true, 0); // in no account's list
+        std::vector<Operation*> manual;
+        for (int day = 0; pattern[day] != '\0'; ++day) {
+            auto* sent = transfer(from, to, day, 1, pattern[day] == 'a');
+            if (!sent->isAutomatic())
+                manual.push_back(sent);
+        }
+        p.wallet.removeAutomaticOperations();
+        EXPECT_EQ(all(*from, &Account::getAllOperations), manual) << pattern;
+        EXPECT_EQ(to->getNbrTransferOperations(), manual.size()) << pattern;
+        EXPECT_EQ(share->getNbrShareOperations(), 1U) << "an automatic sale stays";
+    }
+}
+
+namespace {
+
+/// Makes, moves and destroys objects of several wallets and currencies at random.
+class Shuffle {
+public:
+    explicit Shuffle(unsigned seed) : random_(seed) {}
+    ~Shuffle()
+    {
+        while (!currencies_.empty())
+            destroyOne(currencies_);
+        while (!wallets_.empty())
+            destroyOne(wallets_);
+    }
+    Shuffle(const Shuffle&) = delete;
+    Shuffle& operator=(const Shuffle&) = delete;
+
+    Links links() const { return {currencies_, wallets_}; }
+
+    void step()
+    {
+        const Links now = links();
+        // Each of these has an owner, so that there is one of everything when there is one of them.
+        if (now.companies.empty() || now.transfers.empty() || now.trades.empty() || now.states.empty())
+            return makeOneOfEach();
+        Wallet* wallet = pick(now.wallets);
+        Account* account = pick(now.accounts);
+        Share* share = pick(now.shares);
+        Operation* operation = pick(now.operations);
+        const int day = below(4);
+        const std::function<void()> actions[] = {
+            [&] { new Share(wallet, pick(now.companies)); },
+            [&] { addAccount(*wallet, "A", pick(now.currencies)); },
+            [&] { deposit(account, day, 1, day == 0); },
+            [&] { transfer(account, pick(now.accounts), day, 1, day == 0); },
+            [&] { trade(share, day == 0 ? nullptr : account, day, below(3) - 1, 1); },
+            [&] { new State(wallet, daysAfterStart(day), true); },
+            [&] { account->setWallet(wallet); },
+            [&] { account->setCurrency(pick(now.currencies)); },
+            [&] { operation->setAccount(account); },
+            [&] { operation->setDate(daysAfterStart(day)); },
+            [&] { pick(now.transfers)->setRecepientAccount(account); },
+            [&] { pick(now.trades)->setShare(share); },
+            [&] { delete account; },
+            [&] { delete share; },
+            [&] { delete operation; },
+            [&] { delete pick(now.states); },
+            [&] { delete pick(now.companies); },
+            [&] { delete (day == 0 ? pick(now.markets) : nullptr); },
+            [&] { day == 0 ? destroyOne(currencies_) : void(); },
+            [&] { day == 0 ? destroyOne(wallets_) : void(); },
+        };
+        constexpr std::size_t kMaking = 6;
+        actions[below(below(2) == 0 ? kMaking : std::size(actions))]();
+    }
+
+private:
+    int below(std::size_t n) { return static_cast<int>(::below(random_, n)); }
+
+    template <class T>
+    T* pick(const std::vector<T*>& objects)
+    {
+        return objects[::below(random_, objects.size())];
+    }
+
+    template <class T>
+    void destroyOne(std::vector<T*>& objects)
+    {
+        const auto place = objects.begin() + below(objects.size());
+        delete *place;
+        objects.erase(place);
+    }
+
+    void makeOneOfEach()
+    {
+        wallets_.push_back(new Wallet);
+        currencies_.push_back(new Currency("Euro", "EUR", nullptr));
+        auto* market = new Market("Paris");
+        market->setCurrency(currencies_.back());
+        Account* account = addAccount(*wallets_.back(), "A", currencies_.back());
+        transfer(account, account, 1, 1);
+        trade(new Share(wallets_.back(), new Company(market, "Alpha", "AC")), account, 1, 1, 1);
+        new State(wallets_.back(), kStart, false);
+    }
+
+    std::mt19937 random_;
+    std::vector<Currency*> currencies_;
+    std::vector<Wallet*> wallets_;
+};
+
+} // namespace
+
+TEST(WalletTest, BothEndsOfEveryLinkAgreeWhateverIsDestroyed)
+{
+    for (unsigned seed = 1; seed <= 20 && !HasFailure(); ++seed) {
+        Shuffle shuffle(seed);
+        for (int i = 0; i < 250 && !HasFailure(); ++i) {
+            SCOPED_TRACE("seed " + std::to_string(seed) + ", step " + std::to_string(i));
+            shuffle.step();
+            shuffle.links().expectConsistent();
+        }
+    }
+}
