@@ -1,0 +1,119 @@
+#include "valuation/Totals.h"
+#include "tests/support/SmallPortfolio.h"
+#include "valuation/State.h"
+
+namespace {
+
+struct Portfolio : SmallPortfolio {
+    Totals at(int day) { return {State(&wallet, daysAfterStart(day), false), catalogue}; }
+    Account* account(Currency* currency, float amount)
+    {
+        Account* account = addAccount(wallet, "Account", currency);
+        deposit(account, 0, amount);
+        return account;
+    }
+    void hold(Company* company, int quantity, Account* account = nullptr)
+    {
+        trade(new Share(&wallet, company), account, 0, quantity, 5);
+    }
+};
+
+} // namespace
+
+TEST(TotalsTest, EverythingCountsInTheReferenceCurrencyOfTheStatesDay)
+{
+    Portfolio p;
+    p.wallet.setSellRateCost(0);
+    new CurrencyQuote(p.euro, daysAfterStart(10), 4); // the reference, too, is divided by
+    new CurrencyQuote(p.dollar, daysAfterStart(10), 6);
+    setTrend(p.alpha, 3);
+    setTrend(p.beta, 8);
+    p.account(p.dollar, 100);
+    p.hold(p.beta, 10);
+    p.hold(p.alpha, -7, p.account(p.euro, 1000));
+    const Totals totals = p.at(10);
+    EXPECT_TRUE(totals.isKnown);
+    EXPECT_EQ(totals.totalDeposit, 1000 + 100 * 2);
+    EXPECT_EQ(totals.totalValue, 10 * 8 * 6 / 4.0F - 7 * 3 + (1000 + 7 * 5) + 100 * 6 / 4.0F);
+    EXPECT_EQ(totals.profit, totals.totalValue - totals.totalDeposit);
+    EXPECT_FLOAT_EQ(totals.annualRevenue, 365.25F / 10 * totals.profit / 1200);
+}
+
+TEST(TotalsTest, SumsAreRoundedAfterEveryAddition)
+{
+    Portfolio p;
+    constexpr int kLastWholeNumber = 16777216; // from here on a float has no odd numbers
+    setTrend(p.alpha, 1);
+    for (const int quantity : {kLastWholeNumber, 1, 1})
+        p.hold(p.alpha, quantity);
+    p.account(p.euro, 1);
+    p.account(p.euro, 1);
+    EXPECT_EQ(p.at(0).totalValue, kLastWholeNumber + 2.0F) << "the single shares are lost, the cash is one sum";
+
+    std::mt19937 random(1);
+    for (int run = 0; run < 200; ++run) {
+        Portfolio q;
+        const float price = static_cast<float>(below(random, 100000)) / 300, rate = price / 7 + 1;
+        new CurrencyQuote(q.dollar, kStart, rate);
+        new CompanyQuote(q.beta, kStart, price);
+        float shares = 0, cash = 0;
+        for (int i = 0; i < 8; ++i) {
+            const int quantity = 1 + static_cast<int>(below(random, 10000));
+            q.hold(q.beta, quantity);
+            shares = static_cast<float>(shares + static_cast<double>(price) * quantity * rate);
+            q.account(q.dollar, price / 3);
+            cash = static_cast<float>(cash + static_cast<double>(price / 3) * rate);
+        }
+        ASSERT_EQ(q.at(0).totalValue, shares + cash) << run;
+    }
+}
+
+TEST(TotalsTest, WhatIsInNoKnownCurrencyDoesNotCount)
+{
+    Portfolio p;
+    Currency unlisted("Franc", "FRF", nullptr), sameSymbol("Former euro", "EUR", nullptr);
+    p.account(&unlisted, 100);
+    p.account(nullptr, 100);
+    p.account(p.euro, 100);
+    p.hold(nullptr, 10);
+    EXPECT_EQ(p.at(0).totalValue, 100);
+    p.account(&sameSymbol, 100);
+    EXPECT_EQ(p.at(0).totalValue, 200) << "the symbol tells";
+}
+
+TEST(TotalsTest, RevenueIsAYearsProfitOnTheDeposit)
+{
+    const struct {
+        float deposited, gained; // by a sale on the first day
+        int day;
+        float revenue;
+        const char* why;
+    } cases[] = {{1000, 5, 365, 365.25F / 365 * 5 / 1000, "a year"},
+                 {1000, -5, 730, 365.25F / 730 * -5 / 1000, "a loss in two years"},
+                 {1000, 5, 0, 0, "on the first day"},
+                 {1000, 0, -3, 0, "before the first operation"},
+                 {0, 5, 365, 0, "nothing deposited"}};
+    for (const auto& c : cases) {
+        Portfolio p;
+        p.wallet.setSellRateCost(0);
+        p.wallet.setBuyRateCost(0);
+        p.hold(p.alpha, c.gained < 0 ? 1 : -1, p.account(p.euro, c.deposited)); // worth nothing without quotes
+        const Totals totals = p.at(c.day);
+        EXPECT_FLOAT_EQ(totals.annualRevenue, c.revenue) << c.why;
+        EXPECT_EQ(totals.profit, c.gained) << c.why;
+    }
+}
+
+TEST(TotalsTest, WithoutAReferenceOrItsRateNothingHasAValue)
+{
+    for (const bool hasReference : {false, true}) {
+        Portfolio p;
+        p.account(p.dollar, 100);
+        new CurrencyQuote(p.euro, kStart, 0);
+        p.catalogue.setReferenceCurrency(hasReference ? p.euro : nullptr);
+        const Totals totals = p.at(5);
+        EXPECT_EQ(totals.isKnown, hasReference);
+        EXPECT_EQ(totals.totalDeposit, hasReference ? 200 : 0);
+        EXPECT_EQ(totals.totalValue + totals.profit + totals.annualRevenue, 0);
+    }
+}
