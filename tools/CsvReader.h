@@ -2,66 +2,42 @@
 
 #include <cstddef>
 #include <string>
-#include <string_view>
 #include <vector>
 #include <zlib.h>
 
-/// The records of a CSV file (RFC 4180), plain or gzipped, one after the other.
+/// The records of a CSV file, plain or gzipped: one a line, with fields that may be quoted as in RFC 4180.
 ///
-/// The separator - tab, ';' or ',' - is guessed from the first line. A byte order mark in front and CR LF line ends are
-/// taken, blank lines left out. A file that cannot be opened or read to its end throws std::runtime_error with one line
-/// for the user.
+/// The separator - tab, ';' or ',' - is guessed from the first record. A byte order mark in front and CR LF line ends
+/// are taken. A file that cannot be opened or read to its end throws std::runtime_error with one line for the user.
 class CsvReader {
 public:
-    enum class Outcome { kRecord, kMalformed, kEnd };
-
     explicit CsvReader(const std::string& path);
     ~CsvReader();
     CsvReader(const CsvReader&) = delete;
     CsvReader& operator=(const CsvReader&) = delete;
 
-    /// Goes to the next record. A malformed one - a quote that is not closed, or not at the end of its field, or a
-    /// record longer than `kLongestRecord` - costs a single line: reading goes on with the line after that.
-    Outcome next();
+    /// Goes to the next line that has a text in any field. @return false at the end of the file.
+    bool next();
 
-    /// The fields of the record, without their quotes; valid until the next call of `next`. None when malformed.
-    const std::vector<std::string_view>& fields() const { return fields_; }
-    /// The line, counted from 1, on which the record begins. A quoted field may stretch over more lines.
+    /// The fields of the line, without their quotes. None when the line is malformed: a quote is not closed, or not at
+    /// the end of its field, or the line is longer than `kLongestLine`.
+    const std::vector<std::string>& fields() const { return fields_; }
+    /// The number of the line, counted from 1.
     unsigned long line() const { return line_; }
     char separator() const { return separator_; }
 
-    static constexpr std::size_t kLongestRecord = std::size_t{1} << 18; // bytes
+    static constexpr std::size_t kLongestLine = std::size_t{1} << 16; // bytes
 
 private:
-    static constexpr int kEndOfFile = -1;
-    static constexpr std::size_t kTooLong = ~std::size_t{0};
-
-    void skipByteOrderMark();
+    bool readLine();
     void guessSeparator();
-
-    bool splitPlain();
-    bool splitQuoted();
-    bool takeQuotedField(std::size_t* at);
-    void takeBareField(std::size_t* at);
-    void skipLine();
-    bool isBlank() const;
-
-    std::size_t lineEnd();
-    int peek(std::size_t at);
-    bool fill();
+    bool split();
+    bool takeQuoted(std::size_t* at, std::string* field) const;
 
     std::string path_;
     gzFile file_;
-    std::vector<char> buffer_;
-    std::size_t begin_ = 0; // of the record in the buffer; the private functions count from here
-    std::size_t end_ = 0;   // of what was read
-    bool ended_ = false;    // the file has no more
-
-    char separator_ = ',';
-    std::size_t length_ = 0; // of the record with its line end
+    char separator_ = '\0'; // not known yet
     unsigned long line_ = 0;
-    unsigned long linesInRecord_ = 1;
-    std::vector<std::string_view> fields_;
-    std::string unquoted_;               // the fields of a record with quotes, one behind the other,
-    std::vector<std::size_t> fieldEnds_; // and where in it each ends
+    std::string text_; // of the line
+    std::vector<std::string> fields_;
 };

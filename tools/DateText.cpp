@@ -1,58 +1,54 @@
 #include "tools/DateText.h"
 
+#include <charconv>
+#include <ctime>
+
 namespace {
 
-constexpr std::size_t kYearDigits = 4;
-constexpr std::size_t kDayDigits = 2; // at most, as for the month
-
-/// Takes a number of `shortest` to `longest` digits off the front of `text`; -1 when there is none.
-int takeNumber(std::string_view& text, std::size_t shortest, std::size_t longest)
+/// The number that `text` is, of `shortest` to `longest` digits; -1 for anything else.
+int numberOf(std::string_view text, std::size_t shortest, std::size_t longest)
 {
-    int number = 0;
-    std::size_t digits = 0;
-    for (; digits < text.size() && text[digits] >= '0' && text[digits] <= '9'; ++digits) {
-        if (digits == longest)
-            return -1;
-        number = 10 * number + (text[digits] - '0');
-    }
-    text.remove_prefix(digits);
-    return digits >= shortest ? number : -1;
+    if (text.size() < shortest || text.size() > longest || text.find_first_not_of("0123456789") != text.npos)
+        return -1;
+    int number = -1;
+    std::from_chars(text.data(), text.data() + text.size(), number);
+    return number;
 }
 
-int takeYear(std::string_view& text)
+Date today()
 {
-    return takeNumber(text, kYearDigits, kYearDigits);
-}
-
-int takeDayOrMonth(std::string_view& text)
-{
-    return takeNumber(text, 1, kDayDigits);
-}
-
-bool takeMark(std::string_view& text, char mark)
-{
-    if (text.empty() || text.front() != mark)
-        return false;
-    text.remove_prefix(1);
-    return true;
+    const std::time_t now = std::time(nullptr);
+    std::tm local{};
+    localtime_r(&now, &local);
+    return {static_cast<short>(local.tm_mday), static_cast<short>(local.tm_mon + 1), local.tm_year + 1900};
 }
 
 } // namespace
 
 std::optional<Date> parseDate(std::string_view text)
 {
-    const bool yearFirst = text.find('-') != text.npos;
-    const char mark = yearFirst ? '-' : '/';
-    const int first = yearFirst ? takeYear(text) : takeDayOrMonth(text);
-    if (!takeMark(text, mark))
+    const char mark = text.find('-') != text.npos ? '-' : '/';
+    const std::size_t first = text.find(mark);
+    const std::size_t second = first != text.npos ? text.find(mark, first + 1) : first;
+    if (second == text.npos)
         return std::nullopt;
-    const int month = takeDayOrMonth(text);
-    if (!takeMark(text, mark))
-        return std::nullopt;
-    const int last = yearFirst ? takeDayOrMonth(text) : takeYear(text);
-    if (first < 0 || month < 0 || last < 0 || !text.empty())
-        return std::nullopt;
-    const int day = yearFirst ? last : first;
-    const Date date(static_cast<short>(day), static_cast<short>(month), yearFirst ? first : last);
-    return date.isValid() ? std::optional(date) : std::nullopt;
+    std::string_view day = text.substr(0, first);
+    std::string_view year = text.substr(second + 1);
+    if (mark == '-')
+        std::swap(day, year);
+    const std::string_view month = text.substr(first + 1, second - first - 1);
+    const Date date(static_cast<short>(numberOf(day, 1, 2)), static_cast<short>(numberOf(month, 1, 2)),
+                    numberOf(year, 4, 4));
+    return date.isValid() && date.getYear() >= 0 ? std::optional(date) : std::nullopt;
+}
+
+std::string checkDateArgument(const std::string& text)
+{
+    const bool isDate = text.find('/') != std::string::npos && parseDate(text);
+    return isDate ? std::string() : "is not a date DD/MM/YYYY: " + text;
+}
+
+Date dateArgument(const std::string& text)
+{
+    return text.empty() ? today() : *parseDate(text);
 }

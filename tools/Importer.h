@@ -1,35 +1,28 @@
 #pragma once
 
 #include "foundation/Date.h"
-#include "tools/DatedValues.h"
+#include "tools/Table.h"
 
 #include <cstddef>
 #include <iosfwd>
 #include <map>
 #include <optional>
 #include <string>
-#include <string_view>
 #include <unordered_map>
-#include <vector>
+#include <utility>
 
 class Catalogue;
+class Company;
 class Currency;
-class TableReader;
-
-/// How the numbers of a rates table are meant. The program keeps the second kind, so the first is inverted.
-enum class RateMeaning {
-    kUnitsPerReference, // how many units one unit of the reference currency buys, as central banks publish rates
-    kValueInReference,  // the price of one unit in the reference currency
-};
+class Market;
 
 /// What the tables leave open.
 struct ImportOptions {
-    std::string reference = "EUR";       // symbol of the currency that the rates refer to
-    std::string currency = "USD";        // symbol of the currency of a market for which no table tells it
-    std::string market = "NYSE";         // of a ticker for which no table tells it
-    std::optional<RateMeaning> ratesAre; // what the heading of the rates says (units_per_..., value_in_...), else units
-    bool tickerFromName = false;         // a quotes file without a ticker column is named after its ticker
-    std::map<std::string, std::string> currencyNames; // by symbol; a currency not in here is called by its symbol
+    std::string reference = "EUR";     // symbol of the currency that the rates refer to
+    std::string currency = "USD";      // symbol of the currency of a market for which no table tells it
+    std::string market = "NYSE";       // of a ticker for which no table tells it
+    std::optional<bool> ratesAreUnits; // per unit of the reference, else prices in it; without it as the heading says
+    bool tickerFromName = false;       // a quotes file without a ticker column is named after its ticker
 };
 
 /// What has come in; the rates include those of 1 that the reference currency gets.
@@ -42,81 +35,57 @@ struct ImportCounts {
     std::size_t replaced = 0; // values given up for a later line of the same day
 };
 
-/// Gathers tables of quotes and rates and makes market data of them.
+/// Makes market data of tables of quotes and rates.
 ///
 /// Currencies come in the order of their first mention behind the reference, companies likewise. A company is a ticker
 /// on a market, a market trades in a single currency. Unusable lines are told on the log and skipped. A file that
 /// cannot be read throws std::runtime_error with one line for the user.
 class Importer {
 public:
-    Importer(const ImportOptions& options, std::ostream& log);
+    /// `catalogue` is empty; the currencies and companies come into it with the tables, their quotes with `finish`.
+    Importer(const ImportOptions& options, Catalogue& catalogue, std::ostream& log);
 
     /// Takes market, currency and name of tickers. Has to come before the quotes, which it says how to place.
     void addListing(const std::string& path);
     void addRates(const std::string& path);
     void addQuotes(const std::string& path);
 
-    /// Adds everything to `catalogue`, which is empty; nothing is left here. Throws std::runtime_error for nothing at
-    /// all.
+    /// Throws std::runtime_error when there is no quote and no rate at all.
     /// @return the latest day that has a value.
-    Date fill(Catalogue* catalogue);
+    Date finish();
     const ImportCounts& counts() const { return counts_; }
 
 private:
-    using Index = std::size_t;
-
-    struct CurrencyData {
-        std::string symbol;
-        DatedValues rates;
-        bool hasCompanies = false;
-    };
-    struct MarketData {
-        std::string name;
-        Index currency;
-    };
-    struct CompanyData {
-        std::string ticker;
-        std::string name;
-        Index market;
-        DatedValues quotes;
-    };
+    // A series finds the place of a quote in time only when quotes come in date order, which tables need not have.
+    using Values = std::map<Date, float>;
+    using CompanyValues = std::pair<Company* const, Values>;
     struct Listed {
         std::string market; // each empty when the listing leaves it open
         std::string currency;
         std::string name;
     };
 
-    // These take one row each and return why they cannot, or an empty text.
-    std::string takeListed(const TableReader& row);
-    std::string takeRate(TableReader& row, RateMeaning meaning);
-    std::string takeQuote(TableReader& row, std::string_view tickerOfFile);
+    void takeListed(const Table& row);
+    void takeRate(Table& row, bool units);
+    void takeQuote(Table& row, const std::string& tickerOfFile);
 
-    RateMeaning meaningOf(const TableReader& rates, const std::string& path) const;
-    std::string findCompany(const TableReader& row, std::string_view ticker, CompanyData** out);
-    std::string placeCompany(const TableReader& row, std::string_view ticker, Index* out);
-    std::string findMarket(const std::string& nameOrNone, const std::string& currency, Index* out);
-    Index findCurrency(std::string_view symbol);
+    bool areUnits(const Table& rates, const std::string& path) const;
+    CompanyValues* findCompany(const Table& row, const std::string& ticker);
+    CompanyValues* placeCompany(const Table& row, const std::string& ticker);
+    Market* findMarket(const std::string& nameOrNone, const std::string& currency);
+    Currency* findCurrency(const std::string& symbol);
+    void addValue(Values& values, const Date& date, float value);
 
-    void settle();
     void giveReferenceItsRates();
     void tellDoubts() const;
-    Date latestDay() const;
-    std::vector<Currency*> makeCurrencies(Catalogue* catalogue);
-    void makeCompanies(const std::vector<Currency*>& currencies);
 
     ImportOptions options_;
+    Catalogue& catalogue_;
     std::ostream& log_;
     ImportCounts counts_;
 
-    std::vector<CurrencyData> currencies_; // the reference first
-    std::vector<MarketData> markets_;
-    std::vector<CompanyData> companies_;
     std::unordered_map<std::string, Listed> listing_;      // by ticker
-    std::unordered_map<std::string, Index> currencyIndex_; // by symbol
-    std::unordered_map<std::string, Index> marketIndex_;   // by name
-    std::unordered_map<std::string, Index> companyIndex_;  // by ticker and market
-    std::unordered_map<std::string, Index> rowIndex_;      // by all cells that tell a row's company
-
-    std::string rowKey_;   // of the latest row,
-    Index rowCompany_ = 0; // and its company
+    std::unordered_map<std::string, CompanyValues*> rows_; // by all cells that tell a row's company
+    std::unordered_map<Company*, Values> quotes_;
+    std::unordered_map<Currency*, Values> rates_;
 };

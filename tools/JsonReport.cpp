@@ -6,178 +6,145 @@
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
-#include "tools/JsonWriter.h"
 #include "tools/Valuation.h"
 #include "valuation/AccountState.h"
 #include "valuation/ShareState.h"
 #include "valuation/State.h"
 
+#include <nlohmann/json.hpp>
+
 namespace {
 
-const char* nameOfType(short type)
+/// Keeps the order of the keys. Its floats take 9 significant digits at most, which read back to the same float; one
+/// that is not finite becomes null.
+using Json =
+    nlohmann::basic_json<nlohmann::ordered_map, std::vector, std::string, bool, std::int64_t, std::uint64_t, float>;
+
+std::string text(const String& text)
 {
-    constexpr const char* kNames[] = {"", "deposit", "transfer", "buy", "sell"}; // by type code
-    return kNames[type];
+    return std::string(text.bytes());
 }
 
-class Report {
-public:
-    Report(const Valuation& valuation, FILE* out) : valuation_(valuation), json_(out) {}
-
-    void writeAll()
-    {
-        json_.beginObject(JsonWriter::Layout::kLinePerItem);
-        json_.key("date").date(valuation_.state().getDate());
-        writeTotals();
-        json_.key("firstOperationDate").date(valuation_.state().getFirstOperationDate());
-        writeAccounts();
-        writeShares();
-        writeOperations();
-        if (valuation_.hasEvolution())
-            writeEvolution();
-        json_.end();
-    }
-
-private:
-    void write(const char* key, const String& text) { json_.key(key).text(text.bytes()); }
-    void write(const char* key, float number) { json_.key(key).number(number); }
-
-    void writeTotals();
-    void writeAccounts();
-    void writeShares();
-    void writeOperations();
-    void writeOperation(const Account& account, const Operation& operation);
-    void writeTransfer(const TransferAccountOperation& transfer);
-    void writeTrade(const ShareOperation& trade);
-    void writeEvolution();
-
-    const Valuation& valuation_;
-    JsonWriter json_;
-};
-
-void Report::writeTotals()
+Json day(const Date& date)
 {
-    const Totals totals = valuation_.totals();
-    if (!totals.isKnown) {
-        for (const char* key : {"reference", "totalDeposit", "totalValue", "profit", "annualRevenue"})
-            json_.key(key).null();
-        return;
-    }
-    write("reference", valuation_.catalogue().getReferenceCurrency()->getRepresentation());
-    write("totalDeposit", totals.totalDeposit);
-    write("totalValue", totals.totalValue);
-    write("profit", totals.profit);
-    write("annualRevenue", totals.annualRevenue);
+    return date.isUndefined() ? Json() : Json(text(date.toString()));
 }
 
-void Report::writeAccounts()
+void addTotals(const Valuation& valuation, Json* report)
 {
-    json_.key("accounts").beginArray();
+    const Totals totals = valuation.totals();
+    const Currency* reference = valuation.catalogue().getReferenceCurrency();
+    const auto known = [&totals](float total) { return totals.isKnown ? Json(total) : Json(); };
+    (*report)["reference"] = totals.isKnown ? Json(text(reference->getRepresentation())) : Json();
+    (*report)["totalDeposit"] = known(totals.totalDeposit);
+    (*report)["totalValue"] = known(totals.totalValue);
+    (*report)["profit"] = known(totals.profit);
+    (*report)["annualRevenue"] = known(totals.annualRevenue);
+}
+
+Json accounts(const State& state)
+{
+    Json list = Json::array();
     unsigned n;
-    AccountState** states = valuation_.state().getAllAccountStates(&n);
+    AccountState** states = state.getAllAccountStates(&n);
     for (unsigned i = 0; i < n; ++i) {
         const Account* account = states[i]->listed();
-        json_.beginObject();
-        write("name", states[i]->getAccountName());
-        write("currency", states[i]->getCurrencyRepresentation());
-        write("cash", states[i]->getCash());
-        json_.key("defaultTransfer").boolean(account != nullptr && account->isDefaultTransferAccount());
-        json_.end();
+        list.push_back({{"name", text(states[i]->getAccountName())},
+                        {"currency", text(states[i]->getCurrencyRepresentation())},
+                        {"cash", states[i]->getCash()},
+                        {"defaultTransfer", account != nullptr && account->isDefaultTransferAccount()}});
     }
-    json_.end();
+    return list;
 }
 
-void Report::writeShares()
+Json shares(const State& state)
 {
-    json_.key("shares").beginArray();
+    Json list = Json::array();
     unsigned n;
-    ShareState** states = valuation_.state().getAllShareStates(&n);
+    ShareState** states = state.getAllShareStates(&n);
     for (unsigned i = 0; i < n; ++i) {
         const Share* share = states[i]->listed();
-        json_.beginObject();
-        write("market", share != nullptr ? share->getMarketName() : String());
-        write("ticker", states[i]->getCompanyAbbreviation());
-        write("name", states[i]->getCompanyName());
-        json_.key("quantity").number(states[i]->getQuantity());
-        write("buyQuote", states[i]->getBuyQuote());
-        write("quote", states[i]->getQuote());
-        json_.key("endDate").date(states[i]->getEndDate());
-        write("currency", states[i]->getCurrencyRepresentation());
-        json_.end();
+        list.push_back({{"market", share != nullptr ? text(share->getMarketName()) : ""},
+                        {"ticker", text(states[i]->getCompanyAbbreviation())},
+                        {"name", text(states[i]->getCompanyName())},
+                        {"quantity", states[i]->getQuantity()},
+                        {"buyQuote", states[i]->getBuyQuote()},
+                        {"quote", states[i]->getQuote()},
+                        {"endDate", day(states[i]->getEndDate())},
+                        {"currency", text(states[i]->getCurrencyRepresentation())}});
     }
-    json_.end();
+    return list;
 }
 
-void Report::writeOperations()
+Json describe(const TransferAccountOperation& transfer)
 {
-    json_.key("operations").beginArray();
+    Account* recipient;
+    const bool isReceived = transfer.getRecepientAccount(&recipient) == 0;
+    return {{"recipient", isReceived ? Json(text(recipient->getName())) : Json()},
+            {"amount", transfer.getAmount()},
+            {"rateCost", transfer.getRateCost()},
+            {"cost", transfer.getCost()},
+            {"fromCurrencyQuote", transfer.getFromCurrencyQuote()},
+            {"toCurrencyQuote", transfer.getToCurrencyQuote()}};
+}
+
+Json describe(const ShareOperation& trade)
+{
+    Share* share;
+    const bool isOfShare = trade.getShare(&share) == 0;
+    return {{"market", isOfShare ? text(share->getMarketName()) : ""},
+            {"ticker", isOfShare ? text(share->getCompanyAbbreviation()) : ""},
+            {"quantity", trade.getQuantity()},
+            {"quote", trade.getQuote()},
+            {"operationCost", trade.getOperationCost()}};
+}
+
+Json describe(const Account& account, const Operation& operation)
+{
+    constexpr const char* kTypes[] = {"", "deposit", "transfer", "buy", "sell"}; // by type code
+    Json json = {{"account", text(account.getName())},
+                 {"type", kTypes[operation.getType()]},
+                 {"date", day(operation.getDate())},
+                 {"automatic", operation.isAutomatic()}};
+    if (const auto* deposit = dynamic_cast<const DepositAccountOperation*>(&operation))
+        json["amount"] = deposit->getAmount();
+    else if (const auto* transfer = dynamic_cast<const TransferAccountOperation*>(&operation))
+        json.update(describe(*transfer));
+    else if (const auto* trade = dynamic_cast<const ShareOperation*>(&operation))
+        json.update(describe(*trade));
+    return json;
+}
+
+Json operations(const Wallet& wallet)
+{
+    Json list = Json::array();
     unsigned nAccounts;
-    Account** accounts = valuation_.wallet().getAllAccounts(&nAccounts);
+    Account** accounts = wallet.getAllAccounts(&nAccounts);
     for (unsigned i = 0; i < nAccounts; ++i) {
         unsigned n;
         Operation** operations = accounts[i]->getAllOperations(&n);
         for (unsigned j = 0; j < n; ++j)
-            writeOperation(*accounts[i], *operations[j]);
+            list.push_back(describe(*accounts[i], *operations[j]));
     }
-    json_.end();
-}
-
-void Report::writeOperation(const Account& account, const Operation& operation)
-{
-    json_.beginObject();
-    write("account", account.getName());
-    json_.key("type").text(nameOfType(operation.getType()));
-    json_.key("date").date(operation.getDate());
-    json_.key("automatic").boolean(operation.isAutomatic());
-    if (const auto* deposit = dynamic_cast<const DepositAccountOperation*>(&operation))
-        write("amount", deposit->getAmount());
-    else if (const auto* transfer = dynamic_cast<const TransferAccountOperation*>(&operation))
-        writeTransfer(*transfer);
-    else if (const auto* trade = dynamic_cast<const ShareOperation*>(&operation))
-        writeTrade(*trade);
-    json_.end();
-}
-
-void Report::writeTransfer(const TransferAccountOperation& transfer)
-{
-    Account* recipient;
-    if (transfer.getRecepientAccount(&recipient) == 0)
-        write("recipient", recipient->getName());
-    else
-        json_.key("recipient").null();
-    write("amount", transfer.getAmount());
-    write("rateCost", transfer.getRateCost());
-    write("cost", transfer.getCost());
-    write("fromCurrencyQuote", transfer.getFromCurrencyQuote());
-    write("toCurrencyQuote", transfer.getToCurrencyQuote());
-}
-
-void Report::writeTrade(const ShareOperation& trade)
-{
-    Share* share;
-    const bool isOfShare = trade.getShare(&share) == 0;
-    write("market", isOfShare ? share->getMarketName() : String());
-    write("ticker", isOfShare ? share->getCompanyAbbreviation() : String());
-    json_.key("quantity").number(trade.getQuantity());
-    write("quote", trade.getQuote());
-    write("operationCost", trade.getOperationCost());
-}
-
-void Report::writeEvolution()
-{
-    json_.key("evolution").beginArray();
-    for (const EvolutionPoint& point : valuation_.evolution()) {
-        json_.beginObject();
-        json_.key("date").date(point.date);
-        write("totalValue", point.totalValue);
-        json_.end();
-    }
-    json_.end();
+    return list;
 }
 
 } // namespace
 
 void writeJsonReport(const Valuation& valuation, FILE* out)
 {
-    Report(valuation, out).writeAll();
+    const State& state = valuation.state();
+    Json report = {{"date", day(state.getDate())}};
+    addTotals(valuation, &report);
+    report["firstOperationDate"] = day(state.getFirstOperationDate());
+    report["accounts"] = accounts(state);
+    report["shares"] = shares(state);
+    report["operations"] = operations(valuation.wallet());
+    if (valuation.hasEvolution()) {
+        Json& points = report["evolution"] = Json::array();
+        for (const EvolutionPoint& point : valuation.evolution())
+            points.push_back({{"date", day(point.date)}, {"totalValue", point.totalValue}});
+    }
+    const std::string bytes = report.dump(2, ' ', false, Json::error_handler_t::replace) + '\n';
+    std::fwrite(bytes.data(), 1, bytes.size(), out);
 }

@@ -1,18 +1,13 @@
 #include "market/Catalogue.h"
 #include "tools/AtomicFile.h"
 #include "tools/Importer.h"
+#include "tools/Program.h"
 
-#include <CLI/CLI.hpp>
-#include <exception>
 #include <iostream>
-#include <stdexcept>
 #include <string>
 #include <vector>
 
 namespace {
-
-constexpr int kBadArguments = 2;
-constexpr int kFailure = 1;
 
 const char* const kUnits = "units-per-reference";
 const char* const kValues = "value-in-reference";
@@ -41,25 +36,12 @@ struct Arguments {
     std::vector<std::string> quotes;
     std::vector<std::string> rates;
     std::vector<std::string> listings;
-    std::vector<std::string> currencyNames; // SYMBOL=NAME
     std::string ratesAre;
     bool force = false;
-    bool referenceGiven = false;
     ImportOptions import;
 };
 
-std::string checkNaming(const std::string& text)
-{
-    const std::size_t mark = text.find('=');
-    return mark == 0 || mark == text.npos || mark + 1 == text.size() ? "is not SYMBOL=NAME: " + text : std::string();
-}
-
-std::string checkText(const std::string& text)
-{
-    return text.empty() ? "must not be empty" : std::string();
-}
-
-CLI::Option* describe(CLI::App& app, Arguments& arguments)
+void describe(CLI::App& app, Arguments& arguments)
 {
     ImportOptions& import = arguments.import;
     app.footer(kTables);
@@ -68,73 +50,55 @@ CLI::Option* describe(CLI::App& app, Arguments& arguments)
     app.add_option("--rates", arguments.rates, "Tables of exchange rates")->type_name("FILE");
     app.add_option("--listing", arguments.listings, "Tables that tell market, currency and name of tickers")
         ->type_name("FILE");
-    CLI::Option* reference =
-        app.add_option("--reference", import.reference,
-                       "Currency that the rates refer to; without it EUR, or when there are no rates the --currency")
-            ->type_name("SYMBOL")
-            ->check(checkText);
+    app.add_option("--reference", import.reference,
+                   "Currency that the rates refer to; without it EUR, or when there are no rates the --currency")
+        ->type_name("SYMBOL")
+        ->check(checkNotEmpty);
     app.add_option("--rates-are", arguments.ratesAre, "How the rates are meant; see below")
         ->check(CLI::IsMember({kUnits, kValues}));
     app.add_option("--currency", import.currency, "Currency of the markets that no table tells it of")
         ->capture_default_str()
         ->type_name("SYMBOL")
-        ->check(checkText);
+        ->check(checkNotEmpty);
     app.add_option("--market", import.market, "Market of the tickers that no table tells it of")
         ->capture_default_str()
         ->type_name("NAME")
-        ->check(checkText);
-    app.add_option("--currency-name", arguments.currencyNames, "Full name of a currency, else its symbol")
-        ->type_name("SYMBOL=NAME")
-        ->check(checkNaming);
+        ->check(checkNotEmpty);
     app.add_flag("--ticker-from-name", import.tickerFromName,
                  "The quotes are of one ticker a file, which the file's name tells (AAPL.csv: date,close)");
     app.add_flag("--force", arguments.force, "Replace OUTPUT when it exists");
-    return reference;
 }
 
-/// Turns the texts of the options into what the import wants.
-void interpret(Arguments& arguments)
+void run(const CLI::App& app, Arguments& arguments)
 {
-    ImportOptions& import = arguments.import;
-    if (!arguments.referenceGiven && arguments.rates.empty())
-        import.reference = import.currency;
+    if (arguments.quotes.empty() && arguments.rates.empty())
+        throw CLI::RequiredError("--quotes or --rates");
+    if (app.count("--reference") == 0 && arguments.rates.empty())
+        arguments.import.reference = arguments.import.currency;
     if (!arguments.ratesAre.empty())
-        import.ratesAre =
-            arguments.ratesAre == kUnits ? RateMeaning::kUnitsPerReference : RateMeaning::kValueInReference;
-    for (const std::string& naming : arguments.currencyNames) {
-        const std::size_t mark = naming.find('=');
-        import.currencyNames[naming.substr(0, mark)] = naming.substr(mark + 1);
-    }
-}
-
-void tellOutcome(const ImportCounts& counts)
-{
-    std::cerr << "companies: " << counts.companies << ", quotes: " << counts.quotes
-              << ", currencies: " << counts.currencies << ", rates: " << counts.rates
-              << ", skipped lines: " << counts.skipped << ", values replaced by a later line: " << counts.replaced
-              << '\n';
-}
-
-void run(const Arguments& arguments)
-{
+        arguments.import.ratesAreUnits = arguments.ratesAre == kUnits;
     const auto existing = arguments.force ? AtomicFile::Existing::kReplace : AtomicFile::Existing::kKeep;
     AtomicFile::check(arguments.output, existing);
-    Importer importer(arguments.import, std::cerr);
+
+    Catalogue catalogue;
+    Importer importer(arguments.import, catalogue, std::cerr);
     for (const std::string& path : arguments.listings)
         importer.addListing(path);
     for (const std::string& path : arguments.rates)
         importer.addRates(path);
     for (const std::string& path : arguments.quotes)
         importer.addQuotes(path);
-
-    Catalogue catalogue;
     // The records bear a date; that of the data makes the same input give the same file on any day.
-    const Date stamp = importer.fill(&catalogue);
+    const Date stamp = importer.finish();
     AtomicFile file(arguments.output, existing);
     if (catalogue.wrt(file.stream(), stamp) != 0)
         file.fail("cannot be written");
     file.commit();
-    tellOutcome(importer.counts());
+    const ImportCounts& counts = importer.counts();
+    std::cerr << "companies: " << counts.companies << ", quotes: " << counts.quotes
+              << ", currencies: " << counts.currencies << ", rates: " << counts.rates
+              << ", skipped lines: " << counts.skipped << ", values replaced by a later line: " << counts.replaced
+              << '\n';
 }
 
 } // namespace
@@ -143,21 +107,6 @@ int main(int argc, char** argv)
 {
     Arguments arguments;
     CLI::App app(kPurpose, "pelorin-import");
-    const CLI::Option* reference = describe(app, arguments);
-    try {
-        app.parse(argc, argv);
-        if (arguments.quotes.empty() && arguments.rates.empty())
-            throw CLI::RequiredError("--quotes or --rates");
-    } catch (const CLI::ParseError& error) {
-        return app.exit(error) == 0 ? 0 : kBadArguments;
-    }
-    try {
-        arguments.referenceGiven = reference->count() > 0;
-        interpret(arguments);
-        run(arguments);
-        return 0;
-    } catch (const std::exception& error) {
-        std::cerr << "pelorin-import: " << error.what() << '\n';
-        return kFailure;
-    }
+    describe(app, arguments);
+    return runProgram(app, argc, argv, [&] { run(app, arguments); });
 }

@@ -1,21 +1,17 @@
 #include "market/Catalogue.h"
 #include "portfolio/Wallet.h"
 #include "tools/AtomicFile.h"
-#include "tools/DateArgument.h"
+#include "tools/DateText.h"
+#include "tools/Program.h"
 #include "tools/SampleMarket.h"
 #include "tools/SamplePortfolio.h"
 
-#include <CLI/CLI.hpp>
-#include <exception>
 #include <filesystem>
 #include <iostream>
 #include <stdexcept>
 #include <string>
 
 namespace {
-
-constexpr int kBadArguments = 2;
-constexpr int kFailure = 1;
 
 const char* const kPurpose = "Writes a made-up market file and portfolio into a data folder, as Companies/Sample and\n"
                              "PortoFolios/Sample. A file that is there is left as it is.\n"
@@ -30,16 +26,12 @@ struct Arguments {
     bool quiet = false;
 };
 
-std::string checkFolder(const std::string& text)
-{
-    return text.empty() ? "must not be empty" : std::string();
-}
-
 void describe(CLI::App& app, Arguments& arguments)
 {
     app.footer(kOutput);
-    app.set_version_flag("--version", PELORIN_VERSION);
-    app.add_option("FOLDER", arguments.folder, "Data folder; made when it is missing")->required()->check(checkFolder);
+    app.add_option("FOLDER", arguments.folder, "Data folder; made when it is missing")
+        ->required()
+        ->check(checkNotEmpty);
     app.add_option("--date", arguments.date, "Day up to which there are quotes and rates; without it today")
         ->type_name("DD/MM/YYYY")
         ->check(checkDateArgument);
@@ -93,16 +85,5 @@ int main(int argc, char** argv)
     Arguments arguments;
     CLI::App app(kPurpose, "pelorin-sample");
     describe(app, arguments);
-    try {
-        app.parse(argc, argv);
-    } catch (const CLI::ParseError& error) {
-        return app.exit(error) == 0 ? 0 : kBadArguments;
-    }
-    try {
-        run(arguments);
-        return 0;
-    } catch (const std::exception& error) {
-        std::cerr << "pelorin-sample: " << error.what() << '\n';
-        return kFailure;
-    }
+    return runProgram(app, argc, argv, [&] { run(arguments); });
 }

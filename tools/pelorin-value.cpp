@@ -1,23 +1,17 @@
-#include "tools/DateArgument.h"
+#include "tools/DateText.h"
 #include "tools/JsonReport.h"
+#include "tools/Program.h"
 #include "tools/TableReport.h"
 #include "tools/Valuation.h"
 
-#include <CLI/CLI.hpp>
 #include <cerrno>
-#include <clocale>
-#include <csignal>
 #include <cstdio>
 #include <cstring>
-#include <exception>
 #include <iostream>
 #include <stdexcept>
 #include <string>
 
 namespace {
-
-constexpr int kBadArguments = 2;
-constexpr int kFailure = 1;
 
 const char* const kPurpose = "Values a Pelorin portfolio on a day.\n"
                              "Example: pelorin-value Companies/Sample PortoFolios/Sample --date 31/12/2024";
@@ -48,7 +42,6 @@ struct Arguments {
 void describe(CLI::App& app, Arguments& arguments)
 {
     app.footer(kOutput);
-    app.set_version_flag("--version", PELORIN_VERSION);
     app.add_option("MARKET_FILE", arguments.market, "Currencies, markets and companies with their quotes")->required();
     app.add_option("PORTFOLIO_FILE", arguments.portfolio, "Accounts and holdings with their operations")->required();
     app.add_option("--date", arguments.date, "Day to value the portfolio on; without it today")
@@ -84,23 +77,8 @@ void run(const Arguments& arguments)
 
 int main(int argc, char** argv)
 {
-    // A reader that leaves early is to be a failed write like any other.
-    std::signal(SIGPIPE, SIG_IGN);
-    // Names are UTF-8 whatever the user's locale; without it they lose what is not ASCII in the tables.
-    std::setlocale(LC_CTYPE, "C.UTF-8");
     Arguments arguments;
     CLI::App app(kPurpose, "pelorin-value");
     describe(app, arguments);
-    try {
-        app.parse(argc, argv);
-    } catch (const CLI::ParseError& error) {
-        return app.exit(error) == 0 ? 0 : kBadArguments;
-    }
-    try {
-        run(arguments);
-        return 0;
-    } catch (const std::exception& error) {
-        std::cerr << "pelorin-value: " << error.what() << '\n';
-        return kFailure;
-    }
+    return runProgram(app, argc, argv, [&] { run(arguments); });
 }

@@ -2,10 +2,10 @@
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "market/Market.h"
+#include "tests/support/ToolRun.h"
 #include "tools/AtomicFile.h"
 #include "tools/CsvReader.h"
 #include "tools/DateText.h"
-#include "tools/DecimalReader.h"
 #include "tools/Importer.h"
 
 #include <cstdlib>
@@ -13,7 +13,6 @@
 #include <fstream>
 #include <gmock/gmock.h>
 #include <sstream>
-#include <sys/wait.h>
 
 using testing::ElementsAre;
 using testing::HasSubstr;
@@ -24,21 +23,13 @@ namespace fs = std::filesystem;
 
 class ImportTest : public testing::Test {
 protected:
-    ImportTest() { fs::create_directory(folder_); }
-    ~ImportTest() override { fs::remove_all(folder_); }
-
-    std::string path(const std::string& name) const { return folder_ / name; }
+    std::string path(const std::string& name) const { return folder_.path / name; }
     std::string file(const std::string& name, const std::string& content) const
     {
         std::ofstream(path(name), std::ios::binary) << content;
         return path(name);
     }
-    std::string content(const std::string& name) const
-    {
-        std::ostringstream text;
-        text << std::ifstream(path(name), std::ios::binary).rdbuf();
-        return text.str();
-    }
+    std::string content(const std::string& name) const { return contentOf(path(name)); }
     std::string zipped(const std::string& name, const std::string& content) const
     {
         gzFile out = gzopen(path(name).c_str(), "wb");
@@ -51,9 +42,9 @@ protected:
     {
         std::vector<std::string> result;
         CsvReader reader(file("t.csv", csv));
-        for (auto outcome = reader.next(); outcome != CsvReader::Outcome::kEnd; outcome = reader.next()) {
-            std::string text = outcome == CsvReader::Outcome::kMalformed ? "!|" : "";
-            for (const auto field : reader.fields())
+        while (reader.next()) {
+            std::string text = reader.fields().empty() ? "!|" : "";
+            for (const auto& field : reader.fields())
                 (text += field) += '|';
             text.pop_back();
             result.push_back(std::to_string(reader.line()) + ":" + text);
@@ -86,13 +77,9 @@ protected:
         return text.str();
     }
     std::string log() const { return log_.str(); }
-    int run(const std::string& arguments) const
-    {
-        const std::string command = "cd '" + folder_.string() + "' && '" PELORIN_IMPORT "' " + arguments + " 2>log";
-        return WEXITSTATUS(std::system(command.c_str()));
-    }
+    int run(const std::string& arguments) const { return ToolRun(PELORIN_IMPORT, arguments, folder_).status; }
 
-    fs::path folder_ = fs::temp_directory_path() / ("pelorin-import-test-" + std::to_string(getpid()));
+    TemporaryFolder folder_{"pelorin-import-test"};
     std::ostringstream log_;
     ImportOptions options_;
     Catalogue catalogue_;
@@ -104,25 +91,22 @@ TEST_F(ImportTest, CsvRecordsFollowRfc4180WithLineNumbers)
     EXPECT_THAT(records("\xEF\xBB\xBFx;1,5\r\nb;\"2\"\r\n"), ElementsAre("1:x|1,5", "2:b|2"));
     EXPECT_THAT(records("a\tx;y,z\n"), ElementsAre("1:a|x;y,z"));
     EXPECT_THAT(records("\"a;b\",c\n"), ElementsAre("1:a;b|c")) << "a quoted semicolon separates nothing";
-    EXPECT_THAT(records("\"a \"\"b\"\"\",\"c\nd\",\ne,f\"g\n"), ElementsAre("1:a \"b\"|c\nd|", "3:e|f\"g"));
+    EXPECT_THAT(records("\"a \"\"b\"\"\",\"\",\ne,f\"g\n"), ElementsAre("1:a \"b\"||", "2:e|f\"g"));
     EXPECT_THAT(records("\"a\"b,c\nd,e\n"), ElementsAre("1:!", "2:d|e")) << "text behind the closing quote";
-    EXPECT_THAT(records("a,\"b\nc,d\ne,f\n"), ElementsAre("1:!", "2:c|d", "3:e|f")) << "an open quote costs one line";
-    const std::string longLine(CsvReader::kLongestRecord + 1, 'x');
-    EXPECT_THAT(records("a,b\n" + longLine + "\nc,d\n"), ElementsAre("1:a|b", "2:!", "3:c|d"));
-    EXPECT_THAT(records("a,\"" + longLine + "\"\nc,d\n"), ElementsAre("1:!", "2:c|d"));
-    const std::string widest(CsvReader::kLongestRecord - 4, 'x');
-    EXPECT_THAT(records("a\n" + widest + ",\"y\nz"), ElementsAre("1:a", "2:!", "3:z"))
-        << "full in the middle of a field";
+    EXPECT_THAT(records("a,\"b\n\"\nc,d"), ElementsAre("1:!", "2:!", "3:c|d")) << "an open quote costs one line";
+    const std::string longest(CsvReader::kLongestLine, 'x');
+    EXPECT_THAT(records("a,b\n" + longest + "x\nc,d\n"), ElementsAre("1:a|b", "2:!", "3:c|d"));
+    EXPECT_THAT(records(longest), ElementsAre("1:" + longest));
 }
 
 TEST_F(ImportTest, GzippedDataThatEndTooEarlyAreAnError)
 {
     zipped("t.gz", "2005-01-03,A,1\n2005-01-04,A,2\n");
     fs::resize_file(path("t.gz"), fs::file_size(path("t.gz")) - 9);
-    Importer importer(options_, log_);
+    Importer importer(options_, catalogue_, log_);
     EXPECT_THROW(importer.addQuotes(path("t.gz")), std::runtime_error);
     EXPECT_THROW(importer.addQuotes(path("none")), std::runtime_error);
-    EXPECT_THROW(importer.addQuotes(folder_), std::runtime_error);
+    EXPECT_THROW(importer.addQuotes(folder_.path), std::runtime_error);
 }
 
 TEST_F(ImportTest, DatesAreIsoOrDayMonthYear)
@@ -137,24 +121,21 @@ TEST_F(ImportTest, DatesAreIsoOrDayMonthYear)
 
 TEST_F(ImportTest, TheFirstDecimalMarkOfAFileHoldsForAll)
 {
-    DecimalReader numbers(true);
-    EXPECT_EQ(numbers.read("1234"), 1234);
-    EXPECT_FALSE(numbers.read("1.234,5")) << "a number with both settles nothing";
-    EXPECT_EQ(numbers.read("12,5"), 12.5);
-    EXPECT_FALSE(numbers.read("1.234")) << "could be thousands";
-    EXPECT_EQ(numbers.read("1e-3"), 0.001);
-    DecimalReader pointOnly(false);
-    EXPECT_FALSE(pointOnly.read("12,5"));
-    for (const char* bad : {"", "-", "1x", "0x10", "1 000", "1e999"})
-        EXPECT_FALSE(pointOnly.read(bad)) << bad;
+    Importer importer(options_, catalogue_, log_);
+    importer.addQuotes(file("a.csv", "2005-01-03;A;1234\n2005-01-04;A;1.234,5\n2005-01-05;A;12,5\n"
+                                     "2005-01-06;A;1.234\n2005-01-07;A;1e-3\n"));
+    importer.finish();
+    EXPECT_THAT(companies(), ElementsAre("NYSE/A/A/USD 03/01/2005=1234 05/01/2005=12.5 07/01/2005=0.001"));
+    EXPECT_THAT(log(), HasSubstr("line 2: \"1.234,5\" is no positive number with decimal '.'\n"));
+    EXPECT_THAT(log(), HasSubstr("line 4: \"1.234\" is no positive number with decimal ','\n")) << "could be thousands";
 }
 
 TEST_F(ImportTest, QuotesAreOrderedAndTheLaterLineOfADayCounts)
 {
-    Importer importer(options_, log_);
+    Importer importer(options_, catalogue_, log_);
     importer.addQuotes(file("a.csv", "2005-01-04,A,2\n2005-01-03,A,1\n04/01/2005,A,3\n2005-01-03,B,.5\n"));
     importer.addQuotes(zipped("b.csv.gz", "Adj. Close;CLOSE;Symbol;date\n9;1,5;A;2005-01-03\n;8,25;A;05/01/2005\n"));
-    EXPECT_EQ(importer.fill(&catalogue_), Date(5, 1, 2005));
+    EXPECT_EQ(importer.finish(), Date(5, 1, 2005));
     EXPECT_THAT(companies(),
                 ElementsAre("NYSE/A/A/USD 03/01/2005=1.5 04/01/2005=3 05/01/2005=8.25", "NYSE/B/B/USD 03/01/2005=0.5"));
     EXPECT_EQ(importer.counts().replaced, 2U);
@@ -167,18 +148,19 @@ TEST_F(ImportTest, LinesThatCannotBeUsedAreCountedWithTheirNumbers)
 {
     const char* bad[] = {"2005-13-03,A,1",    "2005-01-03,,1",      "2005-01-03,A",     "2005-01-03,A,0",
                          "2005-01-03,A,-1",   "2005-01-03,A,x",     "2005-01-03,A,nan", "2005-01-03,A,inf",
-                         "2005-01-03,A,1e39", "2005-01-03,A,1e-60", "2005-01-03,A,1,5", "2005-01-03,\"A,1"};
+                         "2005-01-03,A,1e39", "2005-01-03,A,1e-60", "2005-01-03,A,1,5", "2005-01-03,\"A,1",
+                         "2005-01-03,A,1x",   "2005-01-03,A,0x10",  "2005-01-03,A,1 0", "2005-01-03,A,\"1,5\""};
     std::string csv;
     for (const char* line : bad)
         (csv += line) += '\n';
-    Importer importer(options_, log_);
+    Importer importer(options_, catalogue_, log_);
     importer.addQuotes(file("a.csv", csv));
     for (std::size_t i = 1; i <= std::size(bad); ++i)
         EXPECT_THAT(log(), HasSubstr("a.csv, line " + std::to_string(i) + ": ")) << bad[i - 1];
     EXPECT_EQ(importer.counts().skipped, std::size(bad));
-    EXPECT_THROW(importer.fill(&catalogue_), std::runtime_error) << "nothing usable";
+    EXPECT_THROW(importer.finish(), std::runtime_error) << "nothing usable";
 
-    for (std::size_t i = std::size(bad); i < 23; ++i)
+    for (std::size_t i = std::size(bad); i < Table::kLinesTold + 3; ++i)
         csv += "2005-01-03,A,x\n";
     importer.addQuotes(file("b.csv", csv));
     EXPECT_THAT(log(), HasSubstr("b.csv, line 20: "));
@@ -191,30 +173,30 @@ TEST_F(ImportTest, RatesBecomePricesInTheReference)
     const char* rows = "2005-01-03,USD,1.25\n2005-01-04,CHF,0.5\n2005-01-05,EUR,1\n2005-01-05,EUR,2\n";
     const struct {
         const char* heading;
-        std::optional<RateMeaning> option;
+        std::optional<bool> option;
         const char* usd;
         const char* why;
     } cases[] = {
         {"", {}, " 03/01/2005=0.8", "units unless said otherwise"},
-        {"date,currency,rate\n", RateMeaning::kValueInReference, " 03/01/2005=1.25", "the option"},
+        {"date,currency,rate\n", false, " 03/01/2005=1.25", "the option"},
         {"Date,Symbol,Value in EUR\n", {}, " 03/01/2005=1.25", "the heading"},
-        {"date,currency,units_per_eur\n", RateMeaning::kUnitsPerReference, " 03/01/2005=0.8", "both, in agreement"},
-        {"date,currency,units_per_eur\n", RateMeaning::kValueInReference, nullptr, "both, in contradiction"},
+        {"date,currency,units_per_eur\n", true, " 03/01/2005=0.8", "both, in agreement"},
+        {"date,currency,units_per_eur\n", false, nullptr, "both, in contradiction"},
         {"date,currency,units_per_gbp\n", {}, nullptr, "of another reference"},
         {"date,currency\n", {}, nullptr, "no column for the rate"},
         {"date,ticker,close\n", {}, nullptr, "a table of quotes"},
     };
     for (const auto& c : cases) {
-        options_.ratesAre = c.option;
-        Importer importer(options_, log_);
+        options_.ratesAreUnits = c.option;
+        Catalogue made;
+        Importer importer(options_, made, log_);
         const std::string table = file("r.csv", std::string(c.heading) + rows);
         if (c.usd == nullptr) {
             EXPECT_THROW(importer.addRates(table), std::runtime_error) << c.why;
             continue;
         }
         importer.addRates(table);
-        Catalogue made;
-        importer.fill(&made);
+        importer.finish();
         EXPECT_EQ(quotes(*made.getCurrencyByRepresentation("USD")), c.usd) << c.why;
         EXPECT_EQ(quotes(*made.getReferenceCurrency()), " 03/01/2005=1 04/01/2005=1 05/01/2005=1") << c.why;
         EXPECT_EQ(importer.counts().skipped, 1U) << "a reference is not worth 2";
@@ -223,19 +205,17 @@ TEST_F(ImportTest, RatesBecomePricesInTheReference)
 
 TEST_F(ImportTest, TheRowComesBeforeTheListingAndThatBeforeTheOptions)
 {
-    options_.currencyNames["EUR"] = "Euro";
-    Importer importer(options_, log_);
+    Importer importer(options_, catalogue_, log_);
     importer.addListing(
         file("l.csv", "SAP,XETRA,,SAP SE\nBMW,XETRA,EUR,BMW AG\nVOW,XETRA,USD,VW\nABB,,CHF,ABB\n,X,,\nIBM\n"));
     importer.addQuotes(file("q.csv", "date,ticker,close,market,currency,name\n3/1/2005,SAP,1,,,\n3/1/2005,BMW,2,,,BMW\n"
                                      "3/1/2005,IBM,3,,,\n3/1/2005,BMW,4,Wien,,\n3/1/2005,ABB,5,SIX,CHF,\n"
                                      "3/1/2005,ABB,6,SIX,EUR,\n3/1/2005,VOW,7,XETRA,EUR,\n"));
-    importer.fill(&catalogue_);
+    importer.finish();
     EXPECT_THAT(companies(), ElementsAre("XETRA/SAP/SAP SE/EUR 03/01/2005=1", "XETRA/BMW/BMW/EUR 03/01/2005=2",
                                          "XETRA/VOW/VOW/EUR 03/01/2005=7", "NYSE/IBM/IBM/USD 03/01/2005=3",
                                          "Wien/BMW/BMW AG/USD 03/01/2005=4", "SIX/ABB/ABB/CHF 03/01/2005=5"));
     EXPECT_EQ(importer.counts().skipped, 4U) << "XETRA in USD, CHF without a market, no ticker, SIX in EUR";
-    EXPECT_EQ(catalogue_.getReferenceCurrency()->getName(), "Euro");
 }
 
 TEST_F(ImportTest, AnAtomicFileIsWholeOrNotThere)
@@ -243,7 +223,7 @@ TEST_F(ImportTest, AnAtomicFileIsWholeOrNotThere)
     {
         AtomicFile abandoned(path("new"), AtomicFile::Existing::kKeep);
     }
-    EXPECT_TRUE(fs::is_empty(folder_));
+    EXPECT_TRUE(fs::is_empty(folder_.path));
 
     file("old", "old");
     fs::permissions(path("old"), fs::perms::owner_read | fs::perms::owner_write);
@@ -268,21 +248,21 @@ TEST_F(ImportTest, TheProgramWritesAFileThatTheCatalogueReads)
 {
     file("IBM.csv", "Date,Close\n2005-01-03,97.75\n");
     file("r.csv", "2005-01-03,USD,1.25\n");
-    EXPECT_EQ(run("out --quotes IBM.csv --ticker-from-name --rates r.csv --market AMEX"), 0) << content("log");
-    const std::string once = content("out");
-    FILE* written = std::fopen(path("out").c_str(), "rb");
+    EXPECT_EQ(run("made --quotes IBM.csv --ticker-from-name --rates r.csv --market AMEX"), 0);
+    const std::string once = content("made");
+    FILE* written = std::fopen(path("made").c_str(), "rb");
     EXPECT_EQ(catalogue_.rd(written), 0);
     std::fclose(written);
     EXPECT_THAT(companies(), ElementsAre("AMEX/IBM/IBM/USD 03/01/2005=97.75"));
     EXPECT_EQ(catalogue_.getReferenceCurrency()->getRepresentation(), "EUR");
     EXPECT_EQ(rates("USD"), " 03/01/2005=0.8");
 
-    EXPECT_EQ(run("out --rates r.csv"), 1);
-    EXPECT_EQ(content("out"), once) << "nothing is overwritten unasked";
-    EXPECT_EQ(run("out --rates r.csv --force"), 0);
-    EXPECT_NE(content("out"), once);
-    for (const char* bad : {"", "new", "new --rates r.csv --rates-are odd", "new --rates r.csv --currency-name USD",
-                            "new --rates r.csv --reference ''", "new --rates r.csv --what"})
+    EXPECT_EQ(run("made --rates r.csv"), 1);
+    EXPECT_EQ(content("made"), once) << "nothing is overwritten unasked";
+    EXPECT_EQ(run("made --rates r.csv --force"), 0);
+    EXPECT_NE(content("made"), once);
+    for (const char* bad : {"", "new", "new --rates r.csv --rates-are odd", "new --rates r.csv --reference ''",
+                            "new --rates r.csv --what"})
         EXPECT_EQ(run(bad), 2) << bad;
     for (const char* failing : {"new --rates none.csv", "none/new --rates r.csv", "new --quotes IBM.csv"})
         EXPECT_EQ(run(failing), 1) << failing;

@@ -1,0 +1,152 @@
+#include "tools/Table.h"
+
+#include "tools/DateText.h"
+#include "tools/TextTable.h"
+
+#include <algorithm>
+#include <charconv>
+#include <limits>
+#include <ostream>
+
+namespace {
+
+std::string_view trimmed(std::string_view text)
+{
+    constexpr std::string_view kBlanks = " \t";
+    const std::size_t first = text.find_first_not_of(kBlanks);
+    return first == text.npos ? std::string_view() : text.substr(first, text.find_last_not_of(kBlanks) - first + 1);
+}
+
+bool isCalled(std::string_view heading, std::string_view name)
+{
+    return name.ends_with('*') ? heading.starts_with(name.substr(0, name.size() - 1)) : heading == name;
+}
+
+/// 0 when `text` is no decimal number, with a point, or beyond the range of double.
+double numberOf(std::string_view text)
+{
+    double number;
+    const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), number);
+    return error == std::errc() && end == text.data() + text.size() ? number : 0;
+}
+
+const char* describe(Column column)
+{
+    constexpr const char* kDescriptions[] = {"date", "ticker", "price or rate", "market", "currency", "name"};
+    return kDescriptions[static_cast<std::size_t>(column)];
+}
+
+} // namespace
+
+std::string shown(std::string_view text)
+{
+    return '"' + printable(text) + '"';
+}
+
+Table::Table(const std::string& path, const TableForm& form) : path_(path), reader_(path), more_(reader_.next())
+{
+    const bool header = takeHeader(form);
+    if (!header) {
+        places_.fill(kNowhere);
+        valueHeading_.clear();
+        mostFields_ = form.plain.size();
+        for (std::size_t i = 0; i < mostFields_; ++i)
+            place(form.plain[i]) = i;
+    }
+    for (std::size_t i = 0; i < form.required; ++i)
+        if (!has(form.plain[i]))
+            throw std::runtime_error(path + ": the header line names no column for the " + describe(form.plain[i]));
+    if (header)
+        more_ = reader_.next();
+}
+
+/// Finds the columns by the headings in the first record. @return whether it is a header line: it names a column of
+/// dates, or any two, since a ticker may look like a heading.
+bool Table::takeHeader(const TableForm& form)
+{
+    places_.fill(kNowhere);
+    std::vector<std::string> present;
+    for (const std::string& field : reader_.fields())
+        present.push_back(headingOf(field));
+    std::size_t found = 0;
+    for (const auto& [column, names] : form.headings)
+        for (const std::string_view name : names) {
+            const auto isOfName = [name](const std::string& heading) { return isCalled(heading, name); };
+            const auto at = std::find_if(present.begin(), present.end(), isOfName);
+            if (at == present.end())
+                continue;
+            place(column) = static_cast<std::size_t>(at - present.begin());
+            if (column == Column::kValue)
+                valueHeading_ = *at;
+            ++found;
+            break;
+        }
+    return found > 1 || has(Column::kDate);
+}
+
+std::string Table::headingOf(std::string_view text)
+{
+    std::string heading;
+    for (const char c : text)
+        if (std::string_view(" \t_-.").find(c) == std::string_view::npos)
+            heading += c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+    return heading;
+}
+
+std::size_t Table::forEach(const std::function<void()>& take, std::ostream& log)
+{
+    std::size_t rejected = 0;
+    for (; more_; more_ = reader_.next())
+        try {
+            checkFit();
+            take();
+        } catch (const UnusableRow& reason) {
+            if (++rejected <= kLinesTold)
+                log << path_ << ", line " << reader_.line() << ": " << reason.what() << '\n';
+        }
+    if (rejected > kLinesTold)
+        log << path_ << ": ... and " << rejected - kLinesTold << " more\n";
+    return rejected;
+}
+
+void Table::checkFit() const
+{
+    if (reader_.fields().empty())
+        throw UnusableRow("has a quote that is not closed, or is too long");
+    for (std::size_t i = mostFields_; i < reader_.fields().size(); ++i)
+        if (!reader_.fields()[i].empty())
+            throw UnusableRow("has too many fields for a table without a header line");
+}
+
+std::string_view Table::cell(Column column) const
+{
+    const std::size_t i = place(column);
+    return i < reader_.fields().size() ? trimmed(reader_.fields()[i]) : std::string_view();
+}
+
+Date Table::date() const
+{
+    const std::string_view text = cell(Column::kDate);
+    const std::optional<Date> date = parseDate(text);
+    if (!date)
+        throw UnusableRow(shown(text) + " is no date as YYYY-MM-DD or DD/MM/YYYY");
+    return *date;
+}
+
+float Table::value(bool inverted)
+{
+    std::string text(cell(Column::kValue));
+    const std::size_t place = text.find_first_of(".,");
+    const char mark = place != text.npos ? text[place] : decimalMark_;
+    const bool isAllowed =
+        mark == decimalMark_ || (decimalMark_ == '\0' && (mark == '.' || reader_.separator() != ','));
+    std::replace(text.begin(), text.end(), ',', '.');
+    const double number = isAllowed ? numberOf(text) : 0;
+    const double value = inverted && number != 0 ? 1 / number : number;
+    if (value > 0 && value <= static_cast<double>(std::numeric_limits<float>::max()) && static_cast<float>(value) > 0) {
+        decimalMark_ = mark;
+        return static_cast<float>(value);
+    }
+    const char expected = decimalMark_ == '\0' ? '.' : decimalMark_;
+    throw UnusableRow(shown(cell(Column::kValue)) + " is no positive number with decimal '" + expected + "'");
+}
