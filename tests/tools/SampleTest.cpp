@@ -1,0 +1,115 @@
+#include "tests/support/SmallPortfolio.h"
+#include "tests/support/ToolRun.h"
+#include "tools/SampleMarket.h"
+#include "tools/SamplePortfolio.h"
+#include "tools/Valuation.h"
+#include "valuation/AccountState.h"
+#include "valuation/ShareState.h"
+#include "valuation/State.h"
+
+#include <gmock/gmock.h>
+
+using testing::HasSubstr;
+
+namespace {
+
+namespace fs = std::filesystem;
+
+const Date kLast(20, 7, 2025); // a Sunday
+const Date kFriday(18, 7, 2025);
+
+class SampleTest : public testing::Test {
+protected:
+    ToolRun make(const std::string& arguments) const { return ToolRun(PELORIN_SAMPLE, arguments, folder_); }
+    std::string file(const std::string& name) const { return folder_.path / name; }
+
+    TemporaryFolder folder_{"pelorin-sample-test"};
+};
+
+struct Sample {
+    Sample()
+    {
+        fillSampleMarket(catalogue, days);
+        fillSamplePortfolio(wallet, catalogue, days);
+    }
+
+    const std::vector<Date> days = sampleDays(kLast);
+    Catalogue catalogue;
+    Wallet wallet;
+};
+
+} // namespace
+
+TEST_F(SampleTest, SameDateGivesTheSameFilesOnEveryRun)
+{
+    EXPECT_EQ(make("a/b --date 20/07/2025").out, "a/b/Companies/Sample: written\na/b/PortoFolios/Sample: written\n");
+    EXPECT_EQ(make("c --date 20/07/2025 --quiet").out, "");
+    make("d --date 21/07/2025");
+    for (const char* name : {"Companies/Sample", "PortoFolios/Sample"}) {
+        EXPECT_EQ(contentOf(file("a/b/") + name), contentOf(file("c/") + name)) << name;
+        EXPECT_NE(contentOf(file("a/b/") + name), contentOf(file("d/") + name)) << name;
+    }
+    Valuation valuation(file("c/Companies/Sample"), file("c/PortoFolios/Sample"));
+    valuation.compute(kLast, false, false);
+    // A machine that rounds otherwise would show in the end of a walk.
+    EXPECT_EQ(valuation.catalogue().getCurrencyByRepresentation("GBP")->getRealQuote(kFriday), 1.1691F);
+    EXPECT_EQ(valuation.totals().totalDeposit, 93000);
+}
+
+TEST_F(SampleTest, FilesThatAreThereAreLeftAlone)
+{
+    fs::create_directories(file("a/Companies"));
+    std::ofstream(file("a/Companies/Sample")) << "mine";
+    EXPECT_THAT(make("a").out, HasSubstr("a/Companies/Sample: is there and left as it is\n"));
+    EXPECT_EQ(contentOf(file("a/Companies/Sample")), "mine");
+    EXPECT_GT(fs::file_size(file("a/PortoFolios/Sample")), 1000U);
+
+    fs::remove(file("a/Companies/Sample"));
+    fs::create_symlink("nowhere", file("a/Companies/Sample"));
+    EXPECT_EQ(make("a").status, 0);
+    EXPECT_TRUE(fs::is_symlink(file("a/Companies/Sample")));
+    EXPECT_FALSE(fs::exists(file("a/Companies/nowhere")));
+}
+
+TEST_F(SampleTest, FailureIsOneLine)
+{
+    std::ofstream(file("file")) << "x";
+    EXPECT_EQ(make("file").err, "pelorin-sample: file/Companies: cannot be made: Not a directory\n");
+    EXPECT_EQ(make("file").status, 1);
+    for (const char* bad : {"", "''", "a --date 29/02/2025", "a --date 2025-07-20", "a b"})
+        EXPECT_EQ(make(bad).status, 2) << bad;
+    EXPECT_FALSE(fs::exists(file("a")));
+}
+
+TEST(SampleDataTest, EveryWeekdayOfFiveYearsHasAQuote)
+{
+    const Sample sample;
+    const Date someMonday(7, 7, 2025);
+    for (const Date& day : sample.days)
+        EXPECT_LT(((day - someMonday) % 7 + 7) % 7, 5) << testing::PrintToString(day);
+    for (const Market* market : sample.catalogue.getMarkets())
+        for (const Company* company : all(*market, &Market::getAllCompanies)) {
+            EXPECT_EQ(company->getNbrQuotes(), 1305U) << company->getName().bytes();
+            EXPECT_EQ(company->getLastQuote(), kFriday) << company->getName().bytes();
+        }
+}
+
+TEST(SampleDataTest, NothingIsEverOverdrawnOrSoldShort)
+{
+    Sample sample;
+    EvolutionOutcome outcome;
+    const State* last = refreshStates(sample.wallet, kLast, false, &outcome);
+    EXPECT_EQ(sample.wallet.getNbrStates(), 1827U);
+    int losers = 0;
+    for (const State* state : all(sample.wallet, &Wallet::getAllStates)) {
+        const std::string day = testing::PrintToString(state->getDate());
+        for (const AccountState* account : all(*state, &State::getAllAccountStates))
+            EXPECT_GE(account->getCash(), 0) << account->getAccountName().bytes() << ' ' << day;
+        for (const ShareState* share : all(*state, &State::getAllShareStates)) {
+            EXPECT_GE(share->getQuantity(), 0) << share->getCompanyName().bytes() << ' ' << day;
+            losers += state == last && share->getQuantity() > 0 && share->getQuote() < share->getBuyQuote();
+        }
+    }
+    EXPECT_GE(losers, 2);
+    EXPECT_GT(Totals(*last, sample.catalogue).profit, 10000);
+}

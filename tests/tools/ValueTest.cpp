@@ -1,0 +1,277 @@
+#include "tests/support/SmallPortfolio.h"
+#include "tests/support/ToolRun.h"
+
+#include <bit>
+#include <cmath>
+#include <gmock/gmock.h>
+#include <limits>
+#include <nlohmann/json.hpp>
+#include <random>
+#include <regex>
+
+using testing::HasSubstr;
+using testing::StartsWith;
+
+namespace {
+
+/// Compares floats as floats, and the order of the keys.
+using Json =
+    nlohmann::basic_json<nlohmann::ordered_map, std::vector, std::string, bool, std::int64_t, std::uint64_t, float>;
+
+class ValueTest : public testing::Test, protected SmallPortfolio {
+protected:
+    /// Writes both files and values them.
+    ToolRun value(const std::string& options)
+    {
+        save();
+        return ToolRun(PELORIN_VALUE, "market wallet " + options, folder_);
+    }
+    Json json(const std::string& options)
+    {
+        const ToolRun run = value("--json " + options);
+        EXPECT_EQ(run.status, 0) << run.err;
+        return Json::parse(run.out);
+    }
+    void save() const
+    {
+        for (const char* name : {"market", "wallet"}) {
+            FILE* file = std::fopen((folder_.path / name).c_str(), "wb");
+            *name == 'm' ? catalogue.wrt(file, kStart) : wallet.wrt(file, kStart);
+            std::fclose(file);
+        }
+    }
+    /// Replaces the occurrence of `text` with that number, counted from 0, in the saved portfolio; the length stays.
+    void patch(const std::string& text, int number, const std::string& other) const
+    {
+        std::string bytes = contentOf(folder_.path / "wallet");
+        std::size_t place = bytes.find(text);
+        for (; number > 0; --number)
+            place = bytes.find(text, place + 1);
+        std::ofstream(folder_.path / "wallet", std::ios::binary) << bytes.replace(place, text.size(), other);
+    }
+    /// Two accounts, a transfer between them, a purchase and a sale; to be valued on 11/01/1999.
+    void fill()
+    {
+        new CompanyQuote(alpha, kStart, 10);
+        new CompanyQuote(alpha, daysAfterStart(10), 12);
+        Account* savings = addAccount(wallet, "Caf\xC3\xA9 \"\x80", dollar);
+        savings->setDefaultTransferAccount(true);
+        deposit(cash_, 0, 5000);
+        deposit(savings, 1, 1000);
+        TransferAccountOperation* sent = transfer(cash_, savings, 2, 200);
+        sent->setRateCost(0.01F);
+        sent->setCost(5);
+        sent->setToCurrencyQuote(2);
+        trade(share_, cash_, 3, 100, 10, 29.95F);
+        trade(share_, cash_, 10, -40, 12, 29.95F);
+    }
+
+    TemporaryFolder folder_{"pelorin-value-test"};
+    Account* cash_ = addAccount(wallet, "Cash", euro);
+    Share* share_ = new Share(&wallet, alpha);
+};
+
+} // namespace
+
+// 100 shares at 10 take 1000 + 1.70 + 29.95 = 1031.65, 40 at 12 give 480 - 0.816 - 29.95 = 449.234; the transfer takes
+// 200 and gives (200 * 0.99 - 5) / 2 = 96.5. Cash: 5000 - 200 - 1031.65 + 449.234 = 4217.584 and 1096.5, which is worth
+// 2193; shares: 60 * 12 = 720. So the value is 7130.584 of 7000 paid in, 130.584 more within 10 days: 36.525 * 130.584
+// / 7000 = 0.68137 a year. The last digits are those of the nearest floats.
+TEST_F(ValueTest, JsonIsWhatTheSumsByHandGive)
+{
+    fill();
+    new Share(&wallet, beta);
+    EXPECT_EQ(json("--date 11/01/1999"), Json::parse(R"({
+  "date": "11/01/1999",
+  "reference": "EUR",
+  "totalDeposit": 7000.0,
+  "totalValue": 7130.58398,
+  "profit": 130.583984,
+  "annualRevenue": 0.681368589,
+  "firstOperationDate": "01/01/1999",
+  "accounts": [
+    {"name": "Cash", "currency": "EUR", "cash": 4217.58398, "defaultTransfer": false},
+    {"name": "Café \"�", "currency": "USD", "cash": 1096.5, "defaultTransfer": true}
+  ],
+  "shares": [
+    {"market": "Paris", "ticker": "AC", "name": "Alpha", "quantity": 60, "buyQuote": 10.0, "quote": 12.0, "endDate": "04/04/1999", "currency": "EUR"},
+    {"market": "York", "ticker": "AC", "name": "Beta", "quantity": 0, "buyQuote": 0.0, "quote": 0.0, "endDate": null, "currency": "USD"}
+  ],
+  "operations": [
+    {"account": "Cash", "type": "deposit", "date": "01/01/1999", "automatic": false, "amount": 5000.0},
+    {"account": "Cash", "type": "transfer", "date": "03/01/1999", "automatic": false, "recipient": "Café \"�", "amount": 200.0, "rateCost": 0.00999999978, "cost": 5.0, "fromCurrencyQuote": 1.0, "toCurrencyQuote": 2.0},
+    {"account": "Cash", "type": "buy", "date": "04/01/1999", "automatic": false, "market": "Paris", "ticker": "AC", "quantity": 100, "quote": 10.0, "operationCost": 29.9500008},
+    {"account": "Cash", "type": "sell", "date": "11/01/1999", "automatic": false, "market": "Paris", "ticker": "AC", "quantity": 40, "quote": 12.0, "operationCost": 29.9500008},
+    {"account": "Café \"�", "type": "deposit", "date": "02/01/1999", "automatic": false, "amount": 1000.0}
+  ]
+})"));
+}
+
+TEST_F(ValueTest, TableColumnsAreAsWideOnTheTerminalAsTheirTexts)
+{
+    fill();
+    beta->setName("Beta\n\x1B");
+    new Share(&wallet, beta);
+    EXPECT_EQ(value("--date 11/01/1999").out, R"(Portfolio on 11/01/1999, in Euro (EUR)
+
+Total Deposit      7,000.00  EUR
+Total Value        7,130.58  EUR
+Profit               130.58  EUR
+Annual Revenu         68.14  %
+First operation  01/01/1999
+
+Account      Cash       Value in EUR
+Cash     4,217.58  EUR      4,217.58
+Café "?  1,096.50  USD      2,193.00  default transfer account
+
+Holding  Ticker  Market  Quantity  Bought at  Quote         Gain  Value in EUR  End date
+Alpha    AC      Paris         60      10.00  12.00  EUR  +20.0%        720.00  04/04/1999
+Beta??   AC      York           0              0.00  USD
+)");
+}
+
+TEST_F(ValueTest, EvolutionRunsFromTheFirstOperationToTheDay)
+{
+    fill();
+    const double values[] = {5000, 7000, 6993, 6961.35, 6961.35, 6961.35, 6961.35, 6961.35, 6961.35, 6961.35, 7130.584};
+    const auto evolution = json("--evolution --date 11/01/1999")["evolution"];
+    ASSERT_EQ(evolution.size(), std::size(values));
+    for (int day = 0; day < 11; ++day) {
+        EXPECT_EQ(evolution[day]["date"], daysAfterStart(day).toString().getCharacterArray());
+        EXPECT_NEAR(evolution[day]["totalValue"], values[day], 0.001) << "day " << day;
+    }
+}
+
+TEST_F(ValueTest, WhatHasNoValueIsNull)
+{
+    auto report = json("--date 11/01/1999");
+    EXPECT_EQ(report["firstOperationDate"], "31/12/32767");
+    EXPECT_EQ(report["annualRevenue"], 0);
+    EXPECT_FALSE(report.contains("evolution"));
+
+    new CompanyQuote(alpha, kStart, std::numeric_limits<float>::infinity());
+    trade(share_, cash_, 0, 1, 10);
+    report = json("--date 01/01/1999");
+    EXPECT_EQ(report["shares"][0]["quote"], nullptr);
+    EXPECT_EQ(report["totalValue"], nullptr);
+
+    catalogue.setReferenceCurrency(nullptr);
+    report = json("--date 11/01/1999 --evolution");
+    for (const char* key : {"reference", "totalDeposit", "totalValue", "profit", "annualRevenue"})
+        EXPECT_EQ(report.at(key), nullptr) << key;
+    EXPECT_EQ(report["evolution"], Json::array());
+    EXPECT_THAT(value("").out, HasSubstr("without totals: the market file has no reference currency\n\nFirst op"));
+}
+
+// The trend stands at 30, far above the purchase at 10, so the search sells at once. The gain of 3000 * 0.9983 - 29.95
+// less 1000 * 1.0017 + 29.95 is 1933.30, a tenth of which goes to the default transfer account.
+TEST_F(ValueTest, EvolutionTakesTheSuggestedTransfersAwayAgain)
+{
+    setTrend(alpha, 30);
+    addAccount(wallet, "Profits", euro)->setDefaultTransferAccount(true);
+    deposit(cash_, 0, 2000);
+    trade(share_, cash_, 0, 100, 10, 29.95F);
+
+    EXPECT_EQ(json("--date 02/01/1999")["operations"].size(), 2U);
+    const auto found = json("--date 02/01/1999 --previsions");
+    ASSERT_EQ(found["operations"].size(), 3U);
+    EXPECT_EQ(found["operations"][2]["type"], "transfer");
+    EXPECT_EQ(found["operations"][2]["automatic"], true);
+    EXPECT_NEAR(found["operations"][2]["amount"], 193.33, 0.001);
+    EXPECT_NEAR(found["accounts"][1]["cash"], 193.33, 0.001);
+    const auto gone = json("--date 02/01/1999 --previsions --evolution");
+    EXPECT_EQ(gone["operations"].size(), 2U);
+    EXPECT_EQ(gone["accounts"], found["accounts"]);
+    EXPECT_THAT(value("--date 02/01/1999 --previsions").out, HasSubstr(R"(
+Automatic
+02/01/1999  sell         100  AC at 30.00 EUR
+02/01/1999  transfer  193.33  EUR from Cash to Profits
+)"));
+}
+
+TEST_F(ValueTest, FailureIsOneLineThatNamesTheFileAndTheReason)
+{
+    fill();
+    save();
+    std::ofstream(folder_.path / "short") << contentOf(folder_.path / "wallet").substr(0, 200);
+    using Case = std::tuple<const char*, int, const char*>;
+    for (const auto& [arguments, status, message] : std::initializer_list<Case>{
+             {"market wallet --date 31/02/1999", 2, "--date: is not a date DD/MM/YYYY: 31/02/1999"},
+             {"market wallet --date 1999-01-11", 2, "--date: is not a date"},
+             {"market", 2, "PORTFOLIO_FILE is required"},
+             {"market wallet wallet", 2, "The following argument was not expected: wallet"},
+             {"market none --json", 1, "pelorin-value: none: cannot be opened: No such file or directory\n"},
+             {"market . --json", 1, "pelorin-value: .: is a folder\n"},
+             {"wallet wallet --json", 1,
+              "pelorin-value: wallet: ends too early; it is cut short or not a market file\n"},
+             {"market short --json", 1,
+              "pelorin-value: short: ends too early; it is cut short or not a portfolio file\n"},
+             {"market wallet >/dev/full", 1, "pelorin-value: standard output: No space left on device\n"},
+             {"--help", 0, ""},
+             {"--version", 0, ""}}) {
+        const ToolRun run(PELORIN_VALUE, arguments, folder_);
+        EXPECT_EQ(run.status, status) << arguments;
+        EXPECT_THAT(run.err, StartsWith(message)) << arguments;
+        EXPECT_EQ(run.out.empty(), status != 0) << arguments;
+        EXPECT_TRUE(status != 1 || std::count(run.err.begin(), run.err.end(), '\n') == 1) << run.err;
+    }
+}
+
+TEST_F(ValueTest, UnknownNamesAreTold)
+{
+    fill();
+    transfer(wallet.getAccount(1), cash_, 20, 10);
+    const std::string unknown = ", which is no company or currency of the market file, or none of its own holdings";
+    const std::string nowhere = " goes to an account that the file does not have; what follows it is read out of place";
+    using Case = std::tuple<const char*, int, const char*, int, std::string>;
+    for (const auto& [text, number, other, status, message] :
+         std::initializer_list<Case>{{"AC", 0, "AX", 1, R"(names "AX")" + unknown},
+                                     {"Euro", 0, "\nuro", 1, R"(names "?uro")" + unknown},
+                                     {"AC", 1, "AY", 1, R"(names "AY")" + unknown},
+                                     {"Caf", 1, "Cof", 1, R"(a transfer from "Cash")" + nowhere},
+                                     {"Cash", 1, "Cosh", 0, R"(a transfer from "Café "?")" + nowhere}}) {
+        save();
+        patch(text, number, other);
+        const ToolRun run(PELORIN_VALUE, "market wallet --json", folder_);
+        EXPECT_EQ(run.status, status) << message;
+        EXPECT_THAT(run.err, StartsWith("pelorin-value: wallet: " + message + '\n'));
+        EXPECT_EQ(status == 0, run.out.find("\"recipient\": null") != run.out.npos) << "what could be read is shown";
+    }
+}
+
+TEST_F(ValueTest, EvolutionThatCannotBeSaysWhichDateItIs)
+{
+    deposit(cash_, 0, 1000);
+    for (const auto& [date, reason] :
+         {std::pair(Date(1, 1, 99), "01/01/99: too many days (693960) for"),
+          std::pair(Date(45, 13, 1998), "45/13/1998, which is no day of the calendar\n")}) {
+        cash_->getOperation(0)->setDate(date);
+        EXPECT_EQ(value("--date 01/01/1999").status, 0);
+        const ToolRun run = value("--date 01/01/1999 --evolution");
+        EXPECT_EQ(run.status, 1);
+        EXPECT_THAT(run.err, HasSubstr(std::string("wallet: no evolution, since its first operation is of ") + reason));
+    }
+}
+
+TEST_F(ValueTest, JsonFloatsHaveNineDigitsAndReadBackToTheSameFloat)
+{
+    constexpr int kAmounts = 5000;
+    std::mt19937 bits(1);
+    std::vector<float> amounts;
+    for (int i = 0; i < kAmounts; ++i) {
+        amounts.push_back(std::bit_cast<float>(static_cast<std::uint32_t>(bits())));
+        deposit(cash_, 0, amounts.back());
+    }
+    const ToolRun run = value("--json");
+    const Json operations = Json::parse(run.out)["operations"];
+    for (int i = 0; i < kAmounts; ++i)
+        EXPECT_EQ(operations[i]["amount"], std::isfinite(amounts[i]) ? Json(amounts[i]) : Json());
+    const std::regex amount("\"amount\": -?0*\\.?0*([0-9.]+?)0*\\.?0*[,e}\\s]");
+    int checked = 0;
+    for (std::sregex_iterator found(run.out.begin(), run.out.end(), amount), end; found != end; ++found, ++checked) {
+        std::string digits = (*found)[1];
+        std::erase(digits, '.');
+        EXPECT_LE(digits.size(), 9U) << found->str();
+    }
+    EXPECT_GT(checked, kAmounts * 9 / 10);
+}
