@@ -29,6 +29,8 @@ void Wallet::setMarkets(int count, Market** markets)
 
 int Wallet::getCurrency(const String& name, Currency** out) const
 {
+    if (names_ != nullptr)
+        return names_->getCurrency(name, out);
     for (Currency* currency : currencies_)
         if (currency->getName() == name) {
             *out = currency;

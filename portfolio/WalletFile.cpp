@@ -58,8 +58,8 @@ int Wallet::rd(FILE* file, Date* stamp)
     accounts_.deleteAll();
     removeAllStates();
 
-    // Thousands of operations name their holding: look-ups go through an index for as long as the file is read.
-    WalletNames names(markets_);
+    // Thousands of records name what they belong to: look-ups go through an index for as long as the file is read.
+    WalletNames names(markets_, currencies_);
     names_ = &names;
     const bool isRead = readShares(file) == 0 && readAccounts(file) == 0;
     unsigned n;
@@ -100,12 +100,8 @@ int Wallet::readAccounts(FILE* file)
     for (; missing > 0 && !reachedEnd(file); --missing) {
         String currencyName;
         Currency* currency;
-        if (currencyName.rd(file) != 0)
+        if (currencyName.rd(file) != 0 || getCurrency(currencyName, &currency) != 0)
             return -1;
-        if (getCurrency(currencyName, &currency) != 0) {
-            names_->setUnknown(currencyName);
-            return -1;
-        }
         auto account = std::make_unique<Account>();
         account->setWallet(this);
         account->setCurrency(currency);

@@ -1,6 +1,7 @@
 #include "portfolio/WalletNames.h"
 
 #include "market/Company.h"
+#include "market/Currency.h"
 #include "market/Market.h"
 #include "portfolio/Account.h"
 #include "portfolio/Share.h"
@@ -11,8 +12,11 @@ std::size_t WalletNames::PairHash::operator()(const Pair& pair) const
     return hash(pair.first) * 31 + hash(pair.second);
 }
 
-WalletNames::WalletNames(const std::vector<Market*>& markets)
+WalletNames::WalletNames(const std::vector<Market*>& markets, const std::vector<Currency*>& currencies)
 {
+    for (Currency* currency : currencies)
+        if (currency->getName().hasText())
+            currencies_.try_emplace(currency->getName().comparedBytes(), currency);
     for (const Market* market : markets) {
         unsigned n;
         Company** companies = market->getAllCompanies(&n);
@@ -57,8 +61,22 @@ int WalletNames::getShare(const String& market, const String& abbreviation, Shar
     return find(shares_, market, abbreviation, out);
 }
 
+template <class T>
+T* WalletNames::find(const Map<T>& map, const String& name)
+{
+    const auto found = name.hasText() ? map.find(name.comparedBytes()) : map.end();
+    return found != map.end() ? found->second : nullptr;
+}
+
+int WalletNames::getCurrency(const String& name, Currency** out)
+{
+    *out = find(currencies_, name);
+    if (*out == nullptr)
+        unknown_ = name;
+    return *out != nullptr ? 0 : -1;
+}
+
 Account* WalletNames::getAccount(const String& name) const
 {
-    const auto found = name.hasText() ? accounts_.find(name.comparedBytes()) : accounts_.end();
-    return found != accounts_.end() ? found->second : nullptr;
+    return find(accounts_, name);
 }

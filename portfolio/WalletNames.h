@@ -9,6 +9,7 @@
 
 class Account;
 class Company;
+class Currency;
 class Market;
 class Share;
 
@@ -18,13 +19,14 @@ class Share;
 /// refers to the names where they stand, so none may change during its life.
 class WalletNames {
 public:
-    /// Takes in every company of `markets`.
-    explicit WalletNames(const std::vector<Market*>& markets);
+    /// Takes in every company of `markets` and the currencies.
+    WalletNames(const std::vector<Market*>& markets, const std::vector<Currency*>& currencies);
 
     void add(Share* share);
     void add(Account* account);
 
     /// @return 0; -1 and a null `*out` when there is none.
+    int getCurrency(const String& name, Currency** out);
     int getCompany(const String& market, const String& abbreviation, Company** out);
     int getShare(const String& market, const String& abbreviation, Share** out);
     /// Null when there is none.
@@ -32,7 +34,6 @@ public:
 
     /// The ticker or currency name that a look-up did not find last; undefined when all were found.
     const String& getUnknown() const { return unknown_; }
-    void setUnknown(const String& name) { unknown_ = name; }
 
 private:
     using Pair = std::pair<std::string_view, std::string_view>;
@@ -41,12 +42,17 @@ private:
     };
     template <class T>
     using PairMap = std::unordered_map<Pair, T*, PairHash>;
+    template <class T>
+    using Map = std::unordered_map<std::string_view, T*>;
 
     template <class T>
     int find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out);
+    template <class T>
+    static T* find(const Map<T>& map, const String& name);
 
     PairMap<Company> companies_;
     PairMap<Share> shares_;
-    std::unordered_map<std::string_view, Account*> accounts_;
+    Map<Currency> currencies_;
+    Map<Account> accounts_;
     String unknown_;
 };
