@@ -41,6 +41,8 @@ public:
     unsigned getNbrAccounts() const { return accounts_.getNbr(); }
     Account** getAllAccounts(unsigned* n) const { return accounts_.getAll(n); }
     Account* getAccount(unsigned i) const { return accounts_.at(i); }
+    /// `*place` becomes the account's index in the list. @return 0; -1 when it is not in it, or null.
+    int getAccountPlace(Account* account, unsigned* place) const { return accounts_.getElement(account, place); }
 
     int addShare(Share* share) { return shares_.add(share); }
     int removeShare(Share* share) { return shares_.remove(share); }

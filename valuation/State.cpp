@@ -44,25 +44,30 @@ void State::noteOperationDate(const Date& date)
         firstOperationDate_ = date;
 }
 
-AccountState* State::findAccountState(const Account* account) const
+AccountState* State::findAccountState(Account* account) const
 {
+    // A state lists the accounts in the order of the wallet: only when that has changed since is there a search.
+    unsigned place;
+    if (wallet_.partner() != nullptr && wallet_.partner()->getAccountPlace(account, &place) == 0) {
+        AccountState* state = getAccountState(place);
+        if (state != nullptr && state->listed() == account)
+            return state;
+    }
     unsigned n;
     AccountState** states = getAllAccountStates(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        Account* candidate;
-        if (states[i]->getAccount(&candidate) == 0 && candidate == account)
+    for (unsigned i = 0; i < n; ++i)
+        if (states[i]->listed() != nullptr && states[i]->listed() == account)
             return states[i];
-    }
     return nullptr;
 }
 
-void State::BuyShares(const Account* account, float amount)
+void State::BuyShares(Account* account, float amount)
 {
     if (AccountState* state = findAccountState(account))
         state->setCash(state->getCash() - amount);
 }
 
-void State::SellShares(const Account* account, float amount)
+void State::SellShares(Account* account, float amount)
 {
     if (AccountState* state = findAccountState(account))
         state->setCash(state->getCash() + amount);

@@ -39,8 +39,8 @@ public:
     static Date afterAllOperations() { return {31, 12, 32767}; }
 
     /// Take `amount` from, or give it to, the cash of `account`; nothing happens when the state has no such account.
-    void BuyShares(const Account* account, float amount);
-    void SellShares(const Account* account, float amount);
+    void BuyShares(Account* account, float amount);
+    void SellShares(Account* account, float amount);
 
     int addAccountState(AccountState* state) { return accountStates_.add(state); }
     int removeAccountState(AccountState* state) { return accountStates_.remove(state); }
@@ -62,7 +62,7 @@ private:
     /// An empty state of the wallet, to be filled by the evolution.
     State(Wallet* wallet, const Date& date);
 
-    AccountState* findAccountState(const Account* account) const;
+    AccountState* findAccountState(Account* account) const;
 
     StatesToWallet wallet_{this};
     StateToShareStates shareStates_;
