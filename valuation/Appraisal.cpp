@@ -7,27 +7,31 @@
 #include "valuation/ShareState.h"
 #include "valuation/State.h"
 
-#include <algorithm>
-
 namespace {
 
 constexpr unsigned kUnknown = ~0U;
 
 } // namespace
 
-Appraisal::Appraisal(const Catalogue& catalogue) : catalogue_(catalogue), reference_(catalogue.getReferenceCurrency())
-{}
+Appraisal::Appraisal(const Catalogue& catalogue) : reference_(catalogue.getReferenceCurrency())
+{
+    for (const Currency* currency : catalogue.getCurrencies()) {
+        if (currency->getRepresentation().hasText())
+            bySymbol_.try_emplace(currency->getRepresentation().comparedBytes(), static_cast<unsigned>(rates_.size()));
+        rates_.push_back({currency, 0, false});
+    }
+}
 
 float Appraisal::totalValue(const State& state)
 {
     if (!hasReference())
         return 0;
-    const double referenceRate = reference_->getRealQuote(state.getDate());
+    day_ = state.getDate();
+    const double referenceRate = reference_->getRealQuote(day_);
     if (referenceRate == 0)
         return 0;
-    rates_.clear();
-    for (const Currency* currency : catalogue_.getCurrencies())
-        rates_.push_back(currency->getRealQuote(state.getDate()));
+    for (const unsigned i : used_)
+        rates_[i].value = rates_[i].currency->getRealQuote(day_);
     return sharesValue(state, referenceRate) + cashValue(state, referenceRate);
 }
 
@@ -42,7 +46,7 @@ float Appraisal::sharesValue(const State& state, double referenceRate)
         if (currency == kUnknown)
             continue;
         const double quote = states[i]->getQuote();
-        value = addRounded(value, quote * states[i]->getQuantity() * rates_[currency] / referenceRate);
+        value = addRounded(value, quote * states[i]->getQuantity() * rates_[currency].value / referenceRate);
     }
     return value;
 }
@@ -58,7 +62,7 @@ float Appraisal::cashValue(const State& state, double referenceRate)
         if (currency == kUnknown)
             continue;
         const double cash = states[i]->getCash();
-        value = addRounded(value, cash * rates_[currency] / referenceRate);
+        value = addRounded(value, cash * rates_[currency].value / referenceRate);
     }
     return value;
 }
@@ -66,7 +70,7 @@ float Appraisal::cashValue(const State& state, double referenceRate)
 /// The currency of an item's symbol. The states of a wallet have the same items in the same places, so the names are
 /// compared once for all of them.
 template <class Item>
-unsigned Appraisal::currencyOf(std::vector<Line>& lines, unsigned place, const Item* item) const
+unsigned Appraisal::currencyOf(std::vector<Line>& lines, unsigned place, const Item* item)
 {
     const void* listed = item->listed();
     if (lines[place].item != listed || listed == nullptr)
@@ -74,10 +78,15 @@ unsigned Appraisal::currencyOf(std::vector<Line>& lines, unsigned place, const I
     return lines[place].currency;
 }
 
-unsigned Appraisal::findCurrency(const String& representation) const
+unsigned Appraisal::findCurrency(const String& representation)
 {
-    const auto& currencies = catalogue_.getCurrencies();
-    const auto isMeant = [&](const Currency* currency) { return currency->getRepresentation() == representation; };
-    const auto found = std::find_if(currencies.begin(), currencies.end(), isMeant);
-    return found != currencies.end() ? static_cast<unsigned>(found - currencies.begin()) : kUnknown;
+    const auto found = representation.hasText() ? bySymbol_.find(representation.comparedBytes()) : bySymbol_.end();
+    if (found == bySymbol_.end())
+        return kUnknown;
+    Rate& rate = rates_[found->second];
+    if (!rate.isUsed) {
+        used_.push_back(found->second);
+        rate = {rate.currency, rate.currency->getRealQuote(day_), true};
+    }
+    return found->second;
 }

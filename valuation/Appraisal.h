@@ -1,11 +1,14 @@
 #pragma once
 
+#include "foundation/Date.h"
+
+#include <string_view>
+#include <unordered_map>
 #include <vector>
 
 class Catalogue;
 class Currency;
 class State;
-class String;
 
 /// The worth of states in the catalogue's reference currency.
 ///
@@ -23,6 +26,12 @@ public:
     float totalValue(const State& state);
 
 private:
+    /// A currency with its rate on the day of the state at hand, when it is one that anything is in.
+    struct Rate {
+        const Currency* currency;
+        double value;
+        bool isUsed;
+    };
     /// What stood at a place of the states met so far, and the index of its currency in `rates_`, or kUnknown.
     struct Line {
         const void* item = nullptr;
@@ -32,12 +41,14 @@ private:
     float sharesValue(const State& state, double referenceRate);
     float cashValue(const State& state, double referenceRate);
     template <class Item>
-    unsigned currencyOf(std::vector<Line>& lines, unsigned place, const Item* item) const;
-    unsigned findCurrency(const String& representation) const;
+    unsigned currencyOf(std::vector<Line>& lines, unsigned place, const Item* item);
+    unsigned findCurrency(const String& representation);
 
-    const Catalogue& catalogue_;
     Currency* reference_;
-    std::vector<double> rates_; // of each currency of the catalogue, on the day of the state at hand
-    std::vector<Line> shares_;  // by place in the state
+    Date day_;                                                // of the state at hand
+    std::vector<Rate> rates_;                                 // of the catalogue's currencies
+    std::unordered_map<std::string_view, unsigned> bySymbol_; // indices into `rates_`
+    std::vector<unsigned> used_;                              // likewise
+    std::vector<Line> shares_;                                // by place in the state
     std::vector<Line> accounts_;
 };
