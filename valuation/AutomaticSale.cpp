@@ -7,15 +7,49 @@
 #include "portfolio/TransferAccountOperation.h"
 #include "portfolio/Wallet.h"
 
+#include <algorithm>
+#include <cmath>
+
 namespace {
 
 // The period is a 16-bit number of days, so a longer way to the end date only comes from corrupt operations, whose end
-// date can lie millions of years ahead: the day-by-day search then gives up and sells at the end.
+// date can lie millions of years ahead: the search then gives up and sells at the end.
 constexpr int kLongestSearch = 100000;
 
 double limitAt(double begin, double end, int daysLeft, double period, double buyQuote)
 {
     return (end - (end - begin) * daysLeft / period) * buyQuote;
+}
+
+Date dayAfter(const Date& start, int days)
+{
+    Date date = start;
+    return date.moveBy(days);
+}
+
+/// Days from `start` to the first one that is not before `end`, kLongestSearch at most.
+int daysBefore(const Date& end, const Date& start)
+{
+    int low = 0;
+    int high = kLongestSearch;
+    while (low < high) {
+        const int middle = low + (high - low) / 2;
+        if (dayAfter(start, middle) < end)
+            low = middle + 1;
+        else
+            high = middle;
+    }
+    return low;
+}
+
+/// Whether a > b is possible on a day from one to another, given both on these two days. In between, each goes one way
+/// only or is no number where it is none on both.
+bool canExceed(double a0, double a1, double b0, double b1)
+{
+    if ((std::isnan(a0) && std::isnan(a1)) || (std::isnan(b0) && std::isnan(b1)))
+        return false;
+    const bool isUnknown = std::isnan(a0) || std::isnan(a1) || std::isnan(b0) || std::isnan(b1);
+    return isUnknown || std::max(a0, a1) > std::min(b0, b1);
 }
 
 } // namespace
@@ -24,31 +58,53 @@ AutomaticSale::AutomaticSale(Share& share, Wallet& wallet, const Holding& holdin
     : share_(share), wallet_(wallet), holding_(holding)
 {}
 
-AutomaticSale::Outcome AutomaticSale::judge(float prevision, int daysLeft) const
+AutomaticSale::Day AutomaticSale::dayAt(const Date& stateDate, int number) const
 {
+    const Date date = dayAfter(stateDate, number);
+    const int daysLeft = holding_.endDate - date;
     const double period = wallet_.getInvestementPeriod();
     const double buyQuote = holding_.buyQuote;
-    if (limitAt(wallet_.getBeginLoseSellRate(), wallet_.getEndLoseSellRate(), daysLeft, period, buyQuote) > prevision)
+    return {number, share_.getPrevisionQuote(date),
+            limitAt(wallet_.getBeginLoseSellRate(), wallet_.getEndLoseSellRate(), daysLeft, period, buyQuote),
+            limitAt(wallet_.getBeginProfitSellRate(), wallet_.getEndProfitSellRate(), daysLeft, period, buyQuote)};
+}
+
+AutomaticSale::Outcome AutomaticSale::judge(const Day& day)
+{
+    if (day.lossLimit > day.prevision)
         return Outcome::Loss;
-    if (limitAt(wallet_.getBeginProfitSellRate(), wallet_.getEndProfitSellRate(), daysLeft, period, buyQuote) <
-        prevision)
-        return Outcome::Profit;
-    return Outcome::Hold;
+    return day.profitLimit < day.prevision ? Outcome::Profit : Outcome::Hold;
+}
+
+/// The first day from `first` to `last` on which the holding is sold, else `last`.
+///
+/// Trend and limits are straight lines, and rounding keeps their order. So most spans of days without a sale can be
+/// told from their two ends: the search takes steps in proportion to the logarithm of the days, not to the days, whose
+/// number comes from files.
+AutomaticSale::Day AutomaticSale::firstSale(const Date& stateDate, const Day& first, const Day& last) const
+{
+    if (judge(first) != Outcome::Hold)
+        return first;
+    const bool canSell = canExceed(first.lossLimit, last.lossLimit, first.prevision, last.prevision) ||
+                         canExceed(first.prevision, last.prevision, first.profitLimit, last.profitLimit);
+    if (!canSell || last.number - first.number <= 1)
+        return last;
+    const Day middle = dayAt(stateDate, first.number + (last.number - first.number) / 2);
+    const Day sale = firstSale(stateDate, first, middle);
+    return judge(sale) != Outcome::Hold ? sale : firstSale(stateDate, middle, last);
 }
 
 void AutomaticSale::make(const Date& stateDate, Account* sellingAccount)
 {
     Outcome outcome = Outcome::Hold;
-    Date date = stateDate;
-    for (int i = 0; i < kLongestSearch && date < holding_.endDate; ++i) {
-        outcome = judge(share_.getPrevisionQuote(date), holding_.endDate - date);
+    Date date = holding_.endDate;
+    if (const int days = daysBefore(holding_.endDate, stateDate); days > 0) {
+        const Day day = firstSale(stateDate, dayAt(stateDate, 0), dayAt(stateDate, days - 1));
+        outcome = judge(day);
+        // Intended: at the end of the horizon the holding is sold whatever the trend, and no gain is transferred.
         if (outcome != Outcome::Hold)
-            break;
-        date = date.getNext();
+            date = dayAfter(stateDate, day.number);
     }
-    // Intended: at the end of the horizon the holding is sold whatever the trend, and no gain is transferred.
-    if (outcome == Outcome::Hold)
-        date = holding_.endDate;
     const float quote = share_.getPrevisionQuote(date);
     // Owned by the holding. Intended: without an account, so it is no part of any balance, is not written to the
     // portfolio file, and stays when the accounts' automatic operations are removed.

@@ -25,7 +25,17 @@ public:
 private:
     enum class Outcome { Hold, Loss, Profit };
 
-    Outcome judge(float prevision, int daysLeft) const;
+    /// A day of the search, by its number from the state's day.
+    struct Day {
+        int number;
+        float prevision;
+        double lossLimit;
+        double profitLimit;
+    };
+
+    Day dayAt(const Date& stateDate, int number) const;
+    static Outcome judge(const Day& day);
+    Day firstSale(const Date& stateDate, const Day& first, const Day& last) const;
     void transferGain(const Date& date, float quote, Account* sellingAccount);
 
     Share& share_;

@@ -3,6 +3,9 @@
 #include "valuation/ShareState.h"
 #include "valuation/State.h"
 
+#include <cmath>
+#include <iterator>
+
 namespace {
 
 constexpr int kPeriod = 90;
@@ -21,6 +24,23 @@ struct HundredShares : SmallPortfolio {
     Account* profits = addAccount(wallet, "Profits", euro);
     Share* share = new Share(&wallet, alpha);
 };
+
+/// The number of the first day of the horizon on which the trend passes a limit; `days` when there is none.
+int soldByWalking(const HundredShares& p, const Date& day, int days)
+{
+    const Wallet& w = p.wallet;
+    const double price = p.share->getShareOperation(0)->getQuote();
+    const auto limit = [&](double begin, double end, int left) {
+        return (end - (end - begin) * left / w.getInvestementPeriod()) * price;
+    };
+    for (int i = 0; i < days; ++i) {
+        const float trend = p.alpha->getPrevisionQuote(Date(day).moveBy(i));
+        if (limit(w.getBeginLoseSellRate(), w.getEndLoseSellRate(), days - i) > trend ||
+            limit(w.getBeginProfitSellRate(), w.getEndProfitSellRate(), days - i) < trend)
+            return i;
+    }
+    return days;
+}
 
 } // namespace
 
@@ -57,6 +77,34 @@ TEST(AutomaticSaleTest, TheTrendIsHeldAgainstTheLimitsOfEachDay)
         EXPECT_EQ(state->getShareState(0)->getQuantity(), 100) << "the state that makes the sale keeps the holding";
         EXPECT_EQ(p.profits->getNbrTransferOperations(), c.isProfit ? 1U : 0U) << c.why;
     }
+}
+
+TEST(AutomaticSaleTest, TheSearchFindsTheDayThatAWalkFinds)
+{
+    constexpr float kOdd[] = {NAN, INFINITY, -INFINITY, 0, 1e30F, -1e30F};
+    std::mt19937 random(5);
+    const auto around = [&](float from, float to) {
+        if (below(random, 25) == 0)
+            return kOdd[below(random, std::size(kOdd))];
+        return from + (to - from) * static_cast<float>(below(random, 1000)) / 1000;
+    };
+    int soldWithin = 0;
+    for (int i = 0; i < 2000; ++i) {
+        const int period = i % 20 == 0 ? 32767 : 1 + static_cast<int>(below(random, 200));
+        HundredShares p(around(9, 11), around(-6, 9) / static_cast<float>(period));
+        delete p.share->getShareOperation(0);
+        trade(p.share, p.main, 0, 100, around(10, 10));
+        p.wallet.setInvestementPeriod(static_cast<short>(period));
+        p.wallet.setBeginLoseSellRate(around(0.25F, 0.875F));
+        p.wallet.setEndLoseSellRate(around(0.25F, 0.875F));
+        p.wallet.setBeginProfitSellRate(around(1.125F, 2));
+        p.wallet.setEndProfitSellRate(around(1.125F, 2));
+        p.at(0);
+        const int soldOn = soldByWalking(p, kStart, period);
+        ASSERT_EQ(p.share->getShareOperation(1)->getDate(), daysAfterStart(soldOn)) << "case " << i;
+        soldWithin += soldOn > 0 && soldOn < period ? 1 : 0;
+    }
+    EXPECT_GT(soldWithin, 500) << "the cases are no test of the search";
 }
 
 TEST(AutomaticSaleTest, ThePartOfTheGainThatIsNotReinvestedIsTransferred)
