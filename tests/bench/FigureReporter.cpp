@@ -19,19 +19,15 @@ constexpr Figure kFigures[] = {
     {"Load of a market file / walk of its bytes", "BM_Files/load_market", "BM_Files/walk_market", "", "< 20"},
     {"Memory of a loaded quote", "BM_Files/load_market", nullptr, "B", "< 120"},
     {"Evolution of 20 years", "BM_Files/evolve_20_years", nullptr, "ms", "< 1000"},
-    {"Evolution, cost of a day, 20 / 10 years", "BM_Files/evolve_20_years", "BM_Files/evolve_10_years", "", "about 1"},
     {"Evolution, cost of a day, 40 / 20 years", "BM_Files/evolve_40_years", "BM_Files/evolve_20_years", "", "about 1"},
     {"Full replay of a day / a day of the evolution", "BM_Files/replay", "BM_Files/evolve_20_years", "", ""},
     {"Memory of an evolution, per holding and day", "BM_Files/evolve_20_years", nullptr, "B", "< 250"},
-    {"Removal of states, cost of a day, 20 / 10 years", "BM_Files/remove_20_years", "BM_Files/remove_10_years", "",
-     "about 1"},
     {"Removal of states, cost of a day, 40 / 20 years", "BM_Files/remove_40_years", "BM_Files/remove_20_years", "",
      "about 1"},
     {"Files to chart, small portfolio", "BM_Files/chart_small", nullptr, "ms", "< 80"},
     {"Files to chart, large portfolio", "BM_Files/chart_large", nullptr, "ms", "< 640"},
     {"Removal from a list, cost of an element, 4 n / n", "BM_RemoveQuotes/40000", "BM_RemoveQuotes/10000", "",
      "about 1"},
-    {"Load of quotes, shuffled / by date", "BM_LoadQuotes/shuffled", "BM_LoadQuotes/by_date", "", ""},
 };
 
 double medianOf(std::vector<double> values)

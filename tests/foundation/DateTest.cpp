@@ -1,5 +1,4 @@
 #include "foundation/Date.h"
-#include "tests/support/Bytes.h"
 
 #include <climits>
 #include <gtest/gtest.h>
@@ -178,19 +177,4 @@ TEST(DateTest, TextPadsDayAndMonthOnly)
                                                   {{-32768, -32768, INT_MIN}, "0-32768/0-32768/-2147483648"}};
     for (const auto& [date, shown] : cases)
         EXPECT_EQ(text(date), shown);
-}
-
-TEST(DateTest, FileHoldsDayMonthAndYearInEightBytes)
-{
-    const std::pair<Date, const char*> cases[] = {
-        {{3, 5, 1999}, "0300 0500 CF070000"}, {{}, "0000 0000 00000000"}, {{-1, -2, -3}, "FFFF FEFF FDFFFFFF"}};
-    for (const auto& [date, bytes] : cases) {
-        EXPECT_EQ(bytesWritten(date), bytesOf(bytes));
-        Date read(9, 9, 9);
-        EXPECT_EQ(read.rd(BytesFile(bytesOf(bytes))), 0);
-        EXPECT_EQ(read, date) << bytes;
-    }
-    Date cut;
-    EXPECT_EQ(cut.rd(BytesFile(bytesOf("0300 05"))), 0);
-    EXPECT_EQ(cut, Date(3, -251, -1)) << "bytes that are missing read as 0xFF, without a complaint";
 }

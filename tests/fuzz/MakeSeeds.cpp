@@ -1,4 +1,5 @@
-// Writes small valid files for the fuzzers to start from: fuzz_seeds FOLDER makes FOLDER/market and FOLDER/wallet.
+// Writes a small valid file of each kind for the fuzzers to start from: fuzz_seeds FOLDER makes FOLDER/market and
+// FOLDER/wallet.
 
 #include "market/Catalogue.h"
 #include "market/Company.h"
@@ -15,100 +16,61 @@
 #include "tests/fuzz/SmallCatalogue.h"
 
 #include <filesystem>
+#include <utility>
 
 namespace {
 
 const Date kStamp(3, 5, 1999);
 
-/// Everything here is owned by what it is given to.
 template <class Object>
-bool save(const Object& object, const std::filesystem::path& path)
+bool save(const Object& object, const std::filesystem::path& folder)
 {
-    FILE* file = std::fopen(path.c_str(), "wb");
-    if (file == nullptr)
-        return false;
-    const int result = object.wrt(file, kStamp);
-    return std::fclose(file) == 0 && result == 0;
+    std::filesystem::create_directories(folder);
+    FILE* file = std::fopen((folder / "full").c_str(), "wb");
+    const int result = file != nullptr ? object.wrt(file, kStamp) : -1;
+    return file != nullptr && std::fclose(file) == 0 && result == 0;
 }
 
-bool saveMarkets(const std::filesystem::path& folder)
+/// An event of each kind for the first company.
+Company* addEvents(const Catalogue& catalogue)
 {
-    Catalogue empty;
-    Catalogue rates;
-    auto* euro = new Currency("Euro", "E", nullptr);
-    rates.addCurrency(euro);
-    rates.setReferenceCurrency(euro);
-    new CurrencyQuote(euro, kStamp, 1);
-    Catalogue full;
-    fillSmallCatalogue(full);
     Company* company;
-    full.getMarkets().front()->getCompany("A", &company);
+    catalogue.getMarkets().front()->getCompany("A", &company);
     new NoteCompanyEvent(company, kStamp, "Title", "Text");
     new SplitCompanyEvent(company, kStamp, 2, 1);
-    return save(empty, folder / "empty") && save(rates, folder / "rates") && save(full, folder / "full");
+    return company;
 }
 
-Account* addAccount(Wallet& wallet, const char* name, const char* currencyName)
+/// Two accounts, a holding and an operation of each kind. All of it is owned by what it is given to.
+void fill(Wallet& wallet, const Catalogue& catalogue, Company* company)
 {
-    Currency* currency;
-    wallet.getCurrency(currencyName, &currency);
-    auto* account = new Account(name);
-    account->setWallet(&wallet);
-    account->setCurrency(currency);
-    return account;
-}
-
-void trade(Share* share, Account* account, bool buy, int quantity, const Date& date)
-{
-    auto* operation = new ShareOperation(date, share, buy, quantity, 40, false, 29.95F);
-    operation->setAccount(account);
-}
-
-Share* addShare(Wallet& wallet, const char* market, const char* ticker)
-{
-    Company* company;
-    wallet.getCompany(market, ticker, &company);
-    return new Share(&wallet, company);
-}
-
-bool saveWallets(const std::filesystem::path& folder)
-{
-    Catalogue catalogue;
-    fillSmallCatalogue(catalogue);
-    Wallet wallet;
-    setCatalogue(wallet, catalogue);
-    bool isSaved = save(wallet, folder / "empty");
-    Account* account = addAccount(wallet, "a", "E");
-    new DepositAccountOperation(kStamp, account, 1000, false);
-    isSaved = isSaved && save(wallet, folder / "deposit");
-    Account* other = addAccount(wallet, "b", "D");
+    auto* account = new Account("a");
+    auto* other = new Account("b");
+    for (Account* each : {account, other})
+        each->setWallet(&wallet);
+    account->setCurrency(catalogue.getCurrencies()[0]);
+    other->setCurrency(catalogue.getCurrencies()[1]);
     other->setDefaultTransferAccount(true);
+    new DepositAccountOperation(kStamp, account, 1000, false);
     new TransferAccountOperation(kStamp, account, other, 100, false);
-    new TransferAccountOperation(Date(4, 5, 1999), other, account, 50, false);
-    isSaved = isSaved && save(wallet, folder / "transfers");
-    Share* share = addShare(wallet, "P", "A");
-    Share* abroad = addShare(wallet, "Y", "C");
-    trade(share, account, true, 10, kStamp);
-    trade(share, account, true, 10, Date(20, 5, 1999));
-    trade(share, account, false, 15, Date(7, 6, 1999));
-    trade(abroad, account, true, 100, Date(1, 3, 2000)); // still held today: previsions sell it
-    return isSaved && save(wallet, folder / "trades");
+    auto* share = new Share(&wallet, company);
+    // Ten of the last are still held today: previsions sell them.
+    for (const auto& [buy, date] : {std::pair(true, kStamp), {false, Date(7, 6, 1999)}, {true, Date(1, 3, 2000)}})
+        (new ShareOperation(date, share, buy, 10, 40, false, 29.95F))->setAccount(account);
 }
 
 } // namespace
 
 int main(int argc, char** argv)
 {
-    if (argc != 2) {
-        std::fputs("usage: fuzz_seeds FOLDER\n", stderr);
-        return 2;
-    }
-    const std::filesystem::path folder = argv[1];
-    std::filesystem::create_directories(folder / "market");
-    std::filesystem::create_directories(folder / "wallet");
-    if (!saveMarkets(folder / "market") || !saveWallets(folder / "wallet")) {
-        std::fprintf(stderr, "fuzz_seeds: cannot write into %s\n", argv[1]);
-        return 1;
-    }
-    return 0;
+    const std::filesystem::path folder = argc == 2 ? argv[1] : "";
+    Catalogue catalogue;
+    fillSmallCatalogue(catalogue);
+    Wallet wallet;
+    setCatalogue(wallet, catalogue);
+    fill(wallet, catalogue, addEvents(catalogue));
+    if (argc == 2 && save(catalogue, folder / "market") && save(wallet, folder / "wallet"))
+        return 0;
+    std::fputs("usage: fuzz_seeds FOLDER, one that can be written into\n", stderr);
+    return 1;
 }

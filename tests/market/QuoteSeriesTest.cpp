@@ -113,6 +113,7 @@ void compareRandomSeriesWithAPlainOne()
         ASSERT_EQ(found, plain.at(day)) << "turn " << turn;
         ASSERT_EQ(owner.getRealQuote(day), plain.realQuote(day)) << "turn " << turn;
         ASSERT_NEAR(owner.getPrevisionQuote(day), plain.trend(day), 1e-3) << "turn " << turn;
+        ASSERT_NEAR(owner.getPente(), plain.trend(march(1)) - plain.trend(march(0)), 1e-4) << "turn " << turn;
     }
 }
 
@@ -164,29 +165,6 @@ TEST(QuoteSeriesTest, AnAddedQuoteReplacesTheFirstOneOfItsDay)
     EXPECT_EQ(company.removeQuote(d), 0);
     EXPECT_EQ(dump(company), "1:5 ");
     delete d;
-}
-
-TEST(QuoteSeriesTest, TheTrendFollowsEveryChange)
-{
-    Company company;
-    const auto expectTrend = [&company](float slope, float onDay11, const char* why) {
-        EXPECT_FLOAT_EQ(company.getPente(), slope) << why;
-        EXPECT_FLOAT_EQ(company.getPrevisionQuote(march(11)), onDay11) << why;
-    };
-    auto* third = new CompanyQuote(&company, march(3), 3);
-    expectTrend(0, 0, "a single quote has none");
-    new CompanyQuote(&company, march(2), 2);
-    auto* first = new CompanyQuote(&company, march(1), 1);
-    expectTrend(1, 11, "1, 2, 3");
-    third->setValue(4);
-    expectTrend(1.5, 5.0F / 6 + 15, "1, 2, 4");
-    third->setDate(march(4));
-    expectTrend(1, 11, "1, 2, and 4 a day later");
-    delete first;
-    third->setValue(8);
-    expectTrend(3, 29, "2 on day 2 and 8 on day 4");
-    third->setDate(march(2));
-    expectTrend(0, 0, "both on one day");
 }
 
 TEST(QuoteSeriesTest, RandomSeriesAnswerLikePlainOnes)
