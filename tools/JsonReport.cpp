@@ -20,6 +20,46 @@ namespace {
 using Json =
     nlohmann::basic_json<nlohmann::ordered_map, std::vector, std::string, bool, std::int64_t, std::uint64_t, float>;
 
+/// One line; bytes that are no UTF-8 become U+FFFD.
+std::string dump(const Json& json)
+{
+    return json.dump(-1, ' ', false, Json::error_handler_t::replace);
+}
+
+/// An object on a stream, a line for each member and for each item of a list. It is never held as a whole: a name may
+/// be as long as a file, and every operation repeats its account's.
+class ObjectWriter {
+public:
+    explicit ObjectWriter(FILE* out) : out_(out) { put("{"); }
+
+    void add(const char* key, const Json& value) { put(beginMember(key) + dump(value)); }
+    void beginList(const char* key)
+    {
+        put(beginMember(key) + "[");
+        isFirstItem_ = true;
+    }
+    void addItem(const Json& item)
+    {
+        put((isFirstItem_ ? "\n    " : ",\n    ") + dump(item));
+        isFirstItem_ = false;
+    }
+    void endList() { put(isFirstItem_ ? "]" : "\n  ]"); }
+    void end() { put("\n}\n"); }
+
+private:
+    std::string beginMember(const char* key)
+    {
+        const std::string member = (isFirstMember_ ? "\n  " : ",\n  ") + dump(key) + ": ";
+        isFirstMember_ = false;
+        return member;
+    }
+    void put(const std::string& bytes) { std::fwrite(bytes.data(), 1, bytes.size(), out_); }
+
+    FILE* out_;
+    bool isFirstMember_ = true;
+    bool isFirstItem_ = true;
+};
+
 std::string text(const String& text)
 {
     return std::string(text.bytes());
@@ -30,41 +70,41 @@ Json day(const Date& date)
     return date.isUndefined() ? Json() : Json(text(date.toString()));
 }
 
-void addTotals(const Valuation& valuation, Json* report)
+void addTotals(const Valuation& valuation, ObjectWriter& report)
 {
     const Totals totals = valuation.totals();
     const Currency* reference = valuation.catalogue().getReferenceCurrency();
     const auto known = [&totals](float total) { return totals.isKnown ? Json(total) : Json(); };
-    (*report)["reference"] = totals.isKnown ? Json(text(reference->getRepresentation())) : Json();
-    (*report)["totalDeposit"] = known(totals.totalDeposit);
-    (*report)["totalValue"] = known(totals.totalValue);
-    (*report)["profit"] = known(totals.profit);
-    (*report)["annualRevenue"] = known(totals.annualRevenue);
+    report.add("reference", totals.isKnown ? Json(text(reference->getRepresentation())) : Json());
+    report.add("totalDeposit", known(totals.totalDeposit));
+    report.add("totalValue", known(totals.totalValue));
+    report.add("profit", known(totals.profit));
+    report.add("annualRevenue", known(totals.annualRevenue));
 }
 
-Json accounts(const State& state)
+void addAccounts(const State& state, ObjectWriter& report)
 {
-    Json list = Json::array();
+    report.beginList("accounts");
     unsigned n;
     AccountState** states = state.getAllAccountStates(&n);
     for (unsigned i = 0; i < n; ++i) {
         const Account* account = states[i]->listed();
-        list.push_back({{"name", text(states[i]->getAccountName())},
+        report.addItem({{"name", text(states[i]->getAccountName())},
                         {"currency", text(states[i]->getCurrencyRepresentation())},
                         {"cash", states[i]->getCash()},
                         {"defaultTransfer", account != nullptr && account->isDefaultTransferAccount()}});
     }
-    return list;
+    report.endList();
 }
 
-Json shares(const State& state)
+void addShares(const State& state, ObjectWriter& report)
 {
-    Json list = Json::array();
+    report.beginList("shares");
     unsigned n;
     ShareState** states = state.getAllShareStates(&n);
     for (unsigned i = 0; i < n; ++i) {
         const Share* share = states[i]->listed();
-        list.push_back({{"market", share != nullptr ? text(share->getMarketName()) : ""},
+        report.addItem({{"market", share != nullptr ? text(share->getMarketName()) : ""},
                         {"ticker", text(states[i]->getCompanyAbbreviation())},
                         {"name", text(states[i]->getCompanyName())},
                         {"quantity", states[i]->getQuantity()},
@@ -73,7 +113,7 @@ Json shares(const State& state)
                         {"endDate", day(states[i]->getEndDate())},
                         {"currency", text(states[i]->getCurrencyRepresentation())}});
     }
-    return list;
+    report.endList();
 }
 
 Json describe(const TransferAccountOperation& transfer)
@@ -115,18 +155,18 @@ Json describe(const Account& account, const Operation& operation)
     return json;
 }
 
-Json operations(const Wallet& wallet)
+void addOperations(const Wallet& wallet, ObjectWriter& report)
 {
-    Json list = Json::array();
+    report.beginList("operations");
     unsigned nAccounts;
     Account** accounts = wallet.getAllAccounts(&nAccounts);
     for (unsigned i = 0; i < nAccounts; ++i) {
         unsigned n;
         Operation** operations = accounts[i]->getAllOperations(&n);
         for (unsigned j = 0; j < n; ++j)
-            list.push_back(describe(*accounts[i], *operations[j]));
+            report.addItem(describe(*accounts[i], *operations[j]));
     }
-    return list;
+    report.endList();
 }
 
 } // namespace
@@ -134,17 +174,18 @@ Json operations(const Wallet& wallet)
 void writeJsonReport(const Valuation& valuation, FILE* out)
 {
     const State& state = valuation.state();
-    Json report = {{"date", day(state.getDate())}};
-    addTotals(valuation, &report);
-    report["firstOperationDate"] = day(state.getFirstOperationDate());
-    report["accounts"] = accounts(state);
-    report["shares"] = shares(state);
-    report["operations"] = operations(valuation.wallet());
+    ObjectWriter report(out);
+    report.add("date", day(state.getDate()));
+    addTotals(valuation, report);
+    report.add("firstOperationDate", day(state.getFirstOperationDate()));
+    addAccounts(state, report);
+    addShares(state, report);
+    addOperations(valuation.wallet(), report);
     if (valuation.hasEvolution()) {
-        Json& points = report["evolution"] = Json::array();
+        report.beginList("evolution");
         for (const EvolutionPoint& point : valuation.evolution())
-            points.push_back({{"date", day(point.date)}, {"totalValue", point.totalValue}});
+            report.addItem({{"date", day(point.date)}, {"totalValue", point.totalValue}});
+        report.endList();
     }
-    const std::string bytes = report.dump(2, ' ', false, Json::error_handler_t::replace) + '\n';
-    std::fwrite(bytes.data(), 1, bytes.size(), out);
+    report.end();
 }

@@ -266,7 +266,7 @@ TEST_F(ValueTest, JsonFloatsHaveNineDigitsAndReadBackToTheSameFloat)
     const Json operations = Json::parse(run.out)["operations"];
     for (int i = 0; i < kAmounts; ++i)
         EXPECT_EQ(operations[i]["amount"], std::isfinite(amounts[i]) ? Json(amounts[i]) : Json());
-    const std::regex amount("\"amount\": -?0*\\.?0*([0-9.]+?)0*\\.?0*[,e}\\s]");
+    const std::regex amount("\"amount\":-?0*\\.?0*([0-9.]+?)0*\\.?0*[,e}\\s]");
     int checked = 0;
     for (std::sregex_iterator found(run.out.begin(), run.out.end(), amount), end; found != end; ++found, ++checked) {
         std::string digits = (*found)[1];
