@@ -15,6 +15,10 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdio>
+#include <cstdlib>
+#include <string>
+#include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace {
@@ -47,6 +51,8 @@ std::string percentText(double fraction, const char* format)
         return "?";
     char text[64];
     std::snprintf(text, sizeof text, format, fraction * 100);
+    if (std::strtod(text, nullptr) == 0) // without the sign of what is too small to show
+        std::snprintf(text, sizeof text, format, 0.0);
     return text;
 }
 
@@ -109,6 +115,8 @@ public:
     {
         if (reference_ != nullptr)
             referenceSymbol_ = plain(reference_->getRepresentation());
+        for (const Currency* currency : valuation.catalogue().getCurrencies())
+            bySymbol_.try_emplace(currency->getRepresentation().comparedBytes(), currency);
     }
 
     std::string make() const
@@ -130,6 +138,7 @@ private:
     const Valuation& valuation_;
     const Currency* reference_;
     std::string referenceSymbol_;
+    std::unordered_map<std::string_view, const Currency*> bySymbol_; // the first of each symbol
 };
 
 std::string Report::header() const
@@ -158,11 +167,11 @@ std::string Report::totals() const
 /// An amount in the currency of that symbol, in the reference currency; empty when that has no answer.
 std::string Report::inReference(double amount, const String& symbol) const
 {
-    const Currency* currency = valuation_.catalogue().getCurrencyByRepresentation(symbol);
-    if (reference_ == nullptr || currency == nullptr)
+    const auto currency = bySymbol_.find(symbol.comparedBytes());
+    if (reference_ == nullptr || currency == bySymbol_.end())
         return {};
     const Date& day = valuation_.state().getDate();
-    return amountText(amount * currency->getRealQuote(day) / reference_->getRealQuote(day));
+    return amountText(amount * currency->second->getRealQuote(day) / reference_->getRealQuote(day));
 }
 
 std::string Report::accounts() const
