@@ -235,7 +235,7 @@ TEST_F(ValueTest, UnknownNamesAreTold)
         const ToolRun run(PELORIN_VALUE, "market wallet --json", folder_);
         EXPECT_EQ(run.status, status) << message;
         EXPECT_THAT(run.err, StartsWith("pelorin-value: wallet: " + message + '\n'));
-        EXPECT_EQ(status == 0, run.out.find("\"recipient\": null") != run.out.npos) << "what could be read is shown";
+        EXPECT_EQ(status == 0, run.out.find("\"recipient\":null") != run.out.npos) << "what could be read is shown";
     }
 }
 
