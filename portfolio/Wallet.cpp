@@ -1,5 +1,6 @@
 #include "portfolio/Wallet.h"
 
+#include "market/Catalogue.h"
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "market/Market.h"
@@ -25,6 +26,12 @@ void Wallet::setCurrencies(int count, Currency** currencies)
 void Wallet::setMarkets(int count, Market** markets)
 {
     markets_.assign(markets, markets + count);
+}
+
+void Wallet::setCatalogue(const Catalogue& catalogue)
+{
+    currencies_ = catalogue.getCurrencies();
+    markets_ = catalogue.getMarkets();
 }
 
 int Wallet::getCurrency(const String& name, Currency** out) const

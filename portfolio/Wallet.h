@@ -9,6 +9,7 @@
 
 #include <vector>
 
+class Catalogue;
 class Company;
 class Currency;
 class Market;
@@ -59,6 +60,8 @@ public:
     /// Keep copies of the pointers; what they point to is never freed here.
     void setCurrencies(int count, Currency** currencies);
     void setMarkets(int count, Market** markets);
+    /// Both of them at once, as they are in the catalogue now.
+    void setCatalogue(const Catalogue& catalogue);
 
     /// The look-ups below give the first match. @return 0; -1 and a null `*out` when there is none.
     int getCurrency(const String& name, Currency** out) const;

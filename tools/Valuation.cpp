@@ -48,10 +48,7 @@ void Valuation::readMarket()
     const InputFile file(marketPath_);
     if (catalogue_.rd(file.stream()) != 0)
         failReading(file, "market", "is damaged: it has the reference currency over and over");
-    std::vector<Currency*> currencies = catalogue_.getCurrencies();
-    std::vector<Market*> markets = catalogue_.getMarkets();
-    wallet_.setCurrencies(static_cast<int>(currencies.size()), currencies.data());
-    wallet_.setMarkets(static_cast<int>(markets.size()), markets.data());
+    wallet_.setCatalogue(catalogue_);
 }
 
 void Valuation::readPortfolio()

@@ -22,7 +22,7 @@ public:
         first_.setYear(first_.getYear() - size.years);
         for (int i = 0; i < DataFolder::kCurrencies; ++i)
             makeCurrency(std::to_string(i));
-        portfolio.connect();
+        portfolio.wallet.setCatalogue(portfolio.catalogue);
         makeWallet();
     }
 

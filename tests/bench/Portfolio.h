@@ -17,15 +17,6 @@ struct Portfolio {
     /// The last day with quotes, on which the portfolio is valued.
     static Date lastDay() { return {20, 11, 2026}; }
 
-    /// Hands the catalogue's markets and currencies to the wallet.
-    void connect()
-    {
-        std::vector<Market*> markets = catalogue.getMarkets();
-        std::vector<Currency*> currencies = catalogue.getCurrencies();
-        wallet.setMarkets(static_cast<int>(markets.size()), markets.data());
-        wallet.setCurrencies(static_cast<int>(currencies.size()), currencies.data());
-    }
-
     /// @return true when the file was read whole; likewise below.
     bool loadMarket(const std::filesystem::path& path)
     {
@@ -33,7 +24,7 @@ struct Portfolio {
     }
     bool loadWallet(const std::filesystem::path& path)
     {
-        connect();
+        wallet.setCatalogue(catalogue);
         return load(path, [&](FILE* file) { return wallet.rd(file, nullptr); });
     }
 

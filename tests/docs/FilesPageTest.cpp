@@ -87,10 +87,7 @@ TEST(FilesPageTest, ExamplesAreWhatIsWrittenAndRead)
     ASSERT_EQ(readCatalogue.rd(BytesFile(pages[0])), 0);
     EXPECT_EQ(pages[0], written([&](FILE* file) { readCatalogue.wrt(file, kSaved); }));
     Wallet readWallet;
-    std::vector<Market*> markets = readCatalogue.getMarkets();
-    std::vector<Currency*> currencies = readCatalogue.getCurrencies();
-    readWallet.setMarkets(static_cast<int>(markets.size()), markets.data());
-    readWallet.setCurrencies(static_cast<int>(currencies.size()), currencies.data());
+    readWallet.setCatalogue(readCatalogue);
     Date stamp;
     ASSERT_EQ(readWallet.rd(BytesFile(pages[1]), &stamp), 0);
     EXPECT_EQ(stamp, kSaved);

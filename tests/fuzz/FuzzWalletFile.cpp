@@ -66,7 +66,7 @@ std::string writtenForReading(const Wallet& wallet)
 void checkRereading(Wallet& wallet, const Catalogue& catalogue, const std::string& bytes)
 {
     Wallet again;
-    setCatalogue(again, catalogue);
+    again.setCatalogue(catalogue);
     require(again.rd(BytesFile(bytes), nullptr) == 0, "a written portfolio is read whole");
     require(writtenForReading(again) == bytes, "writing, reading and writing gives the same bytes");
     requireSame(State(&wallet, kToday, false), State(&again, kToday, false), "a reread portfolio is worth the same");
@@ -124,7 +124,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Catalogue catalogue;
     fillSmallCatalogue(catalogue);
     Wallet wallet;
-    setCatalogue(wallet, catalogue);
+    wallet.setCatalogue(catalogue);
     wallet.rd(BytesFile(std::string(reinterpret_cast<const char*>(data), size)), nullptr);
     const std::string bytes = writtenForReading(wallet);
     if (!bytes.empty())

@@ -67,7 +67,7 @@ int main(int argc, char** argv)
     Catalogue catalogue;
     fillSmallCatalogue(catalogue);
     Wallet wallet;
-    setCatalogue(wallet, catalogue);
+    wallet.setCatalogue(catalogue);
     fill(wallet, catalogue, addEvents(catalogue));
     if (argc == 2 && save(catalogue, folder / "market") && save(wallet, folder / "wallet"))
         return 0;

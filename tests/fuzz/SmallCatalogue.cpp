@@ -4,7 +4,6 @@
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "market/Market.h"
-#include "portfolio/Wallet.h"
 
 namespace {
 
@@ -49,12 +48,4 @@ void fillSmallCatalogue(Catalogue& catalogue)
     addHill(new Company(abroad, "Gamma", "C"), 3);
     new Company(abroad, "Delta", "A"); // the ticker of another market's company
     addHill(new Company(addMarket(withoutRates, "Z"), "Epsilon", "F"), 20);
-}
-
-void setCatalogue(Wallet& wallet, const Catalogue& catalogue)
-{
-    std::vector<Market*> markets = catalogue.getMarkets();
-    std::vector<Currency*> currencies = catalogue.getCurrencies();
-    wallet.setMarkets(static_cast<int>(markets.size()), markets.data());
-    wallet.setCurrencies(static_cast<int>(currencies.size()), currencies.data());
 }

@@ -32,7 +32,7 @@ TEST(WalletTest, LookUpsNeedEveryNameAndGiveTheFirstMatch)
     twin->setCurrency(p.dollar);
     auto* gamma = new Company(twin, "Gamma", "GA");
     new Company(twin, "Twin of Beta", "AC");
-    p.tell(p.wallet);
+    p.wallet.setCatalogue(p.catalogue);
     auto* share = new Share(&p.wallet, p.beta);
     new Share(&p.wallet, p.beta);
     const Account* account = addAccount(p.wallet, "A", p.euro);

@@ -93,16 +93,7 @@ struct SmallPortfolio {
         new CurrencyQuote(dollar, kStart, 2);
         paris->setCurrency(euro);
         york->setCurrency(dollar);
-        tell(wallet);
-    }
-
-    /// Hands the catalogue's markets and currencies to a wallet.
-    void tell(Wallet& other) const
-    {
-        std::vector<Market*> markets = catalogue.getMarkets();
-        std::vector<Currency*> currencies = catalogue.getCurrencies();
-        other.setMarkets(static_cast<int>(markets.size()), markets.data());
-        other.setCurrencies(static_cast<int>(currencies.size()), currencies.data());
+        wallet.setCatalogue(catalogue);
     }
 
     Catalogue catalogue;
