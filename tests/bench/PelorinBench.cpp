@@ -135,9 +135,11 @@ void BM_Files(benchmark::State& state, const DataSize& size, double items, Step 
 
 PELORIN_BENCHMARK(walk_market, kLarge, quotesOf(kLarge), doNothing, walkMarket);
 PELORIN_BENCHMARK(load_market, kLarge, quotesOf(kLarge), doNothing, loadMarket);
+PELORIN_BENCHMARK(evolve_10_years, small(10), shareStatesOf(small(10)), load, evolve);
 PELORIN_BENCHMARK(evolve_20_years, small(20), shareStatesOf(small(20)), load, evolve);
 PELORIN_BENCHMARK(evolve_40_years, small(40), shareStatesOf(small(40)), load, evolve);
 PELORIN_BENCHMARK(replay, small(20), kReplays* small(20).holdings, load, replay);
+PELORIN_BENCHMARK(remove_10_years, small(10), shareStatesOf(small(10)), loadAndEvolve, removeStates);
 PELORIN_BENCHMARK(remove_20_years, small(20), shareStatesOf(small(20)), loadAndEvolve, removeStates);
 PELORIN_BENCHMARK(remove_40_years, small(40), shareStatesOf(small(40)), loadAndEvolve, removeStates);
 PELORIN_BENCHMARK(chart_small, small(20), 1, doNothing, makeChart);
