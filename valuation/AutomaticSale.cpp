@@ -31,6 +31,11 @@ Date dayAfter(const Date& start, int days)
 int daysBefore(const Date& end, const Date& start)
 {
     int low = 0;
+    if (!start.isValid()) { // on its way to a real date it may pass the end and come back: it has to be walked
+        for (Date date = start; low < kLongestSearch && date < end; date + 1)
+            ++low;
+        return low;
+    }
     int high = kLongestSearch;
     while (low < high) {
         const int middle = low + (high - low) / 2;
@@ -64,7 +69,7 @@ AutomaticSale::Day AutomaticSale::dayAt(const Date& stateDate, int number) const
     const int daysLeft = holding_.endDate - date;
     const double period = wallet_.getInvestementPeriod();
     const double buyQuote = holding_.buyQuote;
-    return {number, share_.getPrevisionQuote(date),
+    return {number, date.isValid(), share_.getPrevisionQuote(date),
             limitAt(wallet_.getBeginLoseSellRate(), wallet_.getEndLoseSellRate(), daysLeft, period, buyQuote),
             limitAt(wallet_.getBeginProfitSellRate(), wallet_.getEndProfitSellRate(), daysLeft, period, buyQuote)};
 }
@@ -80,12 +85,13 @@ AutomaticSale::Outcome AutomaticSale::judge(const Day& day)
 ///
 /// Trend and limits are straight lines, and rounding keeps their order. So most spans of days without a sale can be
 /// told from their two ends: the search takes steps in proportion to the logarithm of the days, not to the days, whose
-/// number comes from files.
+/// number comes from files. From an impossible state date on, the lines begin with the first real day.
 AutomaticSale::Day AutomaticSale::firstSale(const Date& stateDate, const Day& first, const Day& last) const
 {
     if (judge(first) != Outcome::Hold)
         return first;
-    const bool canSell = canExceed(first.lossLimit, last.lossLimit, first.prevision, last.prevision) ||
+    const bool canSell = first.isReal != last.isReal ||
+                         canExceed(first.lossLimit, last.lossLimit, first.prevision, last.prevision) ||
                          canExceed(first.prevision, last.prevision, first.profitLimit, last.profitLimit);
     if (!canSell || last.number - first.number <= 1)
         return last;

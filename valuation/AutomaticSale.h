@@ -28,6 +28,7 @@ private:
     /// A day of the search, by its number from the state's day.
     struct Day {
         int number;
+        bool isReal; // false for a date that no calendar has: trend and limits are the same on all of these
         float prevision;
         double lossLimit;
         double profitLimit;

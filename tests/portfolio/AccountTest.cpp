@@ -31,17 +31,20 @@ TEST(AccountTest, OperationsAreListedByDateAndThoseOfADayAsTheyWereAdded)
 
 TEST(AccountTest, ATransferIsListedAtBothEndsAndCostsNothingUntilToldOtherwise)
 {
-    Account from, to;
-    const TransferAccountOperation* later = transfer(&from, &to, 9, 2);
-    TransferAccountOperation* sent = transfer(&from, &to, 10, 200);
+    Account from;
+    auto* to = new Account;
+    const TransferAccountOperation* later = transfer(&from, to, 9, 2);
+    TransferAccountOperation* sent = transfer(&from, to, 10, 200);
     sent->setDate(daysAfterStart(8));
     EXPECT_EQ(from.getOperation(0), sent);
-    EXPECT_EQ(to.getTransferOperation(0), sent) << "both lists follow a changed date";
-    EXPECT_EQ(to.getTransferOperation(1), later);
+    EXPECT_EQ(to->getTransferOperation(0), sent) << "both lists follow a changed date";
+    EXPECT_EQ(to->getTransferOperation(1), later);
     EXPECT_EQ(sent->getTotalCost(), 0);
     sent->setRateCost(0.01F);
     sent->setCost(5);
     EXPECT_FLOAT_EQ(sent->getTotalCost(), 7);
+    delete to;
+    EXPECT_EQ(from.getNbrOperations(), 0U) << "what an account receives goes with it";
 }
 
 TEST(AccountTest, WithoutCurrencyOrWalletLookUpsFindNothing)

@@ -147,6 +147,20 @@ TEST(WalletFileTest, OperationsOfADayComeBackInTheirOrder)
     }
 }
 
+TEST(WalletFileTest, ANameMeansTheFirstThatBearsIt)
+{
+    SmallPortfolio p;
+    new Share(&p.wallet, p.alpha);
+    auto* second = new Share(&p.wallet, p.alpha);
+    addAccount(p.wallet, "A", p.euro);
+    Account* sender = addAccount(p.wallet, "A", p.dollar);
+    transfer(sender, sender, 0, 1);
+    trade(second, sender, 0, 1, 1);
+    ASSERT_EQ(p.wallet.rd(BytesFile(bytesWritten(p.wallet)), nullptr), 0);
+    EXPECT_EQ(p.wallet.getAccount(0)->getNbrTransferOperations(), 1U);
+    EXPECT_EQ(all(p.wallet, &Wallet::getAllShares).front()->getNbrShareOperations(), 1U);
+}
+
 TEST(WalletFileTest, AutomaticTransfersAreWrittenLikeManualOnesAndAutomaticSalesNotAtAll)
 {
     SmallPortfolio p;
