@@ -1,0 +1,26 @@
+#pragma once
+
+#include "platform/Looper.h"
+
+#include <string>
+
+/// The program's connection to the desktop. There is one, made before any window and destroyed after the last.
+class BApplication : public BLooper {
+public:
+    /// `signature` is the program's name among all programs, such as "application/x-vnd.Someone".
+    explicit BApplication(const char* signature);
+    ~BApplication() override;
+
+    /// Handles events until the application is asked to quit (`B_QUIT_REQUESTED`); then closes the windows that are
+    /// left.
+    int Run();
+    /// Ends `Run` when the present message is done.
+    void Quit();
+    void MessageReceived(BMessage* message) override;
+
+private:
+    std::string signature_;
+};
+
+/// The application, null while there is none.
+extern BApplication* be_app;

@@ -1,0 +1,20 @@
+#include "platform/Button.h"
+
+#include "platform/Labels.h"
+
+#include <QPushButton>
+
+BButton::BButton(BRect frame, const char* name, const char* label, BMessage* message, uint32 resizingMode, uint32 flags)
+    : BControl(frame, name, label, message, resizingMode, flags, new QPushButton(labelText(label)))
+{
+    auto* button = static_cast<QPushButton*>(widget());
+    button->setAutoDefault(true);
+    QObject::connect(button, &QPushButton::clicked, [this] { Invoke(); });
+}
+
+void BButton::SetLabel(const char* label)
+{
+    BControl::SetLabel(label);
+    SetAccessibleName(label);
+    static_cast<QPushButton*>(widget())->setText(labelText(label));
+}

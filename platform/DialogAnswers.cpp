@@ -1,0 +1,7 @@
+#include "platform/DialogAnswers.h"
+
+DialogAnswers& DialogAnswers::current()
+{
+    static DialogAnswers answers;
+    return answers;
+}

@@ -1,0 +1,34 @@
+#include "platform/Entry.h"
+
+#include "platform/Path.h"
+
+#include <filesystem>
+
+BEntry::BEntry(const entry_ref* ref)
+{
+    if (ref == nullptr || (ref->directory.empty() && ref->name.empty()))
+        return;
+    path_ = (std::filesystem::path(ref->directory) / ref->name).string();
+}
+
+BEntry::BEntry(const char* path) : path_(path != nullptr ? path : "") {}
+
+bool BEntry::Exists() const
+{
+    std::error_code error;
+    return std::filesystem::exists(path_, error);
+}
+
+status_t BEntry::GetPath(BPath* path) const
+{
+    return InitCheck() == B_OK ? path->SetTo(path_.c_str()) : B_NO_INIT;
+}
+
+status_t BEntry::GetRef(entry_ref* ref) const
+{
+    if (InitCheck() != B_OK)
+        return B_NO_INIT;
+    const std::filesystem::path path(path_);
+    *ref = {path.parent_path().string(), path.filename().string()};
+    return B_OK;
+}

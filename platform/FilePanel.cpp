@@ -1,0 +1,119 @@
+#include "platform/FilePanel.h"
+
+#include "platform/DialogAnswers.h"
+#include "platform/Entry.h"
+#include "platform/Message.h"
+#include "platform/Path.h"
+#include "platform/View.h"
+#include "platform/Window.h"
+#include "platform/WindowWidget.h"
+
+#include <QFileDialog>
+
+BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const entry_ref* start, uint32,
+                       bool allowMultiple, BMessage* message, bool modal, bool hideWhenDone)
+    : mode_(mode), target_(target != nullptr ? *target : BMessenger()), allowMultiple_(allowMultiple),
+      message_(message != nullptr ? message : new BMessage(mode == B_OPEN_PANEL ? B_REFS_RECEIVED : B_SAVE_REQUESTED)),
+      modal_(modal), hideWhenDone_(hideWhenDone)
+{
+    BPath path;
+    if (start != nullptr && BEntry(start).GetPath(&path) == B_OK)
+        SetPanelDirectory(path.Path());
+}
+
+BFilePanel::~BFilePanel() = default;
+
+QFileDialog& BFilePanel::dialog()
+{
+    if (dialog_ != nullptr)
+        return *dialog_;
+    auto* window = dynamic_cast<BWindow*>(target_.Target());
+    dialog_ = std::make_unique<QFileDialog>(window != nullptr ? &window->widget() : nullptr);
+    dialog_->setObjectName(mode_ == B_OPEN_PANEL ? "OpenPanel" : "SavePanel");
+    dialog_->setWindowTitle(mode_ == B_OPEN_PANEL ? "Load" : "Save");
+    // The desktop's own panel takes no part in this program's event loop and cannot be found by tests.
+    dialog_->setOption(QFileDialog::DontUseNativeDialog);
+    dialog_->setAcceptMode(mode_ == B_OPEN_PANEL ? QFileDialog::AcceptOpen : QFileDialog::AcceptSave);
+    const auto openMode = allowMultiple_ ? QFileDialog::ExistingFiles : QFileDialog::ExistingFile;
+    dialog_->setFileMode(mode_ == B_OPEN_PANEL ? openMode : QFileDialog::AnyFile);
+    dialog_->setModal(modal_);
+    QObject::connect(dialog_.get(), &QFileDialog::accepted, [this] { accept(); });
+    QObject::connect(dialog_.get(), &QFileDialog::rejected, [this] { sendAll(BMessage(B_CANCEL)); });
+    return *dialog_;
+}
+
+void BFilePanel::SetPanelDirectory(const char* path)
+{
+    directory_ = path;
+    if (dialog_ != nullptr)
+        dialog_->setDirectory(QString::fromUtf8(path));
+}
+
+void BFilePanel::Show()
+{
+    if (const auto& answer = DialogAnswers::current().panel) {
+        const std::string path = answer(*this);
+        if (path.empty())
+            sendAll(BMessage(B_CANCEL));
+        else
+            send(path);
+        return;
+    }
+    QFileDialog& shown = dialog();
+    shown.setDirectory(QString::fromStdString(directory_));
+    shown.show();
+    shown.raise();
+    shown.activateWindow();
+}
+
+void BFilePanel::Hide()
+{
+    if (dialog_ != nullptr)
+        dialog_->hide();
+}
+
+bool BFilePanel::IsShowing() const
+{
+    return dialog_ != nullptr && dialog_->isVisible();
+}
+
+void BFilePanel::accept()
+{
+    directory_ = dialog_->directory().absolutePath().toStdString();
+    if (mode_ == B_SAVE_PANEL || !allowMultiple_) {
+        send(dialog_->selectedFiles().value(0).toStdString());
+    } else {
+        BMessage answer = *message_;
+        const auto chosen = dialog_->selectedFiles();
+        for (const auto& file : chosen) {
+            entry_ref ref;
+            if (BEntry(file.toUtf8().constData()).GetRef(&ref) == B_OK)
+                answer.AddRef("refs", &ref);
+        }
+        sendAll(answer);
+    }
+    if (!hideWhenDone_)
+        dialog_->show(); // accepting has hidden it
+}
+
+void BFilePanel::send(const std::string& path) const
+{
+    entry_ref ref;
+    if (BEntry(path.c_str()).GetRef(&ref) != B_OK)
+        return;
+    BMessage answer = *message_;
+    if (mode_ == B_OPEN_PANEL) {
+        answer.AddRef("refs", &ref);
+    } else {
+        entry_ref folder;
+        BEntry(ref.directory.c_str()).GetRef(&folder);
+        answer.AddRef("directory", &folder);
+        answer.AddString("name", ref.name.c_str());
+    }
+    sendAll(answer);
+}
+
+void BFilePanel::sendAll(const BMessage& message) const
+{
+    target_.SendMessage(&message);
+}

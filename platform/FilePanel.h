@@ -1,0 +1,53 @@
+#pragma once
+
+#include "platform/Messenger.h"
+
+#include <memory>
+#include <string>
+
+class BMessage;
+class QFileDialog;
+struct entry_ref;
+
+enum file_panel_mode { B_OPEN_PANEL, B_SAVE_PANEL };
+
+/// Which entries a panel lets a person choose.
+enum : uint32 { B_FILE_NODE = 1, B_DIRECTORY_NODE = 2 };
+
+/// The dialog in which a person chooses a file. It answers with a message to its target.
+///
+/// An open panel sends `B_REFS_RECEIVED` with the chosen files as "refs", a save panel `B_SAVE_REQUESTED` with the
+/// folder as the reference "directory" and the file's name as the string "name"; a save panel has asked before when
+/// there is such a file already. A panel that is left without choice sends `B_CANCEL`.
+class BFilePanel {
+public:
+    /// `target` is copied; `start` may be null. `message`, owned from now on, replaces the code above.
+    explicit BFilePanel(file_panel_mode mode = B_OPEN_PANEL, const BMessenger* target = nullptr,
+                        const entry_ref* start = nullptr, uint32 nodeFlavors = B_FILE_NODE, bool allowMultiple = true,
+                        BMessage* message = nullptr, bool modal = false, bool hideWhenDone = true);
+    ~BFilePanel();
+    BFilePanel(const BFilePanel&) = delete;
+    BFilePanel& operator=(const BFilePanel&) = delete;
+
+    file_panel_mode PanelMode() const { return mode_; }
+    void SetPanelDirectory(const char* path);
+    const std::string& PanelDirectory() const { return directory_; }
+    void Show();
+    void Hide();
+    bool IsShowing() const;
+
+private:
+    QFileDialog& dialog();
+    void accept();
+    void send(const std::string& path) const;
+    void sendAll(const BMessage& message) const;
+
+    file_panel_mode mode_;
+    BMessenger target_;
+    std::string directory_;
+    bool allowMultiple_;
+    std::unique_ptr<BMessage> message_;
+    bool modal_;
+    bool hideWhenDone_;
+    std::unique_ptr<QFileDialog> dialog_; // made when first shown: that takes its time
+};

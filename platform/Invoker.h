@@ -1,0 +1,36 @@
+#pragma once
+
+#include "platform/Message.h"
+#include "platform/Messenger.h"
+
+#include <memory>
+
+/// Something that sends a message of its own to a target when it is used.
+class BInvoker {
+public:
+    /// Owns `message`, which may be null.
+    explicit BInvoker(BMessage* message = nullptr) : message_(message) {}
+    virtual ~BInvoker() = default;
+    BInvoker(const BInvoker&) = delete;
+    BInvoker& operator=(const BInvoker&) = delete;
+
+    /// Takes ownership of `message`; null sends nothing from now on.
+    void SetMessage(BMessage* message) { message_.reset(message); }
+    BMessage* Message() const { return message_.get(); }
+    /// The code of the message, 0 without one.
+    uint32 Command() const { return message_ != nullptr ? message_->what : 0; }
+    /// A view that is told no target sends to its window.
+    void SetTarget(const BHandler* target) { target_ = BMessenger(target); }
+    bool HasTarget() const { return target_.IsValid(); }
+
+    /// Sends a copy of `message`, or of its own one when that is null, to the target.
+    virtual status_t Invoke(const BMessage* message = nullptr)
+    {
+        const BMessage* sent = message != nullptr ? message : message_.get();
+        return sent != nullptr ? target_.SendMessage(sent) : B_BAD_VALUE;
+    }
+
+private:
+    std::unique_ptr<BMessage> message_;
+    BMessenger target_;
+};

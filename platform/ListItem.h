@@ -1,0 +1,32 @@
+#pragma once
+
+#include "platform/Rect.h"
+#include "platform/SupportDefs.h"
+
+#include <string>
+
+class BListView;
+class BView;
+
+/// One row of a list view, which it draws itself.
+class BListItem {
+public:
+    BListItem() = default;
+    virtual ~BListItem() = default;
+    BListItem(const BListItem&) = delete;
+    BListItem& operator=(const BListItem&) = delete;
+
+    /// Draws the row into `frame` of `owner`. The list has painted the ground, in the colour of selected rows where the
+    /// row is selected, and set the high colour to one that can be read on it.
+    virtual void DrawItem(BView* owner, BRect frame, bool complete = false) = 0;
+    /// The row as text: what typing finds it by and what assistive tools say, UTF-8.
+    virtual std::string Text() const = 0;
+
+    bool IsSelected() const { return selected_; }
+
+private:
+    friend class BListView;
+
+    int32 index_ = -1; // in the list, as far as the list keeps it up to date
+    bool selected_ = false;
+};

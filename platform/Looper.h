@@ -1,0 +1,37 @@
+#pragma once
+
+#include "platform/Handler.h"
+
+/// A handler with a queue: messages are posted to it, wait their turn, and are handled one at a time.
+///
+/// All loopers share the program's one thread. `Lock` is what commands take before they touch the model; it counts, so
+/// that they can call one another, and it fails only while the looper is closing.
+class BLooper : public BHandler {
+public:
+    explicit BLooper(const char* name = nullptr) : BHandler(name) {}
+
+    BLooper* Looper() const override { return const_cast<BLooper*>(this); }
+
+    /// Queues a copy of the message, for this looper itself or for `handler`. A message whose receiver dies before its
+    /// turn is dropped.
+    status_t PostMessage(const BMessage* message, BHandler* handler = nullptr);
+    status_t PostMessage(uint32 what, BHandler* handler = nullptr);
+    /// Handles one message, with the looper locked.
+    virtual void DispatchMessage(BMessage* message, BHandler* handler);
+
+    bool Lock();
+    void Unlock();
+    bool IsLocked() const { return locks_ > 0; }
+
+    /// Asked before the looper ends; false refuses.
+    virtual bool QuitRequested() { return true; }
+
+protected:
+    /// From now on `Lock` fails.
+    void beginClosing() { closing_ = true; }
+    bool isClosing() const { return closing_; }
+
+private:
+    int32 locks_ = 0;
+    bool closing_ = false;
+};

@@ -1,0 +1,47 @@
+#pragma once
+
+#include "platform/SupportDefs.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+class BHandler;
+class BMenuItem;
+
+/// A list of choices, of which one is marked at a time. Owns its items.
+class BMenu {
+public:
+    explicit BMenu(const char* name);
+    virtual ~BMenu();
+    BMenu(const BMenu&) = delete;
+    BMenu& operator=(const BMenu&) = delete;
+
+    const char* Name() const { return name_.c_str(); }
+    /// Takes ownership of `item`. @return true
+    bool AddItem(BMenuItem* item);
+    /// Gives the item back to the caller; null out of range.
+    BMenuItem* RemoveItem(int32 index);
+    int32 CountItems() const { return static_cast<int32>(items_.size()); }
+    /// Null out of range.
+    BMenuItem* ItemAt(int32 index) const;
+    /// The first item of that label; null when there is none.
+    BMenuItem* FindItem(const char* label) const;
+    BMenuItem* FindMarked() const;
+    int32 IndexOf(const BMenuItem* item) const;
+    /// All items present send to `target`.
+    void SetTargetForItems(const BHandler* target);
+
+    /// For the platform's own use: told of every change, so that what shows the menu can follow.
+    void setObserver(std::function<void()> observer) { observer_ = std::move(observer); }
+
+private:
+    friend class BMenuItem;
+    void mark(BMenuItem* item, bool marked);
+    void changed() const;
+
+    std::string name_;
+    std::vector<std::unique_ptr<BMenuItem>> items_;
+    std::function<void()> observer_;
+};

@@ -1,0 +1,92 @@
+#include "platform/MenuField.h"
+
+#include "platform/Labels.h"
+#include "platform/Menu.h"
+#include "platform/MenuItem.h"
+#include "platform/Window.h"
+
+#include <QComboBox>
+#include <QLabel>
+#include <QSignalBlocker>
+
+#include <algorithm>
+#include <cmath>
+
+BMenuField::BMenuField(BRect frame, const char* name, const char* label, BMenu* menu, uint32 resizingMode, uint32 flags)
+    : BView(frame, name, resizingMode, flags & ~static_cast<uint32>(B_NAVIGABLE), new QWidget), label_(label),
+      menu_(menu), field_(new QComboBox(widget())), caption_(new QLabel(labelText(label), widget())),
+      divider_(label_.empty() ? 0 : std::floor(frame.Width() / 2))
+{
+    // The menu is what the keyboard reaches, so the menu bears the name.
+    widget()->setObjectName({});
+    field_->setObjectName(QString::fromUtf8(Name()));
+    field_->setAccessibleName(QString::fromUtf8(label));
+    caption_->setBuddy(field_);
+    layOut();
+    fill();
+    menu_->setObserver([this] { fill(); });
+    QObject::connect(field_, &QComboBox::activated, [this](int index) { choose(index); });
+}
+
+BMenuField::~BMenuField() = default;
+
+void BMenuField::layOut()
+{
+    constexpr int kGap = 6; // between label and menu
+    const int width = static_cast<int>(Bounds().Width());
+    const int height = static_cast<int>(Bounds().Height());
+    const int divider = static_cast<int>(divider_);
+    caption_->setGeometry(0, 0, std::max(divider - kGap, 0), height);
+    field_->setGeometry(divider, 0, width - divider, height);
+}
+
+void BMenuField::FrameResized(float, float)
+{
+    layOut();
+}
+
+void BMenuField::fill()
+{
+    const QSignalBlocker silence(field_);
+    QStringList labels;
+    for (int32 i = 0; i < menu_->CountItems(); ++i)
+        labels.append(QString::fromUtf8(menu_->ItemAt(i)->Label()));
+    bool same = field_->count() == labels.size();
+    for (int i = 0; same && i < field_->count(); ++i)
+        same = field_->itemText(i) == labels[i];
+    if (!same) {
+        field_->clear();
+        field_->addItems(labels);
+    }
+    field_->setCurrentIndex(menu_->IndexOf(menu_->FindMarked()));
+}
+
+void BMenuField::choose(int index)
+{
+    BMenuItem* item = menu_->ItemAt(index);
+    if (item == nullptr)
+        return;
+    item->SetMarked(true);
+    if (!item->HasTarget())
+        item->SetTarget(Window());
+    item->Invoke();
+}
+
+void BMenuField::SetDivider(float x)
+{
+    divider_ = x;
+    layOut();
+}
+
+void BMenuField::SetEnabled(bool enabled)
+{
+    widget()->setEnabled(enabled);
+}
+
+void BMenuField::AttachedToWindow()
+{
+    for (int32 i = 0; i < menu_->CountItems(); ++i) {
+        if (!menu_->ItemAt(i)->HasTarget())
+            menu_->ItemAt(i)->SetTarget(Window());
+    }
+}

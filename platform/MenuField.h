@@ -1,0 +1,39 @@
+#pragma once
+
+#include "platform/View.h"
+
+#include <memory>
+#include <string>
+
+class BMenu;
+class QComboBox;
+class QLabel;
+
+/// A label with a menu of which the marked item shows.
+class BMenuField : public BView {
+public:
+    /// Takes ownership of `menu`.
+    BMenuField(BRect frame, const char* name, const char* label, BMenu* menu,
+               uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
+    ~BMenuField() override;
+
+    BMenu* Menu() const { return menu_.get(); }
+    const char* Label() const { return label_.c_str(); }
+    /// Where the menu begins, in pixels from the left.
+    void SetDivider(float x);
+    void SetEnabled(bool enabled);
+    /// Items that have no target send to the window.
+    void AttachedToWindow() override;
+    void FrameResized(float width, float height) override;
+
+private:
+    void layOut();
+    void fill();
+    void choose(int index);
+
+    std::string label_;
+    std::unique_ptr<BMenu> menu_;
+    QComboBox* field_; // a part of the widget
+    QLabel* caption_;  // and so is this
+    float divider_;
+};

@@ -1,0 +1,19 @@
+#include "platform/Screenshot.h"
+
+#include "platform/Window.h"
+#include "platform/WindowWidget.h"
+
+#include <QApplication>
+#include <QPixmap>
+
+status_t save_screenshot(const BWindow& window, const char* path)
+{
+    return window.widget().grab().save(QString::fromUtf8(path), "PNG") ? B_OK : B_ERROR;
+}
+
+void handle_pending_messages()
+{
+    constexpr int kRounds = 10; // a message may post further ones
+    for (int i = 0; i < kRounds; ++i)
+        QApplication::processEvents();
+}

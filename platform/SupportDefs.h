@@ -1,0 +1,20 @@
+#pragma once
+
+#include <cstdint>
+
+using int16 = std::int16_t;
+using int32 = std::int32_t;
+using uint32 = std::uint32_t;
+
+/// Outcome of a call: `B_OK`, or a negative error.
+using status_t = int32;
+
+enum : status_t {
+    B_OK = 0,
+    B_ERROR = -1,
+    B_BAD_VALUE = -2,       ///< an argument that makes no sense here
+    B_NAME_NOT_FOUND = -3,  ///< a message holds nothing under this name
+    B_BAD_INDEX = -4,       ///< and not so many of them
+    B_ENTRY_NOT_FOUND = -5, ///< no such file or folder
+    B_NO_INIT = -6,         ///< the object was never told what it stands for
+};

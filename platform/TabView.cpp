@@ -1,0 +1,50 @@
+#include "platform/TabView.h"
+
+#include "platform/Labels.h"
+
+#include <QTabBar>
+#include <QTabWidget>
+
+BTabView::BTabView(BRect frame, const char* name, button_width, uint32 resizingMode, uint32 flags)
+    : BView(frame, name, resizingMode, flags, new QTabWidget)
+{
+    tabWidget().setFocusPolicy(Qt::NoFocus); // its bar has the keyboard
+    tabWidget().setDocumentMode(true);
+    tabWidget().tabBar()->setObjectName(QString::fromUtf8(Name()) + "Bar");
+    tabWidget().tabBar()->setAccessibleName(QString::fromUtf8(Name()));
+    tabWidget().tabBar()->setExpanding(false);
+}
+
+BTabView::~BTabView()
+{
+    while (CountChildren() > 0)
+        delete ChildAt(CountChildren() - 1);
+}
+
+QTabWidget& BTabView::tabWidget() const
+{
+    return *static_cast<QTabWidget*>(widget());
+}
+
+void BTabView::AddTab(BView* target, BTab* tab)
+{
+    tabs_.emplace_back(tab);
+    host_ = new QWidget;
+    tabWidget().addTab(host_, labelText(tab->Label()));
+    AddChild(target);
+}
+
+BTab* BTabView::TabAt(int32 index) const
+{
+    return index >= 0 && index < CountTabs() ? tabs_[static_cast<std::size_t>(index)].get() : nullptr;
+}
+
+void BTabView::Select(int32 index)
+{
+    tabWidget().setCurrentIndex(index);
+}
+
+int32 BTabView::Selection() const
+{
+    return tabWidget().currentIndex();
+}

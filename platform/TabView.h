@@ -1,0 +1,33 @@
+#pragma once
+
+#include "platform/Tab.h"
+#include "platform/View.h"
+
+#include <memory>
+#include <vector>
+
+class QTabWidget;
+
+/// A row of tabs, each showing its view when it is chosen.
+class BTabView : public BView {
+public:
+    BTabView(BRect frame, const char* name, button_width width = B_WIDTH_AS_USUAL, uint32 resizingMode = B_FOLLOW_ALL,
+             uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
+    ~BTabView() override;
+
+    /// Takes ownership of both. The view keeps its frame, counted from below the tabs; what does not fit is cut off.
+    void AddTab(BView* target, BTab* tab);
+    int32 CountTabs() const { return static_cast<int32>(tabs_.size()); }
+    BTab* TabAt(int32 index) const;
+    virtual void Select(int32 index);
+    /// Index of the tab that is shown, negative without any.
+    int32 Selection() const;
+
+    QWidget* childHost() const override { return host_; }
+
+private:
+    QTabWidget& tabWidget() const;
+
+    std::vector<std::unique_ptr<BTab>> tabs_;
+    QWidget* host_ = nullptr; // the page that the next child goes into
+};

@@ -1,0 +1,146 @@
+#include "platform/TextControl.h"
+
+#include "platform/Keys.h"
+#include "platform/Labels.h"
+
+#include <QKeyEvent>
+#include <QLabel>
+#include <QLineEdit>
+
+#include <cmath>
+
+namespace {
+
+/// Gives the control's `KeyDown` what the field itself has no use for.
+class Field final : public QLineEdit {
+public:
+    using QLineEdit::QLineEdit;
+
+    BView* view = nullptr;
+
+protected:
+    void keyPressEvent(QKeyEvent* event) override
+    {
+        // Enter is the field's: it sends the message, and must not reach a default button.
+        if (event->key() == Qt::Key_Up || event->key() == Qt::Key_Down || event->key() == Qt::Key_PageUp ||
+            event->key() == Qt::Key_PageDown) {
+            const std::string bytes = keyBytes(*event);
+            view->KeyDown(bytes.c_str(), static_cast<int32>(bytes.size()));
+            return;
+        }
+        QLineEdit::keyPressEvent(event);
+    }
+};
+
+Qt::Alignment toQt(alignment side)
+{
+    const Qt::Alignment level = side == B_ALIGN_LEFT    ? Qt::AlignLeft
+                                : side == B_ALIGN_RIGHT ? Qt::AlignRight
+                                                        : Qt::AlignHCenter;
+    return level | Qt::AlignVCenter;
+}
+
+} // namespace
+
+BTextControl::BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message,
+                           uint32 resizingMode, uint32 flags)
+    : BControl(frame, name, label, message, resizingMode, flags & ~static_cast<uint32>(B_NAVIGABLE), new QWidget),
+      field_(new Field(widget())), caption_(new QLabel(labelText(label), widget())),
+      divider_(std::floor(frame.Width() / 2)), committed_(text != nullptr ? text : "")
+{
+    // The field is what the keyboard reaches, so the field bears the name.
+    widget()->setObjectName({});
+    static_cast<Field*>(field_)->view = this;
+    field_->setObjectName(QString::fromUtf8(Name()));
+    field_->setAccessibleName(QString::fromUtf8(Label()));
+    field_->setText(QString::fromUtf8(text));
+    caption_->setBuddy(field_);
+    if (*Label() == '\0')
+        divider_ = 0;
+    layOut();
+    QObject::connect(field_, &QLineEdit::returnPressed, [this] {
+        committed_ = Text();
+        Invoke();
+    });
+    QObject::connect(field_, &QLineEdit::editingFinished, [this] { commit(); });
+    QObject::connect(field_, &QLineEdit::textEdited, [this] { TextModified(); });
+}
+
+void BTextControl::AttachedToWindow()
+{
+    BControl::AttachedToWindow();
+    widget()->setFocusProxy(field_);
+}
+
+void BTextControl::layOut()
+{
+    constexpr int kGap = 6; // between label and field
+    const int width = static_cast<int>(Bounds().Width());
+    const int height = static_cast<int>(Bounds().Height());
+    const int divider = static_cast<int>(divider_);
+    caption_->setGeometry(0, 0, std::max(divider - kGap, 0), height);
+    field_->setGeometry(divider, 0, width - divider, height);
+}
+
+void BTextControl::FrameResized(float, float)
+{
+    layOut();
+}
+
+void BTextControl::commit()
+{
+    if (committed_ == Text())
+        return;
+    committed_ = Text();
+    Invoke();
+}
+
+const char* BTextControl::Text() const
+{
+    text_ = field_->text().toStdString();
+    return text_.c_str();
+}
+
+void BTextControl::SetText(const char* text)
+{
+    field_->setText(QString::fromUtf8(text));
+    field_->setCursorPosition(0);
+    committed_ = Text();
+}
+
+void BTextControl::SetDivider(float x)
+{
+    divider_ = x;
+    layOut();
+}
+
+void BTextControl::SetAlignment(alignment label, alignment text)
+{
+    caption_->setAlignment(toQt(label));
+    field_->setAlignment(toQt(text));
+}
+
+void BTextControl::SetLabel(const char* label)
+{
+    BControl::SetLabel(label);
+    caption_->setText(labelText(label));
+    field_->setAccessibleName(QString::fromUtf8(label));
+}
+
+void BTextControl::SetEditable(bool editable)
+{
+    field_->setReadOnly(!editable);
+    QPalette colors = caption_->palette();
+    if (!editable)
+        colors.setColor(QPalette::Base, QColor(236, 236, 236));
+    field_->setPalette(colors);
+}
+
+void BTextControl::MarkAsInvalid(const char* reason)
+{
+    QPalette colors = caption_->palette();
+    if (reason != nullptr)
+        colors.setColor(QPalette::Base, QColor(255, 214, 209));
+    field_->setPalette(colors);
+    field_->setToolTip(QString::fromUtf8(reason));
+}

@@ -1,0 +1,45 @@
+#pragma once
+
+#include "platform/Control.h"
+
+#include <string>
+
+class QLabel;
+class QLineEdit;
+
+/// A label with a field for one line of text, UTF-8.
+///
+/// Sends its message when Enter is pressed, and when the keyboard leaves a text that was changed by hand.
+class BTextControl : public BControl {
+public:
+    BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message,
+                 uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
+
+    /// The text belongs to the control and is valid until it changes.
+    const char* Text() const;
+    /// Sends no message.
+    void SetText(const char* text);
+    /// Where the field begins, in pixels from the left; 0 leaves no room for the label.
+    void SetDivider(float x);
+    float Divider() const { return divider_; }
+    void SetAlignment(alignment label, alignment text);
+    void SetLabel(const char* label) override;
+    void SetEditable(bool editable);
+    /// Shows by colour that the text is not understood, with the reason as tool tip; null takes the colour away.
+    void MarkAsInvalid(const char* reason);
+
+    /// Hook: the text was changed by hand and not sent yet.
+    virtual void TextModified() {}
+    void FrameResized(float width, float height) override;
+    void AttachedToWindow() override;
+
+private:
+    void layOut();
+    void commit();
+
+    QLineEdit* field_; // a part of the widget
+    QLabel* caption_;  // and so is this
+    float divider_;
+    std::string committed_;
+    mutable std::string text_; // what `Text` has given away
+};

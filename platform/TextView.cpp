@@ -1,0 +1,26 @@
+#include "platform/TextView.h"
+
+#include <QPlainTextEdit>
+
+BTextView::BTextView(BRect frame, const char* name, uint32 resizingMode, uint32 flags)
+    : BView(frame, name, resizingMode, flags, new QPlainTextEdit)
+{
+    field().setTabChangesFocus(true);
+    SetAccessibleName(name);
+}
+
+QPlainTextEdit& BTextView::field() const
+{
+    return *static_cast<QPlainTextEdit*>(widget());
+}
+
+const char* BTextView::Text() const
+{
+    text_ = field().toPlainText().toStdString();
+    return text_.c_str();
+}
+
+void BTextView::SetText(const char* text)
+{
+    field().setPlainText(QString::fromUtf8(text));
+}

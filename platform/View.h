@@ -1,0 +1,141 @@
+#pragma once
+
+#include "platform/Font.h"
+#include "platform/GraphicsDefs.h"
+#include "platform/Handler.h"
+#include "platform/InterfaceDefs.h"
+#include "platform/Rect.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+class BMessage;
+class BWindow;
+class Canvas;
+class QPainter;
+class QWidget;
+
+/// A rectangular part of a window that draws itself and answers to mouse and keyboard.
+///
+/// What a view draws goes into a picture of its own, so drawing is allowed at any time and stays until the next `Draw`;
+/// `Sync` puts it on the screen at once. Coordinates are the view's own: (0, 0) is its left top corner.
+///
+/// Owns its children. A view that stands in a window or in another view is owned by that.
+class BView : public BHandler {
+public:
+    /// `frame` is in the coordinates of the parent to come. `name` is what tests and assistive tools find it by.
+    BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags);
+    ~BView() override;
+
+    // The tree of views.
+    /// Takes ownership of `child`, which belongs to no other parent.
+    void AddChild(BView* child);
+    /// Gives `child` back to the caller. @return false when it is not a child of this view.
+    bool RemoveChild(BView* child);
+    /// @return null out of range.
+    BView* ChildAt(int32 index) const;
+    int32 CountChildren() const { return static_cast<int32>(children_.size()); }
+    BView* Parent() const { return parent_; }
+    /// The window the view stands in, null while it stands in none.
+    BWindow* Window() const { return window_; }
+    BLooper* Looper() const override;
+    /// This view or the first one within it of that name; null when there is none.
+    BView* FindView(const char* name);
+
+    // Place and size.
+    BRect Frame() const { return frame_; }
+    BRect Bounds() const { return frame_.OffsetToCopy(0, 0); }
+    void MoveTo(float x, float y);
+    /// The children follow by their resizing modes.
+    void ResizeTo(float width, float height);
+    uint32 ResizingMode() const { return resizingMode_; }
+    uint32 Flags() const { return flags_; }
+    void Hide();
+    void Show();
+    /// True when this view or one around it was hidden.
+    bool IsHidden() const;
+
+    // Keyboard focus and what assistive tools say.
+    void MakeFocus(bool focus = true);
+    bool IsFocus() const;
+    void SetAccessibleName(const char* text);
+    void SetToolTip(const char* text);
+
+    // Hooks.
+    virtual void AttachedToWindow() {}
+    virtual void AllAttached() {}
+    virtual void Draw(BRect updateRect);
+    virtual void FrameResized(float width, float height);
+    virtual void MouseDown(BPoint where);
+    virtual void MouseUp(BPoint where);
+    /// Also while no button is held. `inside` is false once, when the pointer has left.
+    virtual void MouseMoved(BPoint where, bool inside);
+    /// `bytes` is the UTF-8 text of the key, or one of the control characters of InterfaceDefs.h.
+    virtual void KeyDown(const char* bytes, int32 numBytes);
+
+    // Drawing state.
+    void SetViewColor(rgb_color color);
+    rgb_color ViewColor() const;
+    void SetHighColor(rgb_color color);
+    rgb_color HighColor() const;
+    void SetLowColor(rgb_color color);
+    rgb_color LowColor() const;
+    void SetPenSize(float size);
+    float PenSize() const;
+    void SetDrawingMode(drawing_mode mode);
+    void SetFont(const BFont* font, uint32 mask = B_FONT_ALL);
+    void SetFontSize(float size);
+    void GetFont(BFont* font) const;
+    float StringWidth(const char* text) const;
+    /// Nothing is drawn outside `area` until the next call; an invalid rectangle lifts the limit.
+    void SetClipping(BRect area);
+
+    // Drawing. Upright and level lines are sharp, others smooth.
+    void FillRect(BRect rect, pattern p = B_SOLID_HIGH);
+    void StrokeRect(BRect rect, pattern p = B_SOLID_HIGH);
+    void StrokeLine(BPoint from, BPoint to, pattern p = B_SOLID_HIGH);
+    /// Lines that are drawn together, each in its own colour: begin, add them, end.
+    void BeginLineArray(int32 count);
+    void AddLine(BPoint from, BPoint to, rgb_color color);
+    void EndLineArray();
+    void FillPolygon(const BPoint* points, int32 count, pattern p = B_SOLID_HIGH);
+    void StrokePolygon(const BPoint* points, int32 count, bool closed = true, pattern p = B_SOLID_HIGH);
+    void FillTriangle(BPoint a, BPoint b, BPoint c, pattern p = B_SOLID_HIGH);
+    /// Angles in degrees, counter-clockwise from the right.
+    void FillArc(BPoint center, float xRadius, float yRadius, float startAngle, float arcAngle,
+                 pattern p = B_SOLID_HIGH);
+    /// `where` is the left end of the base line; `text` is UTF-8.
+    void DrawString(const char* text, BPoint where);
+
+    /// Has `Draw` called again, later.
+    void Invalidate();
+    /// Puts what was drawn on the screen before it returns.
+    void Sync();
+
+    /// What the platform shows this view with, and what its children are put into. For the platform's own use.
+    QWidget* widget() const { return widget_; }
+    virtual QWidget* childHost() const { return widget_; }
+    Canvas& canvas() const { return *canvas_; }
+    void setWindow(BWindow* window);
+    void paintOn(QPainter& screen);
+
+protected:
+    /// A view that is shown by `widget`, which it owns.
+    BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags, QWidget* widget);
+
+private:
+    void placeWidget();
+    void followParent(float dx, float dy);
+    void drawAll();
+
+    BRect frame_;
+    uint32 resizingMode_;
+    uint32 flags_;
+    BView* parent_ = nullptr;
+    BWindow* window_ = nullptr;
+    bool hidden_ = false;
+    std::vector<BView*> children_; // owned
+    QWidget* widget_;              // owned
+    std::unique_ptr<Canvas> canvas_;
+};

@@ -1,0 +1,69 @@
+#include "platform/ViewWidget.h"
+
+#include "platform/Keys.h"
+#include "platform/View.h"
+
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QPainter>
+
+namespace {
+
+BPoint at(const QMouseEvent& event)
+{
+    return {static_cast<float>(event.position().x()), static_cast<float>(event.position().y())};
+}
+
+} // namespace
+
+ViewWidget::ViewWidget(BView& view) : view_(view)
+{
+    setMouseTracking(true);
+}
+
+void ViewWidget::paintEvent(QPaintEvent*)
+{
+    QPainter screen(this);
+    view_.paintOn(screen);
+}
+
+void ViewWidget::mousePressEvent(QMouseEvent* event)
+{
+    view_.MouseDown(at(*event));
+}
+
+void ViewWidget::mouseReleaseEvent(QMouseEvent* event)
+{
+    view_.MouseUp(at(*event));
+}
+
+void ViewWidget::mouseMoveEvent(QMouseEvent* event)
+{
+    view_.MouseMoved(at(*event), rect().contains(event->position().toPoint()));
+}
+
+void ViewWidget::leaveEvent(QEvent*)
+{
+    view_.MouseMoved({-1, -1}, false);
+}
+
+void ViewWidget::keyPressEvent(QKeyEvent* event)
+{
+    const std::string bytes = keyBytes(*event);
+    if (bytes.empty())
+        QWidget::keyPressEvent(event);
+    else
+        view_.KeyDown(bytes.c_str(), static_cast<int32>(bytes.size()));
+}
+
+void ViewWidget::focusInEvent(QFocusEvent* event)
+{
+    view_.Invalidate();
+    QWidget::focusInEvent(event);
+}
+
+void ViewWidget::focusOutEvent(QFocusEvent* event)
+{
+    view_.Invalidate();
+    QWidget::focusOutEvent(event);
+}

@@ -1,0 +1,133 @@
+#include "platform/Window.h"
+
+#include "platform/View.h"
+#include "platform/WindowWidget.h"
+
+#include <QApplication>
+
+#include <algorithm>
+#include <cmath>
+#include <vector>
+
+namespace {
+
+std::vector<BWindow*>& windows()
+{
+    static std::vector<BWindow*> all;
+    return all;
+}
+
+/// The view around a window's views, of the window's size.
+class RootView final : public BView {
+public:
+    explicit RootView(BRect frame) : BView(frame, "", B_FOLLOW_ALL, B_WILL_DRAW)
+    {
+        constexpr rgb_color kPanelGrey = {216, 216, 216, 255};
+        SetViewColor(kPanelGrey);
+    }
+};
+
+BView* viewOf(BView* view, const QWidget* widget)
+{
+    if (view->widget() == widget)
+        return view;
+    for (int32 i = 0; i < view->CountChildren(); ++i) {
+        if (BView* found = viewOf(view->ChildAt(i), widget))
+            return found;
+    }
+    return nullptr;
+}
+
+} // namespace
+
+BWindow::BWindow(BRect frame, const char* title, window_type, uint32 flags, uint32)
+    : BLooper(title), frame_(frame), title_(title), widget_(std::make_unique<WindowWidget>(*this)),
+      root_(std::make_unique<RootView>(frame.OffsetToCopy(0, 0)))
+{
+    widget_->setWindowTitle(QString::fromUtf8(title));
+    const QSize size(static_cast<int>(frame.Width()), static_cast<int>(frame.Height()));
+    widget_->fitTo(size, (flags & B_NOT_RESIZABLE) == 0);
+    widget_->move(static_cast<int>(frame.left), static_cast<int>(frame.top));
+    root_->setWindow(this);
+    widget_->setWidget(root_->widget());
+    windows().push_back(this);
+}
+
+BWindow::~BWindow()
+{
+    beginClosing();
+    widget_->hide();
+    std::erase(windows(), this);
+    widget_->takeWidget(); // the view owns it
+    root_.reset();
+}
+
+void BWindow::AddChild(BView* view)
+{
+    root_->AddChild(view);
+}
+
+BView* BWindow::FindView(const char* name) const
+{
+    return root_->FindView(name);
+}
+
+BView* BWindow::CurrentFocus() const
+{
+    // A native control may have the keyboard in a part of its own.
+    for (const QWidget* widget = widget_->focusWidget(); widget != nullptr; widget = widget->parentWidget()) {
+        if (BView* view = viewOf(root_.get(), widget))
+            return view != root_.get() ? view : nullptr;
+    }
+    return nullptr;
+}
+
+void BWindow::Show()
+{
+    widget_->show();
+}
+
+void BWindow::Hide()
+{
+    widget_->hide();
+}
+
+bool BWindow::IsHidden() const
+{
+    return !widget_->isVisible();
+}
+
+void BWindow::Activate()
+{
+    widget_->raise();
+    widget_->activateWindow();
+}
+
+void BWindow::Quit()
+{
+    delete this;
+}
+
+bool BWindow::closeByHand()
+{
+    if (isClosing())
+        return true;
+    if (!QuitRequested())
+        return false;
+    beginClosing();
+    // The desktop's side is still at work on this very window.
+    QMetaObject::invokeMethod(
+        qApp,
+        [self = token()] {
+            if (auto* window = dynamic_cast<BWindow*>(BHandler::withToken(self)))
+                window->Quit();
+        },
+        Qt::QueuedConnection);
+    return true;
+}
+
+void BWindow::closeAll()
+{
+    while (!windows().empty())
+        windows().back()->Quit();
+}

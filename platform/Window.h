@@ -1,0 +1,57 @@
+#pragma once
+
+#include "platform/Looper.h"
+#include "platform/Rect.h"
+
+#include <memory>
+#include <string>
+
+class BView;
+class WindowWidget;
+
+enum window_type { B_TITLED_WINDOW };
+
+enum : uint32 { B_NOT_RESIZABLE = 2 };
+
+constexpr uint32 B_CURRENT_WORKSPACE = 0;
+
+/// A window on the desktop, and the looper of all that stands in it.
+///
+/// Owns its views. The window belongs to itself: `Quit` destroys it, closing it by hand does so when `QuitRequested`
+/// agrees, and the application destroys those that are left. On a screen smaller than its frame it shrinks to what fits
+/// and scrolls its content.
+class BWindow : public BLooper {
+public:
+    /// `frame` is in screen coordinates, without title bar and borders.
+    BWindow(BRect frame, const char* title, window_type type, uint32 flags, uint32 workspaces = B_CURRENT_WORKSPACE);
+    ~BWindow() override;
+
+    const char* Title() const { return title_.c_str(); }
+    BRect Frame() const { return frame_; }
+    BRect Bounds() const { return frame_.OffsetToCopy(0, 0); }
+
+    /// Takes ownership of `view`.
+    void AddChild(BView* view);
+    BView* FindView(const char* name) const;
+    /// The view that has the keyboard, null when none has.
+    BView* CurrentFocus() const;
+
+    void Show();
+    void Hide();
+    bool IsHidden() const;
+    void Activate();
+    /// Destroys the window.
+    virtual void Quit();
+
+    /// What Qt shows the window with. For the platform's own use.
+    WindowWidget& widget() const { return *widget_; }
+    /// The window is asked to close by the person. @return false to stay.
+    bool closeByHand();
+    static void closeAll();
+
+private:
+    BRect frame_;
+    std::string title_;
+    std::unique_ptr<WindowWidget> widget_;
+    std::unique_ptr<BView> root_; // holds the views
+};
