@@ -1,7 +1,8 @@
 #include "tools/DateText.h"
 
+#include "foundation/Today.h"
+
 #include <charconv>
-#include <ctime>
 
 namespace {
 
@@ -13,14 +14,6 @@ int numberOf(std::string_view text, std::size_t shortest, std::size_t longest)
     int number = -1;
     std::from_chars(text.data(), text.data() + text.size(), number);
     return number;
-}
-
-Date today()
-{
-    const std::time_t now = std::time(nullptr);
-    std::tm local{};
-    localtime_r(&now, &local);
-    return {static_cast<short>(local.tm_mday), static_cast<short>(local.tm_mon + 1), local.tm_year + 1900};
 }
 
 } // namespace
