@@ -1,5 +1,5 @@
 #include "market/Catalogue.h"
-#include "tools/AtomicFile.h"
+#include "foundation/AtomicFile.h"
 #include "tools/Importer.h"
 #include "tools/Program.h"
 

@@ -1,6 +1,6 @@
 #include "market/Catalogue.h"
 #include "portfolio/Wallet.h"
-#include "tools/AtomicFile.h"
+#include "foundation/AtomicFile.h"
 #include "tools/DateText.h"
 #include "tools/Program.h"
 #include "tools/SampleMarket.h"

@@ -3,7 +3,6 @@
 #include "market/Currency.h"
 #include "market/Market.h"
 #include "tests/support/ToolRun.h"
-#include "tools/AtomicFile.h"
 #include "tools/CsvReader.h"
 #include "tools/DateText.h"
 #include "tools/Importer.h"
@@ -216,32 +215,6 @@ TEST_F(ImportTest, TheRowComesBeforeTheListingAndThatBeforeTheOptions)
                                          "XETRA/VOW/VOW/EUR 03/01/2005=7", "NYSE/IBM/IBM/USD 03/01/2005=3",
                                          "Wien/BMW/BMW AG/USD 03/01/2005=4", "SIX/ABB/ABB/CHF 03/01/2005=5"));
     EXPECT_EQ(importer.counts().skipped, 4U) << "XETRA in USD, CHF without a market, no ticker, SIX in EUR";
-}
-
-TEST_F(ImportTest, AnAtomicFileIsWholeOrNotThere)
-{
-    {
-        AtomicFile abandoned(path("new"), AtomicFile::Existing::kKeep);
-    }
-    EXPECT_TRUE(fs::is_empty(folder_.path));
-
-    file("old", "old");
-    fs::permissions(path("old"), fs::perms::owner_read | fs::perms::owner_write);
-    fs::create_symlink("old", path("link"));
-    EXPECT_THROW(AtomicFile(path("link"), AtomicFile::Existing::kKeep), std::runtime_error);
-    AtomicFile replacing(path("link"), AtomicFile::Existing::kReplace);
-    std::fputs("new", replacing.stream());
-    EXPECT_EQ(content("old"), "old") << "before the commit";
-    replacing.commit();
-    EXPECT_EQ(content("old"), "new");
-    EXPECT_TRUE(fs::is_symlink(path("link")));
-    EXPECT_EQ(fs::status(path("old")).permissions(), fs::perms::owner_read | fs::perms::owner_write);
-
-    AtomicFile late(path("late"), AtomicFile::Existing::kKeep);
-    file("late", "somebody else's");
-    EXPECT_THROW(late.commit(), std::runtime_error);
-    EXPECT_EQ(content("late"), "somebody else's");
-    EXPECT_THROW(AtomicFile::check("/dev/null", AtomicFile::Existing::kReplace), std::runtime_error);
 }
 
 TEST_F(ImportTest, TheProgramWritesAFileThatTheCatalogueReads)

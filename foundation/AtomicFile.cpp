@@ -1,0 +1,216 @@
+#include "foundation/AtomicFile.h"
+
+#include "foundation/Folders.h"
+
+#include <cerrno>
+#include <cstring>
+#include <fcntl.h>
+#include <filesystem>
+#include <string_view>
+#include <sys/file.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace {
+
+namespace fs = std::filesystem;
+
+constexpr std::string_view kPrefix = ".pelorin-";
+constexpr std::string_view kSuffix = ".tmp";
+
+template <class Error>
+[[noreturn]] void failFor(const std::string& path, const char* what)
+{
+    throw Error(path + ": " + what + ": " + std::strerror(errno));
+}
+
+template <class Error>
+[[noreturn]] void failForExisting(const std::string& path)
+{
+    throw Error(path + ": exists already and is left as it is");
+}
+
+/// What `path` leads to, which need not exist. The caller has seen that its links end somewhere.
+std::string withoutLinks(const std::string& path)
+{
+    constexpr int kMaxLinks = 40; // those of a ring that has come up since
+    std::error_code error;
+    fs::path target = path;
+    for (int i = 0; i < kMaxLinks && fs::is_symlink(target, error); ++i)
+        target = target.parent_path() / fs::read_symlink(target, error);
+    const fs::path folder = fs::canonical(folderOf(target), error);
+    return error ? target : folder / target.filename();
+}
+
+/// Locks a temporary file that was just created. @return false when it was taken for a left-over before it was locked.
+bool lockCreated(int descriptor)
+{
+    while (flock(descriptor, LOCK_EX) != 0 && errno == EINTR) {
+    }
+    struct stat status;
+    return fstat(descriptor, &status) != 0 || status.st_nlink > 0;
+}
+
+/// Creates and locks a file in `folder`. @return its descriptor, with `*name` set; -1 with errno set.
+int createIn(const std::string& folder, mode_t mode, std::string* name)
+{
+    // A name of its own length, since that of the target may already be as long as the file system allows. It never
+    // comes twice, so that nobody takes a new file for the left-over that he has just seen under that name.
+    static unsigned number = 0;
+    const std::string stem = folder + '/' + std::string(kPrefix) + std::to_string(getpid()) + '-';
+    constexpr int kAttempts = 100; // a crash may have left such a file behind
+    for (int i = 0; i < kAttempts; ++i) {
+        *name = stem + std::to_string(number++) + std::string(kSuffix);
+        const int descriptor = open(name->c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode);
+        if (descriptor < 0 && errno != EEXIST)
+            return -1;
+        if (descriptor >= 0 && lockCreated(descriptor))
+            return descriptor;
+        if (descriptor >= 0)
+            close(descriptor);
+    }
+    errno = EEXIST;
+    return -1;
+}
+
+/// Removes a temporary file unless somebody has it locked: he is still writing it.
+void removeUnlessLocked(const std::string& path)
+{
+    constexpr int kFlags = O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC;
+    int descriptor = open(path.c_str(), O_RDONLY | kFlags);
+    if (descriptor < 0)
+        descriptor = open(path.c_str(), O_WRONLY | kFlags);
+    if (descriptor < 0)
+        return;
+    if (flock(descriptor, LOCK_EX | LOCK_NB) == 0)
+        unlink(path.c_str());
+    close(descriptor);
+}
+
+void removeLeftOvers(const std::string& folder)
+{
+    std::error_code error;
+    for (fs::directory_iterator entry(folder, error); !error && entry != fs::directory_iterator();
+         entry.increment(error)) {
+        const std::string name = entry->path().filename();
+        if (name.starts_with(kPrefix) && name.ends_with(kSuffix))
+            removeUnlessLocked(entry->path());
+    }
+}
+
+} // namespace
+
+void AtomicFile::check(const std::string& path, Existing existing)
+{
+    struct stat status;
+    if (lstat(path.c_str(), &status) != 0) {
+        // An empty name is refused here: it would be found to be no name only after the writing.
+        if (errno != ENOENT || path.empty())
+            failFor<OpenError>(path, "cannot be opened");
+        return;
+    }
+    if (existing == Existing::kKeep)
+        failForExisting<OpenError>(path);
+    if (stat(path.c_str(), &status) != 0) {
+        if (errno != ENOENT)
+            failFor<OpenError>(path, "cannot be opened");
+        return; // a link to a file that is yet to be made
+    }
+    // Renaming would put a file in the place of a device or a pipe.
+    if (!S_ISREG(status.st_mode))
+        throw OpenError(path + ": is not an ordinary file");
+    // It would also replace a file that its owner has protected.
+    if (faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) != 0)
+        failFor<OpenError>(path, "cannot be opened");
+}
+
+AtomicFile::AtomicFile(const std::string& path, Existing existing) : path_(path), existing_(existing)
+{
+    check(path, existing);
+    target_ = withoutLinks(path);
+    create();
+}
+
+AtomicFile::~AtomicFile()
+{
+    if (!temporary_.empty())
+        unlink(temporary_.c_str());
+    if (stream_ != nullptr)
+        std::fclose(stream_);
+}
+
+void AtomicFile::create()
+{
+    const std::string folder = folderOf(target_);
+    removeLeftOvers(folder);
+    // Until it has the permissions of the file that it replaces, its contents are for nobody else.
+    struct stat status;
+    const mode_t mode = lstat(target_.c_str(), &status) == 0 ? 0600 : 0666;
+    const int descriptor = createIn(folder, mode, &temporary_);
+    if (descriptor < 0) {
+        temporary_.clear();
+        failFor<OpenError>(path_, "cannot be created");
+    }
+    stream_ = fdopen(descriptor, "wb");
+    if (stream_ == nullptr) {
+        close(descriptor);
+        unlink(temporary_.c_str());
+        failFor<OpenError>(path_, "cannot be created");
+    }
+}
+
+void AtomicFile::flush()
+{
+    // The reason of a write that failed earlier may be forgotten by now.
+    if (std::ferror(stream_) != 0 && errno == 0)
+        errno = EIO;
+    if (std::ferror(stream_) != 0 || std::fflush(stream_) != 0 || fsync(fileno(stream_)) != 0)
+        fail("cannot be written");
+}
+
+void AtomicFile::commit()
+{
+    keepPermissions();
+    flush();
+    giveName();
+    temporary_.clear();
+    // Closed only now, because that unlocks it.
+    std::fclose(stream_);
+    stream_ = nullptr;
+    syncFolder(folderOf(target_));
+}
+
+void AtomicFile::keepPermissions() const
+{
+    struct stat former;
+    if (existing_ != Existing::kReplace || stat(target_.c_str(), &former) != 0)
+        return;
+    constexpr auto kSameOwner = static_cast<uid_t>(-1);
+    const int file = fileno(stream_);
+    mode_t mode = former.st_mode & 0777;
+    if (fchown(file, former.st_uid, former.st_gid) != 0 && fchown(file, kSameOwner, former.st_gid) != 0)
+        mode = (mode & ~S_IRWXG) | (mode & S_IRWXO) << 3; // another group may do what everybody may
+    (void)fchmod(file, mode);
+}
+
+void AtomicFile::giveName()
+{
+    if (existing_ == Existing::kKeep) {
+        // Unlike a rename, a link never replaces a file that has come up since the check.
+        if (link(temporary_.c_str(), target_.c_str()) == 0) {
+            unlink(temporary_.c_str());
+            return;
+        }
+        struct stat status;
+        if (lstat(target_.c_str(), &status) == 0)
+            failForExisting<WriteError>(path_);
+        // a file system without links
+    }
+    if (rename(temporary_.c_str(), target_.c_str()) != 0)
+        fail("cannot be replaced");
+}
+
+void AtomicFile::fail(const char* what) const
+{
+    failFor<WriteError>(path_, what);
+}
