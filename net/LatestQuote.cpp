@@ -1,0 +1,67 @@
+#include "net/LatestQuote.h"
+
+#include "foundation/Today.h"
+#include "market/Company.h"
+#include "net/PageText.h"
+#include "net/PageTransfer.h"
+
+#include <algorithm>
+
+namespace {
+
+constexpr std::size_t kPageLimit = 5000; // characters
+
+/// Takes the next token off the front of `*text`; empty at its end.
+///
+/// The delimiters are the characters of the tags between the numbers, so letters are among them.
+std::string_view takeToken(std::string_view* text)
+{
+    constexpr std::string_view kDelimiters = " <sup>/b";
+    text->remove_prefix(std::min(text->find_first_not_of(kDelimiters), text->size()));
+    const std::string_view token = text->substr(0, text->find_first_of(kDelimiters));
+    text->remove_prefix(token.size());
+    return token;
+}
+
+float singleOf(std::string_view token)
+{
+    return static_cast<float>(leadingNumber(token));
+}
+
+} // namespace
+
+int parseLatestQuotePage(std::string_view page, float* price)
+{
+    const std::string_view text = page.substr(0, page.find('\0'));
+    const std::size_t cell = endOfMarker(text, "<td nowrap><b>");
+    if (cell == text.npos)
+        return -1;
+    std::string_view rest = text.substr(cell);
+    const std::string_view whole = takeToken(&rest);
+    if (whole.empty())
+        return -1;
+    const std::string_view numerator = takeToken(&rest);
+    const float denominator = singleOf(takeToken(&rest));
+    *price = singleOf(whole);
+    const bool closesCell = numerator.starts_with('t'); // "</td>"
+    if (!closesCell && denominator != 0)
+        *price += singleOf(numerator) / denominator;
+    return 0;
+}
+
+int Company::getInternetLastQuote(const String& host, const String& path, float* value, Date* date) const
+{
+    *date = today();
+    // Its destructor closes it: closing it here, too, would close the number twice, which a thread of the user
+    // interface may have been given in between.
+    Socket socket;
+    if (connectToQuotes(&socket, host) != 0)
+        return -1;
+    *value = 0;
+    String request(path);
+    request += getAbbreviation();
+    std::string page;
+    if (requestPage(&socket, request, kPageLimit, &page) != 0)
+        return -1;
+    return parseLatestQuotePage(page, value);
+}

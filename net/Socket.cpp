@@ -1,0 +1,270 @@
+#include "net/Socket.h"
+
+#include "foundation/Error.h"
+#include "foundation/FieldIO.h"
+
+#include <algorithm>
+#include <arpa/inet.h>
+#include <cerrno>
+#include <cstring>
+#include <netdb.h>
+#include <poll.h>
+#include <string>
+#include <sys/socket.h>
+#include <unistd.h>
+
+char Socket::SOCKETString[8];
+short Socket::SOCKETCounter;
+
+Socket::~Socket()
+{
+    if (descriptor_ >= 0)
+        closeConnection();
+}
+
+void Socket::setTimeLimit(std::chrono::milliseconds limit)
+{
+    timeLimit_ = limit;
+    if (descriptor_ >= 0)
+        applyTimeLimit();
+}
+
+int Socket::connectTo(const String& address, unsigned short port)
+{
+    closePrevious();
+    address_ = {};
+    address_.sin_addr.s_addr = inet_addr(address.getCharacterArray());
+    return connectToAddress(port);
+}
+
+int Socket::connectToName(const String& host, unsigned short port)
+{
+    closePrevious();
+    const hostent* found = gethostbyname(host.getCharacterArray());
+    if (found == nullptr || found->h_length < 1)
+        return -1;
+    if (const char* first = found->h_addr_list[0])
+        std::memcpy(&address_.sin_addr, first,
+                    std::min(sizeof address_.sin_addr, static_cast<std::size_t>(found->h_length)));
+    return connectToAddress(port);
+}
+
+int Socket::serverOn(unsigned short port)
+{
+    return serverOn(port, in_addr{INADDR_ANY});
+}
+
+int Socket::serverOn(unsigned short port, in_addr local)
+{
+    // Greater than zero, where connecting asks for not negative. Intended: descriptor 0 stays open.
+    if (descriptor_ > 0 && closeConnection() != 0)
+        return -1;
+    if (open() != 0)
+        return -1;
+    // Else a server that is started again would have to wait until the connections of the former one are forgotten.
+    const int yes = 1;
+    setsockopt(descriptor_, SOL_SOCKET, SO_REUSEADDR, &yes, sizeof yes);
+    address_ = {};
+    address_.sin_family = AF_INET;
+    address_.sin_addr = local;
+    address_.sin_port = htons(port);
+    constexpr int kBacklog = 5;
+    if (bind(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_) != 0 ||
+        listen(descriptor_, kBacklog) != 0)
+        return -1;
+    isServer_ = true;
+    return 0;
+}
+
+int Socket::acceptConnection(Socket** connection)
+{
+    if (!isServer_)
+        return -1;
+    sockaddr_in peer{};
+    socklen_t size = sizeof peer;
+    const int accepted = accept(descriptor_, reinterpret_cast<sockaddr*>(&peer), &size);
+    if (accepted < 0)
+        return -1;
+    *connection = new Socket(accepted, peer); // owned by the caller
+    return 0;
+}
+
+int Socket::closeConnection()
+{
+    isServer_ = false;
+    if (descriptor_ < 0)
+        return 0;
+    if (close(descriptor_) != 0)
+        return -1;
+    // A local socket's address is the path of a file, which goes with it. That of a network connection rarely names a
+    // file, so that closing one fails. Intended: connecting an object again relies on that to be refused.
+    char path[sizeof address_ + 1] = {};
+    std::memcpy(path, &address_, sizeof address_);
+    return unlink(path) == 0 ? 0 : -1;
+}
+
+int Socket::readLine(String* line)
+{
+    if (!canTransferLines())
+        return -1;
+    const Clock::time_point deadline = Clock::now() + lineLimit_;
+    std::string text;
+    char c = '\0';
+    do {
+        if (const int result = readBefore(deadline, &c))
+            return result;
+        if (c != '\0')
+            text += c;
+    } while (c != '\0' && c != '\n');
+    *line = String(text.c_str());
+    return 0;
+}
+
+int Socket::readLine(char* buffer, int size)
+{
+    if (!canTransferLines() || size - 1 <= 0)
+        return -1;
+    const Clock::time_point deadline = Clock::now() + lineLimit_;
+    // Every byte goes to the same place. Intended: callers are told that a line has come, not which.
+    do
+        if (const int result = readBefore(deadline, buffer))
+            return result;
+    while (buffer[0] != '\0' && buffer[0] != '\n');
+    if (buffer[0] == '\n')
+        buffer[1] = '\0';
+    return 0;
+}
+
+int Socket::writeLine(const String& line)
+{
+    std::string text(line.hasText() ? line.bytes() : std::string_view("null\n"));
+    return writeLine(text.data());
+}
+
+int Socket::writeLine(char* text)
+{
+    if (!canTransferLines())
+        return -1;
+    std::size_t n = std::strlen(text);
+    if (n > 0 && text[n - 1] == '\r')
+        text[--n] = '\0';
+    if (n > 0 && text[n - 1] == '\n' && (n == 1 || text[n - 2] != '\r'))
+        text[--n] = '\0';
+    if (n > 0 && send(text, n) != 0)
+        return -1;
+    return n > 0 && text[n - 1] == '\n' ? 0 : send("\r\n", 2);
+}
+
+int Socket::putCharacterArray(const char* bytes, int count)
+{
+    return send(bytes, static_cast<std::size_t>(count));
+}
+
+int Socket::getCharacterArray(char* bytes, int count)
+{
+    const int flags = wholeReceives_ ? MSG_WAITALL : 0;
+    return recv(descriptor_, bytes, static_cast<std::size_t>(count), flags) < 0 ? -1 : 0;
+}
+
+int Socket::putChar(char c)
+{
+    return send(&c, 1);
+}
+
+int Socket::getChar(char* c)
+{
+    return sgetc(c, descriptor_) < 0 ? -1 : 0;
+}
+
+int Socket::getDescriptor(int* descriptor) const
+{
+    if (descriptor_ < 0)
+        return -1;
+    *descriptor = descriptor_;
+    return 0;
+}
+
+int Socket::getLocalPort(unsigned short* port) const
+{
+    sockaddr_in local{};
+    socklen_t size = sizeof local;
+    if (getsockname(descriptor_, reinterpret_cast<sockaddr*>(&local), &size) != 0)
+        return -1;
+    *port = ntohs(local.sin_port);
+    return 0;
+}
+
+void Socket::closePrevious()
+{
+    if (descriptor_ >= 0 && closeConnection() != 0)
+        xError("Error closing previous connection.");
+}
+
+/// Makes the descriptor, with the time limit.
+int Socket::open()
+{
+    descriptor_ = socket(AF_INET, SOCK_STREAM, 0);
+    if (descriptor_ < 0)
+        return -1;
+    applyTimeLimit();
+    return 0;
+}
+
+/// A failed attempt leaves the descriptor open.
+int Socket::connectToAddress(unsigned short port)
+{
+    address_.sin_family = AF_INET;
+    address_.sin_port = htons(port);
+    if (open() != 0)
+        return -1;
+    return connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_) == 0 ? 0 : -1;
+}
+
+void Socket::applyTimeLimit() const
+{
+    constexpr int kThousand = 1000; // milliseconds a second, microseconds a millisecond
+    const auto limit = timeLimit_.count();
+    const timeval value{limit / kThousand, limit % kThousand * kThousand};
+    setsockopt(descriptor_, SOL_SOCKET, SO_RCVTIMEO, &value, sizeof value);
+    setsockopt(descriptor_, SOL_SOCKET, SO_SNDTIMEO, &value, sizeof value); // a connect, too
+}
+
+/// Receives a byte of a line. A signal ends the wait as the deadline does.
+/// @return 0; `kTimedOut`, or -1 at the end of the connection and on an error.
+int Socket::readBefore(Clock::time_point deadline, char* c) const
+{
+    const auto left = std::chrono::ceil<std::chrono::milliseconds>(deadline - Clock::now());
+    if (left.count() <= 0)
+        return kTimedOut;
+    pollfd waiting{descriptor_, POLLIN, 0};
+    const int ready = poll(&waiting, 1, static_cast<int>(left.count()));
+    if (ready == 0)
+        return kTimedOut;
+    const int received = ready > 0 ? sgetc(c, descriptor_) : ready;
+    if (received < 0 && errno == EINTR)
+        return kTimedOut;
+    return received == 1 ? 0 : -1;
+}
+
+int Socket::send(const char* bytes, std::size_t count) const
+{
+    return ::send(descriptor_, bytes, count, MSG_NOSIGNAL) < 0 ? -1 : 0;
+}
+
+int Socket::readValue(void* value, short size)
+{
+    if (recv(descriptor_, SOCKETString, static_cast<std::size_t>(size), 0) < 0)
+        return -1;
+    auto* bytes = static_cast<char*>(value);
+    for (SOCKETCounter = 0; SOCKETCounter < size; ++SOCKETCounter)
+        bytes[SOCKETCounter] = SOCKETString[SOCKETCounter];
+    return 0;
+}
+
+int Socket::writeValue(const void* value, short size)
+{
+    const auto* bytes = static_cast<const char*>(value);
+    for (SOCKETCounter = 0; SOCKETCounter < size; ++SOCKETCounter)
+        SOCKETString[SOCKETCounter] = bytes[SOCKETCounter];
+    return send(SOCKETString, static_cast<std::size_t>(size));
+}

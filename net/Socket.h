@@ -1,0 +1,109 @@
+#pragma once
+
+#include "foundation/String.h"
+
+#include <chrono>
+#include <netinet/in.h>
+
+/// A TCP socket over IPv4: a client, a server, or a server's end of a connection.
+///
+/// Results are 0 for success and -1 for failure; nothing is retried, and a peer that has gone is a failure like any
+/// other, without a signal. An object serves one connection only; see `closeConnection`.
+class Socket {
+public:
+    /// The result of reading a line that did not end in time.
+    static constexpr int kTimedOut = 8;
+    static constexpr std::chrono::milliseconds kLineLimit{5000};
+
+    Socket() = default;
+    /// Takes over an open descriptor, whose peer has this address.
+    Socket(int descriptor, sockaddr_in address) : descriptor_(descriptor), address_(address) {}
+    ~Socket();
+    Socket(const Socket&) = delete;
+    Socket& operator=(const Socket&) = delete;
+
+    /// The longest wait of each connect, receive and send, for those to come and for an open connection; 0, as it is at
+    /// first, is for ever. What exceeds it fails.
+    void setTimeLimit(std::chrono::milliseconds limit);
+    /// The longest wait for a whole line, from the call on; at first `kLineLimit`.
+    void setLineLimit(std::chrono::milliseconds limit) { lineLimit_ = limit; }
+    /// Makes `getCharacterArray` wait for all bytes that were asked for; fewer then tell of the end of the connection,
+    /// or of the time limit.
+    void setWholeReceives(bool whole) { wholeReceives_ = whole; }
+
+    /// Connects to a dotted address, or to a host's first IPv4 address. When the object has a connection that cannot be
+    /// closed, as is so of any that it ever had, the program ends with "Error closing previous connection.".
+    int connectTo(const String& address, unsigned short port);
+    int connectToName(const String& host, unsigned short port);
+
+    /// Listens on all local addresses, or on one. Port 0 lets the system choose; `getLocalPort` tells the choice.
+    int serverOn(unsigned short port);
+    int serverOn(unsigned short port, in_addr local);
+    /// Waits for a client. The caller owns `*connection`.
+    int acceptConnection(Socket** connection);
+
+    /// Closes the descriptor, which keeps its number: the object counts as open, so that it cannot be connected again.
+    /// @return -1 as a rule, after a good close too.
+    int closeConnection();
+
+    /// Reads up to and including a line feed, or up to a zero byte, which is dropped. @return 0; `kTimedOut` or -1,
+    /// with
+    /// `*line` as it was and what had come so far lost.
+    int readLine(String* line);
+    /// Reads a line of which only the last byte is kept, in `buffer[0]`: it is "\n" afterwards. `size` is at least 2.
+    int readLine(char* buffer, int size);
+    /// Sends a line with CR LF at its end, whatever line end the text has; "null" for a String without text.
+    int writeLine(const String& line);
+    /// The same; a CR or LF at the end of `text` is overwritten by a zero.
+    int writeLine(char* text);
+
+    /// One send, one receive of up to `count` bytes. A receive at the end of the connection succeeds without touching
+    /// `bytes`; nobody learns how many came.
+    int putCharacterArray(const char* bytes, int count);
+    int getCharacterArray(char* bytes, int count);
+    int putChar(char c);
+    int getChar(char* c);
+
+    // Numbers, in the byte order of this machine. A read that gets too few bytes fills up with those of an earlier
+    // transfer, and succeeds. All sockets share the buffer: one transfer at a time.
+
+    int readDouble(double* value) { return readValue(value, sizeof *value); }
+    int readFloat(float* value) { return readValue(value, sizeof *value); }
+    int readInt(int* value) { return readValue(value, sizeof *value); }
+    int readUInt(unsigned* value) { return readValue(value, sizeof *value); }
+    int readShort(short* value) { return readValue(value, sizeof *value); }
+    int readUShort(unsigned short* value) { return readValue(value, sizeof *value); }
+    int writeDouble(double value) { return writeValue(&value, sizeof value); }
+    int writeFloat(float value) { return writeValue(&value, sizeof value); }
+    int writeInt(int value) { return writeValue(&value, sizeof value); }
+    int writeUInt(unsigned value) { return writeValue(&value, sizeof value); }
+    int writeShort(short value) { return writeValue(&value, sizeof value); }
+    int writeUShort(unsigned short value) { return writeValue(&value, sizeof value); }
+
+    /// @return -1 when there is none, leaving `*descriptor` alone.
+    int getDescriptor(int* descriptor) const;
+    int getLocalPort(unsigned short* port) const;
+
+private:
+    using Clock = std::chrono::steady_clock;
+
+    void closePrevious();
+    int open();
+    int connectToAddress(unsigned short port);
+    void applyTimeLimit() const;
+    bool canTransferLines() const { return descriptor_ >= 0 && !isServer_; }
+    int readBefore(Clock::time_point deadline, char* c) const;
+    int send(const char* bytes, std::size_t count) const;
+    int readValue(void* value, short size);
+    int writeValue(const void* value, short size);
+
+    static char SOCKETString[8];
+    static short SOCKETCounter;
+
+    int descriptor_ = -1;
+    bool isServer_ = false;
+    sockaddr_in address_{}; // of the peer; of this end for a server
+    bool wholeReceives_ = false;
+    std::chrono::milliseconds timeLimit_{0};
+    std::chrono::milliseconds lineLimit_ = kLineLimit;
+};

@@ -1,0 +1,13 @@
+#include "net/StoreQuote.h"
+
+StoreOutcome storeQuote(Company* company, const Date& date, float price, CompanyQuote** quote)
+{
+    if (company->getQuote(date, quote) != 0) {
+        *quote = new CompanyQuote(company, date, price); // owned by the company
+        return StoreOutcome::kAdded;
+    }
+    if ((*quote)->getValue() == price)
+        return StoreOutcome::kSame;
+    (*quote)->setValue(price);
+    return StoreOutcome::kChanged;
+}
