@@ -65,6 +65,11 @@ std::size_t addAll(Map& valuesByOwner, Date* latest)
 
 } // namespace
 
+const TableForm& quotesOfOneTicker()
+{
+    return kQuotesOfOneTicker;
+}
+
 Importer::Importer(const ImportOptions& options, Catalogue& catalogue, std::ostream& log)
     : options_(options), catalogue_(catalogue), log_(log)
 {

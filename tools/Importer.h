@@ -16,6 +16,9 @@ class Company;
 class Currency;
 class Market;
 
+/// The form of a table of one ticker's closing prices: date, close.
+const TableForm& quotesOfOneTicker();
+
 /// What the tables leave open.
 struct ImportOptions {
     std::string reference = "EUR";     // symbol of the currency that the rates refer to

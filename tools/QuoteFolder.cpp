@@ -1,0 +1,64 @@
+#include "tools/QuoteFolder.h"
+
+#include "net/QuoteServers.h"
+#include "tools/Importer.h"
+#include "tools/Table.h"
+
+#include <optional>
+#include <ostream>
+#include <stdexcept>
+
+namespace {
+
+/// What stands between `front` and `back` in `text`; nothing when these do not enclose it.
+std::optional<std::string_view> between(std::string_view text, std::string_view front, std::string_view back)
+{
+    if (text.size() < front.size() + back.size() || !text.starts_with(front) || !text.ends_with(back))
+        return std::nullopt;
+    return text.substr(front.size(), text.size() - front.size() - back.size());
+}
+
+/// A ticker that begins with a dot would be a hidden file, and one with a slash a file of another folder.
+bool isFileName(std::string_view ticker)
+{
+    return !ticker.empty() && ticker.front() != '.' && ticker.find('/') == ticker.npos;
+}
+
+} // namespace
+
+QuoteFolder::QuoteFolder(const std::filesystem::path& folder, std::ostream& log) : folder_(folder), log_(log)
+{
+    std::error_code error;
+    if (!std::filesystem::is_directory(folder, error))
+        throw std::runtime_error(folder.string() + ": " + (error ? error.message() : "is not a folder"));
+}
+
+std::string QuoteFolder::answer(std::string_view request) const
+{
+    const std::string_view line = request.substr(0, request.find_first_of("\r\n"));
+    const std::string_view path = between(line, "GET ", "").value_or("");
+    const auto latest = between(path, QuoteServers::kLatestPath, "");
+    const auto history = between(path, QuoteServers::kHistoryPath, QuoteServers::kHistoryPathEnd);
+    const Closes closes = closesOf(latest.value_or(history.value_or("")));
+    if (closes.empty())
+        return noQuotesPage();
+    return latest ? latestQuotePage(closes.rbegin()->second) : historyPage(closes);
+}
+
+/// Of two prices of a day the later line counts.
+Closes QuoteFolder::closesOf(std::string_view ticker) const
+{
+    Closes closes;
+    const std::filesystem::path file = folder_ / (std::string(ticker) + ".csv");
+    std::error_code error;
+    // Opening anything else, a pipe for one, could take for ever.
+    if (!isFileName(ticker) || !std::filesystem::is_regular_file(file, error))
+        return closes;
+    try {
+        Table table(file, quotesOfOneTicker());
+        table.forEach([&] { closes.insert_or_assign(table.date(), table.value(false)); }, log_);
+    } catch (const std::runtime_error& reason) {
+        log_ << reason.what() << '\n';
+    }
+    return closes;
+}

@@ -1,0 +1,88 @@
+#include "tools/QuotePages.h"
+
+#include <charconv>
+#include <cmath>
+#include <cstdio>
+#include <limits>
+
+namespace {
+
+struct Fraction {
+    float numerator;
+    float denominator;
+};
+
+/// A fraction that makes `close` when it is added to `whole`, in single precision.
+Fraction fractionOf(float close, float whole)
+{
+    const float rest = close - whole; // exact
+    for (const float denominator : {2.F, 4.F, 8.F, 16.F, 32.F, 64.F, 100.F, 1000.F, 10000.F}) {
+        const float numerator = std::round(rest * denominator);
+        if (whole + numerator / denominator == close)
+            return {numerator, denominator};
+    }
+    int exponent = 0;
+    constexpr int kBits = std::numeric_limits<float>::digits;
+    const float mantissa = std::frexp(rest, &exponent);
+    return {std::ldexp(mantissa, kBits), std::ldexp(1.F, kBits - exponent)};
+}
+
+std::string integerText(float number)
+{
+    char text[std::numeric_limits<float>::max_exponent10 + 2];
+    return {text, static_cast<std::size_t>(std::snprintf(text, sizeof text, "%.0f", static_cast<double>(number)))};
+}
+
+/// The shortest text that reads back to `price`.
+std::string priceText(float price)
+{
+    constexpr float kSmallest = 1e-4F, kLargest = 1e9F; // outside, the power of ten is shorter than zeros
+    const bool plain = price >= kSmallest && price < kLargest;
+    const auto format = plain ? std::chars_format::fixed : std::chars_format::general;
+    char text[32];
+    char* const end = std::to_chars(text, text + sizeof text, price, format).ptr;
+    return {text, end};
+}
+
+/// The day three months before; it may be one that the month does not have, which serves for a comparison.
+Date threeMonthsBefore(const Date& day)
+{
+    constexpr short kMonths = 3, kMonthsOfYear = 12;
+    const bool sameYear = day.getMonth() > kMonths;
+    const int month = day.getMonth() - kMonths + (sameYear ? 0 : kMonthsOfYear);
+    return {day.getDay(), static_cast<short>(month), day.getYear() - (sameYear ? 0 : 1)};
+}
+
+/// Behind the price stand the columns that the table's header names and that are not known here.
+std::string rowOf(const Date& day, float close)
+{
+    char date[32];
+    std::snprintf(date, sizeof date, "%02d/%02d/%04d", day.getMonth(), day.getDay(), day.getYear());
+    return std::string(date) + ' ' + priceText(close) + " - - - -\n";
+}
+
+} // namespace
+
+std::string latestQuotePage(float close)
+{
+    const float whole = std::floor(close);
+    std::string cell = integerText(whole);
+    if (close != whole) {
+        const auto [numerator, denominator] = fractionOf(close, whole);
+        cell += " <sup>" + integerText(numerator) + "</sup>/<sub>" + integerText(denominator) + "</sub>";
+    }
+    return "<html><body><table><tr><td nowrap><b>" + cell + "</b></td></tr></table></body></html>\n";
+}
+
+std::string historyPage(const Closes& closes)
+{
+    std::string page = "<html><body><pre>\n<b>Date Close Open High Low Volume (00s)</b>\n";
+    for (auto close = closes.upper_bound(threeMonthsBefore(closes.rbegin()->first)); close != closes.end(); ++close)
+        page += rowOf(close->first, close->second);
+    return page + "</pre></body></html>\n";
+}
+
+std::string noQuotesPage()
+{
+    return "<html><body>There are no quotes of this ticker.</body></html>\n";
+}
