@@ -1,0 +1,28 @@
+#include "chart/ChartDays.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstdint>
+#include <limits>
+
+namespace {
+
+const Date& firstDay()
+{
+    static const Date day(1, 1, 2000);
+    return day;
+}
+
+} // namespace
+
+double dayNumber(const Date& date)
+{
+    return date.isValid() ? date - firstDay() : std::numeric_limits<double>::quiet_NaN();
+}
+
+Date dateOfDay(double day)
+{
+    constexpr double kLimit = std::numeric_limits<int>::max();
+    Date date = firstDay();
+    return date.moveBy(static_cast<std::int64_t>(std::floor(std::clamp(day, -kLimit, kLimit))));
+}

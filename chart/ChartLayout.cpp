@@ -1,0 +1,291 @@
+#include "chart/ChartLayout.h"
+
+#include "chart/ChartMarks.h"
+#include "chart/DateTicks.h"
+
+#include <cmath>
+
+namespace {
+
+constexpr float kMargin = 8;        // between the bounds and anything
+constexpr float kRightMargin = 12;  // between the plot and the right side
+constexpr float kLabelGap = 7;      // between an axis and its labels
+constexpr float kLegendGap = 6;     // between a legend and what is next to it
+constexpr float kTickGap = 18;      // between the labels of the x axis
+constexpr float kDataInset = 6;     // between the plot's sides and the first and last point
+constexpr float kSampleWidth = 16;  // in the key
+constexpr float kSampleGap = 5;     // between a sample and its name
+constexpr float kEntryGap = 16;     // between entries of the key
+constexpr float kSmallestPlot = 40; // in either direction
+constexpr float kKeyShare = 0.3F;   // of the height, at most
+
+/// The steps of a layout, in their order. Each narrows the plot, beginning with the bounds.
+class Layouter {
+public:
+    explicit Layouter(const ChartContents& contents) : in_(contents) {}
+
+    ChartLayout run()
+    {
+        findRanges();
+        placeHeader();
+        placeFooter();
+        if (!isLargeEnough())
+            return bareChart();
+        placeValueAxis();
+        if (!isLargeEnough())
+            return bareChart();
+        placeXAxis();
+        placeYLegend();
+        out_.marks = placeMarks(in_, out_.plot, out_.scale);
+        return out_;
+    }
+
+private:
+    void findRanges()
+    {
+        for (const ChartSeries& series : in_.series)
+            for (const ChartPoint& point : series.points) {
+                x_.include(point.x);
+                values_.include(point.y);
+            }
+        y_ = values_;
+        widenEmpty(x_, in_.isDateBased ? 1 : std::abs(x_.min) / 10);
+        widenEmpty(y_, std::abs(y_.min) / 20);
+        out_.plot = {std::ceil(in_.bounds.left), std::ceil(in_.bounds.top), std::floor(in_.bounds.right),
+                     std::floor(in_.bounds.bottom)};
+    }
+
+    /// A single value stands in the middle.
+    static void widenEmpty(ChartRange& range, double by)
+    {
+        if (range.length() > 0)
+            return;
+        range.include({range.min - (by > 0 ? by : 1), range.max + (by > 0 ? by : 1)});
+    }
+
+    /// The x legend, and the key beside it or, where there is no room, below.
+    void placeHeader()
+    {
+        const float top = in_.bounds.top + kLegendGap;
+        float bottom = top;
+        float left = in_.bounds.left + kMargin;
+        // It names the values although it is called after x. Intended: the pages set it to the unit of the values,
+        // so it stands above the value axis, where a reader looks for that.
+        const std::string legend = fitText(in_.xLegend, in_.legendFont, rightEnd() - left);
+        if (!legend.empty()) {
+            const ChartText text = textAt(legend, in_.legendFont, left, top);
+            out_.legends.push_back(text);
+            bottom = text.box.bottom;
+            left = text.box.right + kEntryGap;
+        }
+        bottom = std::max(bottom, placeKey(left, top, bottom));
+        out_.plot.top = std::ceil(bottom + kLegendGap);
+    }
+
+    float rightEnd() const { return in_.bounds.right - kMargin; }
+
+    float entryWidth(const std::string& name) const
+    {
+        return std::ceil(kSampleWidth + kSampleGap + in_.legendFont.width(name));
+    }
+
+    /// The series that have a name, one of each.
+    std::vector<const ChartSeries*> keySeries() const
+    {
+        constexpr std::size_t kMostEntries = 12;
+        std::vector<const ChartSeries*> named;
+        for (const ChartSeries& series : in_.series) {
+            const bool isNew = std::none_of(named.begin(), named.end(),
+                                            [&](const ChartSeries* other) { return other->name == series.name; });
+            if (!series.name.empty() && isNew && named.size() < kMostEntries)
+                named.push_back(&series);
+        }
+        return named;
+    }
+
+    /// @return the lower end of the key.
+    float placeKey(float left, float top, float below)
+    {
+        const std::vector<const ChartSeries*> named = keySeries();
+        if (named.empty())
+            return top;
+        float width = -kEntryGap;
+        for (const ChartSeries* series : named)
+            width += entryWidth(series->name) + kEntryGap;
+        if (left + width <= rightEnd())
+            return placeKeyRows(named, rightEnd() - width, top);
+        return placeKeyRows(named, in_.bounds.left + kMargin, below > top ? below + kLegendGap / 2 : top);
+    }
+
+    float placeKeyRows(const std::vector<const ChartSeries*>& named, float left, float top)
+    {
+        const float height = std::ceil(in_.legendFont.height());
+        float x = left;
+        for (const ChartSeries* series : named) {
+            const std::string name =
+                fitText(series->name, in_.legendFont, rightEnd() - left - kSampleWidth - kSampleGap);
+            if (x > left && x + entryWidth(name) > rightEnd()) {
+                x = left;
+                top += height;
+            }
+            if (name.empty() || top + height > in_.bounds.top + in_.bounds.Height() * kKeyShare)
+                break;
+            out_.key.push_back({series->shape, series->color, series->penSize,
+                                BRect(x, top, x + kSampleWidth, top + height),
+                                textAt(name, in_.legendFont, x + kSampleWidth + kSampleGap, top)});
+            x += entryWidth(name) + kEntryGap;
+        }
+        return out_.key.empty() ? top : out_.key.back().sample.bottom;
+    }
+
+    void placeFooter()
+    {
+        out_.plot.bottom -= std::ceil(kLabelGap + in_.labelFont.height() + kLegendGap / 2);
+        if (!in_.yLegend.empty())
+            out_.plot.bottom -= std::ceil(in_.legendFont.height() + kLegendGap / 2);
+    }
+
+    bool isLargeEnough() const { return out_.plot.Width() >= kSmallestPlot && out_.plot.Height() >= kSmallestPlot; }
+
+    ChartLayout bareChart() const
+    {
+        ChartLayout bare;
+        bare.plot = in_.bounds;
+        constexpr float kInset = 2;
+        BRect area = in_.bounds.InsetByCopy(kInset, kInset);
+        area.right = std::max(area.right, area.left + 1);
+        area.bottom = std::max(area.bottom, area.top + 1);
+        bare.scale = ChartScale(x_, y_, area);
+        return bare;
+    }
+
+    BRect dataArea() const
+    {
+        const float inset = marksInset(in_, out_.plot);
+        return out_.plot.InsetByCopy(kDataInset, inset);
+    }
+
+    /// Finds the round values and makes room for the widest at the left.
+    void placeValueAxis()
+    {
+        const ChartScale scale(x_, y_, dataArea());
+        ChartRange shown{scale.y(out_.plot.bottom), scale.y(out_.plot.top)};
+        if (values_.min >= 0) // no labels below 0 where nothing can be
+            shown.min = std::max(shown.min, 0.0);
+        if (values_.max <= 0)
+            shown.max = std::min(shown.max, 0.0);
+        const double valuePerPixel = scale.y(0) - scale.y(1);
+        std::vector<AxisTick> ticks;
+        for (const double spread : {2.6, 1.8, 1.2}) { // labels stand closer where there would be only one
+            ticks = numberTicks(shown, spread * static_cast<double>(in_.labelFont.height()) * valuePerPixel);
+            if (ticks.size() > 1)
+                break;
+        }
+        float widest = 0;
+        for (const AxisTick& tick : ticks)
+            widest = std::max(widest, in_.labelFont.width(tick.label));
+        out_.plot.left = std::ceil(out_.plot.left + kMargin + widest + kLabelGap);
+        out_.plot.right = std::floor(out_.plot.right - kRightMargin);
+        for (const AxisTick& tick : ticks)
+            placeValueLabel(tick, scale.pixelY(tick.value));
+        if (values_.min < 0 && values_.max > 0)
+            out_.zero.push_back(scale.pixelY(0));
+    }
+
+    void placeValueLabel(const AxisTick& tick, float y)
+    {
+        const float top = y - in_.labelFont.height() / 2;
+        const ChartText text = textAt(tick.label, in_.labelFont, 0, top);
+        if (text.box.top < out_.plot.top || text.box.bottom > out_.plot.bottom)
+            return;
+        out_.rows.push_back(y);
+        valueLabels_.push_back({tick.label, top});
+    }
+
+    std::vector<AxisTick> xTicks(const ChartScale& scale) const
+    {
+        const ChartRange shown{scale.x(out_.plot.left), scale.x(out_.plot.right)};
+        return in_.isDateBased ? levelDateTicks(shown, scale.pixelsPerX(), in_.labelFont.width, kTickGap)
+                               : levelNumberTicks(shown, scale.pixelsPerX(), in_.labelFont.width, kTickGap);
+    }
+
+    /// Finds the round days or numbers, with so much room at the sides that the outer labels are not cut.
+    void placeXAxis()
+    {
+        constexpr int kTries = 3; // other sides may mean other labels
+        std::vector<AxisTick> ticks;
+        for (int i = 0; i < kTries; ++i) {
+            out_.scale = ChartScale(x_, y_, dataArea());
+            ticks = xTicks(out_.scale);
+            if (!widenMargins(ticks))
+                break;
+        }
+        placeValueLabels();
+        const float top = out_.plot.bottom + kLabelGap;
+        for (const AxisTick& tick : ticks) {
+            const float x = out_.scale.pixelX(tick.value);
+            const ChartText text = textAt(tick.label, in_.labelFont, x - in_.labelFont.width(tick.label) / 2, top);
+            if (text.box.left < in_.bounds.left || text.box.right > in_.bounds.right)
+                continue;
+            out_.columns.push_back(x);
+            out_.labels.push_back(text);
+        }
+    }
+
+    /// Moves the plot's sides inwards so that the outer labels stay within the bounds. @return whether it had to.
+    bool widenMargins(const std::vector<AxisTick>& ticks)
+    {
+        if (ticks.empty())
+            return false;
+        const auto end = [this](const AxisTick& tick, float sign) {
+            return out_.scale.pixelX(tick.value) + sign * in_.labelFont.width(tick.label) / 2;
+        };
+        const float left = std::ceil(in_.bounds.left + kMargin / 2 - end(ticks.front(), -1));
+        const float right = std::ceil(end(ticks.back(), 1) + kMargin / 2 - in_.bounds.right);
+        if (left <= 0 && right <= 0)
+            return false;
+        const BRect before = out_.plot;
+        out_.plot.left += std::max(left, 0.0F);
+        out_.plot.right -= std::max(right, 0.0F);
+        if (isLargeEnough())
+            return true;
+        out_.plot = before;
+        return false;
+    }
+
+    void placeValueLabels()
+    {
+        for (const auto& [label, top] : valueLabels_)
+            out_.labels.push_back(
+                textAt(label, in_.labelFont, out_.plot.left - kLabelGap - in_.labelFont.width(label), top));
+    }
+
+    void placeYLegend()
+    {
+        const ChartFont& font = in_.legendFont;
+        const std::string legend = fitText(in_.yLegend, font, out_.plot.right - in_.bounds.left - kMargin);
+        if (legend.empty())
+            return;
+        const float top = out_.plot.bottom + kLabelGap + std::ceil(in_.labelFont.height());
+        out_.legends.push_back(textAt(legend, font, out_.plot.right - font.width(legend), top + kLegendGap / 2));
+    }
+
+    struct ValueLabel {
+        std::string text;
+        float top;
+    };
+
+    const ChartContents& in_;
+    ChartLayout out_;
+    ChartRange x_;
+    ChartRange y_;
+    ChartRange values_; // without what a single one is widened by
+    std::vector<ValueLabel> valueLabels_;
+};
+
+} // namespace
+
+ChartLayout layOutChart(const ChartContents& contents)
+{
+    return Layouter(contents).run();
+}

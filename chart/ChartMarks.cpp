@@ -1,0 +1,82 @@
+#include "chart/ChartMarks.h"
+
+#include "chart/ValueFormat.h"
+
+#include <cmath>
+
+namespace {
+
+constexpr float kSmallInset = 6;  // keeps the line off the plot's edges
+constexpr float kMarkGap = 6;     // between a point's middle and its label
+constexpr float kEdgeGap = 3;     // between a label and the plot's edges
+constexpr float kPlotHeights = 5; // the plot is so many times as high as a label, at least
+
+struct Extreme {
+    const ChartSeries* series = nullptr;
+    ChartPoint point;
+};
+
+/// The first line, or else everything: a band around a line would hide what the line itself reached.
+std::vector<const ChartSeries*> markedSeries(const std::vector<ChartSeries>& series)
+{
+    std::vector<const ChartSeries*> all;
+    for (const ChartSeries& one : series) {
+        if (one.shape == ChartSeries::Shape::Line)
+            return {&one};
+        all.push_back(&one);
+    }
+    return all;
+}
+
+void findExtremes(const std::vector<const ChartSeries*>& marked, Extreme* lowest, Extreme* highest)
+{
+    for (const ChartSeries* series : marked)
+        for (const ChartPoint& point : series->points) {
+            if (lowest->series == nullptr || point.y < lowest->point.y)
+                *lowest = {series, point};
+            if (highest->series == nullptr || point.y > highest->point.y)
+                *highest = {series, point};
+        }
+}
+
+/// The label with its left end so that it stands within the plot; without text where it does not fit.
+ChartText labelAt(const std::string& text, const ChartFont& font, float middle, float top, const BRect& plot)
+{
+    const float width = font.width(text);
+    const float furthest = plot.right - kEdgeGap - width;
+    if (furthest < plot.left + kEdgeGap)
+        return {};
+    return textAt(text, font, std::clamp(middle - width / 2, plot.left + kEdgeGap, furthest), top);
+}
+
+bool hasRoom(const ChartContents& contents, const BRect& plot)
+{
+    return plot.Height() >= kPlotHeights * contents.labelFont.height();
+}
+
+} // namespace
+
+float marksInset(const ChartContents& contents, const BRect& plot)
+{
+    return hasRoom(contents, plot) ? std::ceil(kMarkGap + contents.labelFont.height() + 2) : kSmallInset;
+}
+
+std::vector<ChartMark> placeMarks(const ChartContents& contents, const BRect& plot, const ChartScale& scale)
+{
+    Extreme lowest, highest;
+    findExtremes(markedSeries(contents.series), &lowest, &highest);
+    const ValueFormat format = ValueFormat::forValues({lowest.point.y, highest.point.y});
+    const ChartFont& font = contents.labelFont;
+    std::vector<ChartMark> marks;
+    const auto add = [&](const Extreme& extreme, float gap) {
+        const BPoint where = scale.pixel(extreme.point);
+        ChartMark mark{where, extreme.series->color, {}};
+        if (hasRoom(contents, plot))
+            mark.label = labelAt(format(extreme.point.y), font, where.x, where.y + gap, plot);
+        marks.push_back(mark);
+    };
+    add(highest, -kMarkGap - std::ceil(font.height()));
+    if (lowest.point.y < highest.point.y)
+        add(lowest, kMarkGap);
+    return marks;
+}

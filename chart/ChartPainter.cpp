@@ -1,0 +1,198 @@
+#include "chart/ChartPainter.h"
+
+#include "chart/ColumnReduction.h"
+
+#include <cmath>
+
+namespace {
+
+constexpr float kTickLength = 4;
+constexpr float kMarkRadius = 3;
+
+/// Alpha 0 covers as 255 does: elements have it from the start.
+bool isOpaque(rgb_color color)
+{
+    return color.alpha == 0 || color.alpha == 255;
+}
+
+rgb_color opaque(rgb_color color)
+{
+    return {color.red, color.green, color.blue, 255};
+}
+
+/// `background` moved by `share` towards black, or towards white when it is dark.
+rgb_color ink(rgb_color background, double share)
+{
+    constexpr double kHalfBright = 128;
+    const double brightness = 0.299 * background.red + 0.587 * background.green + 0.114 * background.blue;
+    const double target = brightness < kHalfBright ? 255 : 0;
+    const auto mix = [&](std::uint8_t component) {
+        return static_cast<std::uint8_t>(component + (target - component) * share + 0.5);
+    };
+    return {mix(background.red), mix(background.green), mix(background.blue), 255};
+}
+
+float discRadius(float penSize)
+{
+    return penSize + 1;
+}
+
+} // namespace
+
+ChartPainter::ChartPainter(BView& view, rgb_color background)
+    : view_(view), background_(opaque(background)), text_(ink(background, 0.85)), label_(ink(background, 0.65)),
+      axis_(ink(background, 0.45)), grid_(ink(background, 0.1))
+{
+    view_.SetDrawingMode(B_OP_COPY);
+}
+
+void ChartPainter::fillBackground()
+{
+    view_.SetLowColor(background_);
+    view_.FillRect(view_.Bounds(), B_SOLID_LOW);
+}
+
+void ChartPainter::drawNotice(const char* text, BPoint where, float size)
+{
+    view_.SetFontSize(size);
+    view_.SetHighColor(label_);
+    view_.DrawString(text, where);
+}
+
+void ChartPainter::drawChart(const ChartLayout& layout, const std::vector<ChartSeries>& series)
+{
+    using Shape = ChartSeries::Shape;
+    const auto drawAll = [&series](Shape shape, const auto& draw) {
+        for (const ChartSeries& one : series)
+            if (one.shape == shape)
+                draw(one);
+    };
+    drawGrid(layout);
+    drawAll(Shape::Polygon, [&](const ChartSeries& one) { drawPolygon(one, layout.scale); });
+    drawAxes(layout);
+    drawAll(Shape::Line, [&](const ChartSeries& one) { drawLine(one, layout.scale); });
+    drawAll(Shape::Point, [&](const ChartSeries& one) {
+        fillDisc(layout.scale.pixel(one.points.front()), discRadius(one.penSize), one.color);
+    });
+    for (const ChartMark& mark : layout.marks)
+        drawMark(mark);
+    for (const ChartText& label : layout.labels)
+        drawText(label, label_);
+    for (const ChartText& legend : layout.legends)
+        drawText(legend, text_);
+    for (const ChartKeyEntry& entry : layout.key)
+        drawKeyEntry(entry);
+}
+
+void ChartPainter::drawGrid(const ChartLayout& layout)
+{
+    const BRect& plot = layout.plot;
+    view_.SetPenSize(1);
+    view_.BeginLineArray(static_cast<int32>(layout.columns.size() + layout.rows.size()));
+    for (const float x : layout.columns)
+        view_.AddLine({x, plot.top}, {x, plot.bottom}, grid_);
+    for (const float y : layout.rows)
+        view_.AddLine({plot.left, y}, {plot.right, y}, grid_);
+    view_.EndLineArray();
+}
+
+void ChartPainter::drawAxes(const ChartLayout& layout)
+{
+    if (!layout.hasAxes())
+        return;
+    const BRect& plot = layout.plot;
+    view_.SetPenSize(1);
+    view_.BeginLineArray(static_cast<int32>(layout.columns.size() + layout.rows.size() + layout.zero.size() + 2));
+    view_.AddLine({plot.left, plot.top}, {plot.left, plot.bottom}, axis_);
+    view_.AddLine({plot.left, plot.bottom}, {plot.right, plot.bottom}, axis_);
+    for (const float y : layout.zero)
+        view_.AddLine({plot.left, y}, {plot.right, y}, axis_);
+    for (const float x : layout.columns)
+        view_.AddLine({x, plot.bottom}, {x, plot.bottom + kTickLength}, axis_);
+    for (const float y : layout.rows)
+        view_.AddLine({plot.left - kTickLength, y}, {plot.left, y}, axis_);
+    view_.EndLineArray();
+}
+
+void ChartPainter::drawPolygon(const ChartSeries& series, const ChartScale& scale)
+{
+    const std::vector<BPoint> corners = reduceByColumn(series.points, scale);
+    setAreaColor(series.color);
+    view_.FillPolygon(corners.data(), static_cast<int32>(corners.size()));
+    view_.SetDrawingMode(B_OP_COPY);
+}
+
+void ChartPainter::drawLine(const ChartSeries& series, const ChartScale& scale)
+{
+    const std::vector<BPoint> points = reduceByColumn(series.points, scale);
+    if (points.size() == 1) { // the others have no place, or the same
+        fillDisc(points.front(), discRadius(series.penSize), series.color);
+        return;
+    }
+    view_.SetPenSize(series.penSize);
+    view_.BeginLineArray(static_cast<int32>(points.size() - 1));
+    for (std::size_t i = 1; i < points.size(); ++i)
+        view_.AddLine(points[i - 1], points[i], opaque(series.color));
+    view_.EndLineArray();
+}
+
+void ChartPainter::drawMark(const ChartMark& mark)
+{
+    fillDisc(mark.where, kMarkRadius + 1, background_);
+    fillDisc(mark.where, kMarkRadius, mark.color);
+    drawOutlinedText(mark.label);
+}
+
+/// Other lines may pass below a mark's label.
+void ChartPainter::drawOutlinedText(const ChartText& text)
+{
+    for (const BPoint& shift : {BPoint(-1, -1), BPoint(1, -1), BPoint(-1, 1), BPoint(1, 1)}) {
+        ChartText outline = text;
+        outline.where = text.where + shift;
+        drawText(outline, background_);
+    }
+    drawText(text, text_);
+}
+
+void ChartPainter::drawKeyEntry(const ChartKeyEntry& entry)
+{
+    const BRect& box = entry.sample;
+    const float middle = std::round((box.top + box.bottom) / 2);
+    switch (entry.shape) {
+    case ChartSeries::Shape::Line:
+        view_.SetPenSize(entry.penSize);
+        view_.SetHighColor(opaque(entry.color));
+        view_.StrokeLine({box.left, middle}, {box.right, middle});
+        break;
+    case ChartSeries::Shape::Polygon: {
+        constexpr float kHalfHeight = 5;
+        setAreaColor(entry.color);
+        view_.FillRect({box.left, middle - kHalfHeight, box.right, middle + kHalfHeight});
+        view_.SetDrawingMode(B_OP_COPY);
+        break;
+    }
+    case ChartSeries::Shape::Point:
+        fillDisc({(box.left + box.right) / 2, middle}, discRadius(entry.penSize), entry.color);
+        break;
+    }
+    drawText(entry.name, text_);
+}
+
+void ChartPainter::drawText(const ChartText& text, rgb_color color)
+{
+    view_.SetFontSize(text.size);
+    view_.SetHighColor(color);
+    view_.DrawString(text.text.c_str(), text.where);
+}
+
+void ChartPainter::fillDisc(BPoint center, float radius, rgb_color color)
+{
+    view_.SetHighColor(opaque(color));
+    view_.FillArc(center, radius, radius, 0, 360);
+}
+
+void ChartPainter::setAreaColor(rgb_color color)
+{
+    view_.SetDrawingMode(isOpaque(color) ? B_OP_COPY : B_OP_ALPHA);
+    view_.SetHighColor(color);
+}

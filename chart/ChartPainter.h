@@ -1,0 +1,36 @@
+#pragma once
+
+#include "chart/ChartLayout.h"
+#include "platform/View.h"
+
+/// Draws what a layout has found a place for.
+class ChartPainter {
+public:
+    /// Draws on `view`, in colours that can be read on `background`. Leaves the view's drawing mode at B_OP_COPY.
+    ChartPainter(BView& view, rgb_color background);
+
+    void fillBackground();
+    /// A text in place of a chart.
+    void drawNotice(const char* text, BPoint where, float size);
+    /// From back to front: grid, polygons, axes, lines, points, lowest and highest value, texts.
+    void drawChart(const ChartLayout& layout, const std::vector<ChartSeries>& series);
+
+private:
+    void drawGrid(const ChartLayout& layout);
+    void drawAxes(const ChartLayout& layout);
+    void drawPolygon(const ChartSeries& series, const ChartScale& scale);
+    void drawLine(const ChartSeries& series, const ChartScale& scale);
+    void drawMark(const ChartMark& mark);
+    void drawKeyEntry(const ChartKeyEntry& entry);
+    void drawText(const ChartText& text, rgb_color color);
+    void drawOutlinedText(const ChartText& text);
+    void fillDisc(BPoint center, float radius, rgb_color color);
+    void setAreaColor(rgb_color color);
+
+    BView& view_;
+    rgb_color background_;
+    rgb_color text_;
+    rgb_color label_;
+    rgb_color axis_;
+    rgb_color grid_;
+};

@@ -1,0 +1,32 @@
+#pragma once
+
+#include "chart/ChartScale.h"
+#include "platform/GraphicsDefs.h"
+
+#include <string>
+#include <vector>
+
+class GraphElement;
+class GraphPoint;
+
+/// What one element of a chart shows, in numbers.
+struct ChartSeries {
+    enum class Shape { Line, Polygon, Point };
+
+    Shape shape = Shape::Line;
+    rgb_color color;
+    float penSize = 1;
+    std::string name;               // in the key; empty for none
+    std::vector<ChartPoint> points; // those that have a place on the chart, in the element's order
+};
+
+/// The defined ones of `elements` that have a place on a chart that goes by dates or by numbers: no undefined date, no
+/// value that is infinite or not a number. A line or polygon leaves such points out.
+std::vector<ChartSeries> seriesOf(GraphElement* const* elements, unsigned count, bool isDateBased);
+
+/// The coordinates of `point`, which are not finite where it has no place.
+ChartPoint chartPointOf(const GraphPoint& point, bool isDateBased);
+bool hasPlace(const ChartPoint& point);
+
+/// The points of an element: of a point, itself. `*single` is room for that, and has to outlive the result.
+GraphPoint* const* pointsOf(GraphElement& element, unsigned* count, GraphPoint** single);

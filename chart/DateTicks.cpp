@@ -1,0 +1,118 @@
+#include "chart/DateTicks.h"
+
+#include "chart/ChartDays.h"
+
+#include <cmath>
+#include <cstdio>
+
+namespace {
+
+using Unit = DateStep::Unit;
+
+constexpr int kMonths = 12;
+
+double daysOf(DateStep step)
+{
+    constexpr double kDays[] = {1, 7, 30.44, 365.25};
+    return kDays[static_cast<int>(step.unit)] * step.count;
+}
+
+std::string label(const Date& date, Unit unit)
+{
+    char text[40];
+    if (unit == Unit::Year)
+        std::snprintf(text, sizeof text, "%d", date.getYear());
+    else if (unit == Unit::Month)
+        std::snprintf(text, sizeof text, "%d/%d", date.getMonth(), date.getYear());
+    else
+        std::snprintf(text, sizeof text, "%d/%d/%d", date.getDay(), date.getMonth(), date.getYear());
+    return text;
+}
+
+/// Begins with the smallest multiple of `step` from `value` up.
+std::int64_t roundUp(std::int64_t value, std::int64_t step)
+{
+    const std::int64_t rest = (value % step + step) % step;
+    return rest == 0 ? value : value + step - rest;
+}
+
+std::vector<AxisTick> ticksByDays(const ChartRange& range, DateStep step)
+{
+    constexpr std::int64_t kFirstMonday = 2;
+    const bool isWeek = step.unit == Unit::Week;
+    const std::int64_t days = isWeek ? 7 * step.count : step.count;
+    const std::int64_t shift = isWeek ? kFirstMonday : 0;
+    std::vector<AxisTick> ticks;
+    for (auto day = roundUp(static_cast<std::int64_t>(std::ceil(range.min)) - shift, days) + shift;
+         static_cast<double>(day) <= range.max; day += days)
+        ticks.push_back({static_cast<double>(day), label(dateOfDay(static_cast<double>(day)), step.unit)});
+    return ticks;
+}
+
+std::vector<AxisTick> ticksByMonths(const ChartRange& range, DateStep step)
+{
+    const std::int64_t months = step.unit == Unit::Year ? std::int64_t{kMonths} * step.count : step.count;
+    const Date first = dateOfDay(range.min);
+    std::vector<AxisTick> ticks;
+    double previous = -std::numeric_limits<double>::infinity();
+    for (auto month = roundUp(std::int64_t{first.getYear()} * kMonths + first.getMonth() - 1, months);;
+         month += months) {
+        const std::int64_t inYear = (month % kMonths + kMonths) % kMonths;
+        const Date date(1, static_cast<short>(inYear + 1), static_cast<int>((month - inYear) / kMonths));
+        const double day = dayNumber(date);
+        if (!(day <= range.max && day > previous)) // days that are too far off all have the same number
+            return ticks;
+        if (day >= range.min)
+            ticks.push_back({day, label(date, step.unit)});
+        previous = day;
+    }
+}
+
+/// The step after `step`: some that divide weeks, months and years well, then 1, 2 and 5 times a power of ten years.
+DateStep coarser(DateStep step)
+{
+    constexpr DateStep kSteps[] = {{Unit::Day, 1},   {Unit::Day, 2},   {Unit::Week, 1},
+                                   {Unit::Week, 2},  {Unit::Month, 1}, {Unit::Month, 2},
+                                   {Unit::Month, 3}, {Unit::Month, 6}, {Unit::Year, 1}};
+    for (std::size_t i = 0; i + 1 < std::size(kSteps); ++i)
+        if (kSteps[i].unit == step.unit && kSteps[i].count == step.count)
+            return kSteps[i + 1];
+    int leading = step.count;
+    while (leading >= 10)
+        leading /= 10;
+    return {Unit::Year, leading == 2 ? step.count / 2 * 5 : step.count * 2};
+}
+
+/// The ends of the range, or only the first day when there is no room for both.
+std::vector<AxisTick> endTicks(const ChartRange& range, double pixelsPerDay, const TextWidth& width, float gap)
+{
+    std::vector<AxisTick> ticks;
+    for (const double day : {std::ceil(range.min), std::floor(range.max)})
+        if (day >= range.min && day <= range.max && (ticks.empty() || day > ticks.back().value))
+            ticks.push_back({day, label(dateOfDay(day), Unit::Day)});
+    if (!areLabelsApart(ticks, pixelsPerDay, width, gap))
+        ticks.pop_back();
+    return ticks;
+}
+
+} // namespace
+
+std::vector<AxisTick> dateTicks(const ChartRange& range, DateStep step)
+{
+    return step.unit == Unit::Day || step.unit == Unit::Week ? ticksByDays(range, step) : ticksByMonths(range, step);
+}
+
+std::vector<AxisTick> levelDateTicks(const ChartRange& range, double pixelsPerDay, const TextWidth& width, float gap)
+{
+    const double narrowest = static_cast<double>(width("0") + gap);
+    DateStep step{Unit::Day, 1};
+    std::vector<AxisTick> ticks;
+    for (;; step = coarser(step)) {
+        if (daysOf(step) * pixelsPerDay < narrowest)
+            continue;
+        ticks = dateTicks(range, step);
+        if (areLabelsApart(ticks, pixelsPerDay, width, gap))
+            break;
+    }
+    return ticks.size() > 1 ? ticks : endTicks(range, pixelsPerDay, width, gap);
+}

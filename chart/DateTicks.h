@@ -1,0 +1,19 @@
+#pragma once
+
+#include "chart/AxisTicks.h"
+
+/// What a calendar axis goes by: every so many days, weeks, months or years.
+struct DateStep {
+    enum class Unit { Day, Week, Month, Year };
+
+    Unit unit;
+    int count;
+};
+
+/// The days of `range` (numbers of days) that begin such a step, Mondays for weeks. Labels are day/month/year,
+/// month/year or the year.
+std::vector<AxisTick> dateTicks(const ChartRange& range, DateStep step);
+
+/// The ticks of the finest step whose labels, centred below, keep `gap` pixels between them. Where no round day lies in
+/// the range, its ends are labelled, as far as there is room.
+std::vector<AxisTick> levelDateTicks(const ChartRange& range, double pixelsPerDay, const TextWidth& width, float gap);

@@ -1,0 +1,57 @@
+#include "chart/GraphPoint.h"
+
+#include "chart/GraphPolyElement.h"
+
+#include <cmath>
+
+GraphPoint::~GraphPoint()
+{
+    setGraphPolyElement(nullptr);
+}
+
+void GraphPoint::setX(float x)
+{
+    x_ = x;
+    notifyChange();
+}
+
+void GraphPoint::setDateX(const Date& date)
+{
+    dateX_ = date;
+    notifyChange();
+}
+
+void GraphPoint::setY(float y)
+{
+    y_ = y;
+    notifyChange();
+}
+
+void GraphPoint::notifyChange()
+{
+    if (GraphPolyElement* element = polyElement_.partner())
+        element->graphPointChanged();
+}
+
+int sortPointsByX(const void* a, const void* b)
+{
+    const GraphPoint& first = **static_cast<GraphPoint* const*>(a);
+    const GraphPoint& second = **static_cast<GraphPoint* const*>(b);
+    if (first.isDateBased() != second.isDateBased())
+        return 0;
+    if (first.isDateBased())
+        return first.getDateX() > second.getDateX() ? 1 : first.getDateX() < second.getDateX() ? -1 : 0;
+    if (std::isnan(first.getX()) || std::isnan(second.getX()))
+        return static_cast<int>(std::isnan(first.getX())) - static_cast<int>(std::isnan(second.getX()));
+    return first.getX() > second.getX() ? 1 : first.getX() < second.getX() ? -1 : 0;
+}
+
+int GraphPointsToGraphPolyElement::xAdd(GraphPolyElement* partner)
+{
+    return partner->addGraphPoint(owner());
+}
+
+int GraphPointsToGraphPolyElement::xRemove(GraphPolyElement* partner)
+{
+    return partner->removeGraphPoint(owner());
+}

@@ -1,0 +1,45 @@
+#pragma once
+
+#include "chart/GraphElement.h"
+#include "chart/GraphPointsToGraphPolyElement.h"
+#include "foundation/Date.h"
+
+class GraphPolyElement;
+
+/// A value at a number or at a day: a corner of a line or polygon, or a disc that stands alone on a chart.
+class GraphPoint final : public GraphElement {
+public:
+    static constexpr short kType = 3;
+
+    GraphPoint() = default;
+    GraphPoint(float x, float y) : x_(x), y_(y) {}
+    ~GraphPoint() override;
+
+    short getType() const override { return kType; }
+    bool isUndefined() const override { return false; }
+
+    float getX() const { return x_; }
+    void setX(float x);
+    const Date& getDateX() const { return dateX_; }
+    void setDateX(const Date& date);
+    float getY() const { return y_; }
+    void setY(float y);
+
+    int setGraphPolyElement(GraphPolyElement* element) { return polyElement_.set(element); }
+    /// @return 0; -1 and a null `*out` when the point belongs to no line or polygon.
+    int getGraphPolyElement(GraphPolyElement** out) const { return polyElement_.get(out); }
+
+private:
+    friend class GraphLineToGraphPoints;
+    friend class GraphPolygonToGraphPoints;
+    void notifyChange();
+
+    float x_ = 0;
+    Date dateX_;
+    float y_ = 0;
+    GraphPointsToGraphPolyElement polyElement_{this};
+};
+
+/// Orders two places of an array of point pointers by x, ascending, for `qsort`: dates if both points are date based,
+/// numbers if neither is, where one that is not a number comes last. A date based point and another compare equal.
+int sortPointsByX(const void* a, const void* b);

@@ -1,0 +1,65 @@
+#include "chart/ValueFormat.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstdio>
+
+namespace {
+
+constexpr int kMostDecimals = 6;       // smaller steps are written as powers of ten,
+constexpr double kSmallest = 1e-3;     // and so are all values where they are
+constexpr double kGreatest = 1e9;      // below or above these
+constexpr int kMostFactorDecimals = 9; // more than a float has
+
+/// The exponent of the power of ten that is `x` or just below it; the margin lets 0.001 count as 10^-3.
+int exponent(double x)
+{
+    return static_cast<int>(std::floor(std::log10(x) + 1e-9));
+}
+
+/// Decimals for a value of that size, between a price in cents and the worth of a portfolio.
+int usualDecimals(double magnitude)
+{
+    constexpr double kLimits[] = {1e4, 1e3, 10};
+    int decimals = 0;
+    for (const double limit : kLimits)
+        if (magnitude < limit)
+            ++decimals;
+    return decimals;
+}
+
+} // namespace
+
+ValueFormat ValueFormat::forStep(double step, double magnitude)
+{
+    const int decimals = std::max(0, -exponent(step));
+    if (decimals <= kMostDecimals && magnitude >= kSmallest && magnitude < kGreatest)
+        return {decimals, false};
+    return {std::clamp(exponent(std::max(magnitude, step)) - exponent(step), 0, kMostFactorDecimals), true};
+}
+
+ValueFormat ValueFormat::forValues(const ChartRange& range)
+{
+    constexpr double kPartsOfRange = 50;
+    constexpr double kPartsOfValue = 100;
+    const double magnitude = std::max(std::abs(range.min), std::abs(range.max));
+    if (magnitude == 0)
+        return {0, false};
+    double step = magnitude / kPartsOfValue;
+    if (range.length() > 0)
+        step = std::min(step, range.length() / kPartsOfRange);
+    ValueFormat format = forStep(step, magnitude);
+    if (!format.isScientific_)
+        format.decimals_ = std::max(format.decimals_, usualDecimals(magnitude));
+    return format;
+}
+
+std::string ValueFormat::operator()(double value) const
+{
+    char text[64];
+    if (isScientific_ && value != 0)
+        std::snprintf(text, sizeof text, "%.*e", decimals_, value);
+    else
+        std::snprintf(text, sizeof text, "%.*f", isScientific_ ? 0 : decimals_, value);
+    return text;
+}
