@@ -87,17 +87,6 @@ void removeUnlessLocked(const std::string& path)
     close(descriptor);
 }
 
-void removeLeftOvers(const std::string& folder)
-{
-    std::error_code error;
-    for (fs::directory_iterator entry(folder, error); !error && entry != fs::directory_iterator();
-         entry.increment(error)) {
-        const std::string name = entry->path().filename();
-        if (name.starts_with(kPrefix) && name.ends_with(kSuffix))
-            removeUnlessLocked(entry->path());
-    }
-}
-
 } // namespace
 
 void AtomicFile::check(const std::string& path, Existing existing)
@@ -122,6 +111,17 @@ void AtomicFile::check(const std::string& path, Existing existing)
     // It would also replace a file that its owner has protected.
     if (faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) != 0)
         failFor<OpenError>(path, "cannot be opened");
+}
+
+void AtomicFile::removeLeftOvers(const std::string& folder)
+{
+    std::error_code error;
+    for (fs::directory_iterator entry(folder, error); !error && entry != fs::directory_iterator();
+         entry.increment(error)) {
+        const std::string name = entry->path().filename();
+        if (name.starts_with(kPrefix) && name.ends_with(kSuffix))
+            removeUnlessLocked(entry->path());
+    }
 }
 
 AtomicFile::AtomicFile(const std::string& path, Existing existing) : path_(path), existing_(existing)
@@ -164,14 +164,16 @@ void AtomicFile::flush()
     // The reason of a write that failed earlier may be forgotten by now.
     if (std::ferror(stream_) != 0 && errno == 0)
         errno = EIO;
+    keepPermissions();
     if (std::ferror(stream_) != 0 || std::fflush(stream_) != 0 || fsync(fileno(stream_)) != 0)
         fail("cannot be written");
+    flushed_ = true;
 }
 
 void AtomicFile::commit()
 {
-    keepPermissions();
-    flush();
+    if (!flushed_)
+        flush();
     giveName();
     temporary_.clear();
     // Closed only now, because that unlocks it.

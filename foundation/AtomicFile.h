@@ -30,6 +30,9 @@ public:
     /// again.
     static void check(const std::string& path, Existing existing);
 
+    /// Removes the temporary files in `folder` that killed programs have left. The constructor does so, too.
+    static void removeLeftOvers(const std::string& folder);
+
     /// Creates the temporary file. A link at `path` stays a link: the file that it points to is the one replaced, or
     /// made when there is none.
     AtomicFile(const std::string& path, Existing existing);
@@ -42,11 +45,11 @@ public:
     FILE* stream() const { return stream_; }
     /// The file that is made or replaced: `path` without links, absolute.
     const std::string& target() const { return target_; }
-    /// Brings the contents to the disk. `commit` does so, too; calling this before leaves little between something that
-    /// must come before the commit, but only when the contents are safe, and the commit.
+    /// Brings the contents to the disk, with the owner and permissions of the file that they replace as far as the user
+    /// may set them. Nothing may be written afterwards. For work that must wait until the contents are safe, and come
+    /// before the commit.
     void flush();
-    /// Brings the contents to the disk and gives them their name, with the owner and permissions of the file that they
-    /// replace as far as the user may set them.
+    /// Flushes unless that is done, and gives the contents their name.
     void commit();
     /// Throws a WriteError with the file's name, `what` and the reason in errno.
     [[noreturn]] void fail(const char* what) const;
@@ -61,4 +64,5 @@ private:
     std::string temporary_;
     Existing existing_;
     FILE* stream_ = nullptr;
+    bool flushed_ = false;
 };

@@ -1,0 +1,121 @@
+#include "app/DurableSave.h"
+
+#include "foundation/AtomicFile.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <csignal>
+#include <cstring>
+#include <fcntl.h>
+#include <memory>
+#include <stdexcept>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace {
+
+/// A file that grows past the user's limit is to be a failed write, not the end of the program.
+class SizeSignalIgnored {
+public:
+    SizeSignalIgnored()
+    {
+        struct sigaction ignore {};
+        ignore.sa_handler = SIG_IGN;
+        sigaction(SIGXFSZ, &ignore, &former_);
+    }
+    ~SizeSignalIgnored() { sigaction(SIGXFSZ, &former_, nullptr); }
+    SizeSignalIgnored(const SizeSignalIgnored&) = delete;
+    SizeSignalIgnored& operator=(const SizeSignalIgnored&) = delete;
+
+private:
+    struct sigaction former_ {};
+};
+
+[[noreturn]] void failWriting(const std::string& path)
+{
+    throw AtomicFile::WriteError(
+        path + ": cannot be written: " + (errno != 0 ? std::strerror(errno) : "not all of it can be saved"));
+}
+
+/// Lets `write` write; throws a WriteError when it fails.
+void fill(FILE* stream, const std::string& path, const DurableSave::Writer& write)
+{
+    errno = 0;
+    if (write(stream) != 0 || std::ferror(stream) != 0)
+        failWriting(path);
+}
+
+bool exists(const std::string& path)
+{
+    struct stat status;
+    return lstat(path.c_str(), &status) == 0;
+}
+
+bool isDevice(const std::string& path)
+{
+    struct stat status;
+    return stat(path.c_str(), &status) == 0 && S_ISCHR(status.st_mode);
+}
+
+/// A device has no contents that could be lost, and must not be replaced by a file.
+void writeDevice(const std::string& path, const DurableSave::Writer& write)
+{
+    const int descriptor = open(path.c_str(), O_WRONLY | O_NOCTTY | O_CLOEXEC);
+    FILE* const opened = descriptor >= 0 ? fdopen(descriptor, "wb") : nullptr;
+    if (opened == nullptr) {
+        const int reason = errno;
+        if (descriptor >= 0)
+            close(descriptor);
+        throw AtomicFile::OpenError(path + ": cannot be opened: " + std::strerror(reason));
+    }
+    const std::unique_ptr<FILE, int (*)(FILE*)> stream(opened, std::fclose);
+    fill(opened, path, write);
+    if (std::fflush(opened) != 0)
+        failWriting(path);
+}
+
+DurableSave::Result failed(DurableSave::Outcome outcome, std::string reason)
+{
+    // File names may contain anything.
+    std::ranges::replace_if(
+        reason, [](char c) { return c >= 0 && c < ' '; }, ' ');
+    return {outcome, reason};
+}
+
+} // namespace
+
+DurableSave::Result DurableSave::save(const std::string& path, const Writer& write) const
+{
+    const SizeSignalIgnored ignored;
+    try {
+        if (isDevice(path))
+            writeDevice(path, write);
+        else
+            replace(path, write);
+        return {Outcome::kSaved, ""};
+    } catch (const AtomicFile::OpenError& error) {
+        return failed(Outcome::kOpenFailed, error.what());
+    } catch (const std::runtime_error& error) {
+        return failed(Outcome::kWriteFailed, error.what());
+    }
+}
+
+void DurableSave::replace(const std::string& path, const Writer& write) const
+{
+    AtomicFile file(path, AtomicFile::Existing::kReplace);
+    fill(file.stream(), path, write);
+    // The old file is kept only when it is sure to be replaced, and as late as possible.
+    file.flush();
+    if (!exists(file.target())) {
+        file.commit();
+        return;
+    }
+    const std::string version = versions_.keep(file.target());
+    try {
+        file.commit();
+    } catch (const AtomicFile::WriteError&) {
+        versions_.forget(version);
+        throw;
+    }
+    versions_.prune(file.target(), version);
+}

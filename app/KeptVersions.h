@@ -1,0 +1,45 @@
+#pragma once
+
+#include "app/DataFolder.h"
+
+#include <ctime>
+#include <string>
+#include <vector>
+
+/// The former versions of files that saves have replaced, in the data folder's "Backups".
+///
+/// A version is named after its file and the local time, "Sample 2026-11-21 10.53.04"; those that follow within the
+/// same second end in "-002", "-003" and so on. Versions of files under "Companies" and "PortoFolios" lie in folders of
+/// the same name; those of all others under "Elsewhere", followed by their folder's whole path. So files of equal names
+/// never meet. A name of more than 110 bytes is shortened, and a number made of the whole name put behind it, because
+/// the time must have room.
+///
+/// A version is a hard link to the file where that works, so that it costs the same for large files as for small ones:
+/// the save then gives the name to a new file, and the link keeps the old one. Until then the two names are one file,
+/// and a program that wrote into it in place would change both. That can only be in the moment between `keep` and the
+/// rename; a link that a killed save has left is removed by the next one, and a file that already has other names is
+/// copied, because they stay in use.
+class KeptVersions {
+public:
+    static constexpr std::size_t kVersions = 20; // of each file
+
+    explicit KeptVersions(const DataFolder& folder) : folder_(folder) {}
+
+    /// Keeps the file at `path` (absolute, no links) as it is now; the version is on the disk on return.
+    /// Throws std::runtime_error with one line for the user when it cannot be kept.
+    /// @return the version's path.
+    std::string keep(const std::string& path, std::time_t now = std::time(nullptr)) const;
+    /// Removes `version` again, since the save that kept it did not come about.
+    void forget(const std::string& version) const;
+    /// Removes the oldest versions of the file at `path`, up to `kVersions`. `newest`, what `keep` has returned, stays.
+    /// Versions whose time is after that come from a time when the clock was ahead, and count as older than all others.
+    void prune(const std::string& path, const std::string& newest) const;
+
+    /// The paths of the versions of the file at `path`, by their time.
+    std::vector<std::string> versionsOf(const std::string& path) const;
+
+private:
+    std::string folderFor(const std::string& path) const;
+
+    DataFolder folder_;
+};

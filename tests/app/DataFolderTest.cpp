@@ -1,0 +1,91 @@
+#include "app/DataFolder.h"
+#include "tests/support/PlainUser.h"
+#include "tests/support/ToolRun.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+namespace fs = std::filesystem;
+
+/// A variable of the environment that has another value for a while; null takes it away.
+class Variable {
+public:
+    Variable(const char* name, const char* value) : name_(name)
+    {
+        if (const char* former = std::getenv(name))
+            former_ = former, wasSet_ = true;
+        value != nullptr ? setenv(name, value, 1) : unsetenv(name);
+    }
+    ~Variable() { wasSet_ ? setenv(name_, former_.c_str(), 1) : unsetenv(name_); }
+    Variable(const Variable&) = delete;
+    Variable& operator=(const Variable&) = delete;
+
+private:
+    const char* name_;
+    std::string former_;
+    bool wasSet_ = false;
+};
+
+} // namespace
+
+TEST(DataFolderTest, IsWhereTheDesktopKeepsDocuments)
+{
+    const TemporaryFolder folder("DataFolderTest");
+    const std::string home = folder.path / "home";
+    const Variable variable("HOME", home.c_str());
+    const struct {
+        const char* lines;
+        std::string path;
+        const char* why;
+    } cases[] = {
+        {"", home + "/Documents/Pelorin", "nothing said"},
+        {"XDG_DOCUMENTS_DIR=\"$HOME/Texte\"\n", home + "/Texte/Pelorin", "below the home folder"},
+        {" XDG_DOCUMENTS_DIR = \"/data/My \\\"Docs\\\"/\" # mine\n", "/data/My \"Docs\"/Pelorin", "anywhere else"},
+        {"XDG_DOCUMENTS_DIR=\"$HOME/\"\n", home + "/Pelorin", "none of its own"},
+        {"XDG_DOCUMENTS_DIR=\"/a\"\nXDG_DOCUMENTS_DIR=\"/b\"", "/b/Pelorin", "the last line counts"},
+        {"# XDG_DOCUMENTS_DIR=\"/a\"\nXDG_MUSIC_DIR=\"/m\"\nXDG_DOCUMENTS_DIR=/b\n", home + "/Documents/Pelorin",
+         "a comment, another folder, no quotation marks"},
+        {"XDG_DOCUMENTS_DIR=\"Texte\"\n", home + "/Documents/Pelorin", "neither absolute nor below the home folder"},
+        {"XDG_DOCUMENTS_DIR=\"$HOMES/x\"\n", home + "/Documents/Pelorin", "another variable"},
+    };
+    for (const auto& c : cases)
+        for (const bool isElsewhere : {false, true}) {
+            const fs::path configuration = isElsewhere ? folder.path / "config" : fs::path(home) / ".config";
+            const Variable config("XDG_CONFIG_HOME", isElsewhere ? configuration.c_str() : "not/absolute");
+            fs::create_directories(configuration);
+            std::ofstream(configuration / "user-dirs.dirs") << c.lines;
+            EXPECT_EQ(DataFolder().path(), c.path) << c.why;
+            fs::remove_all(configuration);
+        }
+    const Variable homeless("HOME", nullptr);
+    EXPECT_EQ(DataFolder().path().front(), '/') << "the user's entry has a home folder, too";
+}
+
+TEST(DataFolderTest, MakesWhatIsNeededAndSaysWhyItCannot)
+{
+    const TemporaryFolder folder("DataFolderTest");
+    const PlainUser user(folder.path);
+    const DataFolder data(folder.path / "Documents/Pelorin");
+    std::string error = "former";
+    EXPECT_EQ(data.companies(&error), data.path() + "/Companies");
+    EXPECT_EQ(data.companies(&error) + error, data.path() + "/Companies") << "there already";
+    EXPECT_FALSE(fs::exists(data.path() + "/PortoFolios")) << "not needed yet";
+    data.portoFolios(&error);
+    EXPECT_TRUE(fs::is_directory(data.path() + "/PortoFolios"));
+    data.backups(&error);
+    EXPECT_EQ(error, "");
+    EXPECT_EQ(fs::status(data.path() + "/Backups").permissions(), fs::perms::owner_all);
+
+    std::ofstream(folder.path / "file") << "old";
+    fs::create_symlink("nowhere", folder.path / "dangling");
+    fs::create_directory(folder.path / "locked");
+    fs::permissions(folder.path / "locked", fs::perms(0555));
+    for (const char* place : {"file", "file/x", "dangling", "dangling/x", "locked/x"}) {
+        const std::string path = folder.path / place;
+        EXPECT_EQ(DataFolder(path).companies(&error), path + "/Companies");
+        EXPECT_TRUE(error.starts_with(path + "/Companies: cannot be made: ")) << error;
+    }
+    DataFolder("").companies(&error);
+    EXPECT_NE(error, "") << "no home folder";
+}
