@@ -151,10 +151,8 @@ private:
     {
         ChartLayout bare;
         bare.plot = in_.bounds;
-        constexpr float kInset = 2;
-        BRect area = in_.bounds.InsetByCopy(kInset, kInset);
-        area.right = std::max(area.right, area.left + 1);
-        area.bottom = std::max(area.bottom, area.top + 1);
+        const float inset = std::min({2.0F, in_.bounds.Width() / 4, in_.bounds.Height() / 4});
+        const BRect area = in_.bounds.InsetByCopy(inset, inset);
         bare.scale = ChartScale(x_, y_, area);
         return bare;
     }
@@ -172,7 +170,7 @@ private:
         ChartRange shown{scale.y(out_.plot.bottom), scale.y(out_.plot.top)};
         if (values_.min >= 0) // no labels below 0 where nothing can be
             shown.min = std::max(shown.min, 0.0);
-        if (values_.max <= 0)
+        else if (values_.max <= 0)
             shown.max = std::min(shown.max, 0.0);
         const double valuePerPixel = scale.y(0) - scale.y(1);
         std::vector<AxisTick> ticks;
