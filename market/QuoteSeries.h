@@ -63,6 +63,8 @@ public:
     /// Date of the earliest and of the latest quote; the undefined date without quotes.
     Date getFirstQuote() const { return quotes_.getNbr() > 0 ? quotes_.at(0)->getDate() : Date(); }
     Date getLastQuote() const { return quotes_.getNbr() > 0 ? quotes_.at(quotes_.getNbr() - 1)->getDate() : Date(); }
+    /// Date of the latest quote on or before `d`; the undefined date when there is none.
+    Date getLastQuoteUpTo(const Date& d) const;
     /// Largest and smallest value; 0 without quotes.
     float getHighestQuote() const;
     float getLowestQuote() const;
@@ -119,6 +121,15 @@ unsigned QuoteSeries<Owner, SeriesQuote, ManyEnd>::firstOnOrAfter(const Date& d)
         return n;
     const auto isBefore = [&d](const SeriesQuote* q) { return q->getDate() < d; };
     return static_cast<unsigned>(std::partition_point(quotes, quotes + n, isBefore) - quotes);
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+Date QuoteSeries<Owner, SeriesQuote, ManyEnd>::getLastQuoteUpTo(const Date& d) const
+{
+    if (findQuote(d) != nullptr)
+        return d;
+    const unsigned next = firstOnOrAfter(d);
+    return next > 0 ? getQuote(next - 1)->getDate() : Date();
 }
 
 template <class Owner, class SeriesQuote, class ManyEnd>

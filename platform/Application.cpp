@@ -5,6 +5,7 @@
 #include "platform/Window.h"
 
 #include <QApplication>
+#include <QFont>
 #include <QPalette>
 #include <QStyleFactory>
 

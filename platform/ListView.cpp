@@ -10,6 +10,7 @@
 #include <QScrollBar>
 
 #include <algorithm>
+#include <utility>
 
 namespace {
 
@@ -143,15 +144,16 @@ void BListView::InvalidateItem(int32 index)
 
 // --- Selection.
 
-void BListView::Select(int32 index, bool extend)
+void BListView::Select(int32 first, int32 last, bool extend)
 {
-    if (ItemAt(index) == nullptr)
+    if (ItemAt(first) == nullptr || ItemAt(last) == nullptr)
         return;
-    const bool more = extend && listWidget().selectionMode() == QAbstractItemView::ExtendedSelection;
-    const auto row = listWidget().rows().index(index);
-    listWidget().selectionModel()->select(row,
-                                          more ? QItemSelectionModel::Select : QItemSelectionModel::ClearAndSelect);
-    listWidget().selectionModel()->setCurrentIndex(row, QItemSelectionModel::NoUpdate);
+    const bool severalAllowed = listWidget().selectionMode() == QAbstractItemView::ExtendedSelection;
+    const auto top = listWidget().rows().index(first);
+    const auto bottom = listWidget().rows().index(severalAllowed ? last : first);
+    listWidget().selectionModel()->select(
+        {top, bottom}, extend && severalAllowed ? QItemSelectionModel::Select : QItemSelectionModel::ClearAndSelect);
+    listWidget().selectionModel()->setCurrentIndex(top, QItemSelectionModel::NoUpdate);
 }
 
 void BListView::DeselectAll()

@@ -45,7 +45,9 @@ public:
     void InvalidateItem(int32 index);
 
     /// Selects the row, besides those that are when `extend` is set and the list's type allows it.
-    void Select(int32 index, bool extend = false);
+    void Select(int32 index, bool extend = false) { Select(index, index, extend); }
+    /// The same with all rows from `first` to `last`; in a list of single selection only with the first.
+    void Select(int32 first, int32 last, bool extend);
     void DeselectAll();
     /// The index of the selected row number `which`, counted from the top; negative when there are not so many.
     int32 CurrentSelection(int32 which = 0) const;

@@ -71,6 +71,7 @@ ListWidget::ListWidget(BListView& list) : list_(list), rows_(list), painter_(lis
     setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOn);
     setVerticalScrollMode(QAbstractItemView::ScrollPerItem);
     setEditTriggers(QAbstractItemView::NoEditTriggers);
+    silent_ = false;
 }
 
 ListWidget::~ListWidget()

@@ -58,5 +58,5 @@ private:
     BListView& list_;
     ListModel rows_;
     ListRows painter_;
-    bool silent_ = false;
+    bool silent_ = true; // until it is set up
 };

@@ -1,5 +1,6 @@
 #include "tools/TableReport.h"
 
+#include "foundation/NumberText.h"
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "portfolio/Account.h"
@@ -24,44 +25,6 @@
 namespace {
 
 constexpr auto kRight = TextTable::Align::kRight;
-constexpr std::size_t kGroup = 3; // digits between thousands separators
-
-std::string withSeparators(std::string digits, std::size_t end)
-{
-    const std::size_t begin = digits.front() == '-' ? 1 : 0;
-    for (std::size_t i = end; i > begin + kGroup; i -= kGroup)
-        digits.insert(i - kGroup, 1, ',');
-    return digits;
-}
-
-/// "1,234.50"; a number that is not finite is "?".
-std::string amountText(double amount)
-{
-    if (!std::isfinite(amount))
-        return "?";
-    char digits[64];
-    std::snprintf(digits, sizeof digits, "%.2f", amount);
-    const std::string text(digits);
-    return withSeparators(text == "-0.00" ? "0.00" : text, text.find('.'));
-}
-
-std::string percentText(double fraction, const char* format)
-{
-    if (!std::isfinite(fraction))
-        return "?";
-    char text[64];
-    std::snprintf(text, sizeof text, format, fraction * 100);
-    if (std::strtod(text, nullptr) == 0) // without the sign of what is too small to show
-        std::snprintf(text, sizeof text, format, 0.0);
-    return text;
-}
-
-std::string countText(int count)
-{
-    const std::string digits = std::to_string(count);
-    return withSeparators(digits, digits.size());
-}
-
 std::string dateText(const Date& date)
 {
     return date.isUndefined() ? std::string() : date.toString().getCharacterArray();
@@ -157,7 +120,7 @@ std::string Report::totals() const
         table.addRow({"Total Deposit", amountText(totals.totalDeposit), referenceSymbol_});
         table.addRow({"Total Value", amountText(totals.totalValue), referenceSymbol_});
         table.addRow({"Profit", amountText(totals.profit), referenceSymbol_});
-        table.addRow({"Annual Revenu", percentText(totals.annualRevenue, "%.2f"), "%"});
+        table.addRow({"Annual Revenu", amountText(totals.annualRevenue * 100.0), "%"});
     }
     const Date first = valuation_.state().getFirstOperationDate();
     table.addRow({"First operation", first == State::afterAllOperations() ? "none" : dateText(first), ""});
@@ -212,7 +175,7 @@ std::string Report::holdings() const
         table.addRow({plain(state.getCompanyName()), plain(state.getCompanyAbbreviation()),
                       share != nullptr ? plain(share->getMarketName()) : "", countText(state.getQuantity()),
                       isHeld ? amountText(state.getBuyQuote()) : "", amountText(quote), plain(symbol),
-                      isHeld ? percentText(quote / state.getBuyQuote() - 1, "%+.1f%%") : "",
+                      isHeld ? changeText(quote / state.getBuyQuote() - 1) : "",
                       isHeld ? inReference(quote * state.getQuantity(), symbol) : "",
                       isHeld ? dateText(state.getEndDate()) : ""});
     }

@@ -1,4 +1,4 @@
-#include "tools/InputFile.h"
+#include "foundation/InputFile.h"
 
 #include <cerrno>
 #include <cstring>

@@ -1,0 +1,200 @@
+#include "app/PLWindow.h"
+
+#include "app/MessageView.h"
+#include "app/WindowLock.h"
+#include "foundation/Today.h"
+#include "market/Currency.h"
+#include "platform/Alert.h"
+#include "platform/Application.h"
+#include "platform/Message.h"
+#include "platform/TabView.h"
+#include "portfolio/Wallet.h"
+#include "valuation/State.h"
+#include "views/CompanyView.h"
+#include "views/CurrencyView.h"
+#include "views/OperationView.h"
+#include "views/ParameterView.h"
+#include "views/WalletView.h"
+
+#include <algorithm>
+#include <iterator>
+
+namespace {
+
+/// One entry of the command vocabulary.
+struct Command {
+    uint32 code;
+    void (*run)(PLWindow& window, BMessage* message);
+};
+
+constexpr Command kCommands[] = {
+    // The company page.
+    {'CBAm', [](PLWindow& w, BMessage*) { w.AddMarket(); }},
+    {'CBUm', [](PLWindow& w, BMessage*) { w.UpdateMarket(); }},
+    {'CBRm', [](PLWindow& w, BMessage*) { w.RemoveMarket(nullptr, true); }},
+    {'MSel', [](PLWindow& w, BMessage*) { w.MarketSelection(); }},
+    {'CBAc', [](PLWindow& w, BMessage*) { w.AddCompany(); }},
+    {'CBUc', [](PLWindow& w, BMessage*) { w.UpdateCompany(); }},
+    {'CBRc', [](PLWindow& w, BMessage*) { w.RemoveCompany(nullptr, true); }},
+    {'CSel', [](PLWindow& w, BMessage*) { w.CompanySelection(); }},
+    {'CMSp', [](PLWindow& w, BMessage*) { w.ChangeCompanyEventType(1); }},
+    {'CMNo', [](PLWindow& w, BMessage*) { w.ChangeCompanyEventType(2); }},
+    {'CBEa', [](PLWindow& w, BMessage*) { w.AddCompanyEvent(); }},
+    {'CBEu', [](PLWindow& w, BMessage*) { w.UpdateCompanyEvent(); }},
+    {'CBEr', [](PLWindow& w, BMessage*) { w.RemoveCompanyEvent(); }},
+    {'CEse', [](PLWindow& w, BMessage*) { w.CompanyEventSelection(); }},
+    {'CBAq', [](PLWindow& w, BMessage*) { w.AddCompanyQuote(); }},
+    {'CBUq', [](PLWindow& w, BMessage*) { w.UpdateCompanyQuote(); }},
+    {'CBRq', [](PLWindow& w, BMessage*) { w.RemoveCompanyQuote(); }},
+    {'CQSe', [](PLWindow& w, BMessage*) { w.CompanyQuoteSelection(); }},
+    {'CBSq', [](PLWindow& w, BMessage*) { w.SplitQuotes(); }},
+    {'CCWs', [](PLWindow& w, BMessage*) { w.UpdateCompanyQuotesChart(); }},
+    {'CB3M', [](PLWindow& w, BMessage*) { w.SetThreeMonthsCompanyQuotes(); }},
+    {'CBLd', [](PLWindow& w, BMessage*) { w.LoadSomething(); }}, // of the currency page, too
+    {'CBSv', [](PLWindow& w, BMessage*) { w.SaveSomething(); }}, // and this
+    // The currency page.
+    {'RBAd', [](PLWindow& w, BMessage*) { w.AddCurrency(); }},
+    {'RBUp', [](PLWindow& w, BMessage*) { w.UpdateCurrency(); }},
+    {'RBRe', [](PLWindow& w, BMessage*) { w.RemoveCurrency(); }},
+    {'Crsl', [](PLWindow& w, BMessage*) { w.CurrencySelection(); }},
+    {'RBSr', [](PLWindow& w, BMessage*) { w.SetCurrencyRef(); }},
+    {'RBAq', [](PLWindow& w, BMessage*) { w.AddCurrencyQuote(); }},
+    {'RBUq', [](PLWindow& w, BMessage*) { w.UpdateCurrencyQuote(); }},
+    {'RBRq', [](PLWindow& w, BMessage*) { w.RemoveCurrencyQuote(); }},
+    {'RQSe', [](PLWindow& w, BMessage*) { w.CurrencyQuoteSelection(); }},
+    // The portfolio page.
+    {'WTDa', [](PLWindow& w, BMessage*) { w.UpdateState(); }},
+    {'WCCe', [](PLWindow& w, BMessage*) { w.UpdateState(); }},
+    {'WBLd', [](PLWindow& w, BMessage*) { w.LoadSomething(); }},
+    {'WBSv', [](PLWindow& w, BMessage*) { w.SaveSomething(); }},
+    {'WBRe', [](PLWindow& w, BMessage*) { w.ReinitWallet(); }},
+    {'WBUp', [](PLWindow& w, BMessage*) { w.UpdatePortoFolioQuotes(); }},
+    {'WBAa', [](PLWindow& w, BMessage*) { w.AddAccount(); }},
+    {'WBUa', [](PLWindow& w, BMessage*) { w.UpdateAccount(); }},
+    {'WBRa', [](PLWindow& w, BMessage*) { w.RemoveAccount(); }},
+    {'Acsl', [](PLWindow& w, BMessage*) { w.AccountSelection(); }},
+    // The operation page.
+    {'OCPr', [](PLWindow& w, BMessage*) { w.UpdateState(); }},
+    {'OPDe', [](PLWindow& w, BMessage*) { w.ChangeOperationType("DEPOSIT"); }},
+    {'OPTr', [](PLWindow& w, BMessage*) { w.ChangeOperationType("TRANSFER"); }},
+    {'OPBu', [](PLWindow& w, BMessage*) { w.ChangeOperationType("BUY"); }},
+    {'OPSe', [](PLWindow& w, BMessage*) { w.ChangeOperationType("SELL"); }},
+    {'OTQy', [](PLWindow& w, BMessage*) { w.UpdateOperationTotal(); }},
+    {'OTQo', [](PLWindow& w, BMessage*) { w.UpdateOperationTotal(); }},
+    {'OBAd', [](PLWindow& w, BMessage*) { w.AddOperation(); }},
+    {'OBUp', [](PLWindow& w, BMessage*) { w.UpdateOperation(); }},
+    {'OBRe', [](PLWindow& w, BMessage*) { w.RemoveOperation(); }},
+    {'OSel', [](PLWindow& w, BMessage*) { w.SelectOperation(); }},
+    // The parameter page.
+    {'PTBc', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBc'); }},
+    {'PTSc', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTSc'); }},
+    {'PTBr', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBr'); }},
+    {'PTSr', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTSr'); }},
+    {'PTIn', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTIn'); }},
+    {'PTBp', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBp'); }},
+    {'PTEp', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTEp'); }},
+    {'PTBl', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBl'); }},
+    {'PTEl', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTEl'); }},
+    {'PTRe', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTRe'); }},
+    // The file panels.
+    {'SAVE', [](PLWindow& w, BMessage* m) { w.Save(m); }},
+    {B_REFS_RECEIVED, [](PLWindow& w, BMessage* m) { w.RefsReceived(m); }},
+};
+static_assert(std::size(kCommands) == 65);
+
+const BRect kPageFrame(0, 0, 800, 775);
+
+} // namespace
+
+PLWindow::PLWindow(BRect frame, const DataFolder& folder)
+    : BWindow(frame, "Pelorin", B_TITLED_WINDOW, B_NOT_RESIZABLE, B_CURRENT_WORKSPACE), folder_(folder)
+{
+    makePages();
+    SetMessage("No Company...");
+    makePanels();
+    walletView_->setDate(today());
+    ReinitWallet();
+}
+
+PLWindow::~PLWindow() = default;
+
+void PLWindow::makePages()
+{
+    tabView_ = new BTabView({0, 0, 800, 800}, "TabView", B_WIDTH_AS_USUAL, B_FOLLOW_ALL_SIDES);
+    const auto add = [this](BView* page, const char* label) {
+        auto* tab = new BTab(page);
+        tab->SetLabel(label);
+        tabView_->AddTab(page, tab);
+    };
+    add(companyView_ = new CompanyView(kPageFrame, "CompanyView", this), "Company");
+    add(currencyView_ = new CurrencyView(kPageFrame, "CurrencyView", this), "Currency");
+    add(walletView_ = new WalletView(kPageFrame, "WalletView", this), "PortoFolio");
+    add(operationView_ = new OperationView(kPageFrame, "OperationView", this), "Operations");
+    add(parameterView_ = new ParameterView(kPageFrame, "ParameterView", this), "Parameters");
+    messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
+    AddChild(tabView_);
+    AddChild(messageView_);
+}
+
+void PLWindow::makePanels()
+{
+    const BMessenger self(this);
+    openPanel_ = std::make_unique<BFilePanel>(B_OPEN_PANEL, &self, nullptr, B_FILE_NODE, false, nullptr, false, true);
+    savePanel_ = std::make_unique<BFilePanel>(B_SAVE_PANEL, &self, nullptr, B_FILE_NODE, false, nullptr, false, true);
+}
+
+void PLWindow::MessageReceived(BMessage* message)
+{
+    const auto* command = std::find_if(std::begin(kCommands), std::end(kCommands),
+                                       [&](const Command& c) { return c.code == message->what; });
+    // Many text fields have codes that are no commands: typing changes nothing until a button is pressed.
+    if (command != std::end(kCommands))
+        command->run(*this, message);
+    else
+        BWindow::MessageReceived(message);
+}
+
+bool PLWindow::QuitRequested()
+{
+    be_app->PostMessage(B_QUIT_REQUESTED);
+    return true;
+}
+
+void PLWindow::SetMessage(const char* text)
+{
+    const WindowLock lock(*this);
+    if (lock.isHeld())
+        messageView_->SetMessage(text);
+}
+
+bool PLWindow::confirm(const char* question)
+{
+    constexpr int32 kContinue = 1;
+    return (new BAlert("Warning", question, "Cancel", "Continue"))->Go() == kContinue;
+}
+
+Market** PLWindow::getMarkets(int* n) const
+{
+    const auto markets = catalogue_.getMarkets();
+    *n = static_cast<int>(markets.size());
+    if (markets.empty())
+        return nullptr;
+    auto** array = new Market*[markets.size()];
+    std::copy(markets.begin(), markets.end(), array);
+    return array;
+}
+
+Currency* PLWindow::getCurrencyByRepresentation(const String& representation) const
+{
+    return catalogue_.getCurrencyByRepresentation(representation);
+}
+
+BListView* PLWindow::getCompanyListView() const
+{
+    return companyView_->getCompanyListView();
+}
+
+void PLWindow::refreshWalletCatalogue()
+{
+    wallet_->setCatalogue(catalogue_);
+}

@@ -1,0 +1,91 @@
+#include "foundation/NumberText.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+#include <cstdio>
+#include <cstdlib>
+#include <iterator>
+
+namespace {
+
+constexpr std::size_t kGroup = 3; // digits between thousands separators
+
+std::string withSeparators(std::string digits, std::size_t end)
+{
+    const std::size_t begin = digits.front() == '-' ? 1 : 0;
+    for (std::size_t i = end; i > begin + kGroup; i -= kGroup)
+        digits.insert(i - kGroup, 1, ',');
+    return digits;
+}
+
+std::string formatted(const char* format, double value)
+{
+    if (!std::isfinite(value))
+        return "?";
+    char text[400]; // the largest double has 309 digits before the point
+    std::snprintf(text, sizeof text, format, value);
+    if (std::strtod(text, nullptr) == 0)
+        std::snprintf(text, sizeof text, format, 0.0);
+    return text;
+}
+
+} // namespace
+
+std::string amountText(double amount)
+{
+    const std::string text = formatted("%.2f", amount);
+    return std::isfinite(amount) ? withSeparators(text, text.find('.')) : text;
+}
+
+std::string countText(int count)
+{
+    const std::string digits = std::to_string(count);
+    return withSeparators(digits, digits.size());
+}
+
+std::string percentText(double fraction)
+{
+    return formatted("%.2f %%", fraction * 100);
+}
+
+std::string changeText(double fraction)
+{
+    return formatted("%+.1f%%", fraction * 100);
+}
+
+std::string exactText(float value)
+{
+    if (!std::isfinite(value))
+        return "?";
+    char digits[100];
+    const auto end = std::to_chars(std::begin(digits), std::end(digits), value, std::chars_format::fixed).ptr;
+    std::string text(digits, end);
+    constexpr std::size_t kDecimals = 2;
+    if (text.find('.') == text.npos)
+        text += '.';
+    const std::size_t decimals = text.size() - text.find('.') - 1;
+    if (decimals < kDecimals)
+        text.append(kDecimals - decimals, '0');
+    return text;
+}
+
+double readNumber(const std::string& text)
+{
+    // The last mark is the decimal one; those before it part thousands: "1,234.5", "1.234,5".
+    std::string plain = text;
+    const std::size_t decimal = plain.find_last_of(".,");
+    if (decimal != plain.npos) {
+        plain[decimal] = '.';
+        const auto marks = std::remove_if(plain.begin(), plain.begin() + static_cast<std::ptrdiff_t>(decimal),
+                                          [](char c) { return c == '.' || c == ','; });
+        plain.erase(marks, plain.begin() + static_cast<std::ptrdiff_t>(decimal));
+    }
+    const std::size_t begin = plain.find_first_not_of(" \t");
+    if (begin == plain.npos)
+        return 0;
+    const char* first = plain.data() + begin + (plain[begin] == '+' ? 1 : 0);
+    double value = 0;
+    const auto result = std::from_chars(first, plain.data() + plain.size(), value);
+    return result.ec == std::errc() && std::isfinite(value) ? value : 0;
+}

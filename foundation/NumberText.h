@@ -1,0 +1,20 @@
+#pragma once
+
+#include <string>
+
+/// Numbers as a person reads them. A number that is not finite is "?", and one that is too small to show has no sign.
+
+/// "1,234.50"
+std::string amountText(double amount);
+/// "1,234"
+std::string countText(int count);
+/// "12.34 %" for 0.1234.
+std::string percentText(double fraction);
+/// "+12.3%" for 0.123: a change, in one digit.
+std::string changeText(double fraction);
+/// The shortest text that reads back to the same value, with two decimals at least: "12.50", "0.00123".
+std::string exactText(float value);
+
+/// The number at the beginning of `text`, behind blanks, with "." or "," as decimal mark, and the
+/// other one between thousands; 0 for a text without one.
+double readNumber(const std::string& text);

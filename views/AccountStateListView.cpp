@@ -1,0 +1,44 @@
+#include "views/AccountStateListView.h"
+
+#include "foundation/NumberText.h"
+#include "market/Currency.h"
+#include "portfolio/Account.h"
+#include "views/Look.h"
+
+namespace {
+
+enum Column { kName, kBalance, kCurrency, kDefault };
+
+} // namespace
+
+AccountStateItem::AccountStateItem(AccountState* state) : state_(state), account_(state->listed()) {}
+
+Cell AccountStateItem::cell(int column) const
+{
+    Currency* currency = nullptr;
+    if (account_ != nullptr)
+        account_->getCurrency(&currency);
+    switch (column) {
+    case kName:
+        return {std::string(state_->getAccountName().bytes())};
+    case kBalance:
+        return {amountText(state_->getCash()), state_->getCash() < 0 ? look::kLoss : look::kText};
+    case kCurrency:
+        // Such a balance counts as 0 in the totals.
+        if (currency == nullptr)
+            return {"no currency", look::kWarning};
+        if (currency->getNbrQuotes() == 0)
+            return {std::string(currency->getRepresentation().bytes()) + " (no rate)", look::kWarning};
+        return {std::string(currency->getRepresentation().bytes())};
+    case kDefault:
+        return {account_ != nullptr && account_->isDefaultTransferAccount() ? "\u2713" : ""};
+    default:
+        return {};
+    }
+}
+
+AccountStateListView::AccountStateListView(const char* name)
+    : ObjectListView(
+          {}, name, B_SINGLE_SELECTION_LIST,
+          {{"Account", 172}, {"Balance", 100, B_ALIGN_RIGHT}, {"Currency", 96}, {"Default", 56, B_ALIGN_CENTER}})
+{}

@@ -1,0 +1,65 @@
+#include "views/ColumnItem.h"
+
+#include "platform/View.h"
+#include "views/ColumnListView.h"
+#include "views/Look.h"
+
+#include <cmath>
+
+namespace {
+
+constexpr float kPadding = 4; // from the sides of a column to its text
+
+/// `text`, cut at a character of UTF-8 and ended with three dots when it is wider than `width`.
+std::string fitted(const BView& view, std::string text, float width)
+{
+    if (view.StringWidth(text.c_str()) <= width)
+        return text;
+    constexpr const char* kDots = "\u2026";
+    const auto isInside = [&](std::size_t i) { return (static_cast<unsigned char>(text[i]) & 0xC0) == 0x80; };
+    std::size_t end = text.size();
+    std::size_t shortest = 0;
+    // The width grows with the length, so halving finds the cut.
+    while (end - shortest > 1) {
+        std::size_t middle = (end + shortest) / 2;
+        if (view.StringWidth((text.substr(0, middle) + kDots).c_str()) <= width)
+            shortest = middle;
+        else
+            end = middle;
+    }
+    while (shortest > 0 && isInside(shortest))
+        --shortest;
+    return text.substr(0, shortest) + kDots;
+}
+
+} // namespace
+
+std::string ColumnItem::Text() const
+{
+    std::string line;
+    for (int i = 0; i < columns_; ++i)
+        line += (i > 0 ? "\t" : "") + cell(i).text;
+    return line;
+}
+
+void ColumnItem::DrawItem(BView* owner, BRect frame, bool)
+{
+    const auto& list = static_cast<const ColumnListView&>(*owner);
+    const rgb_color ground = owner->HighColor(); // that of a selected row's text, where the row is selected
+    BFont font;
+    owner->GetFont(&font);
+    font_height height;
+    font.GetHeight(&height);
+    const float base = std::round(frame.top + (frame.Height() + height.ascent - height.descent) / 2);
+    float left = frame.left;
+    for (int i = 0; i < list.CountColumns(); ++i) {
+        const ListColumn& column = list.ColumnAt(i);
+        const Cell shown = cell(i);
+        const std::string text = fitted(*owner, shown.text, column.width - 2 * kPadding);
+        const float room = column.width - 2 * kPadding - owner->StringWidth(text.c_str());
+        const float indent = column.align == B_ALIGN_RIGHT ? room : column.align == B_ALIGN_CENTER ? room / 2 : 0;
+        owner->SetHighColor(ground == look::kText ? shown.color : ground);
+        owner->DrawString(text.c_str(), {std::round(left + kPadding + indent), base});
+        left += column.width;
+    }
+}

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "platform/GraphicsDefs.h"
+
+/// The measures and colours that all pages share, so that they look like one program. Lengths in pixels.
+namespace look {
+
+constexpr rgb_color kPanel = {216, 216, 216, 255};
+constexpr rgb_color kHeading = {196, 203, 212, 255};
+constexpr rgb_color kLine = {168, 168, 168, 255};
+constexpr rgb_color kText = {0, 0, 0, 255};
+constexpr rgb_color kFaint = {110, 110, 110, 255}; ///< what is there but old
+constexpr rgb_color kWarning = {176, 32, 16, 255}; ///< what is missing
+constexpr rgb_color kGain = {0, 104, 44, 255};
+constexpr rgb_color kLoss = {176, 32, 16, 255};
+constexpr rgb_color kSeries = {24, 78, 148, 255}; ///< the line of a chart
+constexpr rgb_color kTrend = {204, 98, 0, 255};   ///< its trend
+constexpr rgb_color kBand = {204, 98, 0, 48};     ///< what lies about the trend
+
+constexpr float kPageWidth = 800;
+constexpr float kPageHeight = 742; ///< what shows of a page, between the tabs and the status line
+constexpr float kMargin = 8;       ///< between the groups of a page, and around them
+constexpr float kBoxTop = 20;      ///< from the upper edge of a box to what is in it
+constexpr float kBoxSide = 10;     ///< from its other edges
+constexpr float kFieldHeight = 22;
+constexpr float kRow = 27; ///< from one field to the one below
+constexpr float kButtonHeight = 24;
+constexpr float kGap = 6; ///< between neighbours in a row
+constexpr float kHeadingHeight = 18;
+constexpr float kListRow = 18;
+constexpr float kScrollBar = 16;
+
+} // namespace look

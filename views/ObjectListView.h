@@ -1,0 +1,152 @@
+#pragma once
+
+#include "views/ColumnItem.h"
+#include "views/ColumnListView.h"
+
+#include <algorithm>
+#include <unordered_map>
+#include <vector>
+
+/// A list with a row for each of some objects of the model.
+///
+/// `Row` is a `ColumnItem` made from an `Object*`, with two accessors that never look into the object: `object()`, and
+/// `key()`, the address of what the row stands for, by which a selection is found again after the list was filled anew
+/// (null for rows that shall not be found again). The list never looks into objects by itself, but showing a row does:
+/// who destroys an object takes its row out before.
+template <class Object, class Row>
+class ObjectListView : public ColumnListView {
+public:
+    using ColumnListView::ColumnListView;
+
+    /// Puts a row behind the others, or before row `index`.
+    void add(Object* object) { add(object, CountItems()); }
+    void add(Object* object, int32 index)
+    {
+        auto* row = new Row(object);
+        if (isIndexed_)
+            rows_[object] = row;
+        addRow(row, index);
+    }
+    /// Adds rows for all of them at once.
+    void addAll(const std::vector<Object*>& objects)
+    {
+        std::vector<ColumnItem*> rows;
+        rows.reserve(objects.size());
+        for (Object* object : objects)
+            rows.push_back(new Row(object));
+        isIndexed_ = false;
+        addRows(rows);
+    }
+    /// Replaces the rows; what was selected stays so where it still is, as does the place that the list is scrolled to.
+    /// Sends no message.
+    void setAll(const std::vector<Object*>& objects)
+    {
+        remember();
+        clear();
+        addAll(objects);
+        recall();
+    }
+
+    /// Draws the object's row again.
+    void modify(const Object* object) { InvalidateItem(indexOf(object)); }
+    /// Takes the object's row out. @return false when there is none.
+    bool remove(const Object* object)
+    {
+        const int32 index = indexOf(object);
+        if (index < 0)
+            return false;
+        rows_.erase(object);
+        destroyRow(index);
+        return true;
+    }
+    void clear()
+    {
+        destroyRows();
+        rows_.clear();
+        isIndexed_ = false;
+    }
+
+    int32 indexOf(const Object* object) const
+    {
+        index();
+        const auto found = rows_.find(object);
+        return found != rows_.end() ? IndexOf(found->second) : -1;
+    }
+    Object* objectAt(int32 index) const
+    {
+        const BListItem* item = ItemAt(index);
+        return item != nullptr ? static_cast<const Row*>(item)->object() : nullptr;
+    }
+    /// The first selected object, null when there is none.
+    Object* selected() const { return objectAt(CurrentSelection()); }
+    /// All selected objects, from the top.
+    std::vector<Object*> allSelected() const
+    {
+        std::vector<Object*> objects;
+        for (int32 i = 0; i < CountSelected(); ++i)
+            objects.push_back(objectAt(CurrentSelection(i)));
+        return objects;
+    }
+    /// Selects the object's row alone and shows it; sends the selection message.
+    void select(const Object* object)
+    {
+        Select(indexOf(object));
+        ScrollToSelection();
+    }
+
+    /// Keeps in mind what is selected and where the list is scrolled to, for `recall` to bring back after the list was
+    /// emptied and filled.
+    void remember()
+    {
+        remembered_.clear();
+        for (int32 i = 0; i < CountSelected(); ++i) {
+            if (const void* key = static_cast<const Row*>(ItemAt(CurrentSelection(i)))->key())
+                remembered_.push_back(key);
+        }
+        rememberedTop_ = TopRow();
+    }
+    /// What was kept in mind no longer means anything here.
+    void forget()
+    {
+        remembered_.clear();
+        rememberedTop_ = 0;
+    }
+    /// Sends no message.
+    void recall()
+    {
+        SetQuiet(true);
+        std::sort(remembered_.begin(), remembered_.end());
+        int32 first = -1; // of a run of rows that are selected together
+        for (int32 i = 0; !remembered_.empty() && i <= CountItems(); ++i) {
+            const void* key = i < CountItems() ? static_cast<const Row*>(ItemAt(i))->key() : nullptr;
+            const bool isRemembered = key != nullptr && std::binary_search(remembered_.begin(), remembered_.end(), key);
+            if (isRemembered && first < 0)
+                first = i;
+            if (!isRemembered && first >= 0) {
+                Select(first, i - 1, true);
+                first = -1;
+            }
+        }
+        SetTopRow(rememberedTop_);
+        SetQuiet(false);
+        forget();
+    }
+
+private:
+    void index() const
+    {
+        if (isIndexed_)
+            return;
+        rows_.clear();
+        for (int32 i = 0; i < CountItems(); ++i) {
+            auto* row = static_cast<Row*>(ItemAt(i));
+            rows_[row->object()] = row;
+        }
+        isIndexed_ = true;
+    }
+
+    mutable std::unordered_map<const Object*, Row*> rows_; // when it is up to date
+    mutable bool isIndexed_ = false;
+    std::vector<const void*> remembered_;
+    int32 rememberedTop_ = 0;
+};

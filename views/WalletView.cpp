@@ -1,0 +1,293 @@
+#include "views/WalletView.h"
+
+#include "chart/GraphPoint.h"
+#include "chart/GraphView.h"
+#include "foundation/NumberText.h"
+#include "market/Catalogue.h"
+#include "market/Currency.h"
+#include "platform/Box.h"
+#include "platform/Button.h"
+#include "platform/CheckBox.h"
+#include "valuation/Evolution.h"
+#include "valuation/State.h"
+#include "valuation/Totals.h"
+#include "views/AccountStateListView.h"
+#include "views/DateControl.h"
+#include "views/Look.h"
+#include "views/ShareStateListView.h"
+
+namespace {
+
+using namespace look;
+
+// Where the groups of the page begin and end.
+constexpr float kRight = kPageWidth - kMargin;
+constexpr float kTopEnd = kMargin + kButtonHeight;
+constexpr float kTotalsTop = kTopEnd + kMargin;
+constexpr float kTotalsEnd = kTotalsTop + 54;
+constexpr float kAccountsTop = kTotalsEnd + kMargin;
+constexpr float kAccountsEnd = kAccountsTop + 148;
+constexpr float kHoldingsTop = kAccountsEnd + kMargin;
+constexpr float kHoldingsEnd = kHoldingsTop + 210;
+constexpr float kChartTop = kHoldingsEnd + kMargin;
+
+template <class Object>
+std::vector<Object*> all(unsigned n, Object** objects)
+{
+    return {objects, objects + n};
+}
+
+} // namespace
+
+WalletView::WalletView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
+{
+    makeTop();
+    makeTotals();
+    makeAccounts();
+    makeHoldings();
+    makeChart();
+}
+
+WalletView::~WalletView() = default;
+
+void WalletView::makeTop()
+{
+    constexpr float kDateDivider = 38;
+    date_ = new DateControl({kMargin, kMargin + 1, kMargin + 132, kMargin + 1 + kFieldHeight}, "txtDate", "Date", "",
+                            new BMessage('WTDa'));
+    date_->SetDivider(kDateDivider);
+    date_->SetAlignment(B_ALIGN_RIGHT, B_ALIGN_LEFT);
+    AddChild(date_);
+    computeEvolution_ = addCheckBox(this, {kMargin + 148, kMargin + 1, kMargin + 300, kMargin + 1 + kFieldHeight},
+                                    "cbxComputeEvolution", "Compute Evolution", 'WCCe');
+    constexpr float kWidth = 110;
+    const struct {
+        const char* name;
+        const char* label;
+        uint32 code;
+    } buttons[] = {
+        {"btnLoadPortoFolio", "Load from File", 'WBLd'},
+        {"btnSavePortoFolio", "Save to File", 'WBSv'},
+        {"btnReinitPortoFolio", "Reinit", 'WBRe'},
+        {"btnUpdateAllQuotes", "Update Quotes", 'WBUp'},
+    };
+    float left = kRight - 4 * kWidth - 3 * kGap;
+    for (const auto& b : buttons) {
+        addButton(this, {left, kMargin, left + kWidth, kTopEnd}, b.name, b.label, b.code);
+        left += kWidth + kGap;
+    }
+}
+
+void WalletView::makeTotals()
+{
+    totalsBox_ = addBox(this, {kMargin, kTotalsTop, kRight, kTotalsEnd}, "Totals");
+    const float width = (kRight - kMargin - 2 * kBoxSide - 3 * kMargin) / 4;
+    float left = kBoxSide;
+    const auto add = [&](const char* name, const char* label, uint32 code, float divider) {
+        BTextControl* field = addNumber(totalsBox_, {left, kBoxTop + 2, left + width, kBoxTop + 2 + kFieldHeight}, name,
+                                        label, code, divider);
+        field->SetEditable(false);
+        left += width + kMargin;
+        return field;
+    };
+    totalDeposit_ = add("txtTotalDeposit", "Total Deposit", 'WTTd', 86);
+    totalValue_ = add("txtTotalValue", "Total Value", 'WTTv', 74);
+    profit_ = add("txtProfit", "Profit", 'WTPr', 42);
+    annualRevenu_ = add("txtAnnualRevenu", "Annual Revenu", 'WTAr', 96);
+}
+
+void WalletView::makeAccounts()
+{
+    BBox* box = addBox(this, {kMargin, kAccountsTop, kRight, kAccountsEnd}, "Accounts");
+    const float bottom = kAccountsEnd - kAccountsTop - kBoxSide;
+    constexpr float kListEnd = kBoxSide + 440;
+    accounts_ = new AccountStateListView("lstAccounts");
+    accounts_->addTo(box, {kBoxSide, kBoxTop, kListEnd, bottom}, "Accounts");
+    accounts_->SetSelectionMessage(new BMessage('Acsl'));
+
+    constexpr float kLeft = kListEnd + 2 * kMargin;
+    const float right = kRight - kMargin - kBoxSide;
+    constexpr float kDivider = 62;
+    float top = kBoxTop;
+    accountName_ = addField(box, {kLeft, top, right, top + kFieldHeight}, "txtAccountName", "Name", 'WTAn', kDivider);
+    top += kRow;
+    accountCurrency_ =
+        addField(box, {kLeft, top, right, top + kFieldHeight}, "txtAccountCurrency", "Currency", 'WTAc', kDivider);
+    top += kRow;
+    defaultTransferAccount_ = addCheckBox(box, {kLeft, top, right, top + kFieldHeight}, "cbxDefaultTransferAccount",
+                                          "Default Transfer Account for this currency", 'WCDt');
+    const float width = (right - kLeft - 2 * kGap) / 3;
+    const float buttonTop = bottom - kButtonHeight;
+    // The last two bear the names of the quote buttons of other pages. Intended: controls are found by these names.
+    addButton(box, {kLeft, buttonTop, kLeft + width, bottom}, "btnAddAccount", "Add", 'WBAa');
+    addButton(box, {kLeft + width + kGap, buttonTop, kLeft + 2 * width + kGap, bottom}, "btnUpdateQuote", "Update",
+              'WBUa');
+    addButton(box, {right - width, buttonTop, right, bottom}, "btnRemoveQuote", "Remove", 'WBRa');
+}
+
+void WalletView::makeHoldings()
+{
+    BBox* box = addBox(this, {kMargin, kHoldingsTop, kRight, kHoldingsEnd}, "Holdings");
+    shares_ = new ShareStateListView("lstShares");
+    shares_->addTo(box, {kBoxSide, kBoxTop, kRight - kMargin - kBoxSide, kHoldingsEnd - kHoldingsTop - kBoxSide},
+                   "Holdings");
+}
+
+void WalletView::makeChart()
+{
+    evolution_ = new GraphView({kMargin, kChartTop, kRight, kPageHeight - kMargin}, "grvEvolution");
+    evolution_->SetAccessibleName("Evolution of the total value");
+    evolution_->setXDateBased(true);
+    line_.setDateBased(true);
+    line_.setColor(kSeries);
+    evolution_->addGraphElement(&line_);
+    AddChild(evolution_);
+}
+
+void WalletView::setDate(const Date& date)
+{
+    date_->setDate(date);
+}
+
+Date WalletView::getDate() const
+{
+    return date_->getDate();
+}
+
+bool WalletView::isComputeEvolution() const
+{
+    return computeEvolution_->Value() == B_CONTROL_ON;
+}
+
+// --- The state.
+
+void WalletView::SetState(const State* state, const Catalogue& catalogue)
+{
+    SetAccountStateList(state);
+    shares_->clear();
+    if (state == nullptr) {
+        showNoTotals();
+        return;
+    }
+    unsigned n;
+    ShareState** shares = state->getAllShareStates(&n);
+    shares_->addAll(all(n, shares));
+    accounts_->recall();
+    shares_->recall();
+
+    const Totals totals(*state, catalogue);
+    const Currency* reference = catalogue.getReferenceCurrency();
+    if (totals.isKnown)
+        showTotals(totals, std::string(reference->getRepresentation().bytes()), reference->getNbrQuotes() > 0);
+    else
+        showNoTotals();
+}
+
+void WalletView::ClearState()
+{
+    accounts_->remember();
+    shares_->remember();
+    accounts_->clear();
+    shares_->clear();
+    showNoTotals();
+}
+
+void WalletView::ForgetSelection()
+{
+    accounts_->forget();
+    shares_->forget();
+}
+
+void WalletView::showTotals(const Totals& totals, const std::string& symbol, bool hasRate)
+{
+    totalsBox_->SetLabel(hasRate ? "Totals" : ("Totals: " + symbol + " has no rate, so nothing has a value").c_str());
+    const auto show = [&](BTextControl* field, float amount) {
+        field->SetText((amountText(amount) + ' ' + symbol).c_str());
+    };
+    show(totalDeposit_, totals.totalDeposit);
+    show(totalValue_, totals.totalValue);
+    show(profit_, totals.profit);
+    annualRevenu_->SetText(percentText(totals.annualRevenue).c_str());
+}
+
+void WalletView::showNoTotals()
+{
+    totalsBox_->SetLabel("Totals");
+    for (BTextControl* field : {totalDeposit_, totalValue_, profit_, annualRevenu_})
+        field->SetText("");
+}
+
+void WalletView::UpdateEvolution(const Wallet& wallet, const Catalogue& catalogue, EvolutionOutcome outcome)
+{
+    ClearEvolution();
+    const Currency* reference = catalogue.getReferenceCurrency();
+    const std::string symbol = reference != nullptr ? std::string(reference->getRepresentation().bytes()) : "???";
+    evolution_->setXLegend(("Value in " + symbol).c_str());
+    if (outcome != EvolutionOutcome::Built)
+        evolution_->setYLegend(outcome == EvolutionOutcome::TooLong
+                                   ? "The evolution would be too long: is the date of an operation mistyped?"
+                                   : "The first operation has no real date");
+    for (const auto& point : evolutionPoints(wallet, catalogue)) {
+        auto* shown = new GraphPoint;
+        shown->setDateBased(true);
+        shown->setDateX(point.date);
+        shown->setY(point.totalValue);
+        line_.addGraphPoint(shown);
+    }
+}
+
+void WalletView::ClearEvolution()
+{
+    line_.clearAll();
+    evolution_->removeAllGraphPoints();
+    evolution_->setXLegend(String());
+    evolution_->setYLegend(String());
+    evolution_->Invalidate();
+}
+
+// --- Accounts.
+
+void WalletView::SetAccountStateList(const State* state)
+{
+    accounts_->clear();
+    if (state == nullptr)
+        return;
+    unsigned n;
+    AccountState** accounts = state->getAllAccountStates(&n);
+    accounts_->addAll(all(n, accounts));
+}
+
+AccountState* WalletView::GetSelectedAccountState() const
+{
+    return accounts_->selected();
+}
+
+String WalletView::getAccountName() const
+{
+    return accountName_->Text();
+}
+
+void WalletView::setAccountName(const String& name)
+{
+    accountName_->SetText(name.hasText() ? name.getCharacterArray() : "");
+}
+
+String WalletView::getAccountCurrency() const
+{
+    return accountCurrency_->Text();
+}
+
+void WalletView::setAccountCurrency(const String& representation)
+{
+    accountCurrency_->SetText(representation.hasText() ? representation.getCharacterArray() : "");
+}
+
+bool WalletView::isDefaultTransferAccount() const
+{
+    return defaultTransferAccount_->Value() == B_CONTROL_ON;
+}
+
+void WalletView::setDefaultTransferAccount(bool isDefault)
+{
+    defaultTransferAccount_->SetValue(isDefault ? B_CONTROL_ON : B_CONTROL_OFF);
+}
