@@ -54,6 +54,7 @@ public:
     int readLine(char* buffer, int size);
     /// Sends a line with CR LF at its end, whatever line end the text has; "null" for a String without text.
     int writeLine(const String& line);
+    int writeLine(const char* text) { return writeLine(String(text)); }
     /// The same; a CR or LF at the end of `text` is overwritten by a zero.
     int writeLine(char* text);
 

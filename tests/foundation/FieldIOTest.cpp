@@ -5,6 +5,8 @@
 #include <bit>
 #include <climits>
 #include <gtest/gtest.h>
+#include <sys/socket.h>
+#include <unistd.h>
 
 TEST(FieldIOTest, FieldsAreLittleEndianWithoutPadding)
 {
@@ -43,6 +45,23 @@ TEST(FieldIOTest, BytesPastTheEndReadAsFF)
         EXPECT_EQ(freadshort(shorts), asShort[size]);
         EXPECT_EQ(reachedEnd(shorts), size < 2) << size;
     }
+}
+
+TEST(FieldIOTest, ASocketGivesOneByteThenItsEndThenAnError)
+{
+    int ends[2];
+    ASSERT_EQ(socketpair(AF_UNIX, SOCK_STREAM, 0, ends), 0);
+    ASSERT_EQ(send(ends[1], "\0x", 2, 0), 2);
+    close(ends[1]);
+    char c = '-';
+    EXPECT_EQ(sgetc(&c, ends[0]), 1);
+    EXPECT_EQ(c, '\0');
+    EXPECT_EQ(sgetc(&c, ends[0]), 1);
+    EXPECT_EQ(c, 'x');
+    EXPECT_EQ(sgetc(&c, ends[0]), 0);
+    close(ends[0]);
+    EXPECT_LT(sgetc(&c, ends[0]), 0);
+    EXPECT_EQ(c, 'x');
 }
 
 TEST(ErrorDeathTest, TheMessageGoesToStandardErrorAndTheProcessEnds)

@@ -1,0 +1,222 @@
+#include "market/Company.h"
+#include "market/Market.h"
+#include "net/LatestQuote.h"
+#include "net/QuoteHistory.h"
+#include "net/QuoteServers.h"
+#include "net/Socket.h"
+#include "tests/support/ToolRun.h"
+#include "tools/QuoteFolder.h"
+
+#include <cmath>
+#include <csignal>
+#include <gmock/gmock.h>
+#include <limits>
+#include <memory>
+#include <sys/stat.h>
+
+using testing::HasSubstr;
+using testing::StartsWith;
+
+namespace {
+
+namespace fs = std::filesystem;
+
+/// A running pelorin-quotes, at a port that the system has chosen.
+class ServerRun {
+public:
+    explicit ServerRun(const fs::path& folder)
+    {
+        int ends[2];
+        EXPECT_EQ(pipe(ends), 0);
+        pid_ = fork();
+        if (pid_ == 0) {
+            dup2(ends[1], STDOUT_FILENO);
+            close(ends[0]);
+            execl(PELORIN_QUOTES, PELORIN_QUOTES, folder.c_str(), "--port", "0", nullptr);
+            _exit(127);
+        }
+        close(ends[1]);
+        for (char c; read(ends[0], &c, 1) == 1 && c != '\n';)
+            address_ += c;
+        close(ends[0]);
+    }
+    ~ServerRun() { stop(SIGKILL); }
+    ServerRun(const ServerRun&) = delete;
+    ServerRun& operator=(const ServerRun&) = delete;
+
+    const std::string& address() const { return address_; }
+    unsigned short port() const
+    {
+        return static_cast<unsigned short>(std::stoi("0" + address_.substr(address_.find(':') + 1)));
+    }
+    /// @return the exit status; -1 when it did not exit by itself.
+    int stop(int signal)
+    {
+        int status = -1;
+        if (pid_ > 0) {
+            kill(pid_, signal);
+            waitpid(pid_, &status, 0);
+        }
+        pid_ = 0;
+        return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    }
+
+private:
+    pid_t pid_;
+    std::string address_;
+};
+
+class QuotesTest : public testing::Test {
+protected:
+    ~QuotesTest() override { quoteServers() = before_; }
+    void file(const std::string& name, const std::string& content) const
+    {
+        std::ofstream(folder_.path / name, std::ios::binary) << content;
+    }
+    float latest(const ServerRun& server, const char* ticker)
+    {
+        quoteServers() = {"localhost", "localhost", server.port(), std::chrono::seconds(20)};
+        company_->setAbbreviation(ticker);
+        float value = -1;
+        Date date;
+        const int result = company_->getInternetLastQuote("localhost", QuoteServers::kLatestPath, &value, &date);
+        return result == 0 ? value : -1;
+    }
+
+    const QuoteServers before_ = quoteServers();
+    TemporaryFolder folder_{"pelorin-quotes-test"};
+    Market market_{"NYSE"};
+    Company* company_ = new Company(&market_, "Company", "A"); // owned by the market
+};
+
+TEST_F(QuotesTest, APageReadsBackToTheVeryPrice)
+{
+    std::vector<float> prices = {0.0001F, 1e-7F, 1.0F / 3, 97.765F, 16777218, 123456.78F, 1e10F, 3e38F};
+    for (int cents = 1; cents < 30000; ++cents)
+        prices.push_back(static_cast<float>(cents / 100.0));
+    for (int cents = 30001; cents < 90000000; cents += 44449)
+        prices.push_back(static_cast<float>(cents / 100.0));
+    const Date day(5, 1, 2005);
+    for (const float price : prices) {
+        float latest = 0;
+        EXPECT_EQ(parseLatestQuotePage(latestQuotePage(price), &latest), 0);
+        EXPECT_EQ(latest, price) << latestQuotePage(price);
+        std::vector<DatedPrice> rows;
+        EXPECT_EQ(parseHistoryPage(historyPage({{day, price}}), &rows), 0);
+        ASSERT_EQ(rows.size(), 1U) << price;
+        EXPECT_EQ(rows[0].price, price) << historyPage({{day, price}});
+        EXPECT_EQ(rows[0].date, day);
+    }
+    EXPECT_THAT(latestQuotePage(112.375F), HasSubstr("<b>112 <sup>3</sup>/<sub>8</sub>"));
+    EXPECT_THAT(latestQuotePage(97.76F), HasSubstr("<b>97 <sup>76</sup>/<sub>100</sub>"));
+    EXPECT_THAT(latestQuotePage(45), HasSubstr("<b>45</b></td>"));
+}
+
+TEST_F(QuotesTest, TheProgramServesWhatTheFetchesRead)
+{
+    std::string table = "Date;Open;Close\n";
+    std::map<Date, float> closes;
+    int cents = 4511;
+    for (Date day(1, 12, 2004); day <= Date(31, 5, 2005); day + 1) {
+        cents += (cents * 7) % 31 - 15;
+        closes[day] = static_cast<float>(cents / 100.0);
+        table += std::string(day.toString().bytes()) + ";1;" + std::to_string(cents / 100) + "," +
+                 (cents % 100 < 10 ? "0" : "") + std::to_string(cents % 100) + "\n";
+    }
+    file("BRK.B.csv", table);
+    file("^X&Y.csv", "2005-01-04,8.25\r\n2005-01-03,7.75\r\n");
+    ServerRun server(folder_.path);
+    EXPECT_THAT(server.address(), StartsWith("127.0.0.1:"));
+    EXPECT_EQ(latest(server, "^X&Y"), 8.25F) << "of the last day, not of the last line";
+    EXPECT_EQ(latest(server, "BRK.B"), closes.rbegin()->second);
+    EXPECT_EQ(company_->setInternetLastThreeMonthsQuote(), 0);
+    closes.erase(closes.begin(), closes.upper_bound(Date(28, 2, 2005)));
+    EXPECT_EQ(company_->getFirstQuote(), Date(1, 3, 2005));
+    ASSERT_EQ(company_->getNbrQuotes(), closes.size());
+    for (const auto& [day, close] : closes)
+        EXPECT_EQ(company_->getRealQuote(day), close) << day.toString().bytes();
+    file("BRK.B.csv", "2005-06-01,9.5\n");
+    EXPECT_EQ(latest(server, "BRK.B"), 9.5F) << "files are read anew";
+    EXPECT_EQ(server.stop(SIGTERM), 0);
+}
+
+TEST_F(QuotesTest, OtherRequestsGetAPageWithoutAPrice)
+{
+    fs::create_directory(folder_.path / "in");
+    fs::create_directory(folder_.path / "in/FOLDER.csv");
+    mkfifo((folder_.path / "in/PIPE.csv").c_str(), 0600);
+    for (const char* name : {"out.csv", "in/A.csv", "in/.hidden.csv", "in/.csv"})
+        file(name, "2005-01-03,97.75\n");
+    file("in/EMPTY.csv", "");
+    file("in/BAD.csv", "Date,Close\n2005-01-03,none\n");
+    file("in/COLUMNS.csv", "Date,Volume\n2005-01-03,1\n");
+    std::ostringstream log;
+    const QuoteFolder folder(folder_.path / "in", log);
+    EXPECT_EQ(folder.answer("GET /quotes?symbol=A\r\n"), latestQuotePage(97.75F));
+    const std::string absolute = (folder_.path / "out").string();
+    for (const std::string ticker : {"B", "", "a", "../out", "../in/A", "in/../A", "./A", "/A", ".hidden", "FOLDER",
+                                     "PIPE", "EMPTY", "BAD", "COLUMNS", "A.csv", "A ", "..", absolute.c_str()})
+        for (const std::string& request :
+             {"GET /quotes?symbol=" + ticker, "GET /idc/nasdgraph.idc?usymbol=" + ticker + "&umos=03&site=nasdaq"})
+            EXPECT_EQ(folder.answer(request + "\r\n"), noQuotesPage()) << request;
+    for (const char* request :
+         {"", "\r\n", "GET", "GET /", "get /quotes?symbol=A", "POST /quotes?symbol=A",
+          "GET /idc/nasdgraph.idc?usymbol=A", "GET /idc/nasdgraph.idc?usymbol=&umos=03&site=nasdaq"})
+        EXPECT_EQ(folder.answer(request), noQuotesPage()) << request;
+    EXPECT_THAT(log.str(), HasSubstr("BAD.csv, line 2: "));
+    EXPECT_THAT(log.str(), HasSubstr("COLUMNS.csv: the header line names no column for the price"));
+    float price = 0;
+    EXPECT_EQ(parseLatestQuotePage(noQuotesPage(), &price), -1);
+    EXPECT_THROW(QuoteFolder(folder_.path / "out.csv", log), std::runtime_error);
+}
+
+TEST_F(QuotesTest, ASilentClientHoldsTheServerForSecondsOnly)
+{
+    file("A.csv", "2005-01-03,97.75\n");
+    ServerRun server(folder_.path);
+    auto silent = std::make_unique<Socket>();
+    ASSERT_EQ(silent->connectTo("127.0.0.1", server.port()), 0);
+    const auto start = std::chrono::steady_clock::now();
+    EXPECT_EQ(latest(server, "A"), 97.75F);
+    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(10));
+
+    auto gone = std::make_unique<Socket>();
+    ASSERT_EQ(gone->connectTo("127.0.0.1", server.port()), 0);
+    gone.reset();
+    EXPECT_EQ(latest(server, "A"), 97.75F) << "one that hangs up does not end it";
+
+    silent = std::make_unique<Socket>();
+    ASSERT_EQ(silent->connectTo("127.0.0.1", server.port()), 0);
+    usleep(200000); // so that it waits for the request
+    const auto stopping = std::chrono::steady_clock::now();
+    EXPECT_EQ(server.stop(SIGINT), 0);
+    EXPECT_LT(std::chrono::steady_clock::now() - stopping, std::chrono::seconds(3));
+}
+
+TEST_F(QuotesTest, WhatCannotBeServedIsTold)
+{
+    ServerRun server(folder_.path);
+    const std::string taken = "--port " + std::to_string(server.port());
+    const struct {
+        std::string arguments;
+        int status;
+        const char* message;
+    } cases[] = {
+        {". " + taken, 1, "cannot be listened on: "},
+        {". --port 0 --bind 192.0.2.1", 1, "192.0.2.1:0: cannot be listened on: "},
+        {"none --port 0", 1, "none: No such file"},
+        {"", 2, "FOLDER"},
+        {". --port 65536", 2, "--port"},
+        {". --port x", 2, "--port"},
+        {". --bind localhost", 2, "--bind"},
+        {"''", 2, "FOLDER"},
+    };
+    for (const auto& c : cases) {
+        const ToolRun run(PELORIN_QUOTES, c.arguments, folder_);
+        EXPECT_EQ(run.status, c.status) << c.arguments;
+        EXPECT_THAT(run.err, HasSubstr(c.message)) << c.arguments;
+        EXPECT_EQ(run.out, "") << c.arguments;
+    }
+}
+
+} // namespace
