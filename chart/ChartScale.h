@@ -34,33 +34,27 @@ struct ChartPoint {
 class ChartScale {
 public:
     ChartScale() = default;
-    /// Neither range nor the area has length 0.
-    ChartScale(const ChartRange& x, const ChartRange& y, const BRect& area) : x_(x), y_(y), area_(area) {}
+    /// Neither range has length 0.
+    ChartScale(const ChartRange& x, const ChartRange& y, const BRect& area)
+        : left_(area.left), bottom_(area.bottom), minX_(x.min), minY_(y.min),
+          perX_(static_cast<double>(area.Width()) / x.length()), perY_(static_cast<double>(area.Height()) / y.length())
+    {}
 
-    float pixelX(double x) const
-    {
-        return static_cast<float>(area_.left + (x - x_.min) / x_.length() * static_cast<double>(area_.Width()));
-    }
-    float pixelY(double y) const
-    {
-        return static_cast<float>(area_.bottom - (y - y_.min) / y_.length() * static_cast<double>(area_.Height()));
-    }
+    float pixelX(double x) const { return static_cast<float>(left_ + (x - minX_) * perX_); }
+    float pixelY(double y) const { return static_cast<float>(bottom_ - (y - minY_) * perY_); }
     BPoint pixel(const ChartPoint& p) const { return {pixelX(p.x), pixelY(p.y)}; }
 
-    double x(float pixelX) const
-    {
-        return x_.min + static_cast<double>(pixelX - area_.left) / static_cast<double>(area_.Width()) * x_.length();
-    }
-    double y(float pixelY) const
-    {
-        return y_.min + static_cast<double>(area_.bottom - pixelY) / static_cast<double>(area_.Height()) * y_.length();
-    }
+    double x(float pixelX) const { return minX_ + (static_cast<double>(pixelX) - left_) / perX_; }
+    double y(float pixelY) const { return minY_ + (bottom_ - static_cast<double>(pixelY)) / perY_; }
 
     /// Pixels to a unit of the x axis.
-    double pixelsPerX() const { return static_cast<double>(area_.Width()) / x_.length(); }
+    double pixelsPerX() const { return perX_; }
 
 private:
-    ChartRange x_{0, 1};
-    ChartRange y_{0, 1};
-    BRect area_{0, 0, 1, 1};
+    double left_ = 0; // in pixels
+    double bottom_ = 1;
+    double minX_ = 0; // in units of the axes
+    double minY_ = 0;
+    double perX_ = 1; // pixels to a unit
+    double perY_ = 1;
 };

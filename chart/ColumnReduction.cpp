@@ -49,8 +49,9 @@ std::vector<BPoint> reduceByColumn(std::span<const ChartPoint> points, const Cha
     std::size_t end = 0;
     for (std::size_t i = 0; i < pixels.size();) {
         Run run(i);
-        const float column = std::floor(pixels[i].x);
-        for (++i; i < pixels.size() && std::floor(pixels[i].x) == column; ++i)
+        const float left = std::floor(pixels[i].x);
+        const float right = left + 1;
+        for (++i; i < pixels.size() && pixels[i].x >= left && pixels[i].x < right; ++i)
             run.add(i, pixels);
         end = run.moveTo(end, pixels);
     }

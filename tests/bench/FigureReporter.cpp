@@ -31,6 +31,8 @@ constexpr Figure kFigures[] = {
     {"Files to chart, large portfolio", "BM_Files/chart_large", nullptr, "ms", "< 640"},
     {"Removal from a list, cost of an element, 4 n / n", "BM_RemoveQuotes/40000", "BM_RemoveQuotes/10000", "",
      "about 1"},
+    {"Drawing of a line, 100,000 / 5,000 points", "BM_DrawLine/100000", "BM_DrawLine/5000", "", "< 3"},
+    {"Filling and clearing a line, a point, 4 n / n", "BM_FillLine/80000", "BM_FillLine/20000", "", "about 1"},
 };
 
 double medianOf(std::vector<double> values)

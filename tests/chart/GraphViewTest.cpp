@@ -1,0 +1,139 @@
+// Run by the program of tests that have an application object, on the platform without a screen.
+
+#include "chart/GraphView.h"
+#include "chart/GraphLine.h"
+#include "chart/GraphPoint.h"
+#include "chart/GraphPolygon.h"
+
+#include <gtest/gtest.h>
+
+#include <QImage>
+#include <QWidget>
+
+#include <limits>
+
+namespace {
+
+constexpr rgb_color kBackground{10, 120, 30, 0};
+constexpr rgb_color kColor{200, 20, 60, 0};
+
+class GraphViewTest : public testing::Test {
+protected:
+    GraphViewTest()
+    {
+        view_.setBackgroundColor(kBackground);
+        line_.setColor(kColor);
+        band_.setColor({kColor.red, kColor.green, kColor.blue, 127});
+        view_.addGraphElement(&band_);
+        view_.addGraphElement(&line_);
+    }
+
+    static void fill(GraphPolyElement& element, std::initializer_list<BPoint> points)
+    {
+        for (const BPoint& p : points)
+            element.addGraphPoint(new GraphPoint(p.x, p.y));
+    }
+
+    QImage image() { return view_.widget()->grab().toImage(); }
+
+    /// The colour at a place of the chart's data.
+    QColor colorAt(const QImage& image, double x, double y) const
+    {
+        const BPoint p = view_.scale()->pixel({x, y});
+        return image.pixelColor(static_cast<int>(p.x), static_cast<int>(p.y));
+    }
+
+    GraphLine line_;
+    GraphPolygon band_;
+    GraphView view_{BRect(0, 0, 300, 200), "chart"};
+};
+
+TEST_F(GraphViewTest, RemovesThePointsThatStandAlone)
+{
+    for (int i = 0; i < 3; ++i)
+        view_.addGraphElement(new GraphPoint(1, 1));
+    GraphLine behind;
+    view_.addGraphElement(&behind);
+    EXPECT_EQ(view_.getNbrGraphElements(), 6U);
+    view_.removeAllGraphPoints();
+    unsigned count;
+    GraphElement* const* elements = view_.getAllGraphElements(&count);
+    ASSERT_EQ(count, 3U);
+    EXPECT_EQ(elements[0], &band_);
+    EXPECT_EQ(elements[1], &line_);
+    EXPECT_EQ(elements[2], &behind);
+}
+
+TEST_F(GraphViewTest, OwnsOnlyPointsThatStandAlone)
+{
+    GraphView* shownBy;
+    {
+        GraphView other(BRect(0, 0, 10, 10), "other");
+        line_.setGraphView(&other);
+        EXPECT_EQ(view_.getNbrGraphElements(), 1U) << "left for the other chart";
+        other.addGraphElement(new GraphPoint(1, 1));
+    } // a leak shows under AddressSanitizer
+    EXPECT_EQ(line_.getGraphView(&shownBy), -1);
+    {
+        GraphLine line;
+        view_.addGraphElement(&line);
+    }
+    EXPECT_EQ(view_.getNbrGraphElements(), 1U);
+}
+
+TEST_F(GraphViewTest, SaysThatThereIsNoDataAndNothingElse)
+{
+    constexpr float kInfinite = std::numeric_limits<float>::infinity();
+    const struct {
+        std::initializer_list<BPoint> points;
+        const char* why;
+    } cases[] = {{{}, "nothing"}, {{{1, 1}}, "too few points"}, {{{1, kInfinite}, {2, kInfinite}}, "no place"}};
+    view_.setXLegend("Value in EUR");
+    for (const auto& c : cases) {
+        line_.clearAll();
+        fill(line_, c.points);
+        view_.Invalidate();
+        const QImage drawn = image();
+        const QRect text(10, 5, 70, 20);
+        const QColor background(kBackground.red, kBackground.green, kBackground.blue);
+        bool hasText = false;
+        for (int y = 0; y < drawn.height(); ++y)
+            for (int x = 0; x < drawn.width(); ++x) {
+                const bool isBackground = drawn.pixelColor(x, y) == background;
+                hasText = hasText || !isBackground;
+                ASSERT_TRUE(isBackground || text.contains(x, y)) << c.why << ": " << x << ", " << y;
+            }
+        EXPECT_TRUE(hasText) << c.why;
+        EXPECT_EQ(view_.scale(), nullptr) << c.why;
+    }
+}
+
+TEST_F(GraphViewTest, CoversWithAlpha0AndLetsShineThroughBetween)
+{
+    fill(line_, {{0, 1}, {10, 1}});
+    fill(band_, {{0, 0}, {10, 0}, {10, 3}, {0, 3}});
+    const QImage drawn = image();
+    EXPECT_EQ(colorAt(drawn, 6.5, 1), QColor(kColor.red, kColor.green, kColor.blue)) << "the line is in front";
+    const QColor mixed = colorAt(drawn, 6.5, 2.2);
+    EXPECT_NEAR(mixed.red(), (kColor.red + kBackground.red) / 2, 2);
+    EXPECT_NEAR(mixed.green(), (kColor.green + kBackground.green) / 2, 2);
+    band_.setColor(kColor);
+    view_.Invalidate();
+    EXPECT_EQ(colorAt(image(), 6.5, 2.2), QColor(kColor.red, kColor.green, kColor.blue));
+}
+
+TEST_F(GraphViewTest, FindsThePointUnderThePointer)
+{
+    fill(line_, {{0, 1}, {5, 2}, {10, 1}});
+    EXPECT_EQ(view_.nearestPoint({0, 0}, 1e6), nullptr) << "nothing drawn yet";
+    image();
+    const BPoint middle = view_.scale()->pixel({5, 2});
+    EXPECT_NEAR(view_.scale()->x(middle.x), 5, 0.01);
+    EXPECT_NEAR(view_.scale()->y(middle.y), 2, 0.01);
+    const GraphPoint* found = view_.nearestPoint(middle + BPoint(3, 2), 5);
+    ASSERT_NE(found, nullptr);
+    EXPECT_EQ(found->getX(), 5);
+    EXPECT_EQ(view_.nearestPoint(middle + BPoint(3, 2), 2), nullptr);
+}
+
+} // namespace
