@@ -137,6 +137,15 @@ void removeLinkTo(const struct stat& file, const Shelf& shelf, const std::vector
     }
 }
 
+/// Removes the oldest of the versions. Those after `present` come from a time when the clock was ahead, and count as
+/// older than all others.
+void removeOldest(const Shelf& shelf, std::vector<Moment> moments, const Moment& present)
+{
+    std::ranges::rotate(moments, std::ranges::upper_bound(moments, present));
+    for (std::size_t i = 0; i + KeptVersions::kVersions < moments.size(); ++i)
+        unlink(shelf.pathOf(moments[i]).c_str());
+}
+
 /// Links the file to `version` unless it has other names. @return false when it has to be copied.
 bool linkVersion(const std::string& path, const std::string& version)
 {
@@ -229,6 +238,7 @@ std::string KeptVersions::keep(const std::string& path, std::time_t now) const
     for (const Moment& former : moments) // a number is not used again, even if its version is gone
         if (former.stamp == moment.stamp)
             moment.number = former.number + 1;
+    removeOldest(shelf, moments, moment); // of saves that were killed before they could prune
     const std::string version = shelf.pathOf(moment);
     if (!linkVersion(path, version)) {
         try {
@@ -249,12 +259,10 @@ void KeptVersions::forget(const std::string& version) const
 void KeptVersions::prune(const std::string& path, const std::string& newest) const
 {
     const Shelf shelf(folderFor(path), path);
-    std::vector<Moment> moments = shelf.moments();
-    const auto last = std::ranges::find(moments, newest, [&shelf](const Moment& m) { return shelf.pathOf(m); });
-    if (last != moments.end())
-        std::rotate(moments.begin(), last + 1, moments.end());
-    for (std::size_t i = 0; i + kVersions < moments.size(); ++i)
-        unlink(shelf.pathOf(moments[i]).c_str());
+    const std::vector<Moment> moments = shelf.moments();
+    const auto present = std::ranges::find(moments, newest, [&shelf](const Moment& m) { return shelf.pathOf(m); });
+    if (present != moments.end())
+        removeOldest(shelf, moments, *present);
 }
 
 std::vector<std::string> KeptVersions::versionsOf(const std::string& path) const

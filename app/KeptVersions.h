@@ -33,6 +33,7 @@ public:
     void forget(const std::string& version) const;
     /// Removes the oldest versions of the file at `path`, up to `kVersions`. `newest`, what `keep` has returned, stays.
     /// Versions whose time is after that come from a time when the clock was ahead, and count as older than all others.
+    /// `keep` removes what a save that was killed before this has left, so that there is never more than one too many.
     void prune(const std::string& path, const std::string& newest) const;
 
     /// The paths of the versions of the file at `path`, by their time.

@@ -136,7 +136,7 @@ int killAfter(std::chrono::microseconds time, const Files& files, int generation
     return last;
 }
 
-/// Lets a child do `work` and kills it when it enters or leaves a system call for the `n`-th time.
+/// Lets a child do `work` and kills it on its way into system call number `n`, from 0.
 /// @return false when it has ended before; `*status` is what waitpid says.
 bool killAtCall(int n, const std::function<bool()>& work, int* status)
 {
@@ -148,7 +148,7 @@ bool killAtCall(int n, const std::function<bool()>& work, int* status)
         _exit(work() ? 0 : 1);
     }
     waitpid(child, status, 0);
-    for (; n > 0 && WIFSTOPPED(*status); --n) {
+    for (int stops = 2 * n + 1; stops > 0 && WIFSTOPPED(*status); --stops) { // it stops on its way out, too
         ptrace(PTRACE_SYSCALL, child, nullptr, nullptr);
         waitpid(child, status, 0);
     }
@@ -165,7 +165,7 @@ bool killAtCall(int n, const std::function<bool()>& work, int* status)
 TEST(KilledSaveTest, AKillAtAnyTimeLeavesTheOldFileOrTheNewOne)
 {
     constexpr int kKills = 220;
-    constexpr int kQuotes = 400000;
+    constexpr int kQuotes = 200000;
     const Generations generations(kQuotes);
     Files files(generations);
     const auto start = std::chrono::steady_clock::now();
@@ -197,7 +197,7 @@ TEST(KilledSaveTest, AKillAtAnyTimeLeavesTheOldFileOrTheNewOne)
     EXPECT_GT(saved, kKills / 10) << "too few saves have got through";
 }
 
-TEST(KilledSaveTest, AKillBeforeOrAfterAnySystemCallLeavesTheOldFileOrTheNewOne)
+TEST(KilledSaveTest, AKillBetweenAnyTwoSystemCallsLeavesTheOldFileOrTheNewOne)
 {
     const Generations generations(200);
     for (const bool isCopied : {false, true}) {
@@ -224,7 +224,7 @@ TEST(KilledSaveTest, AKillBeforeOrAfterAnySystemCallLeavesTheOldFileOrTheNewOne)
         }
         EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
         EXPECT_GT(found[0], 20);
-        EXPECT_GT(found[1], 5);
+        EXPECT_GT(found[1], 3);
         RecordProperty(isCopied ? "calls_copying" : "calls_linking", calls);
     }
 }
