@@ -37,6 +37,7 @@ void MessageView::SetMessage(const char* text)
     std::memmove(message_, text, size); // `text` may be the message itself
     SetAccessibleName(message_);
     DrawMsg();
+    Sync(); // the command may go on to block for a while
 }
 
 void MessageView::DrawMsg()

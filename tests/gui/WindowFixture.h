@@ -1,0 +1,97 @@
+#pragma once
+
+#include "app/PLWindow.h"
+
+#include <QString>
+#include <QWidget>
+#include <gtest/gtest.h>
+#include <memory>
+#include <string>
+#include <vector>
+
+class BListView;
+class QTemporaryDir;
+
+/// The tabs of the window.
+enum Page { kCompanyPage, kCurrencyPage, kPortoFolioPage, kOperationPage, kParameterPage };
+
+/// A test of the real window, on a data folder of its own, on 21/11/2024. What a person does is done by events: clicks
+/// and keys.
+class WindowTest : public testing::Test {
+protected:
+    WindowTest();
+    ~WindowTest() override;
+
+    /// Closes the window, and opens another one on the same folder.
+    void restart();
+    PLWindow& window() { return *window_; }
+    Wallet& wallet() { return *window_->getWallet(); }
+    const std::string& folder() const { return folder_; }
+    std::string marketFile() const { return folder_ + "/Companies/Sample"; }
+    std::string walletFile() const { return folder_ + "/PortoFolios/Sample"; }
+    /// Writes the sample of `pelorin-sample` into the data folder.
+    void makeSample() const;
+
+    /// Clicks on a tab.
+    void show(Page page);
+    /// The control of that name on the page that is shown; the test fails when there is none.
+    template <class Widget>
+    Widget& find(const char* name)
+    {
+        auto* widget = page().findChild<Widget*>(QString::fromUtf8(name));
+        if (widget == nullptr)
+            throw std::runtime_error(std::string("no such control: ") + name);
+        return *widget;
+    }
+    bool isVisible(const char* name) { return find<QWidget>(name).isVisible(); }
+    BListView& list(const char* name);
+
+    /// Clicks on a button or a check box.
+    void click(const char* name);
+    /// Types into a field in place of what is there, without Enter.
+    void type(const char* name, const std::string& text);
+    /// The same, with Enter.
+    void enter(const char* name, const std::string& text);
+    std::string text(const char* name);
+    /// Chooses the item of a menu by keys.
+    void choose(const char* name, const std::string& item);
+    /// Clicks on a row; with `more` the ones selected before stay so.
+    void select(const char* list, int row, bool more = false);
+    /// The texts of a list's rows, cells with tabs between.
+    std::vector<std::string> rows(const char* list);
+
+    /// What the status line shows.
+    std::string message() const;
+    void clearMessage() { window().SetMessage(""); }
+    /// Sends a code as a control does.
+    void post(uint32 code);
+    /// Handles all that waits.
+    static void settle();
+
+    /// The button of the next alert that a person clicks; the alert's text is noted. Without it an alert fails the
+    /// test.
+    void answerNextAlert(const char* button) { alertAnswer_ = button; }
+    /// The texts of the alerts since the last call.
+    std::vector<std::string> alerts() { return std::exchange(alerts_, {}); }
+    /// Chooses a file in the panel that is open, by keys; an empty path leaves the panel by Escape.
+    void answerPanel(const char* panel, const std::string& path);
+    bool isPanelOpen(const char* panel) const;
+    /// The folder that an open panel shows.
+    std::string panelFolder(const char* panel) const;
+
+    /// Both files through the buttons and panels.
+    void loadSample();
+
+private:
+    QWidget& page();
+    QWidget& desktopWindow() const;
+    int32 onAlert();
+    void watchForAlert();
+
+    std::unique_ptr<QTemporaryDir> temporary_;
+    std::string folder_;
+    PLWindow* window_; // owns itself
+    std::string alertAnswer_;
+    std::vector<std::string> alerts_;
+    std::unique_ptr<QObject> watcher_;
+};

@@ -1,0 +1,239 @@
+// The window itself, the portfolio page and the parameter page.
+
+#include "app/MessageView.h"
+#include "market/Company.h"
+#include "platform/ListView.h"
+#include "platform/TabView.h"
+#include "platform/WindowWidget.h"
+#include "portfolio/Account.h"
+#include "portfolio/Share.h"
+#include "portfolio/Wallet.h"
+#include "tests/gui/WindowFixture.h"
+#include "valuation/State.h"
+
+#include <QAbstractButton>
+#include <QAbstractItemView>
+#include <QComboBox>
+#include <QLineEdit>
+#include <QPixmap>
+#include <QPlainTextEdit>
+#include <QTabBar>
+#include <QTest>
+#include <gmock/gmock.h>
+
+namespace {
+
+using testing::ElementsAre;
+using testing::HasSubstr;
+using testing::SizeIs;
+
+class MainWindowTest : public WindowTest {};
+
+TEST_F(MainWindowTest, OpensEmptyOnTodayWithFiveTabs)
+{
+    EXPECT_STREQ(window().Title(), "Pelorin");
+    EXPECT_EQ(window().widget().size(), QSize(800, 800));
+    EXPECT_EQ(window().widget().minimumSize(), window().widget().maximumSize());
+    auto* tabs = static_cast<BTabView*>(window().FindView("TabView"));
+    std::vector<std::string> labels;
+    for (int32 i = 0; i < tabs->CountTabs(); ++i)
+        labels.emplace_back(tabs->TabAt(i)->Label());
+    EXPECT_THAT(labels, ElementsAre("Company", "Currency", "PortoFolio", "Operations", "Parameters"));
+    EXPECT_EQ(message(), "No Company...");
+    show(kPortoFolioPage);
+    EXPECT_EQ(text("txtDate"), "21/11/2024");
+    EXPECT_EQ(text("txtTotalValue"), "") << "without a reference currency nothing is shown";
+}
+
+TEST_F(MainWindowTest, EveryControlHasANameForTestsAndForAssistiveTools)
+{
+    for (const Page page : {kCompanyPage, kCurrencyPage, kPortoFolioPage, kOperationPage, kParameterPage}) {
+        show(page);
+        for (const QWidget* widget : window().widget().findChildren<QWidget*>()) {
+            const bool isControl = qobject_cast<const QAbstractButton*>(widget) != nullptr ||
+                                   qobject_cast<const QLineEdit*>(widget) != nullptr ||
+                                   qobject_cast<const QComboBox*>(widget) != nullptr ||
+                                   qobject_cast<const QPlainTextEdit*>(widget) != nullptr ||
+                                   qobject_cast<const QAbstractItemView*>(widget) != nullptr;
+            if (!isControl || !widget->isVisible() || widget->parentWidget()->inherits("QTabBar"))
+                continue;
+            const std::string name = widget->objectName().toStdString();
+            EXPECT_NE(name, "") << "on page " << page;
+            EXPECT_NE(widget->accessibleName().toStdString(), "") << name;
+            EXPECT_NE(widget->focusPolicy() & Qt::TabFocus, 0) << name;
+        }
+    }
+}
+
+TEST_F(MainWindowTest, UnknownCodesAndTypingChangeNothing)
+{
+    loadSample();
+    const State* state = window().getState();
+    clearMessage();
+    for (const uint32 code : {'Xxxx', 'WTTd', 'WTAn', 'CTMn', 'RTNa', 'OTDa'})
+        post(code);
+    show(kPortoFolioPage);
+    enter("txtAccountName", "Somebody");
+    EXPECT_EQ(window().getState(), state);
+    EXPECT_EQ(message(), "");
+}
+
+TEST_F(MainWindowTest, StatusLineIsOnTheScreenWhileItsCommandStillRuns)
+{
+    auto& line = *window().FindView("MessageView")->widget();
+    const auto shown = [&] { return window().widget().screen()->grabWindow(window().widget().winId()).toImage(); };
+    const QRect place(line.mapTo(&window().widget(), QPoint(0, 0)), line.size());
+    window().SetMessage("");
+    const QImage empty = shown().copy(place);
+    window().SetMessage("Getting the latest quote on the Internet... Please stand by."); // no event is handled here
+    EXPECT_NE(shown().copy(place), empty);
+}
+
+TEST_F(MainWindowTest, StatusLineReplacesClearsAndCutsItsMessage)
+{
+    auto* line = static_cast<MessageView*>(window().FindView("MessageView"));
+    window().SetMessage("first");
+    window().SetMessage("other"); // of the same length
+    EXPECT_STREQ(line->Message(), "other");
+    window().SetMessage(std::string(1000, 'x').c_str());
+    EXPECT_EQ(message().size(), 1000U);
+    line->SetMessage(line->Message());
+    EXPECT_EQ(message().size(), 1000U);
+    line->SetMessage(nullptr);
+    EXPECT_EQ(line->Message(), nullptr);
+    EXPECT_EQ(line->Frame(), BRect(0, 776, 800, 800));
+}
+
+class PortoFolioPageTest : public WindowTest {
+protected:
+    PortoFolioPageTest() { loadSample(); }
+};
+
+TEST_F(PortoFolioPageTest, DateRevaluesAndAWrongOneStopsTheValuation)
+{
+    enter("txtDate", "31.12.2022");
+    EXPECT_EQ(window().getState()->getDate(), Date(31, 12, 2022));
+    EXPECT_NE(text("txtTotalValue"), "");
+    enter("txtDate", "31/2/2022");
+    EXPECT_EQ(window().getState(), nullptr);
+    EXPECT_EQ(text("txtTotalValue"), "");
+    EXPECT_THAT(rows("lstAccounts"), SizeIs(0));
+    // Leaving the field commits it as well.
+    type("txtDate", "1-1-2023");
+    QTest::keyClick(&find<QLineEdit>("txtDate"), Qt::Key_Tab);
+    settle();
+    EXPECT_EQ(window().getState()->getDate(), Date(1, 1, 2023));
+}
+
+TEST_F(PortoFolioPageTest, SelectionAndScrollingSurviveARecomputation)
+{
+    select("lstShares", 9);
+    select("lstAccounts", 1);
+    const int32 top = list("lstShares").TopRow();
+    ASSERT_GT(top, 0);
+    enter("txtDate", "1/6/2024");
+    EXPECT_EQ(list("lstAccounts").CurrentSelection(), 1);
+    EXPECT_EQ(list("lstShares").CurrentSelection(), 9);
+    EXPECT_EQ(list("lstShares").TopRow(), top);
+}
+
+TEST_F(PortoFolioPageTest, EvolutionIsBuiltAndEmptied)
+{
+    click("cbxComputeEvolution");
+    EXPECT_GT(wallet().getNbrStates(), 300U);
+    click("cbxComputeEvolution");
+    EXPECT_EQ(wallet().getNbrStates(), 1U);
+}
+
+TEST_F(PortoFolioPageTest, RowsSayWhatIsOldOrMissing)
+{
+    enter("txtDate", "24/11/2024"); // a Sunday
+    EXPECT_THAT(rows("lstShares")[0], HasSubstr("22/11/2024"));
+    Company* company = nullptr;
+    unsigned n;
+    wallet().getAllShares(&n)[0]->getCompany(&company);
+    while (company->getNbrQuotes() > 0)
+        delete company->getQuote(0U);
+    enter("txtDate", "22/11/2024");
+    EXPECT_THAT(rows("lstShares")[0], HasSubstr("no quote"));
+    wallet().getAccount(0)->setCurrency(nullptr);
+    enter("txtDate", "21/11/2024");
+    EXPECT_THAT(rows("lstAccounts")[0], HasSubstr("no currency"));
+}
+
+class ParameterPageTest : public WindowTest {
+protected:
+    ParameterPageTest() { show(kParameterPage); }
+};
+
+TEST_F(ParameterPageTest, ShowsTheDefaults)
+{
+    const struct {
+        const char* field;
+        const char* text;
+    } cases[] = {
+        {"txtBuyCost", "29.95"},
+        {"txtSellCost", "29.95"},
+        {"txtBuyRateCost", "0.17 %"},
+        {"txtSellRateCost", "0.17 %"},
+        {"txtInvestementPeriod", "90"},
+        {"txtBeginProfitSellRate", "200.00 %"},
+        {"txtEndProfitSellRate", "110.00 %"},
+        {"txtBeginLoseSellRate", "80.00 %"},
+        {"txtEndLoseSellRate", "80.00 %"},
+        {"txtReinvestRate", "90.00 %"},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(text(c.field), c.text) << c.field;
+}
+
+TEST_F(ParameterPageTest, CommitsStoreWhatTheFieldBeginsWith)
+{
+    const struct {
+        const char* text;
+        float cost;
+    } costs[] = {
+        {"29.95 $", 29.95F}, {"$29.95", 29.95F},
+        {"\u00A330", 30},    {"12abc", 12},
+        {"abc", 0},          {"", 0},
+        {"7%", 7},           {"1000000000000000000000000000000000000000000", 3.40282347e38F},
+    };
+    for (const auto& c : costs) {
+        enter("txtBuyCost", c.text);
+        EXPECT_EQ(wallet().getBuyCost(), c.cost) << c.text;
+    }
+    for (const char* text : {"0.25 %", "0.25", "%0.25"}) {
+        enter("txtSellRateCost", text);
+        EXPECT_EQ(wallet().getSellRateCost(), 0.0025F) << text;
+    }
+    const struct {
+        const char* text;
+        short days;
+    } periods[] = {{"90.7", 90}, {"12 days", 12}, {"", 0}, {"99999", 32767}};
+    for (const auto& c : periods) {
+        enter("txtInvestementPeriod", c.text);
+        EXPECT_EQ(wallet().getInvestementPeriod(), c.days) << c.text;
+    }
+    enter("txtBeginProfitSellRate", "150");
+    EXPECT_EQ(wallet().getBeginProfitSellRate(), 1.5F);
+}
+
+TEST_F(ParameterPageTest, OnlyTheFixedCostsDoNotRevalue)
+{
+    const struct {
+        const char* field;
+        bool revalues;
+    } cases[] = {
+        {"txtBuyCost", false},          {"txtSellCost", false},         {"txtBuyRateCost", true},
+        {"txtSellRateCost", true},      {"txtInvestementPeriod", true}, {"txtBeginProfitSellRate", true},
+        {"txtEndProfitSellRate", true}, {"txtBeginLoseSellRate", true}, {"txtEndLoseSellRate", true},
+        {"txtReinvestRate", true},
+    };
+    for (const auto& c : cases) {
+        window().SetState(nullptr);
+        enter(c.field, "33");
+        EXPECT_EQ(window().getState() != nullptr, c.revalues) << c.field;
+    }
+}
+
+} // namespace
