@@ -30,6 +30,35 @@ std::string formatted(const char* format, double value)
     return text;
 }
 
+/// What a text says as a number, and whether it says nothing else.
+struct Parsed {
+    double value = 0;
+    bool isWhole = false;
+};
+
+Parsed parsed(const std::string& text)
+{
+    // The last mark is the decimal one; those before it part thousands: "1,234.5", "1.234,5".
+    std::string plain = text;
+    const std::size_t decimal = plain.find_last_of(".,");
+    if (decimal != plain.npos) {
+        plain[decimal] = '.';
+        const auto marks = std::remove_if(plain.begin(), plain.begin() + static_cast<std::ptrdiff_t>(decimal),
+                                          [](char c) { return c == '.' || c == ','; });
+        plain.erase(marks, plain.begin() + static_cast<std::ptrdiff_t>(decimal));
+    }
+    const std::size_t begin = plain.find_first_not_of(" \t");
+    if (begin == plain.npos)
+        return {};
+    const char* first = plain.data() + begin + (plain[begin] == '+' ? 1 : 0);
+    const char* end = plain.data() + plain.size();
+    double value = 0;
+    const auto result = std::from_chars(first, end, value);
+    if (result.ec != std::errc() || !std::isfinite(value))
+        return {};
+    return {value, std::all_of(result.ptr, end, [](char c) { return c == ' ' || c == '\t'; })};
+}
+
 } // namespace
 
 std::string amountText(double amount)
@@ -47,6 +76,11 @@ std::string countText(int count)
 std::string percentText(double fraction)
 {
     return formatted("%.2f %%", fraction * 100);
+}
+
+std::string finePercentText(double fraction)
+{
+    return formatted("%.4f %%", fraction * 100);
 }
 
 std::string changeText(double fraction)
@@ -72,20 +106,10 @@ std::string exactText(float value)
 
 double readNumber(const std::string& text)
 {
-    // The last mark is the decimal one; those before it part thousands: "1,234.5", "1.234,5".
-    std::string plain = text;
-    const std::size_t decimal = plain.find_last_of(".,");
-    if (decimal != plain.npos) {
-        plain[decimal] = '.';
-        const auto marks = std::remove_if(plain.begin(), plain.begin() + static_cast<std::ptrdiff_t>(decimal),
-                                          [](char c) { return c == '.' || c == ','; });
-        plain.erase(marks, plain.begin() + static_cast<std::ptrdiff_t>(decimal));
-    }
-    const std::size_t begin = plain.find_first_not_of(" \t");
-    if (begin == plain.npos)
-        return 0;
-    const char* first = plain.data() + begin + (plain[begin] == '+' ? 1 : 0);
-    double value = 0;
-    const auto result = std::from_chars(first, plain.data() + plain.size(), value);
-    return result.ec == std::errc() && std::isfinite(value) ? value : 0;
+    return parsed(text).value;
+}
+
+bool isNumber(const std::string& text)
+{
+    return parsed(text).isWhole;
 }

@@ -10,6 +10,8 @@ std::string amountText(double amount);
 std::string countText(int count);
 /// "12.34 %" for 0.1234.
 std::string percentText(double fraction);
+/// "0.0123 %" for 0.000123: what happens in a day, in four decimals.
+std::string finePercentText(double fraction);
 /// "+12.3%" for 0.123: a change, in one digit.
 std::string changeText(double fraction);
 /// The shortest text that reads back to the same value, with two decimals at least: "12.50", "0.00123".
@@ -18,3 +20,5 @@ std::string exactText(float value);
 /// The number at the beginning of `text`, behind blanks, with "." or "," as decimal mark, and the
 /// other one between thousands; 0 for a text without one.
 double readNumber(const std::string& text);
+/// Whether all of `text` but the blanks around it is what `readNumber` reads.
+bool isNumber(const std::string& text);
