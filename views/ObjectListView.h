@@ -59,11 +59,36 @@ public:
         destroyRow(index);
         return true;
     }
+    /// Leaves the object's row without object, in constant time, for when many objects go: `dropReleased` then takes
+    /// all such rows out at once. Needs a row with `release()`. @return false when there is none.
+    bool release(const Object* object)
+    {
+        index();
+        const auto found = rows_.find(object);
+        if (found == rows_.end())
+            return false;
+        found->second->release();
+        rows_.erase(found);
+        hasReleased_ = true;
+        return true;
+    }
+    void dropReleased()
+    {
+        if (!hasReleased_)
+            return;
+        std::vector<Object*> left;
+        for (int32 i = 0; i < CountItems(); ++i) {
+            if (Object* object = objectAt(i))
+                left.push_back(object);
+        }
+        setAll(left);
+    }
     void clear()
     {
         destroyRows();
         rows_.clear();
         isIndexed_ = false;
+        hasReleased_ = false;
     }
 
     int32 indexOf(const Object* object) const
@@ -147,6 +172,7 @@ private:
 
     mutable std::unordered_map<const Object*, Row*> rows_; // when it is up to date
     mutable bool isIndexed_ = false;
+    bool hasReleased_ = false; // rows that wait to be dropped
     std::vector<const void*> remembered_;
     int32 rememberedTop_ = 0;
 };

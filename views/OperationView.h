@@ -5,6 +5,8 @@
 class Account;
 class BCheckBox;
 class Operation;
+class OperationListView;
+class ShareOperation;
 
 /// The page of the operations on the portfolio's accounts.
 class OperationView final : public PageView {
@@ -25,6 +27,12 @@ public:
     /// What was selected belongs to a portfolio that is gone.
     void ForgetSelection();
 
+    /// Shows nothing of the operation any more, in constant time; its row goes with the next refresh.
+    void RemoveShareOperation(ShareOperation* operation);
+    /// Draws the operation's row again.
+    void UpdateShareOperation(ShareOperation* operation);
+
 private:
     BCheckBox* prevision_;
+    OperationListView* operations_;
 };

@@ -1,0 +1,135 @@
+#include "views/OperationListView.h"
+
+#include "foundation/NumberText.h"
+#include "platform/View.h"
+#include "portfolio/Account.h"
+#include "portfolio/Share.h"
+#include "portfolio/ShareOperation.h"
+#include "portfolio/TransferAccountOperation.h"
+#include "views/DateText.h"
+#include "views/Look.h"
+
+namespace {
+
+enum Column { kDate, kAccount, kType, kWhat, kQuantity, kPrice, kCost, kTotal, kAutomatic };
+
+constexpr const char* kTypeNames[] = {"?", "Deposit", "Transfer", "Buy", "Sell"}; // by type code
+
+std::string textOf(const String& text)
+{
+    return std::string(text.bytes());
+}
+
+bool isTrade(const Operation& operation)
+{
+    return operation.getType() == Operation::kBuy || operation.getType() == Operation::kSell;
+}
+
+const ShareOperation& asTrade(const Operation& operation)
+{
+    return static_cast<const ShareOperation&>(operation);
+}
+
+const TransferAccountOperation& asTransfer(const Operation& operation)
+{
+    return static_cast<const TransferAccountOperation&>(operation);
+}
+
+std::string accountName(const Operation& operation)
+{
+    Account* account;
+    return operation.getAccount(&account) == 0 ? textOf(account->getName()) : std::string();
+}
+
+/// Ticker and company, or the account that receives a transfer.
+Cell what(const Operation& operation)
+{
+    if (isTrade(operation)) {
+        Share* share;
+        if (asTrade(operation).getShare(&share) != 0)
+            return {"no company", look::kWarning};
+        return {textOf(share->getCompanyAbbreviation()) + "  " + textOf(share->getCompanyName())};
+    }
+    if (operation.getType() != Operation::kTransfer)
+        return {};
+    Account* recipient;
+    if (asTransfer(operation).getRecepientAccount(&recipient) != 0)
+        return {"to no account", look::kWarning};
+    return {"to " + textOf(recipient->getName())};
+}
+
+/// The quote of a trade, the amount of anything else.
+float price(const Operation& operation)
+{
+    return isTrade(operation) ? asTrade(operation).getQuote()
+                              : static_cast<const AccountOperation&>(operation).getAmount();
+}
+
+std::string cost(const Operation& operation)
+{
+    if (isTrade(operation))
+        return amountText(asTrade(operation).getOperationCost());
+    return operation.getType() == Operation::kTransfer ? amountText(asTransfer(operation).getTotalCost()) : "";
+}
+
+/// What is traded or moved, before costs, in the account's currency.
+std::string total(const Operation& operation)
+{
+    const double quantity = isTrade(operation) ? asTrade(operation).getQuantity() : 1;
+    return amountText(quantity * price(operation)) + ' ' + textOf(operation.getCurrencyRepresentation());
+}
+
+} // namespace
+
+Cell OperationItem::cell(int column) const
+{
+    if (operation_ == nullptr)
+        return {};
+    const Operation& operation = *operation_;
+    switch (column) {
+    case kDate:
+        return {dateText(operation.getDate())};
+    case kAccount:
+        return {accountName(operation)};
+    case kType:
+        return {kTypeNames[operation.getType()]};
+    case kWhat:
+        return what(operation);
+    case kQuantity:
+        return {isTrade(operation) ? countText(asTrade(operation).getQuantity()) : ""};
+    case kPrice:
+        return {amountText(price(operation))};
+    case kCost:
+        return {cost(operation)};
+    case kTotal:
+        return {total(operation)};
+    case kAutomatic:
+        return {isAutomatic_ ? "\u2713" : ""};
+    default:
+        return {};
+    }
+}
+
+void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
+{
+    const rgb_color text = owner->HighColor();
+    if (isAutomatic_ && text == look::kText) { // not on the ground of a selected row
+        owner->SetHighColor(look::kGenerated);
+        owner->FillRect(frame);
+        owner->SetHighColor(text);
+    }
+    ColumnItem::DrawItem(owner, frame, complete);
+}
+
+OperationListView::OperationListView(const char* name)
+    : ObjectListView({}, name, B_SINGLE_SELECTION_LIST,
+                     {{"Date", 80},
+                      {"Account", 104},
+                      {"Type", 60},
+                      {"What", 126},
+                      {"Quantity", 64, B_ALIGN_RIGHT},
+                      {"Quote / Amount", 100, B_ALIGN_RIGHT},
+                      {"Cost", 62, B_ALIGN_RIGHT},
+                      {"Total", 116, B_ALIGN_RIGHT},
+                      {"Auto", 36, B_ALIGN_CENTER}})
+{}

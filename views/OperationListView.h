@@ -1,0 +1,29 @@
+#pragma once
+
+#include "portfolio/Operation.h"
+#include "views/ObjectListView.h"
+
+/// A row for one operation.
+class OperationItem final : public ColumnItem {
+public:
+    explicit OperationItem(Operation* operation) : operation_(operation), isAutomatic_(operation->isAutomatic()) {}
+
+    Operation* object() const { return operation_; }
+    /// Null for an automatic operation: the next valuation destroys it and may make another one in its place.
+    const void* key() const { return isAutomatic_ ? nullptr : operation_; }
+    /// Leaves the row without operation, and blank.
+    void release() { operation_ = nullptr; }
+
+    Cell cell(int column) const override;
+    void DrawItem(BView* owner, BRect frame, bool complete) override;
+
+private:
+    Operation* operation_;
+    bool isAutomatic_; // known also when the operation is gone
+};
+
+/// The operations of all accounts, automatic ones on a ground of their own.
+class OperationListView final : public ObjectListView<Operation, OperationItem> {
+public:
+    explicit OperationListView(const char* name);
+};
