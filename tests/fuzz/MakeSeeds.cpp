@@ -1,5 +1,5 @@
-// Writes a small valid file of each kind for the fuzzers to start from: fuzz_seeds FOLDER makes FOLDER/market and
-// FOLDER/wallet.
+// Writes a small valid file and page of each kind for the fuzzers to start from: fuzz_seeds FOLDER makes FOLDER/market,
+// FOLDER/wallet, FOLDER/latest and FOLDER/history.
 
 #include "market/Catalogue.h"
 #include "market/Company.h"
@@ -16,6 +16,7 @@
 #include "tests/fuzz/SmallCatalogue.h"
 
 #include <filesystem>
+#include <fstream>
 #include <utility>
 
 namespace {
@@ -29,6 +30,12 @@ bool save(const Object& object, const std::filesystem::path& folder)
     FILE* file = std::fopen((folder / "full").c_str(), "wb");
     const int result = file != nullptr ? object.wrt(file, kStamp) : -1;
     return file != nullptr && std::fclose(file) == 0 && result == 0;
+}
+
+bool savePage(const char* page, const std::filesystem::path& folder)
+{
+    std::filesystem::create_directories(folder);
+    return static_cast<bool>(std::ofstream(folder / "page") << page << std::flush);
 }
 
 /// An event of each kind for the first company.
@@ -69,7 +76,10 @@ int main(int argc, char** argv)
     Wallet wallet;
     wallet.setCatalogue(catalogue);
     fill(wallet, catalogue, addEvents(catalogue));
-    if (argc == 2 && save(catalogue, folder / "market") && save(wallet, folder / "wallet"))
+    const char* latest = "<html><td nowrap><b>112 <sup>3</sup>/<sub>8</sub></b></td><td nowrap><b>45</b></td>";
+    const char* history = "<pre><b>Date Close Volume (00s)</b>\n5/3/1999 45.5 46 100\n05/04/1999\t46\t47\t9\n</pre>";
+    if (argc == 2 && save(catalogue, folder / "market") && save(wallet, folder / "wallet") &&
+        savePage(latest, folder / "latest") && savePage(history, folder / "history"))
         return 0;
     std::fputs("usage: fuzz_seeds FOLDER, one that can be written into\n", stderr);
     return 1;
