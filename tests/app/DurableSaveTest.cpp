@@ -133,6 +133,7 @@ TEST_F(DurableSaveTest, DealsWithWhateverThePathLeadsTo)
     EXPECT_EQ(content("made"), "new");
     EXPECT_EQ(content("locked/f"), "old");
     EXPECT_EQ(save_.save(path("locked/a\nb"), writeNew).reason.find('\n'), std::string::npos) << "one line";
+    fs::permissions(path("locked"), fs::perms(0755)); // to be removed in the end
 }
 
 TEST_F(DurableSaveTest, AFullDiskLeavesTheOldFile)

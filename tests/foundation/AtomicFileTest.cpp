@@ -86,6 +86,7 @@ TEST_F(AtomicFileTest, RefusesInTimeWhatItCouldNotWriteInTheEnd)
     for (const auto& c : cases)
         EXPECT_THROW(AtomicFile(c.path, c.existing), AtomicFile::OpenError) << c.why;
     EXPECT_EQ(files(), 4) << "temporary files";
+    fs::permissions(path("locked"), fs::perms(0755)); // to be removed in the end
 }
 
 TEST_F(AtomicFileTest, RemovesWhatAKilledProgramLeftButNotWhatALivingOneWrites)
