@@ -36,10 +36,8 @@ QFileDialog* findPanel(const char* name)
 WindowTest::WindowTest() : temporary_(std::make_unique<QTemporaryDir>()), folder_(temporary_->path().toStdString())
 {
     setToday(Date(21, 11, 2024));
-    window_ = new PLWindow({50, 50, 850, 850}, DataFolder(folder_));
-    window_->Show();
+    open();
     watchForAlert();
-    settle();
 }
 
 WindowTest::~WindowTest()
@@ -53,9 +51,25 @@ WindowTest::~WindowTest()
 void WindowTest::restart()
 {
     window_->Quit();
+    open();
+}
+
+void WindowTest::open()
+{
     window_ = new PLWindow({50, 50, 850, 850}, DataFolder(folder_));
     window_->Show();
+    activate();
+}
+
+/// As a desktop does with a new window, and with the one below a dialog that closes. Without it no field would lose the
+/// keyboard.
+void WindowTest::activate()
+{
+    window_->Activate();
+    QApplication::setActiveWindow(&window_->widget());
+    ASSERT_TRUE(QTest::qWaitForWindowActive(&window_->widget()));
     settle();
+    ASSERT_TRUE(window_->widget().isActiveWindow());
 }
 
 void WindowTest::makeSample() const
@@ -225,6 +239,7 @@ void WindowTest::answerPanel(const char* panel, const std::string& path)
     }
     settle();
     EXPECT_FALSE(isPanelOpen(panel));
+    activate();
 }
 
 void WindowTest::loadSample()

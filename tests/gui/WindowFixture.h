@@ -83,6 +83,8 @@ protected:
     void loadSample();
 
 private:
+    void open();
+    void activate();
     QWidget& page();
     QWidget& desktopWindow() const;
     int32 onAlert();
