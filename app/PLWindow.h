@@ -8,6 +8,8 @@
 
 #include <memory>
 
+class Account;
+class AccountOperation;
 class BListView;
 class BTabView;
 class Company;
@@ -19,6 +21,7 @@ class Operation;
 class OperationView;
 class ParameterView;
 class Share;
+class ShareOperation;
 class State;
 class Wallet;
 class WalletView;
@@ -158,8 +161,28 @@ private:
     void loadWallet(FILE* file, const String& path);
     void showFolder(BFilePanel& panel, std::string (DataFolder::*subfolder)(std::string*) const);
 
+    // AccountCommands.cpp
+    /// Null, after a message, when there is none.
+    Account* selectedAccount();
+
     // OperationCommands.cpp
+    // These make an operation as the page says; null, after a message or in silence, when it says none.
     Operation* makeOperation();
+    Operation* makeTransfer(const Date& date, Account* from);
+    Operation* makeTrade(const Date& date, Account* account, bool isBuy);
+    Company* findCompany(const String& marketName, const String& ticker) const;
+    /// Values the portfolio with the operation just made, which replaces `former` unless that is null, and shows it.
+    void showMadeOperation(Operation* made, Operation* former);
+    /// Takes its row out first.
+    void destroyOperation(Operation* operation);
+    Operation* selectedOperation() const;
+    void showAccountOperation(const AccountOperation& operation);
+    void showTrade(const ShareOperation& trade);
+    void showCommonFields(const Operation& operation);
+
+    // OperationOffers.cpp
+    void offerOperationQuotes();
+    void offerTransferQuotes(const Date& date);
 
     Catalogue catalogue_;
     std::unique_ptr<Wallet> wallet_;

@@ -27,8 +27,10 @@ void PLWindow::UpdateState()
     const bool isEvolutionAsked = walletView_->isComputeEvolution();
     EvolutionOutcome outcome = EvolutionOutcome::Built;
     State* state = refreshStates(*wallet_, date, operationView_->isPrevision(), isEvolutionAsked ? &outcome : nullptr);
-    if (state == nullptr)
+    if (state == nullptr) {
+        operationView_->DropRemovedOperations();
         return;
+    }
     if (isEvolutionAsked)
         walletView_->UpdateEvolution(*wallet_, catalogue_, outcome);
     else
@@ -52,5 +54,7 @@ void PLWindow::SetState(State* state)
         }
     }
     operationView_->RecallSelection();
+    if (state != nullptr)
+        operationView_->offerDate(state->getDate());
     CompanySelection();
 }

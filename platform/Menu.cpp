@@ -36,6 +36,16 @@ BMenuItem* BMenu::RemoveItem(int32 index)
     return item;
 }
 
+void BMenu::ReplaceItems(const std::vector<BMenuItem*>& items)
+{
+    items_.clear();
+    for (BMenuItem* item : items) {
+        items_.emplace_back(item);
+        item->menu_ = this;
+    }
+    changed();
+}
+
 BMenuItem* BMenu::ItemAt(int32 index) const
 {
     return index >= 0 && index < CountItems() ? items_[static_cast<std::size_t>(index)].get() : nullptr;

@@ -23,6 +23,8 @@ public:
     bool AddItem(BMenuItem* item);
     /// Gives the item back to the caller; null out of range.
     BMenuItem* RemoveItem(int32 index);
+    /// Destroys the items that are here and takes ownership of `items`.
+    void ReplaceItems(const std::vector<BMenuItem*>& items);
     int32 CountItems() const { return static_cast<int32>(items_.size()); }
     /// Null out of range.
     BMenuItem* ItemAt(int32 index) const;

@@ -78,6 +78,13 @@ void BMenuField::SetDivider(float x)
     layOut();
 }
 
+void BMenuField::SetAlignment(alignment label)
+{
+    caption_->setAlignment(label == B_ALIGN_RIGHT  ? Qt::AlignRight | Qt::AlignVCenter
+                           : label == B_ALIGN_LEFT ? Qt::AlignLeft | Qt::AlignVCenter
+                                                   : Qt::AlignCenter);
+}
+
 void BMenuField::SetEnabled(bool enabled)
 {
     widget()->setEnabled(enabled);

@@ -21,6 +21,7 @@ public:
     const char* Label() const { return label_.c_str(); }
     /// Where the menu begins, in pixels from the left.
     void SetDivider(float x);
+    void SetAlignment(alignment label);
     void SetEnabled(bool enabled);
     /// Items that have no target send to the window.
     void AttachedToWindow() override;

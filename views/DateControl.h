@@ -4,7 +4,7 @@
 #include "platform/TextControl.h"
 
 /// A field for a date. A text that is none shows by its colour until it is mended.
-class DateControl final : public BTextControl {
+class DateControl : public BTextControl {
 public:
     using BTextControl::BTextControl;
 

@@ -4,7 +4,7 @@
 
 /// A field for a number, with "." or "," as decimal mark. A text that is none shows by its colour until it is mended,
 /// and so does one with a number and more; the number that it begins with counts then, or 0.
-class NumberControl final : public BTextControl {
+class NumberControl : public BTextControl {
 public:
     using BTextControl::BTextControl;
 

@@ -1,16 +1,202 @@
 #include "views/OperationView.h"
 
+#include "platform/Box.h"
 #include "platform/CheckBox.h"
+#include "platform/MenuField.h"
+#include "platform/MenuItem.h"
+#include "platform/PopUpMenu.h"
+#include "portfolio/Account.h"
+#include "portfolio/AccountOperation.h"
 #include "portfolio/ShareOperation.h"
+#include "views/DateControl.h"
 #include "views/Look.h"
+#include "views/NumberControl.h"
+#include "views/OfferField.h"
 #include "views/OperationListView.h"
+
+#include <cstring>
+
+namespace {
+
+using namespace look;
+
+// Where the groups of the page begin and end.
+constexpr float kRight = kPageWidth - kMargin;
+constexpr float kEditorEnd = kPageHeight - kMargin;
+constexpr float kEditorTop = kEditorEnd - kBoxTop - 3 * kRow - kGap - kButtonHeight - kBoxSide;
+constexpr float kListEnd = kEditorTop - kMargin;
+constexpr float kListTop = kMargin + kFieldHeight + 4;
+
+constexpr float kDivider = 82;
+constexpr float kColumnGap = 16;
+constexpr float kColumnWidth = (kRight - kMargin - 2 * kBoxSide - 2 * kColumnGap) / 3;
+
+/// The place of a field in the box, by column and row.
+BRect cell(int column, int row)
+{
+    const float left = kBoxSide + static_cast<float>(column) * (kColumnWidth + kColumnGap);
+    const float top = kBoxTop + static_cast<float>(row) * kRow;
+    return {left, top, left + kColumnWidth, top + kFieldHeight};
+}
+
+struct TypePlan {
+    const char* type;
+    const char* label;
+    uint32 code;
+};
+
+constexpr TypePlan kTypes[] = {
+    {"DEPOSIT", "Deposit", 'OPDe'}, {"TRANSFER", "Transfer", 'OPTr'}, {"BUY", "Buy", 'OPBu'}, {"SELL", "Sell", 'OPSe'}};
+
+// Sets of types, a bit for each.
+constexpr unsigned kDeposit = 1;
+constexpr unsigned kTransfer = 2;
+constexpr unsigned kTrade = 4 + 8;
+
+/// An account in a menu. Sends nothing when it is chosen, but calls the hook.
+class AccountMenuItem final : public BMenuItem {
+public:
+    AccountMenuItem(const Account* account, const std::function<void()>& hook)
+        : BMenuItem(account->getName().hasText() ? account->getName().getCharacterArray() : "", nullptr),
+          account_(account), hook_(hook)
+    {}
+
+    /// May be gone: only to be compared.
+    const Account* account() const { return account_; }
+
+    status_t Invoke(const BMessage*) override
+    {
+        if (hook_)
+            hook_();
+        return B_OK;
+    }
+
+private:
+    const Account* account_;
+    const std::function<void()>& hook_; // the page's
+};
+
+} // namespace
 
 OperationView::OperationView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
 {
-    prevision_ = addCheckBox(this, {8, 8, 160, 8 + look::kFieldHeight}, "cbxPrevision", "With Previsions", 'OCPr');
+    prevision_ = addCheckBox(this, {kMargin, kMargin, kMargin + 150, kMargin + kFieldHeight}, "cbxPrevision",
+                             "With Previsions", 'OCPr');
+    prevision_->SetToolTip("Simulates the sales that the parameters ask for");
+    makeList();
+    makeFields();
+    SetType(kTypes[0].type);
+}
+
+void OperationView::makeList()
+{
+    BBox* box = addBox(this, {kMargin, kListTop, kRight, kListEnd}, "Operations");
     operations_ = new OperationListView("lstOperations");
-    operations_->addTo(this, {8, 36, look::kPageWidth - 8, 500}, "Operations");
+    operations_->addTo(box, {kBoxSide, kBoxTop, kRight - kMargin - kBoxSide, kListEnd - kListTop - kBoxSide},
+                       "Operations");
     operations_->SetSelectionMessage(new BMessage('OSel'));
+}
+
+void OperationView::makeFields()
+{
+    BBox* box = addBox(this, {kMargin, kEditorTop, kRight, kEditorEnd}, "Operation");
+    makeCommonFields(box);
+    makeTypedFields(box);
+    makeButtons(box);
+}
+
+template <class Field>
+Field* OperationView::addOfferField(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
+                                    alignment side)
+{
+    auto* field = new Field(frame, name, label, "", new BMessage(code));
+    field->SetDivider(kDivider);
+    field->SetAlignment(B_ALIGN_RIGHT, side);
+    parent->AddChild(field);
+    return field;
+}
+
+BMenuField* OperationView::addMenu(BView* parent, BRect frame, const char* name, const char* label)
+{
+    auto* field = new BMenuField(frame, name, label, new BPopUpMenu(name));
+    field->SetDivider(kDivider);
+    field->SetAlignment(B_ALIGN_RIGHT);
+    parent->AddChild(field);
+    return field;
+}
+
+void OperationView::makeCommonFields(BBox* box)
+{
+    type_ = addMenu(box, cell(0, 0), "operationType", "Type");
+    for (const TypePlan& plan : kTypes)
+        type_->Menu()->AddItem(new BMenuItem(plan.label, new BMessage(plan.code)));
+    baseAccount_ = addMenu(box, cell(1, 0), "baseAccount", "Account");
+    date_ = addOfferField<OfferField<DateControl>>(box, cell(2, 0), "txtDate", "Date", 'OTDa', B_ALIGN_LEFT);
+}
+
+void OperationView::makeTypedFields(BBox* box)
+{
+    const auto of = [this](unsigned types, auto* field) {
+        typedFields_.push_back({field, types});
+        return field;
+    };
+    const auto number = [&](int column, int row, const char* name, const char* label, uint32 code) {
+        return addTypedNumber(box, cell(column, row), name, label, code, kDivider);
+    };
+    const auto offered = [&](int column, int row, const char* name, const char* label, uint32 code) {
+        return addOfferField<OfferNumber>(box, cell(column, row), name, label, code, B_ALIGN_RIGHT);
+    };
+    const auto word = [&](int column, int row, const char* name, const char* label) {
+        return addOfferField<OfferField<BTextControl>>(box, cell(column, row), name, label, 'OTAb', B_ALIGN_LEFT);
+    };
+
+    amount_ = of(kDeposit | kTransfer, number(0, 1, "txtAmount", "Amount", 'OTAm'));
+    transferAccount_ = of(kTransfer, addMenu(box, cell(1, 1), "transferAccount", "To Account"));
+    transferCost_ = of(kTransfer, number(2, 1, "txtTransferCost", "Cost", 'OTTc'));
+    transferFromQuote_ = of(kTransfer, offered(0, 2, "txtTransferFromQuote", "From Quote", 'OTFq'));
+    transferToQuote_ = of(kTransfer, offered(1, 2, "txtTransferToQuote", "To Quote", 'OTTq'));
+    transferRateCost_ = of(kTransfer, number(2, 2, "txtTransferRateCost", "Rate Cost", 'OTTr'));
+    transferFromQuote_->SetToolTip("Rate of the sending account's currency");
+    transferToQuote_->SetToolTip("Rate of the receiving account's currency");
+    transferRateCost_->SetToolTip("Cost in proportion to the amount, as a fraction: 0.01 for one percent");
+
+    marketName_ = of(kTrade, word(0, 1, "txtMarketName", "Market"));
+    companyAbbreviation_ = of(kTrade, word(1, 1, "txtCompanyAbbreviation", "Ticker"));
+    quantity_ = of(kTrade, number(2, 1, "txtQuantity", "Quantity", 'OTQy'));
+    quote_ = of(kTrade, offered(0, 2, "txtQuote", "Quote", 'OTQo'));
+    shareCost_ = of(kTrade, offered(1, 2, "txtShareCost", "Cost", 'OTSc'));
+    total_ = of(kTrade, addNumber(box, cell(2, 2), "txtTotal", "Total", 'OTTo', kDivider));
+    total_->SetEditable(false);
+    total_->SetToolTip("Quantity times quote, before costs");
+}
+
+void OperationView::makeButtons(BBox* box)
+{
+    const float bottom = kEditorEnd - kEditorTop - kBoxSide;
+    const float top = bottom - kButtonHeight;
+    automatic_ = addCheckBox(box, {kBoxSide + kDivider, top, kBoxSide + kColumnWidth, bottom}, "cbAutomatic",
+                             "Automatic", 'OCAu');
+    automatic_->SetToolTip("As if a valuation had made it up: the next one takes it away");
+    const float left = kBoxSide + kColumnWidth + kColumnGap + kDivider;
+    addButtons(box, {left, top, kRight - kMargin - kBoxSide, bottom},
+               {{"btnAddOperation", "Add", 'OBAd'},
+                {"btnUpdateOperation", "Update", 'OBUp'},
+                {"btnRemoveOperation", "Remove", 'OBRe'}});
+}
+
+void OperationView::Draw(BRect)
+{
+    // What the ground of some rows means, at the right above the list.
+    constexpr const char* kLegend = "Automatic operations";
+    constexpr float kPatch = 12;
+    const float left = kRight - StringWidth(kLegend) - kPatch - kGap;
+    const float top = kMargin + (kFieldHeight - kPatch) / 2;
+    SetHighColor(kGenerated);
+    FillRect({left, top, left + kPatch, top + kPatch});
+    SetHighColor(kLine);
+    StrokeRect({left, top, left + kPatch, top + kPatch});
+    SetHighColor(kText);
+    DrawString(kLegend, {left + kPatch + kGap, top + kPatch - 1});
 }
 
 bool OperationView::isPrevision() const
@@ -18,7 +204,7 @@ bool OperationView::isPrevision() const
     return prevision_->Value() == B_CONTROL_ON;
 }
 
-void OperationView::SetAccountsList(Account**, int) {}
+// --- The list.
 
 void OperationView::ClearAllOperations()
 {
@@ -41,12 +227,98 @@ void OperationView::ForgetSelection()
     operations_->forget();
 }
 
-void OperationView::RemoveShareOperation(ShareOperation* operation)
+void OperationView::RemoveOperation(const Operation* operation)
 {
     operations_->release(operation);
+}
+
+void OperationView::RemoveAccountOperation(AccountOperation* operation)
+{
+    RemoveOperation(operation);
+}
+
+void OperationView::RemoveShareOperation(ShareOperation* operation)
+{
+    RemoveOperation(operation);
+}
+
+void OperationView::DropRemovedOperations()
+{
+    operations_->dropReleased();
 }
 
 void OperationView::UpdateShareOperation(ShareOperation* operation)
 {
     operations_->modify(operation);
+}
+
+void OperationView::ShowOperation(const Operation* operation)
+{
+    operations_->SetQuiet(true);
+    operations_->select(operation);
+    operations_->SetQuiet(false);
+}
+
+bool OperationView::IsSelectedAccountOperation() const
+{
+    return GetSelectedAccountOperation() != nullptr;
+}
+
+AccountOperation* OperationView::GetSelectedAccountOperation() const
+{
+    return dynamic_cast<AccountOperation*>(operations_->selected());
+}
+
+ShareOperation* OperationView::GetSelectedShareOperation() const
+{
+    return dynamic_cast<ShareOperation*>(operations_->selected());
+}
+
+// --- The menus.
+
+void OperationView::SetAccountsList(Account** accounts, int count)
+{
+    fillAccounts(*baseAccount_->Menu(), accounts, count);
+    fillAccounts(*transferAccount_->Menu(), accounts, count);
+}
+
+void OperationView::fillAccounts(BMenu& menu, Account** accounts, int count)
+{
+    const auto* chosen = static_cast<const AccountMenuItem*>(menu.FindMarked());
+    const Account* former = chosen != nullptr ? chosen->account() : nullptr;
+    std::vector<BMenuItem*> items;
+    BMenuItem* next = nullptr;
+    for (int i = 0; i < count; ++i) {
+        items.push_back(new AccountMenuItem(accounts[i], typingHook_));
+        if (accounts[i] == former)
+            next = items.back();
+    }
+    menu.ReplaceItems(items);
+    if (next != nullptr)
+        next->SetMarked(true);
+}
+
+String OperationView::getType() const
+{
+    return kTypes[type_->Menu()->IndexOf(type_->Menu()->FindMarked())].type;
+}
+
+void OperationView::setType(const String& type)
+{
+    for (const TypePlan& plan : kTypes) {
+        if (type == plan.type)
+            type_->Menu()->FindItem(plan.label)->SetMarked(true);
+    }
+}
+
+void OperationView::SetType(const String& type)
+{
+    setType(type);
+    const int index = type_->Menu()->IndexOf(type_->Menu()->FindMarked());
+    for (const TypedField& field : typedFields_) {
+        if ((field.types >> index & 1U) != 0)
+            field.view->Show();
+        else
+            field.view->Hide();
+    }
 }
