@@ -17,7 +17,9 @@ const Date& firstDay()
 
 double dayNumber(const Date& date)
 {
-    return date.isValid() ? date - firstDay() : std::numeric_limits<double>::quiet_NaN();
+    constexpr int kLimit = std::numeric_limits<int>::max(); // where `Date` cuts differences
+    const int days = date.isValid() ? date - firstDay() : kLimit;
+    return days > -kLimit && days < kLimit ? days : std::numeric_limits<double>::quiet_NaN();
 }
 
 Date dateOfDay(double day)

@@ -54,17 +54,15 @@ std::vector<AxisTick> ticksByMonths(const ChartRange& range, DateStep step)
     const std::int64_t months = step.unit == Unit::Year ? std::int64_t{kMonths} * step.count : step.count;
     const Date first = dateOfDay(range.min);
     std::vector<AxisTick> ticks;
-    double previous = -std::numeric_limits<double>::infinity();
     for (auto month = roundUp(std::int64_t{first.getYear()} * kMonths + first.getMonth() - 1, months);;
          month += months) {
         const std::int64_t inYear = (month % kMonths + kMonths) % kMonths;
         const Date date(1, static_cast<short>(inYear + 1), static_cast<int>((month - inYear) / kMonths));
         const double day = dayNumber(date);
-        if (!(day <= range.max && day > previous)) // days that are too far off all have the same number
+        if (!(day <= range.max)) // or it is not a number: too far away
             return ticks;
         if (day >= range.min)
             ticks.push_back({day, label(date, step.unit)});
-        previous = day;
     }
 }
 

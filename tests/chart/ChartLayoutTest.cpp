@@ -10,6 +10,7 @@
 
 #include <cmath>
 #include <limits>
+#include <sstream>
 
 namespace {
 
@@ -21,6 +22,7 @@ float widthOf(const std::string& text)
 }
 
 const ChartFont kFont{10, 9, 3, widthOf};
+const ChartFont kLargeFont{24, 22, 6, [](const std::string& text) { return 2.3F * widthOf(text); }};
 
 std::string joined(const std::vector<AxisTick>& ticks)
 {
@@ -195,7 +197,7 @@ void expectReadable(const ChartContents& contents, const std::string& what)
         EXPECT_TRUE(layout.plot.Contains(layout.scale.pixel(point))) << what << ": " << point.x << ", " << point.y;
     for (const float x : layout.columns)
         EXPECT_TRUE(x >= layout.plot.left && x <= layout.plot.right) << what;
-    if (contents.bounds.Width() >= 400 && contents.bounds.Height() >= 230) {
+    if (contents.bounds.Width() >= 400 && contents.bounds.Height() >= 230 && contents.labelFont.size <= 12) {
         EXPECT_GE(layout.rows.size(), 2U) << what;
         EXPECT_GE(layout.columns.size(), 1U) << what;
         EXPECT_FALSE(layout.marks.at(0).label.text.empty()) << what;
@@ -219,17 +221,31 @@ TEST(ChartLayoutTest, NoTextIsCutOrLiesOnAnother)
         {"huge", {{-7e8, -kFloatMax}, {7e8, kFloatMax}}},
         {"close together", {{0, 16777216}, {1, 16777217}}},
         {"high and close", {{0, 1e30}, {3, 1e30 * (1 + 1e-7)}}},
-        {"end of days", {{2147483647.0, 1}, {2147483646.0, 2}}},
+        {"last days", {{2147483647.0, 1}, {2147483646.0, 2}}},
+        {"all days", {{-2147483648.0, 1}, {2147483647.0, 2}}},
     };
     const BRect sizes[] = {{0, 0, 780, 230}, {0, 0, 780, 360}, {0, 0, 400, 300}, {0, 0, 250, 150},
                            {0, 0, 160, 90},  {0, 0, 90, 200},  {0, 0, 60, 40},   {0, 0, 1, 1}};
     for (const auto& d : data)
         for (const BRect& size : sizes)
             for (const bool isDateBased : {true, false})
-                expectReadable(contentsOf(size, d.points, isDateBased),
-                               std::string(d.what) + (isDateBased ? ", dates, " : ", numbers, ") +
-                                   std::to_string(static_cast<int>(size.right)) + "x" +
-                                   std::to_string(static_cast<int>(size.bottom)));
+                for (const ChartFont& font : {kFont, kLargeFont}) {
+                    ChartContents contents = contentsOf(size, d.points, isDateBased);
+                    contents.labelFont = font;
+                    std::ostringstream what;
+                    what << d.what << (isDateBased ? ", dates, " : ", numbers, ") << size.right << 'x' << size.bottom
+                         << ", labels " << font.size;
+                    expectReadable(contents, what.str());
+                }
+}
+
+TEST(ChartLayoutTest, MakesRoomForLabelsAtTheEnds)
+{
+    const ChartContents contents = contentsOf({0, 0, 400, 200}, {{0, 1}, {1, 2}, {2, 3}}, true);
+    const ChartLayout layout = layOutChart(contents);
+    ASSERT_EQ(layout.columns.size(), 3U);
+    EXPECT_EQ(layout.columns[0], layout.scale.pixelX(0));
+    EXPECT_EQ(layout.columns[2], layout.scale.pixelX(2));
 }
 
 TEST(ChartLayoutTest, MarksTheExtremesOfTheFirstLine)

@@ -68,8 +68,8 @@ TEST(GraphLineTest, SortsByDatesThatBecomeKnownAfterTheAddition)
     GraphLine line;
     for (const short day : std::initializer_list<short>{30, 10, 20}) {
         auto* point = new GraphPoint(0, day);
-        line.addGraphPoint(point);
         point->setDateX(Date(day, 6, 2001));
+        line.addGraphPoint(point);
         point->setDateBased(true);
     }
     unsigned count;
