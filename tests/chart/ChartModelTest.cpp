@@ -63,15 +63,17 @@ TEST(GraphLineTest, KeepsItsPointsByX)
     EXPECT_EQ(xsOf(line), (std::vector<float>{2, 2.5F, 3}));
 }
 
-TEST(GraphLineTest, SortsByDatesThatBecomeKnownAfterTheAddition)
+TEST(GraphLineTest, SortsByDatesThatCountOnlyAfterTheAddition)
 {
     GraphLine line;
+    std::vector<GraphPoint*> added;
     for (const short day : std::initializer_list<short>{30, 10, 20}) {
-        auto* point = new GraphPoint(0, day);
-        point->setDateX(Date(day, 6, 2001));
-        line.addGraphPoint(point);
-        point->setDateBased(true);
+        added.push_back(new GraphPoint(0, day));
+        added.back()->setDateX(Date(day, 6, 2001));
+        line.addGraphPoint(added.back());
     }
+    for (GraphPoint* point : added)
+        point->setDateBased(true);
     unsigned count;
     GraphPoint* const* points = line.getAllGraphPoints(&count);
     EXPECT_EQ(points[0]->getY(), 10);
