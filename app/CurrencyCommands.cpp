@@ -1,17 +1,234 @@
 // Currencies and their rates.
 
 #include "app/PLWindow.h"
+#include "app/StateHold.h"
+#include "app/WindowLock.h"
+#include "market/Currency.h"
+#include "market/Market.h"
+#include "views/CompanyView.h"
+#include "views/CurrencyView.h"
 
-void PLWindow::AddCurrency() {}
-void PLWindow::AddCurrency(Currency*, bool) {}
-void PLWindow::UpdateCurrency() {}
-void PLWindow::RemoveCurrency() {}
-void PLWindow::RemoveAllCurrencies() {}
-void PLWindow::CurrencySelection() {}
-void PLWindow::SetCurrencyRef() {}
-void PLWindow::SetCurrencyRef(Currency*) {}
-void PLWindow::AddCurrencyQuote() {}
-void PLWindow::UpdateCurrencyQuote() {}
-void PLWindow::RemoveCurrencyQuote() {}
-void PLWindow::CurrencyQuoteSelection() {}
-void PLWindow::UpdateCurrencyQuotesChart() {}
+#include <memory>
+
+namespace {
+
+void removeMarkets(PLWindow& window, const Currency& currency)
+{
+    unsigned n;
+    while (Market** markets = currency.getAllMarkets(&n))
+        window.RemoveMarket(markets[0], false);
+}
+
+} // namespace
+
+void PLWindow::AddCurrency()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    const String name = currencyView_->getCurrencyName();
+    const String representation = currencyView_->getCurrencyRepresentation();
+    if (name.isUndefined() || representation.isUndefined()) {
+        SetMessage("Please specify a currency name and representation.");
+        return;
+    }
+    auto* currency = new Currency(name, representation, getReferenceCurrency());
+    if (getReferenceCurrency() == nullptr) {
+        setReferenceCurrency(currency);
+        currencyView_->setCurrencyRefName(name);
+    }
+    AddCurrency(currency, true);
+}
+
+void PLWindow::AddCurrency(Currency* currency, bool selected)
+{
+    const WindowLock lock(*this);
+    catalogue_.addCurrency(currency);
+    if (!lock.isHeld())
+        return;
+    currencyView_->AddCurrency(currency, selected);
+    refreshWalletCatalogue();
+}
+
+void PLWindow::UpdateCurrency()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    Currency* currency = currencyView_->GetSelectedCurrency();
+    if (currency == nullptr)
+        return;
+    currency->setName(currencyView_->getCurrencyName());
+    currency->setRepresentation(currencyView_->getCurrencyRepresentation());
+    currency->setReferenceCurrency(getReferenceCurrency());
+    currencyView_->ModifyCurrency(currency);
+    if (currency == getReferenceCurrency())
+        currencyView_->setCurrencyRefName(currency->getName());
+    UpdateState();
+}
+
+void PLWindow::RemoveCurrency()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    if (catalogue_.getNbrCurrencies() == 1) {
+        SetMessage("You may not remove the last currency...");
+        return;
+    }
+    if (!confirm("This will delete all attached markets, companies and accounts..."))
+        return;
+    const StateHold hold(*this);
+    if (Currency* currency = currencyView_->GetSelectedCurrency()) {
+        const std::unique_ptr<Currency> removed(currency);
+        const bool wasReference = currency == getReferenceCurrency();
+        catalogue_.removeCurrency(currency);
+        if (wasReference) {
+            currencyView_->setCurrencyRefName(getReferenceCurrency()->getName());
+            CurrencySelection();
+        }
+        // The accounts stay, without a currency, though the question names them. Intended: its wording is kept.
+        removeMarkets(*this, *currency);
+        currencyView_->DeleteCurrency(currency);
+    }
+    UpdateState();
+}
+
+void PLWindow::RemoveAllCurrencies()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    const StateHold hold(*this);
+    companyView_->SetMarketList({}); // at once
+    for (Currency* currency : catalogue_.getCurrencies()) {
+        removeMarkets(*this, *currency);
+        currencyView_->DeleteCurrency(currency);
+    }
+    catalogue_.clear();
+    currencyView_->setCurrencyRefName(String());
+    UpdateState();
+}
+
+void PLWindow::CurrencySelection()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    Currency* currency = currencyView_->GetSelectedCurrency();
+    currencyView_->SetMarketList(currency);
+    currencyView_->SetQuoteList(currency);
+    if (currency == nullptr)
+        return;
+    currencyView_->setCurrencyName(currency->getName());
+    currencyView_->setCurrencyRepresentation(currency->getRepresentation());
+    const Date last = currency->getLastQuote();
+    const float trend = currency->getPrevisionQuote(last);
+    // On the company page, until a company is selected there. Intended, as is that the chart is not drawn here: it
+    // shows the rates of the currency that is named in it until a rate is selected.
+    companyView_->setRelativeDailyChange(currency->getPente() / trend);
+    companyView_->setDiffWithAverage((currency->getRealQuote(last) - trend) / trend);
+}
+
+void PLWindow::SetCurrencyRef()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    if (Currency* currency = currencyView_->GetSelectedCurrency())
+        SetCurrencyRef(currency);
+    else
+        SetMessage("Please select a currency.");
+}
+
+void PLWindow::SetCurrencyRef(Currency* newReference)
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld() || newReference == getReferenceCurrency())
+        return;
+    catalogue_.rebaseOn(newReference);
+    currencyView_->setCurrencyRefName(newReference->getName());
+    CurrencySelection();
+}
+
+void PLWindow::AddCurrencyQuote()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    const Date date = currencyView_->getQuoteDate();
+    if (date.isUndefined()) {
+        SetMessage("Please specify a date.");
+        return;
+    }
+    const float value = currencyView_->getQuoteValue();
+    Currency* currency = currencyView_->GetSelectedCurrency();
+    if (currency == nullptr) {
+        SetMessage("You must first select a currency");
+        return;
+    }
+    CurrencyQuote* quote;
+    if (currency->getQuote(date, &quote) == 0) {
+        quote->setValue(value);
+        currencyView_->ModifyQuote(quote);
+    } else {
+        currencyView_->AddQuote(new CurrencyQuote(currency, date, value));
+    }
+    UpdateCurrencyQuotesChart();
+    UpdateState();
+}
+
+void PLWindow::UpdateCurrencyQuote()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    if (CurrencyQuote* quote = currencyView_->GetSelectedQuote()) {
+        const Date date = currencyView_->getQuoteDate();
+        if (date.isUndefined()) {
+            SetMessage("Please specify a date.");
+            return;
+        }
+        // Another rate may have that day; both stay.
+        quote->setDate(date);
+        quote->setValue(currencyView_->getQuoteValue());
+        currencyView_->ModifyQuote(quote);
+    } else {
+        SetMessage("You must first select a quote");
+    }
+    UpdateCurrencyQuotesChart();
+    UpdateState();
+}
+
+void PLWindow::RemoveCurrencyQuote()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    int n;
+    const std::unique_ptr<CurrencyQuote*[]> quotes(currencyView_->getAllSelectedQuotes(&n));
+    currencyView_->DeleteQuotes(quotes.get(), n);
+    for (int i = 0; i < n; ++i)
+        delete quotes[static_cast<std::size_t>(i)];
+    UpdateCurrencyQuotesChart();
+    UpdateState();
+}
+
+void PLWindow::CurrencyQuoteSelection()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    if (const CurrencyQuote* quote = currencyView_->GetSelectedQuote()) {
+        currencyView_->setQuoteDate(quote->getDate());
+        currencyView_->setQuoteValue(quote->getValue());
+    }
+    UpdateCurrencyQuotesChart();
+}
+
+void PLWindow::UpdateCurrencyQuotesChart()
+{
+    const WindowLock lock(*this);
+    if (lock.isHeld())
+        currencyView_->UpdateQuotesChart();
+}

@@ -4,6 +4,8 @@
 #include "market/Currency.h"
 #include "market/Market.h"
 
+#include <algorithm>
+
 namespace {
 
 // Each currency with the reference's symbol makes all quotes read so far be expressed anew. A file saved after the same
@@ -27,8 +29,7 @@ Catalogue::Catalogue() = default;
 
 Catalogue::~Catalogue()
 {
-    for (Currency* currency : currencies_)
-        delete currency;
+    clear();
 }
 
 int Catalogue::rd(FILE* file)
@@ -69,6 +70,36 @@ int Catalogue::wrt(FILE* file, const Date& stamp) const
 void Catalogue::addCurrency(Currency* currency)
 {
     currencies_.push_back(currency);
+}
+
+void Catalogue::removeCurrency(Currency* currency)
+{
+    const auto place = std::find(currencies_.begin(), currencies_.end(), currency);
+    if (place == currencies_.end())
+        return;
+    *place = currencies_.back();
+    currencies_.pop_back();
+    if (currency == reference_) {
+        if (currencies_.empty())
+            reference_ = nullptr;
+        else
+            rebaseOn(currencies_.front());
+    }
+    // Nobody may be left with a pointer to what its new owner may destroy.
+    for (Currency* other : currencies_) {
+        Currency* stored;
+        other->getReferenceCurrency(&stored);
+        if (stored == currency)
+            other->setReferenceCurrency(reference_);
+    }
+}
+
+void Catalogue::clear()
+{
+    for (Currency* currency : currencies_)
+        delete currency;
+    currencies_.clear();
+    reference_ = nullptr;
 }
 
 unsigned Catalogue::getNbrCurrencies() const

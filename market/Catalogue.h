@@ -30,6 +30,12 @@ public:
 
     /// Takes ownership of `currency`.
     void addCurrency(Currency* currency);
+    /// Takes `currency` out and gives it back to the caller; the last currency moves into its place. When it was the
+    /// reference, the currency then first becomes that, by `rebaseOn`. No other currency goes on storing it as its own
+    /// reference.
+    void removeCurrency(Currency* currency);
+    /// Destroys all currencies; there is no reference any more.
+    void clear();
     unsigned getNbrCurrencies() const;
     /// The list itself, in order of addition; valid until the next change.
     const std::vector<Currency*>& getCurrencies() const { return currencies_; }

@@ -142,6 +142,11 @@ void BListView::InvalidateItem(int32 index)
     listWidget().update(listWidget().rows().index(index));
 }
 
+void BListView::InvalidateItems()
+{
+    listWidget().viewport()->update();
+}
+
 // --- Selection.
 
 void BListView::Select(int32 first, int32 last, bool extend)

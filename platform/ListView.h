@@ -43,6 +43,8 @@ public:
     int32 IndexOf(const BListItem* item) const;
     /// Draws the row again.
     void InvalidateItem(int32 index);
+    /// Draws all rows again.
+    void InvalidateItems();
 
     /// Selects the row, besides those that are when `extend` is set and the list's type allows it.
     void Select(int32 index, bool extend = false) { Select(index, index, extend); }

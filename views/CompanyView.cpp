@@ -1,11 +1,456 @@
 #include "views/CompanyView.h"
 
+#include "foundation/NumberText.h"
+#include "market/Company.h"
+#include "market/Market.h"
+#include "platform/Box.h"
+#include "platform/CheckBox.h"
+#include "platform/Message.h"
+#include "platform/StringView.h"
+#include "platform/TextControl.h"
+#include "views/CompanyEventListView.h"
+#include "views/CompanyListView.h"
+#include "views/EventBox.h"
 #include "views/Look.h"
+#include "views/MarketListView.h"
+#include "views/NumberControl.h"
+#include "views/QuoteBox.h"
+#include "views/QuoteChart.h"
+#include "views/QuoteListView.h"
+#include "views/Selection.h"
+
+using namespace look;
+
+namespace {
+
+// Where the groups of the page begin and end.
+constexpr float kRight = kPageWidth - kMargin;
+constexpr float kTopEnd = kMargin + kButtonHeight;
+constexpr float kListsTop = kTopEnd + kMargin;
+constexpr float kListsEnd = kListsTop + 194;
+constexpr float kMarketsEnd = kMargin + 292;
+constexpr float kQuotesTop = kListsEnd + kMargin;
+constexpr float kQuotesEnd = kQuotesTop + 248;
+constexpr float kQuotesRight = kMargin + 414;
+constexpr float kChartTop = kQuotesEnd + kMargin;
+
+} // namespace
 
 CompanyView::CompanyView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
 {
-    addButton(this, {8, 8, 108, 8 + look::kButtonHeight}, "btnLoadMarket", "Load", 'CBLd');
-    addButton(this, {114, 8, 214, 8 + look::kButtonHeight}, "btnSaveMarket", "Save", 'CBSv');
+    addLoadAndSave(this);
+    makeMarkets({kMargin, kListsTop, kMarketsEnd, kListsEnd});
+    makeCompanies({kMarketsEnd + kMargin, kListsTop, kRight, kListsEnd});
+    makeQuotes({kMargin, kQuotesTop, kQuotesRight, kQuotesEnd});
+    events_ = new EventBox({kQuotesRight + kMargin, kQuotesTop, kRight, kQuotesEnd});
+    AddChild(events_);
+    chart_ = new QuoteChart({kMargin, kChartTop, kRight, kPageHeight - kMargin});
+    AddChild(chart_);
 }
 
-void CompanyView::SetMarketList(const std::vector<Market*>&) {}
+void CompanyView::makeMarkets(BRect frame)
+{
+    BBox* box = addBox(this, frame, "Markets");
+    const float right = frame.Width() - kBoxSide;
+    const float bottom = frame.Height() - kBoxSide;
+    const float buttonTop = bottom - kButtonHeight;
+    const float fieldTop = buttonTop - kGap - kFieldHeight;
+    markets_ = new MarketListView("lstMarkets", right - kBoxSide - kScrollBar - MarketListView::kOtherWidth);
+    markets_->addTo(box, {kBoxSide, kBoxTop, right, fieldTop - kGap}, "Markets");
+    markets_->SetSelectionMessage(new BMessage('MSel'));
+    constexpr float kCurrencyWidth = 112;
+    marketName_ = addField(box, {kBoxSide, fieldTop, right - kCurrencyWidth - kGap, fieldTop + kFieldHeight},
+                           "txtMarketName", "Name", 'CTMn', 40);
+    marketCurrency_ = addField(box, {right - kCurrencyWidth, fieldTop, right, fieldTop + kFieldHeight},
+                               "txtMarketCurrencyRepresentation", "Currency", 'CTMc', 62);
+    addButtons(box, {kBoxSide, buttonTop, right, bottom},
+               {{"btnAddMarket", "Add", 'CBAm'},
+                {"btnUpdateMarket", "Update", 'CBUm'},
+                {"btnRemoveMarket", "Remove", 'CBRm'}});
+}
+
+void CompanyView::makeCompanies(BRect frame)
+{
+    BBox* box = addBox(this, frame, "Companies");
+    const float right = frame.Width() - kBoxSide;
+    const float bottom = frame.Height() - kBoxSide;
+    constexpr float kListEnd = kBoxSide + 66 + 176 + kScrollBar;
+    companies_ = new CompanyListView("lstCompanies");
+    companies_->addTo(box, {kBoxSide, kBoxTop, kListEnd, bottom}, "Companies");
+    companies_->SetSelectionMessage(new BMessage('CSel'));
+
+    constexpr float kLeft = kListEnd + kMargin;
+    constexpr float kNarrow = 44;
+    constexpr float kWide = 116;
+    float top = kBoxTop;
+    const auto add = [&](auto make, const char* name, const char* label, uint32 code, float divider) {
+        BTextControl* field = make(box, BRect(kLeft, top, right, top + kFieldHeight), name, label, code, divider);
+        top += kRow;
+        return field;
+    };
+    abbreviation_ = add(addField, "txtAbbreviation", "Ticker", 'CTCa', kNarrow);
+    companyName_ = add(addField, "txtName", "Name", 'CTCn', kNarrow);
+    relativeDailyChange_ = add(addNumber, "txtRelativeDailyChange", "Rel. Daily Change", 'CTRe', kWide);
+    diffWithAverage_ = add(addNumber, "txtDiffWithAverage", "Diff. with Average", 'CTDi', kWide);
+    relativeDailyChange_->SetEditable(false);
+    diffWithAverage_->SetEditable(false);
+    const float fetchTop = bottom - kButtonHeight;
+    const float buttonTop = fetchTop - kGap - kButtonHeight;
+    addButtons(box, {kLeft, buttonTop, right, buttonTop + kButtonHeight},
+               {{"btnAddCompany", "Add", 'CBAc'},
+                {"btnUpdateCompany", "Update", 'CBUc'},
+                {"btnRemoveCompany", "Remove", 'CBRc'}});
+    addButton(box, {kLeft, fetchTop, right, bottom}, "btnSetLastThreeMonths", "Set Last Three Months", 'CB3M');
+}
+
+void CompanyView::makeQuotes(BRect frame)
+{
+    quotes_ = new QuoteBox(frame, "Quotes", {'CQSe', 'CTQd', 'CTQv', 'CBAq', 'CBUq', 'CBRq'});
+    AddChild(quotes_);
+    const BRect area = quotes_->freeArea();
+    float top = area.top + kMargin;
+    auto* title = new BStringView({area.left, top, area.right, top + kFieldHeight}, "", "Split of the selected quotes");
+    quotes_->AddChild(title);
+    top += kFieldHeight;
+    constexpr float kFirst = 44 + 34;
+    constexpr float kSecond = 22 + 34;
+    splitNumerator_ = addTypedNumber(quotes_, {area.left, top + 1, area.left + kFirst, top + 1 + kFieldHeight},
+                                     "txtSplitRangeNum", "Factor", 'CTSp', 44);
+    splitDenominator_ =
+        addTypedNumber(quotes_, {area.left + kFirst, top + 1, area.left + kFirst + kSecond, top + 1 + kFieldHeight},
+                       "txtSplitRangeDenum", "to", 'CTSp', 22);
+    addButton(quotes_, {area.left + kFirst + kSecond + kGap, top, area.right, top + kButtonHeight}, "btnSplitQuotes",
+              "Split", 'CBSq');
+    withSafe_ = addCheckBox(quotes_, {area.left, area.bottom - kFieldHeight, area.right, area.bottom}, "cbWithSafe",
+                            "With Safe", 'CCWs');
+}
+
+// --- Markets.
+
+String CompanyView::getMarketName() const
+{
+    return marketName_->Text();
+}
+
+void CompanyView::setMarketName(const String& name)
+{
+    showText(*marketName_, name);
+}
+
+String CompanyView::getMarketCurrencyRepresentation() const
+{
+    return marketCurrency_->Text();
+}
+
+void CompanyView::setMarketCurrencyRepresentation(const String& representation)
+{
+    showText(*marketCurrency_, representation);
+}
+
+Market* CompanyView::GetSelectedMarket() const
+{
+    return markets_->selected();
+}
+
+void CompanyView::AddMarket(Market* market, bool selected)
+{
+    markets_->add(market);
+    if (selected)
+        markets_->select(market);
+}
+
+void CompanyView::ModifyMarket(Market* market)
+{
+    markets_->modify(market);
+}
+
+void CompanyView::DeleteMarket(Market* market)
+{
+    markets_->remove(market);
+    if (market == shownMarket_)
+        SetCompanyList(nullptr);
+}
+
+void CompanyView::SetMarketList(const std::vector<Market*>& markets)
+{
+    markets_->setAll(markets);
+    SetCompanyList(nullptr);
+}
+
+// --- Companies.
+
+String CompanyView::getCompanyName() const
+{
+    return companyName_->Text();
+}
+
+void CompanyView::setCompanyName(const String& name)
+{
+    showText(*companyName_, name);
+}
+
+String CompanyView::getCompanyAbbreviation() const
+{
+    return abbreviation_->Text();
+}
+
+void CompanyView::setCompanyAbbreviation(const String& abbreviation)
+{
+    showText(*abbreviation_, abbreviation);
+}
+
+void CompanyView::setRelativeDailyChange(float change)
+{
+    relativeDailyChange_->SetText(finePercentText(change).c_str());
+}
+
+void CompanyView::setDiffWithAverage(float difference)
+{
+    diffWithAverage_->SetText(percentText(difference).c_str());
+}
+
+Company* CompanyView::GetSelectedCompany() const
+{
+    return companies_->selected();
+}
+
+void CompanyView::AddCompany(Company* company, bool selected)
+{
+    Market* market;
+    markets_->InvalidateItems(); // they count their companies
+    if (company->getMarket(&market) != 0 || market != shownMarket_)
+        return;
+    companies_->add(company);
+    if (selected)
+        companies_->select(company);
+}
+
+void CompanyView::ModifyCompany(Company* company)
+{
+    companies_->modify(company);
+}
+
+void CompanyView::DeleteCompany(Company* company)
+{
+    companies_->remove(company);
+    markets_->InvalidateItems();
+    if (company == quotesOf_)
+        SetQuoteList(nullptr);
+    if (company == eventsOf_)
+        SetCompanyEventList(nullptr);
+}
+
+void CompanyView::SetCompanyList(Market* market)
+{
+    if (market != shownMarket_)
+        companies_->clear(); // what is selected in it is not to be found again
+    shownMarket_ = market;
+    unsigned n = 0;
+    Company** companies = market != nullptr ? market->getAllCompanies(&n) : nullptr;
+    companies_->setAll({companies, companies + n});
+    const Company* selected = GetSelectedCompany();
+    if (selected != quotesOf_ || selected == nullptr) {
+        SetQuoteList(nullptr);
+        SetCompanyEventList(nullptr);
+    }
+}
+
+BListView* CompanyView::getCompanyListView() const
+{
+    return companies_;
+}
+
+// --- Quotes.
+
+Date CompanyView::getQuoteDate() const
+{
+    return quotes_->getDate();
+}
+
+void CompanyView::setQuoteDate(const Date& date)
+{
+    quotes_->setDate(date);
+}
+
+float CompanyView::getQuoteValue() const
+{
+    return quotes_->getValue();
+}
+
+void CompanyView::setQuoteValue(float value)
+{
+    quotes_->setValue(value);
+}
+
+double CompanyView::getSplitFactor() const
+{
+    const double denominator = splitDenominator_->getNumber();
+    return denominator != 0 ? splitNumerator_->getNumber() / denominator : 0;
+}
+
+CompanyQuote* CompanyView::GetSelectedQuote() const
+{
+    return static_cast<CompanyQuote*>(quotes_->list().selected());
+}
+
+CompanyQuote** CompanyView::getAllSelectedQuotes(int* n) const
+{
+    return newArrayOf<CompanyQuote>(quotes_->list().allSelected(), n);
+}
+
+void CompanyView::AddQuote(CompanyQuote* quote)
+{
+    Company* company;
+    if (quote->getCompany(&company) == 0 && company == quotesOf_)
+        quotes_->list().insert(quote);
+}
+
+void CompanyView::ModifyQuote(CompanyQuote* quote)
+{
+    quotes_->list().update(quote);
+}
+
+void CompanyView::DeleteQuote(CompanyQuote* quote)
+{
+    DeleteQuotes(&quote, 1);
+}
+
+void CompanyView::DeleteQuotes(CompanyQuote* const* quotes, int n)
+{
+    quotes_->list().removeAll({quotes, quotes + n});
+}
+
+void CompanyView::SetQuoteList(Company* company)
+{
+    QuoteListView& list = quotes_->list();
+    const bool isOther = company != quotesOf_;
+    if (isOther)
+        list.clear();
+    quotesOf_ = company;
+    unsigned n = 0;
+    CompanyQuote** quotes = company != nullptr ? company->getAllQuotes(&n) : nullptr;
+    list.showAll({quotes, quotes + n});
+    if (isOther)
+        list.ScrollTo(list.CountItems() - 1); // the latest quote
+    if (company == nullptr)
+        UpdateQuotesChart();
+}
+
+void CompanyView::UpdateQuotesChart()
+{
+    const Company* company = GetSelectedCompany();
+    if (company == nullptr) {
+        chart_->showNothing();
+        return;
+    }
+    const String unit = company->getCurrencyRepresentation();
+    chart_->showSeries(*company, std::string(company->getAbbreviation().bytes()),
+                       unit.isUndefined() ? "???" : std::string(unit.bytes()), withSafe_->Value() == B_CONTROL_ON);
+}
+
+// --- Events.
+
+short CompanyView::getEventType() const
+{
+    return events_->getType();
+}
+
+void CompanyView::SetEventType(short type)
+{
+    events_->setType(type);
+}
+
+Date CompanyView::getCompanyEventDate() const
+{
+    return events_->getDate();
+}
+
+void CompanyView::setCompanyEventDate(const Date& date)
+{
+    events_->setDate(date);
+}
+
+String CompanyView::getCompanyEventTitle() const
+{
+    return events_->getTitle();
+}
+
+void CompanyView::setCompanyEventTitle(const String& title)
+{
+    events_->setTitle(title);
+}
+
+String CompanyView::getCompanyEventText() const
+{
+    return events_->getText();
+}
+
+void CompanyView::setCompanyEventText(const String& text)
+{
+    events_->setText(text);
+}
+
+short CompanyView::getCompanyEventNumerator() const
+{
+    return events_->getNumerator();
+}
+
+void CompanyView::setCompanyEventNumerator(short numerator)
+{
+    events_->setNumerator(numerator);
+}
+
+short CompanyView::getCompanyEventDivider() const
+{
+    return events_->getDivider();
+}
+
+void CompanyView::setCompanyEventDivider(short divider)
+{
+    events_->setDivider(divider);
+}
+
+CompanyEvent* CompanyView::GetSelectedCompanyEvent() const
+{
+    return events_->list().selected();
+}
+
+CompanyEvent** CompanyView::GetAllSelectedCompanyEvents(int* n) const
+{
+    return newArrayOf<CompanyEvent>(events_->list().allSelected(), n);
+}
+
+void CompanyView::AddCompanyEvent(CompanyEvent* event, bool selected)
+{
+    Company* company;
+    if (event->getCompany(&company) != 0 || company != eventsOf_)
+        return;
+    events_->list().insert(event);
+    if (selected)
+        events_->list().select(event);
+}
+
+void CompanyView::ModifyCompanyEvent(CompanyEvent* event)
+{
+    events_->list().update(event);
+}
+
+void CompanyView::DeleteCompanyEvent(CompanyEvent* event)
+{
+    DeleteCompanyEvents(&event, 1);
+}
+
+void CompanyView::DeleteCompanyEvents(CompanyEvent* const* events, int n)
+{
+    events_->list().removeAll({events, events + n});
+}
+
+void CompanyView::SetCompanyEventList(Company* company)
+{
+    if (company != eventsOf_)
+        events_->list().clear();
+    eventsOf_ = company;
+    unsigned n = 0;
+    CompanyEvent** events = company != nullptr ? company->getAllEvents(&n) : nullptr;
+    events_->list().showAll({events, events + n});
+}

@@ -59,6 +59,17 @@ public:
         destroyRow(index);
         return true;
     }
+    /// Puts the row at `from` at `to`, counted without it; it stays selected if it was. Sends no message.
+    void move(int32 from, int32 to)
+    {
+        const bool wasSelected = IsItemSelected(from);
+        AddItem(RemoveItem(from), to);
+        if (!wasSelected)
+            return;
+        SetQuiet(true);
+        Select(to, true);
+        SetQuiet(false);
+    }
     /// Leaves the object's row without object, in constant time, for when many objects go: `dropReleased` then takes
     /// all such rows out at once. Needs a row with `release()`. @return false when there is none.
     bool release(const Object* object)

@@ -8,6 +8,8 @@
 #include "views/Look.h"
 #include "views/NumberControl.h"
 
+#include <cmath>
+
 namespace {
 
 /// A field of its class, in the look of all fields.
@@ -68,9 +70,35 @@ BButton* PageView::addButton(BView* parent, BRect frame, const char* name, const
     return button;
 }
 
+void PageView::addButtons(BView* parent, BRect area, const std::vector<ButtonPlan>& buttons)
+{
+    const auto count = static_cast<float>(buttons.size());
+    const float pitch = (area.Width() + look::kGap) / count;
+    float left = area.left;
+    for (const ButtonPlan& button : buttons) {
+        const float right = left + pitch - look::kGap;
+        addButton(parent, {std::round(left), area.top, std::round(right), area.bottom}, button.name, button.label,
+                  button.code);
+        left += pitch;
+    }
+}
+
+void PageView::addLoadAndSave(BView* page)
+{
+    constexpr float kWidth = 110;
+    constexpr float kRight = look::kPageWidth - look::kMargin;
+    addButtons(page, {kRight - 2 * kWidth - look::kGap, look::kMargin, kRight, look::kMargin + look::kButtonHeight},
+               {{"btnLoadMarket", "Load", 'CBLd'}, {"btnSaveMarket", "Save", 'CBSv'}});
+}
+
 BCheckBox* PageView::addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code)
 {
     auto* box = new BCheckBox(frame, name, label, new BMessage(code));
     parent->AddChild(box);
     return box;
+}
+
+void PageView::showText(BTextControl& field, const String& text)
+{
+    field.SetText(text.hasText() ? text.getCharacterArray() : "");
 }

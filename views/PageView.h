@@ -1,6 +1,9 @@
 #pragma once
 
+#include "foundation/String.h"
 #include "platform/View.h"
+
+#include <vector>
 
 class BBox;
 class BButton;
@@ -30,5 +33,17 @@ public:
     static NumberControl* addTypedNumber(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
                                          float divider);
     static BButton* addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code);
+    struct ButtonPlan {
+        const char* name;
+        const char* label;
+        uint32 code;
+    };
+    /// A row of buttons of one width that fills `area`.
+    static void addButtons(BView* parent, BRect area, const std::vector<ButtonPlan>& buttons);
+    /// The buttons for the market data file, at the right of the page's upper edge.
+    static void addLoadAndSave(BView* page);
     static BCheckBox* addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code);
+
+    /// Shows a text of the model; nothing for a String without text.
+    static void showText(BTextControl& field, const String& text);
 };

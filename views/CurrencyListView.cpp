@@ -1,0 +1,36 @@
+#include "views/CurrencyListView.h"
+
+#include "foundation/NumberText.h"
+#include "views/DateText.h"
+#include "views/Look.h"
+
+namespace {
+
+enum Column { kName, kSymbol, kRate, kRateDay };
+
+} // namespace
+
+Cell CurrencyItem::cell(int column) const
+{
+    const unsigned rates = currency_->getNbrQuotes();
+    switch (column) {
+    case kName:
+        return {std::string(currency_->getName().bytes())};
+    case kSymbol:
+        return {std::string(currency_->getRepresentation().bytes())};
+    case kRate:
+        // What is held in a currency without a rate has no value.
+        return rates > 0 ? Cell{exactText(currency_->getQuote(rates - 1)->getValue())}
+                         : Cell{"no rate", look::kWarning};
+    case kRateDay:
+        return {dateText(currency_->getLastQuote()), look::kFaint};
+    default:
+        return {};
+    }
+}
+
+CurrencyListView::CurrencyListView(const char* name)
+    : ObjectListView(
+          {}, name, B_SINGLE_SELECTION_LIST,
+          {{"Currency", 150}, {"Symbol", 62}, {"Latest Rate", 96, B_ALIGN_RIGHT}, {"Rate of", 82, B_ALIGN_RIGHT}})
+{}

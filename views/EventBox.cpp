@@ -1,0 +1,152 @@
+#include "views/EventBox.h"
+
+#include "market/NoteCompanyEvent.h"
+#include "market/SplitCompanyEvent.h"
+#include "platform/MenuField.h"
+#include "platform/MenuItem.h"
+#include "platform/PopUpMenu.h"
+#include "platform/StringView.h"
+#include "platform/TextControl.h"
+#include "platform/TextView.h"
+#include "views/CompanyEventListView.h"
+#include "views/DateControl.h"
+#include "views/Look.h"
+#include "views/NumberControl.h"
+#include "views/PageView.h"
+
+using namespace look;
+
+namespace {
+
+constexpr float kDivider = 38; // room for the labels at the left
+
+void setVisible(BView& view, bool isVisible)
+{
+    if (isVisible)
+        view.Show();
+    else
+        view.Hide();
+}
+
+} // namespace
+
+EventBox::EventBox(BRect frame) : BBox(frame, "")
+{
+    SetLabel("Events");
+    const float right = frame.Width() - kBoxSide;
+    const float bottom = frame.Height() - kBoxSide;
+    constexpr float kListEnd = kBoxTop + kHeadingHeight + 4 * kListRow + 2;
+    list_ = new CompanyEventListView("lstCompanyEvents");
+    list_->addTo(this, {kBoxSide, kBoxTop, right, kListEnd}, "Events");
+    list_->SetSelectionMessage(new BMessage('CEse'));
+
+    const float top = kListEnd + kMargin;
+    const float buttonTop = bottom - kButtonHeight;
+    makeFields({kBoxSide, top, right, buttonTop - kMargin});
+    PageView::addButtons(this, {kBoxSide, buttonTop, right, bottom},
+                         {{"btnAddCompanyEvent", "Add", 'CBEa'},
+                          {"btnUpdateCompanyEvent", "Update", 'CBEu'},
+                          {"btnRemoveCompanyEvent", "Remove", 'CBEr'}});
+    setNumerator(1);
+    setDivider(2);
+    setType(SplitCompanyEvent::kType);
+}
+
+BMenuField* EventBox::makeMenu(BRect frame)
+{
+    auto* kinds = new BPopUpMenu("companyEventType");
+    kinds->AddItem(new BMenuItem("Split", new BMessage('CMSp')));
+    kinds->AddItem(new BMenuItem("Note", new BMessage('CMNo')));
+    auto* field = new BMenuField(frame, "companyEventType", "Kind", kinds);
+    field->SetDivider(kDivider);
+    AddChild(field);
+    return field;
+}
+
+void EventBox::makeFields(BRect area)
+{
+    const float middle = area.left + 136;
+    float top = area.top;
+    menu_ = makeMenu({area.left, top, middle, top + kFieldHeight});
+    date_ = PageView::addDate(this, {middle, top, area.right, top + kFieldHeight}, "txtCompanyEventDate", "Date",
+                              'CTEd', kDivider + kMargin);
+    top += kRow;
+    // The two kinds take turns in the same place.
+    constexpr float kNumberWidth = 80;
+    const float second = area.left + kDivider + kNumberWidth;
+    numerator_ = PageView::addTypedNumber(this, {area.left, top, second, top + kFieldHeight}, "txtEventSplitRangeNum",
+                                          "Split", 'CTQv', kDivider);
+    divider_ = PageView::addTypedNumber(this, {second, top, second + 24 + kNumberWidth, top + kFieldHeight},
+                                        "txtEventSplitRangeDenum", "to", 'CTQv', 24);
+    title_ = PageView::addField(this, {area.left, top, area.right, top + kFieldHeight}, "txtCompanyEventTitle", "Title",
+                                'CTEt', kDivider);
+    top += kRow;
+    auto* label = new BStringView({area.left, top, area.left + kDivider - kGap, top + kFieldHeight}, "", "Text");
+    label->SetAlignment(B_ALIGN_RIGHT);
+    AddChild(textLabel_ = label);
+    text_ = new BTextView({area.left + kDivider, top, area.right, area.bottom}, "txtCompanyEventText",
+                          B_FOLLOW_LEFT | B_FOLLOW_TOP);
+    text_->SetAccessibleName("Text");
+    AddChild(text_);
+}
+
+void EventBox::setType(short type)
+{
+    const bool isNote = type == NoteCompanyEvent::kType;
+    type_ = isNote ? NoteCompanyEvent::kType : SplitCompanyEvent::kType;
+    menu_->Menu()->ItemAt(isNote ? 1 : 0)->SetMarked(true);
+    for (BView* view : {static_cast<BView*>(title_), textLabel_, static_cast<BView*>(text_)})
+        setVisible(*view, isNote);
+    for (BView* view : {numerator_, divider_})
+        setVisible(*view, !isNote);
+}
+
+Date EventBox::getDate() const
+{
+    return date_->getDate();
+}
+
+void EventBox::setDate(const Date& date)
+{
+    date_->setDate(date);
+}
+
+String EventBox::getTitle() const
+{
+    return title_->Text();
+}
+
+void EventBox::setTitle(const String& title)
+{
+    PageView::showText(*title_, title);
+}
+
+String EventBox::getText() const
+{
+    return text_->Text();
+}
+
+void EventBox::setText(const String& text)
+{
+    text_->SetText(text.hasText() ? text.getCharacterArray() : "");
+}
+
+short EventBox::getNumerator() const
+{
+    return numerator_->getShort();
+}
+
+void EventBox::setNumerator(short numerator)
+{
+    numerator_->setInteger(numerator);
+}
+
+short EventBox::getDivider() const
+{
+    return divider_->getShort();
+}
+
+void EventBox::setDivider(short divider)
+{
+    divider_->setInteger(divider);
+}

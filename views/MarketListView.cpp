@@ -1,0 +1,28 @@
+#include "views/MarketListView.h"
+
+#include "foundation/NumberText.h"
+
+namespace {
+
+enum Column { kName, kCurrency, kCompanies };
+
+} // namespace
+
+Cell MarketItem::cell(int column) const
+{
+    switch (column) {
+    case kName:
+        return {std::string(market_->getName().bytes())};
+    case kCurrency:
+        return {std::string(market_->getCurrencyRepresentation().bytes())};
+    case kCompanies:
+        return {countText(static_cast<int>(market_->getNbrCompanies()))};
+    default:
+        return {};
+    }
+}
+
+MarketListView::MarketListView(const char* name, float nameWidth)
+    : ObjectListView({}, name, B_SINGLE_SELECTION_LIST,
+                     {{"Market", nameWidth}, {"Currency", 66}, {"Companies", 78, B_ALIGN_RIGHT}})
+{}

@@ -1,0 +1,55 @@
+#include "views/QuoteBox.h"
+
+#include "views/DateControl.h"
+#include "views/Look.h"
+#include "views/NumberControl.h"
+#include "views/PageView.h"
+#include "views/QuoteListView.h"
+
+using namespace look;
+
+QuoteBox::QuoteBox(BRect frame, const char* title, const Codes& codes) : BBox(frame, "")
+{
+    SetLabel(title);
+    const float right = frame.Width() - kBoxSide;
+    const float bottom = frame.Height() - kBoxSide;
+    constexpr float kListWidth = 82 + 96 + kScrollBar;
+    list_ = new QuoteListView("lstQuotes");
+    list_->addTo(this, {kBoxSide, kBoxTop, kBoxSide + kListWidth, bottom}, title);
+    list_->SetSelectionMessage(new BMessage(codes.selection));
+
+    constexpr float kLeft = kBoxSide + kListWidth + kMargin;
+    constexpr float kDivider = 44;
+    float top = kBoxTop;
+    date_ =
+        PageView::addDate(this, {kLeft, top, right, top + kFieldHeight}, "txtQuoteDate", "Date", codes.date, kDivider);
+    top += kRow;
+    value_ = PageView::addTypedNumber(this, {kLeft, top, right, top + kFieldHeight}, "txtQuoteValue", "Value",
+                                      codes.value, kDivider);
+    top += kRow + kGap;
+    PageView::addButtons(this, {kLeft, top, right, top + kButtonHeight},
+                         {{"btnAddQuote", "Add", codes.add},
+                          {"btnUpdateQuote", "Update", codes.update},
+                          {"btnRemoveQuote", "Remove", codes.remove}});
+    freeArea_ = {kLeft, top + kButtonHeight + kMargin, right, bottom};
+}
+
+Date QuoteBox::getDate() const
+{
+    return date_->getDate();
+}
+
+void QuoteBox::setDate(const Date& date)
+{
+    date_->setDate(date);
+}
+
+float QuoteBox::getValue() const
+{
+    return value_->getNumber();
+}
+
+void QuoteBox::setValue(float value)
+{
+    value_->setNumber(value);
+}

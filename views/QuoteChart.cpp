@@ -1,0 +1,87 @@
+#include "views/QuoteChart.h"
+
+#include "chart/GraphPoint.h"
+#include "views/Look.h"
+
+#include <cmath>
+#include <utility>
+
+namespace {
+
+void add(GraphPolyElement& element, const Date& date, double value)
+{
+    auto* point = new GraphPoint;
+    point->setDateBased(true);
+    point->setDateX(date);
+    point->setY(static_cast<float>(value));
+    element.addGraphPoint(point);
+}
+
+} // namespace
+
+QuoteChart::QuoteChart(BRect frame) : GraphView(frame, "grvQuotes")
+{
+    SetAccessibleName("Quotes");
+    setXDateBased(true);
+    const struct {
+        GraphElement& element;
+        rgb_color color;
+        const char* legend;
+    } elements[] = {
+        {band_, look::kBand, "Trend \u00B1 one standard deviation"},
+        {line_, look::kSeries, ""}, // named after what it shows; the first line, whose extremes the chart marks
+        {trend_, look::kTrend, "Trend"},
+    };
+    for (const auto& e : elements) {
+        e.element.setDateBased(true);
+        e.element.setColor(e.color);
+        e.element.setLegend(e.legend);
+        addGraphElement(&e.element);
+    }
+    showNothing();
+}
+
+void QuoteChart::showContent(Content content)
+{
+    if (content == shown_)
+        return;
+    shown_ = std::move(content);
+    band_.clearAll();
+    trend_.clearAll();
+    line_.clearAll();
+    removeAllGraphPoints();
+    setXLegend(("Value in " + shown_.unit).c_str());
+    line_.setLegend(shown_.name.empty() ? "Quotes" : shown_.name.c_str());
+    fill();
+    Invalidate();
+}
+
+void QuoteChart::fill()
+{
+    const auto& days = shown_.days;
+    if (days.empty())
+        return;
+    for (const Day& day : days)
+        add(line_, day.date, day.value);
+    for (const Day& day : {days.front(), days.back()})
+        add(trend_, day.date, day.trend);
+    if (shown_.withBand)
+        fillBand();
+}
+
+void QuoteChart::fillBand()
+{
+    const auto& days = shown_.days;
+    double squares = 0;
+    for (const Day& day : days) {
+        const double distance = static_cast<double>(day.value) - day.trend;
+        squares += distance * distance;
+    }
+    const double deviation = std::sqrt(squares / static_cast<double>(days.size()));
+    const Day& first = days.front();
+    const Day& last = days.back();
+    add(band_, first.date, first.trend + deviation);
+    add(band_, last.date, last.trend + deviation);
+    add(band_, last.date, last.trend - deviation);
+    add(band_, first.date, first.trend - deviation);
+}
