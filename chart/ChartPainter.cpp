@@ -140,7 +140,8 @@ void ChartPainter::drawMark(const ChartMark& mark)
 {
     fillDisc(mark.where, kMarkRadius + 1, background_);
     fillDisc(mark.where, kMarkRadius, mark.color);
-    drawOutlinedText(mark.label);
+    if (!mark.label.text.empty())
+        drawOutlinedText(mark.label);
 }
 
 /// Other lines may pass below a mark's label.

@@ -5,6 +5,7 @@
 #include "chart/GraphPoint.h"
 #include "chart/GraphPolygon.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace {
@@ -27,7 +28,7 @@ std::vector<ChartSeries> seriesOf(GraphElement* const* elements, unsigned count,
             continue;
         ChartSeries series{shapeOf(element),
                            element.getColor(),
-                           static_cast<float>(element.getPenSize()),
+                           std::max<float>(element.getPenSize(), 1),
                            std::string(element.getLegend().bytes()),
                            {}};
         unsigned n;

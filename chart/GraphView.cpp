@@ -5,6 +5,7 @@
 #include "chart/GraphElement.h"
 #include "chart/GraphPoint.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace {
@@ -14,7 +15,7 @@ const BPoint kNoDataPlace(10, 20);
 ChartFont fontOf(short size)
 {
     BFont font = *be_plain_font;
-    font.SetSize(size);
+    font.SetSize(std::max<short>(size, 1));
     font_height height;
     font.GetHeight(&height);
     return {font.Size(), height.ascent, height.descent,
@@ -51,7 +52,7 @@ void GraphView::Draw(BRect)
     const ChartContents contents = readContents();
     if (contents.series.empty()) {
         scale_.reset();
-        painter.drawNotice("No data", kNoDataPlace, legendSize_);
+        painter.drawNotice("No data", kNoDataPlace, contents.legendFont.size);
         return;
     }
     const ChartLayout layout = layOutChart(contents);
