@@ -123,13 +123,13 @@ void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
 
 OperationListView::OperationListView(const char* name)
     : ObjectListView({}, name, B_SINGLE_SELECTION_LIST,
-                     {{"Date", 80},
-                      {"Account", 104},
-                      {"Type", 60},
-                      {"What", 126},
-                      {"Quantity", 64, B_ALIGN_RIGHT},
-                      {"Quote / Amount", 100, B_ALIGN_RIGHT},
+                     {{"Date", 78},
+                      {"Account", 106},
+                      {"Type", 58},
+                      {"What", 128},
+                      {"Quantity", 66, B_ALIGN_RIGHT},
+                      {"Quote/Amount", 94, B_ALIGN_RIGHT},
                       {"Cost", 62, B_ALIGN_RIGHT},
-                      {"Total", 116, B_ALIGN_RIGHT},
+                      {"Total", 120, B_ALIGN_RIGHT},
                       {"Auto", 36, B_ALIGN_CENTER}})
 {}

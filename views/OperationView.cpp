@@ -25,7 +25,7 @@ constexpr float kRight = kPageWidth - kMargin;
 constexpr float kEditorEnd = kPageHeight - kMargin;
 constexpr float kEditorTop = kEditorEnd - kBoxTop - 3 * kRow - kGap - kButtonHeight - kBoxSide;
 constexpr float kListEnd = kEditorTop - kMargin;
-constexpr float kListTop = kMargin + kFieldHeight + 4;
+constexpr float kListTop = kMargin + kFieldHeight + 1; // the list then ends with a whole row
 
 constexpr float kDivider = 82;
 constexpr float kColumnGap = 16;

@@ -1,0 +1,408 @@
+// The operation commands, by their controls on the operation page.
+
+#include "platform/ListView.h"
+#include "portfolio/DepositAccountOperation.h"
+#include "portfolio/Share.h"
+#include "portfolio/ShareOperation.h"
+#include "portfolio/TransferAccountOperation.h"
+#include "portfolio/Wallet.h"
+#include "tests/gui/SmallCatalogue.h"
+#include "tests/gui/WindowFixture.h"
+
+#include <QCheckBox>
+#include <QComboBox>
+#include <gmock/gmock.h>
+
+#include <map>
+
+namespace {
+
+using testing::Contains;
+using testing::ElementsAre;
+using testing::EndsWith;
+using testing::IsEmpty;
+using testing::SizeIs;
+
+constexpr const char* kAdd = "btnAddOperation";
+constexpr const char* kUpdate = "btnUpdateOperation";
+constexpr const char* kRemove = "btnRemoveOperation";
+
+class OperationTest : public WindowTest {
+protected:
+    OperationTest()
+    {
+        addSmallCatalogue(window());
+        cash_ = addAccount(window(), "Cash", "EUR");
+        addAccount(window(), "Broker", "EUR");
+        addAccount(window(), "Dollars", "USD");
+        showAccounts();
+        show(kOperationPage);
+    }
+
+    /// Has the menus follow, as the account commands do.
+    void showAccounts()
+    {
+        show(kPortoFolioPage);
+        window().UpdateState();
+        select("lstAccounts", 0);
+        click("btnUpdateQuote");
+    }
+    void deposit(const char* account, const char* amount)
+    {
+        choose("operationType", "Deposit");
+        choose("baseAccount", account);
+        type("txtAmount", amount);
+    }
+    void transfer(const char* from, const char* to)
+    {
+        choose("operationType", "Transfer");
+        choose("baseAccount", from);
+        choose("transferAccount", to);
+        type("txtAmount", "50");
+    }
+    void trade(const char* type_, const char* account, const char* ticker, const char* quantity)
+    {
+        choose("operationType", type_);
+        choose("baseAccount", account);
+        type("txtMarketName", "Paris");
+        type("txtCompanyAbbreviation", ticker);
+        type("txtQuantity", quantity);
+    }
+    std::string menuText(const char* name) { return find<QComboBox>(name).currentText().toStdString(); }
+    const Share& firstShare()
+    {
+        unsigned n;
+        return *wallet().getAllShares(&n)[0];
+    }
+    int selectedRow() { return list("lstOperations").CurrentSelection(); }
+    unsigned countOperations()
+    {
+        unsigned n = 0;
+        for (unsigned i = 0; i < wallet().getNbrAccounts(); ++i)
+            n += wallet().getAccount(i)->getNbrOperations();
+        return n;
+    }
+
+    Account* cash_;
+};
+
+TEST_F(OperationTest, OnlyTheFieldsOfTheTypeShow)
+{
+    const std::map<std::string, std::string> types = {{"Deposit", "D"}, {"Transfer", "T"}, {"Buy", "B"}, {"Sell", "B"}};
+    const struct {
+        const char *name, *types;
+    } fields[] = {
+        {"txtDate", "DTB"},
+        {"baseAccount", "DTB"},
+        {"cbAutomatic", "DTB"},
+        {"txtAmount", "DT"},
+        {"transferAccount", "T"},
+        {"txtTransferCost", "T"},
+        {"txtTransferFromQuote", "T"},
+        {"txtTransferToQuote", "T"},
+        {"txtTransferRateCost", "T"},
+        {"txtMarketName", "B"},
+        {"txtCompanyAbbreviation", "B"},
+        {"txtQuantity", "B"},
+        {"txtQuote", "B"},
+        {"txtShareCost", "B"},
+        {"txtTotal", "B"},
+    };
+    for (const auto& [type, letter] : types) {
+        choose("operationType", type);
+        for (const auto& f : fields)
+            EXPECT_EQ(isVisible(f.name), std::string(f.types).find(letter) != std::string::npos) << type << f.name;
+    }
+}
+
+TEST_F(OperationTest, ChecksComeInTheirOrderAndChangeNothing)
+{
+    const struct {
+        const char* why;
+        std::function<void()> enterFields;
+        const char* message;
+    } cases[] = {
+        {"no date: silence", [&] { type("txtDate", ""); }, ""},
+        {"a date that is none: silence", [&] { type("txtDate", "31/02/2024"); }, ""},
+        {"no account", [&] { type("txtDate", "01/11/2024"); }, "Undefined account."},
+        {"unknown account",
+         [&] {
+             choose("baseAccount", "Cash");
+             cash_->setName("Purse");
+         },
+         "Unknown account."},
+        {"a transfer to nowhere: silence",
+         [&] {
+             cash_->setName("Cash");
+             choose("operationType", "Transfer");
+         },
+         ""},
+        {"unknown market",
+         [&] {
+             choose("operationType", "Sell");
+             type("txtMarketName", "London");
+             type("txtCompanyAbbreviation", "BBB");
+         },
+         "Unknown company."},
+        {"unknown ticker", [&] { trade("Buy", "Cash", "CCC", "0"); }, "Unknown company."},
+        {"currencies differ, which is seen before the quantity", [&] { trade("Buy", "Cash", "AAA", "0"); },
+         "Not the same currencies."},
+        {"no quantity", [&] { trade("Buy", "Cash", "BBB", "0"); }, "Quantity must be higher than 0."},
+        {"negative quantity", [&] { trade("Sell", "Cash", "BBB", "-3"); }, "Quantity must be higher than 0."},
+    };
+    unsigned shares = 0;
+    for (const auto& c : cases) {
+        c.enterFields();
+        for (const char* button : {kAdd, kUpdate}) {
+            clearMessage();
+            click(button);
+            EXPECT_EQ(message(), c.message) << c.why << ", " << button;
+            EXPECT_EQ(countOperations(), 0U) << c.why;
+        }
+        if (std::string(c.message) == "Quantity must be higher than 0.")
+            shares = 1;
+        EXPECT_EQ(wallet().getNbrShares(), shares) << c.why << ": a holding is made before the quantity is looked at";
+    }
+}
+
+TEST_F(OperationTest, AnAdditionIsListedSelectedAndLeavesTheFields)
+{
+    deposit("Broker", "1000");
+    click(kAdd);
+    EXPECT_THAT(rows("lstOperations"), ElementsAre("21/11/2024\tBroker\tDeposit\t\t\t1,000.00\t\t1,000.00 EUR\t"));
+
+    transfer("Broker", "Dollars");
+    type("txtDate", "20/11/2024");
+    type("txtTransferCost", "2");
+    type("txtTransferRateCost", "0.01");
+    click(kAdd);
+    EXPECT_EQ(rows("lstOperations")[0], "20/11/2024\tBroker\tTransfer\tto Dollars\t\t50.00\t2.50\t50.00 EUR\t");
+    EXPECT_EQ(selectedRow(), 0);
+    EXPECT_EQ(text("txtTransferCost"), "2");
+    const auto* made = static_cast<TransferAccountOperation*>(wallet().getAccount(1)->getOperation(0));
+    EXPECT_EQ(made->getFromCurrencyQuote(), 1.0F) << "offered";
+    EXPECT_EQ(made->getToCurrencyQuote(), 0.5F) << "offered";
+    EXPECT_EQ(made->getRateCost(), 0.01F);
+
+    for (const char* side : {"Buy", "Sell"}) {
+        trade(side, "Broker", "BBB", "3");
+        type("txtDate", "22/11/2024");
+        type("txtQuote", "12,5");
+        type("txtShareCost", "1.25");
+        click(kAdd);
+        EXPECT_EQ(rows("lstOperations").back(),
+                  "22/11/2024\tBroker\t" + std::string(side) + "\tBBB  Beta\t3\t12.50\t1.25\t37.50 EUR\t");
+        EXPECT_EQ(selectedRow(), static_cast<int>(rows("lstOperations").size()) - 1);
+        EXPECT_EQ(text("txtQuote"), "12,5") << "as it was typed";
+    }
+    EXPECT_EQ(wallet().getNbrShares(), 1U);
+    EXPECT_EQ(message(), "No Company...") << "a success is silent";
+}
+
+TEST_F(OperationTest, AnUpdateReplacesAndWithoutSelectionAdds)
+{
+    deposit("Cash", "10");
+    click(kUpdate);
+    EXPECT_THAT(rows("lstOperations"), SizeIs(1));
+    type("txtAmount", "20");
+    type("txtDate", "");
+    click(kUpdate);
+    EXPECT_THAT(rows("lstOperations"), ElementsAre("21/11/2024\tCash\tDeposit\t\t\t10.00\t\t10.00 EUR\t"))
+        << "after a failed check the old one stays";
+    type("txtDate", "20/11/2024");
+    click(kUpdate);
+    EXPECT_THAT(rows("lstOperations"), ElementsAre("20/11/2024\tCash\tDeposit\t\t\t20.00\t\t20.00 EUR\t"));
+    trade("Buy", "Cash", "BBB", "2");
+    click(kUpdate);
+    EXPECT_THAT(rows("lstOperations"), ElementsAre("20/11/2024\tCash\tBuy\tBBB  Beta\t2\t10.00\t29.95\t20.00 EUR\t"))
+        << "with another type, at the quote and the cost that were offered";
+    EXPECT_EQ(selectedRow(), 0);
+}
+
+TEST_F(OperationTest, ASelectionFillsTheFieldsOfItsType)
+{
+    auto* dated = new DepositAccountOperation(Date(1, 2, 2024), cash_, -12.5F, false);
+    auto* moved = new TransferAccountOperation(Date(2, 2, 2024), cash_, wallet().getAccount(2), 9, false);
+    moved->setCost(1);
+    moved->setRateCost(0.0017F);
+    moved->setFromCurrencyQuote(2);
+    moved->setToCurrencyQuote(3);
+    Company* beta;
+    wallet().getCompany("Paris", "BBB", &beta);
+    auto* share = new Share(&wallet(), beta);
+    (new ShareOperation(Date(3, 2, 2024), share, true, 1234, 2.5F, false, 7))->setAccount(cash_);
+    (new ShareOperation(Date(4, 2, 2024), nullptr, false, 2, 3, false, 8))->setAccount(cash_);
+    window().UpdateState();
+    using Fields = std::map<const char*, std::string>;
+    const struct {
+        const char* type;
+        Fields fields;
+    } cases[] = {
+        {"Deposit", {{"txtDate", "01/02/2024"}, {"txtAmount", "-12.50"}}},
+        {"Transfer",
+         {{"txtDate", "02/02/2024"},
+          {"txtAmount", "9.00"},
+          {"txtTransferCost", "1.00"},
+          {"txtTransferRateCost", "0.0017"},
+          {"txtTransferFromQuote", "2.00"},
+          {"txtTransferToQuote", "3.00"}}},
+        {"Buy",
+         {{"txtDate", "03/02/2024"},
+          {"txtMarketName", "Paris"},
+          {"txtCompanyAbbreviation", "BBB"},
+          {"txtQuantity", "1234"},
+          {"txtQuote", "2.50"},
+          {"txtShareCost", "7.00"},
+          {"txtTotal", "3,085.00"}}},
+        {"Sell", {{"txtMarketName", "ERROR"}, {"txtCompanyAbbreviation", "ERROR"}, {"txtTotal", "6.00"}}},
+    };
+    for (int row = 3; row >= 0; --row) {
+        select("lstOperations", row);
+        EXPECT_EQ(menuText("operationType"), cases[row].type);
+        EXPECT_EQ(menuText("baseAccount"), "Cash");
+        for (const auto& [name, value] : cases[row].fields) {
+            EXPECT_TRUE(isVisible(name)) << name;
+            EXPECT_EQ(text(name), value) << name;
+        }
+    }
+    select("lstOperations", 1);
+    EXPECT_EQ(menuText("transferAccount"), "Dollars");
+    click(kUpdate);
+    EXPECT_EQ(static_cast<TransferAccountOperation*>(cash_->getOperation(1))->getRateCost(), 0.0017F)
+        << "what is shown reads back to the same";
+    EXPECT_EQ(cash_->getOperation(0), dated);
+}
+
+TEST_F(OperationTest, ARemovalIsNotAskedFor)
+{
+    for (const float amount : {1.0F, 2.0F, 3.0F})
+        new DepositAccountOperation(Date(1, 2, 2024), cash_, amount, false);
+    window().UpdateState();
+    click(kRemove);
+    EXPECT_EQ(countOperations(), 3U) << "nothing is selected";
+    select("lstOperations", 1);
+    click(kRemove);
+    EXPECT_THAT(rows("lstOperations"), ElementsAre(EndsWith("1.00 EUR\t"), EndsWith("3.00 EUR\t")));
+    EXPECT_EQ(selectedRow(), -1);
+
+    // While the portfolio's date is none, the list is not filled again.
+    show(kPortoFolioPage);
+    enter("txtDate", "never");
+    show(kOperationPage);
+    select("lstOperations", 0);
+    click(kRemove);
+    EXPECT_THAT(rows("lstOperations"), ElementsAre(EndsWith("3.00 EUR\t")));
+}
+
+TEST_F(OperationTest, TheTotalFollowsConfirmedQuantitiesAndQuotes)
+{
+    trade("Buy", "Cash", "BBB", "7");
+    EXPECT_EQ(text("txtTotal"), "") << "typed only";
+    enter("txtQuantity", "7");
+    EXPECT_EQ(text("txtTotal"), "70.00");
+    enter("txtQuote", "1000.5");
+    EXPECT_EQ(text("txtTotal"), "7,003.50");
+    enter("txtShareCost", "5");
+    EXPECT_EQ(text("txtTotal"), "7,003.50") << "before costs";
+}
+
+/// Has the next valuation with previsions find a profitable sale, and so move the profit from Broker to Cash.
+class AutomaticOperationTest : public OperationTest {
+protected:
+    AutomaticOperationTest()
+    {
+        Company* beta;
+        wallet().getCompany("Paris", "BBB", &beta);
+        new CompanyQuote(beta, Date(20, 11, 2024), 40);
+        cash_->setDefaultTransferAccount(true);
+        auto* share = new Share(&wallet(), beta);
+        (new ShareOperation(Date(1, 11, 2024), share, true, 10, 10, false, 0))->setAccount(wallet().getAccount(1));
+        click("cbxPrevision");
+        select("lstOperations", 1);
+    }
+};
+
+TEST_F(AutomaticOperationTest, IsToldApartAndNeverFoundAgainByItsAddress)
+{
+    ASSERT_THAT(rows("lstOperations"), SizeIs(2));
+    EXPECT_THAT(rows("lstOperations")[1], EndsWith("\t\u2713"));
+    EXPECT_TRUE(find<QCheckBox>("cbAutomatic").isChecked());
+    EXPECT_EQ(menuText("transferAccount"), "Cash");
+    window().UpdateState();
+    EXPECT_EQ(selectedRow(), -1);
+}
+
+TEST_F(AutomaticOperationTest, CanBeReplacedThoughTheValuationDestroysIt)
+{
+    click("cbAutomatic");
+    type("txtAmount", "5");
+    click(kUpdate);
+    const auto shown = rows("lstOperations");
+    EXPECT_THAT(shown, Contains("21/11/2024\tBroker\tTransfer\tto Cash\t\t5.00\t0.00\t5.00 EUR\t"));
+    EXPECT_EQ(shown[static_cast<std::size_t>(selectedRow())],
+              "21/11/2024\tBroker\tTransfer\tto Cash\t\t5.00\t0.00\t5.00 EUR\t");
+}
+
+TEST_F(AutomaticOperationTest, CanBeRemovedOrReplacedByAnotherOne)
+{
+    click(kUpdate); // by an automatic one, which the valuation takes away
+    EXPECT_THAT(rows("lstOperations"), SizeIs(1)) << "the sale is in the past now, and makes no transfer again";
+    EXPECT_EQ(countOperations(), 1U);
+    click(kAdd);
+    EXPECT_EQ(countOperations(), 1U) << "gone before it is listed";
+    click("cbxPrevision");
+    EXPECT_EQ(firstShare().getNbrShareOperations(), 2U) << "the sale stays with its holding";
+}
+
+TEST_F(AutomaticOperationTest, CanBeRemoved)
+{
+    click(kRemove);
+    EXPECT_EQ(countOperations(), 1U);
+    EXPECT_EQ(selectedRow(), -1);
+}
+
+TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
+{
+    EXPECT_EQ(text("txtDate"), "21/11/2024") << "the portfolio's date";
+    show(kPortoFolioPage);
+    enter("txtDate", "02/11/2024");
+    show(kOperationPage);
+    EXPECT_EQ(text("txtDate"), "02/11/2024") << "and follows it";
+
+    window().getWallet()->setSellCost(5);
+    choose("operationType", "Buy");
+    EXPECT_EQ(text("txtShareCost"), "29.95");
+    choose("operationType", "Sell");
+    EXPECT_EQ(text("txtShareCost"), "5.00");
+    type("txtShareCost", "7");
+    choose("operationType", "Buy");
+    EXPECT_EQ(text("txtShareCost"), "7") << "typed";
+
+    type("txtMarketName", "Paris");
+    type("txtCompanyAbbreviation", "BBB");
+    EXPECT_EQ(text("txtQuote"), "10.00");
+    type("txtCompanyAbbreviation", "AAA");
+    EXPECT_EQ(text("txtQuote"), "") << "it has no quotes, and BBB's is not its";
+    type("txtQuote", "4");
+    type("txtCompanyAbbreviation", "BBB");
+    EXPECT_EQ(text("txtQuote"), "4") << "typed";
+
+    choose("operationType", "Transfer");
+    choose("baseAccount", "Cash");
+    choose("transferAccount", "Dollars");
+    EXPECT_EQ(text("txtTransferFromQuote"), "1.00");
+    EXPECT_EQ(text("txtTransferToQuote"), "0.50");
+    choose("transferAccount", "Broker");
+    EXPECT_EQ(text("txtTransferToQuote"), "1.00") << "nothing to exchange";
+    type("txtTransferToQuote", "3");
+    choose("transferAccount", "Dollars");
+    EXPECT_EQ(text("txtTransferToQuote"), "3") << "typed";
+
+    type("txtDate", "05/05/2024");
+    show(kPortoFolioPage);
+    enter("txtDate", "03/11/2024");
+    show(kOperationPage);
+    EXPECT_EQ(text("txtDate"), "05/05/2024") << "typed";
+}
+
+} // namespace
