@@ -96,8 +96,8 @@ RowReader::Outcome RowReader::readYear(int* year)
     return outcome;
 }
 
-/// The end is searched from as far behind the start as the year was wide. Intended: only the number in front counts,
-/// and the rows of the chart server are wider than that.
+/// The end is searched from as far behind the start as the year was wide, which lies in the next column. Intended: only
+/// the number in front counts.
 RowReader::Outcome RowReader::readPrice(float* price)
 {
     if (place_ == text_.size())

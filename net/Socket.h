@@ -22,8 +22,8 @@ public:
     Socket(const Socket&) = delete;
     Socket& operator=(const Socket&) = delete;
 
-    /// The longest wait of each connect, receive and send, for those to come and for an open connection; 0, as it is at
-    /// first, is for ever. What exceeds it fails.
+    /// The longest wait of each connect, receive and send from now on; what exceeds it fails. 0, as it is at first,
+    /// stands for ever.
     void setTimeLimit(std::chrono::milliseconds limit);
     /// The longest wait for a whole line, from the call on; at first `kLineLimit`.
     void setLineLimit(std::chrono::milliseconds limit) { lineLimit_ = limit; }
@@ -31,8 +31,8 @@ public:
     /// or of the time limit.
     void setWholeReceives(bool whole) { wholeReceives_ = whole; }
 
-    /// Connects to a dotted address, or to a host's first IPv4 address. When the object has a connection that cannot be
-    /// closed, as is so of any that it ever had, the program ends with "Error closing previous connection.".
+    /// Connects to a dotted address, or to a host's first IPv4 address. On an object that was connected before, the
+    /// program ends with "Error closing previous connection.", since `closeConnection` fails.
     int connectTo(const String& address, unsigned short port);
     int connectToName(const String& host, unsigned short port);
 
@@ -46,9 +46,8 @@ public:
     /// @return -1 as a rule, after a good close too.
     int closeConnection();
 
-    /// Reads up to and including a line feed, or up to a zero byte, which is dropped. @return 0; `kTimedOut` or -1,
-    /// with
-    /// `*line` as it was and what had come so far lost.
+    /// Reads up to and including a line feed, or up to a zero byte, which is dropped.
+    /// @return 0; `kTimedOut` or -1, with `*line` as it was and what had come so far lost.
     int readLine(String* line);
     /// Reads a line of which only the last byte is kept, in `buffer[0]`: it is "\n" afterwards. `size` is at least 2.
     int readLine(char* buffer, int size);

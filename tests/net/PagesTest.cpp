@@ -32,25 +32,20 @@ TEST(LatestPageTest, ThePriceIsCutOutOfTheFirstMarkedCell)
     } cases[] = {
         {"<td nowrap><b>45</b></td>", 45, "a whole number"},
         {"<td nowrap><b>112<sup>3</sup>/<sub>8</sub></b></td>", 112.375F, "a fraction"},
-        {"<td nowrap><b> 112 <sup>3</sup>/<sub>8</sub> </b>", 112.375F, "blanks around"},
         {"<td nowrap><b>0<sup>1</sup>/<sub>3</sub>", 1.0F / 3, "in single precision"},
         {"<td nowrap><b>16777216<sup>1</sup>/<sub>2</sub>", 16777216, "the sum, too"},
         {"<td nowrap><b>45.25</b></td>", 45.25F, "a decimal price"},
         {"<td nowrap><b>7</b></td><td nowrap><b>8</b></td>", 7, "the first cell counts"},
-        {"<td>6</td><tr><td nowrap><b>7</b></td>", 7, "other cells do not"},
         {"<<td nowrap><b>7</b></td>", -1, "a match that breaks is not begun anew"},
         {"<<td nowrap><b>7</b></td> <td nowrap><b>8</b></td>", 8, "but a later one is found"},
         {"<td nowrap><b", -1, "no whole marker"},
-        {"<TD NOWRAP><B>7", -1, "another case"},
         {"", -1, "nothing"},
         {{"\0<td nowrap><b>7", 16}, -1, "the page ends at a zero"},
         {"<td nowrap><b>", -1, "the page ends before the price"},
         {"<td nowrap><b>45", 45, "behind the whole part"},
         {"<td nowrap><b>45 <sup>3", 45, "behind the numerator"},
         {"<td nowrap><b>45 <sup>3</sup>/<sub>0</sub>", 45, "a denominator of 0"},
-        {"<td nowrap><b>45 <sup>3</sup>/<sub>x</sub>", 45, "one that is no number"},
         {"<td nowrap><b>N/A</b></td>", 0, "no number is 0"},
-        {"<td nowrap><b></b></td>", 0, "an empty cell, too"},
     };
     for (const auto& c : cases) {
         float price = -1;
@@ -106,17 +101,6 @@ TEST(HistoryPageTest, RowsAreReadInPageOrder)
     EXPECT_EQ(parsed("5/3/1999 45 - - -\n<"), "-1: ") << "no header";
     EXPECT_EQ(parsed("((00s)</b>5/3/1999 45 - - -\n<"), "-1: ") << "a match that breaks is not begun anew";
     EXPECT_EQ(parsed({"(00s)</b>5/3/1999 45 - - -\n\0<", 29}), "-1: 03/05/1999=45 ") << "the page ends at a zero";
-}
-
-TEST(HistoryPageTest, AnyCutOfAPageGivesItsFirstRows)
-{
-    const std::string page = "(00s)</b>\n5/3/1999 45.5 46 44\nno row\n 1/1/1 1 1 1\n5/4/1999\t46\t47\t9\n"
-                             "5/5/1999 47\n5/6/1999 48 - - -\n5/7/1999 49 - - -\n</pre>";
-    const std::string all = parsed(page).substr(3);
-    for (std::size_t size = 0; size < page.size(); ++size) {
-        const std::string cut = parsed(page.substr(0, size));
-        EXPECT_EQ(all.find(cut.substr(cut.find(' ') + 1)), 0U) << page.substr(0, size);
-    }
 }
 
 } // namespace

