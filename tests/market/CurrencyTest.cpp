@@ -9,6 +9,7 @@
 
 #include <cmath>
 #include <gtest/gtest.h>
+#include <memory>
 
 namespace {
 
@@ -69,6 +70,33 @@ TEST(CurrencyTest, ANewReferenceDividesTheOtherRatesByItsOwnOfTheDay)
 
     catalogue.rebaseOn(addCurrency(catalogue, "D", {}));
     EXPECT_EQ(rates(*b), Rates(2, INFINITY)) << "a rate of 0 is not guarded against";
+}
+
+TEST(CurrencyTest, ARemovedCurrencyLeavesItsPlaceToTheLastAndNoPointerBehind)
+{
+    Catalogue catalogue;
+    Currency* a = addCurrency(catalogue, "A", {{1, 1}});
+    catalogue.rebaseOn(a);
+    Currency* b = addCurrency(catalogue, "B", {{1, 2}});
+    Currency* c = addCurrency(catalogue, "C", {{1, 4}});
+    Currency* d = addCurrency(catalogue, "D", {{1, 8}});
+    const auto removed = [&catalogue](Currency* currency) {
+        catalogue.removeCurrency(currency);
+        return std::unique_ptr<Currency>(currency);
+    };
+    removed(b);
+    EXPECT_EQ(catalogue.getCurrencies(), (std::vector<Currency*>{a, d, c}));
+    EXPECT_EQ(rates(*d), Rates{8}) << "the reference stays";
+    removed(a);
+    EXPECT_EQ(catalogue.getCurrencies(), (std::vector<Currency*>{c, d}));
+    EXPECT_EQ(catalogue.getReferenceCurrency(), c);
+    EXPECT_EQ(rates(*d), Rates{2}) << "in the new reference";
+    Currency* stored;
+    d->getReferenceCurrency(&stored);
+    EXPECT_EQ(stored, c);
+    removed(d);
+    removed(c);
+    EXPECT_EQ(catalogue.getReferenceCurrency(), nullptr);
 }
 
 TEST(CurrencyTest, ADestroyedCurrencyTakesItsMarketsAlongAndLeavesItsAccounts)
