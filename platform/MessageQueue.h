@@ -5,15 +5,28 @@
 #include <QObject>
 
 #include <cstdint>
+#include <deque>
 
 class BHandler;
 class BLooper;
 
-/// Carries posted messages through Qt's event loop, in the order in which they were posted.
+/// Carries posted messages through Qt's event loop, in the order in which they were posted and one at a time: a message
+/// that comes while another one is handled, as an alert waits for its answer, has to wait as well.
 class MessageQueue final : public QObject {
 public:
     static void post(const BMessage& message, BLooper& looper, BHandler& handler);
 
 protected:
     bool event(QEvent* event) override;
+
+private:
+    struct Delivery {
+        BMessage message;
+        std::uint64_t looper; // tokens: either may be gone when the message arrives
+        std::uint64_t handler;
+    };
+    class MessageEvent;
+
+    std::deque<Delivery> waiting_;
+    bool isDelivering_ = false;
 };
