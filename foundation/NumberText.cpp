@@ -109,6 +109,16 @@ double readNumber(const std::string& text)
     return parsed(text).value;
 }
 
+double readCount(const std::string& text)
+{
+    const std::size_t mark = text.find_last_of(".,");
+    const std::size_t end = text.find_last_not_of(" \t") + 1;
+    const bool isThousands =
+        mark != text.npos && end - mark - 1 == kGroup && text.find_first_not_of("0123456789", mark + 1) >= end;
+    // With a decimal mark behind it the last group is read as the others.
+    return readNumber(isThousands ? text.substr(0, end) + ".0" : text);
+}
+
 bool isNumber(const std::string& text)
 {
     return parsed(text).isWhole;

@@ -20,5 +20,7 @@ std::string exactText(float value);
 /// The number at the beginning of `text`, behind blanks, with "." or "," as decimal mark, and the
 /// other one between thousands; 0 for a text without one.
 double readNumber(const std::string& text);
+/// The same for a count, which has no decimals: there a mark in front of the last three digits parts thousands, too.
+double readCount(const std::string& text);
 /// Whether all of `text` but the blanks around it is what `readNumber` reads.
 bool isNumber(const std::string& text);

@@ -7,13 +7,13 @@
 
 namespace {
 
-/// The number that `text` begins with, brought into the range of `Number`.
+/// The nearest number that `Number` has.
 template <class Number>
-Number readAs(const char* text)
+Number limited(double number)
 {
     constexpr double kHighest = std::numeric_limits<Number>::max();
     constexpr double kLowest = std::numeric_limits<Number>::lowest();
-    return static_cast<Number>(std::clamp(readNumber(text), kLowest, kHighest));
+    return static_cast<Number>(std::clamp(number, kLowest, kHighest));
 }
 
 } // namespace
@@ -26,7 +26,7 @@ void NumberControl::setNumber(float value)
 
 float NumberControl::getNumber() const
 {
-    return readAs<float>(Text());
+    return limited<float>(readNumber(Text()));
 }
 
 void NumberControl::setInteger(int value)
@@ -37,12 +37,12 @@ void NumberControl::setInteger(int value)
 
 int NumberControl::getInteger() const
 {
-    return readAs<int>(Text());
+    return limited<int>(readCount(Text()));
 }
 
 short NumberControl::getShort() const
 {
-    return readAs<short>(Text());
+    return limited<short>(readCount(Text()));
 }
 
 void NumberControl::TextModified()

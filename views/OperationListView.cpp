@@ -112,8 +112,8 @@ Cell OperationItem::cell(int column) const
 
 void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
 {
-    const rgb_color text = owner->HighColor();
-    if (isAutomatic_ && text == look::kText) { // not on the ground of a selected row
+    if (isAutomatic_ && !IsSelected()) {
+        const rgb_color text = owner->HighColor();
         owner->SetHighColor(look::kGenerated);
         owner->FillRect(frame);
         owner->SetHighColor(text);
@@ -127,9 +127,9 @@ OperationListView::OperationListView(const char* name)
                       {"Account", 106},
                       {"Type", 58},
                       {"What", 128},
-                      {"Quantity", 66, B_ALIGN_RIGHT},
-                      {"Quote/Amount", 94, B_ALIGN_RIGHT},
+                      {"Quantity", 64, B_ALIGN_RIGHT},
+                      {"Quote/Amount", 98, B_ALIGN_RIGHT},
                       {"Cost", 62, B_ALIGN_RIGHT},
-                      {"Total", 120, B_ALIGN_RIGHT},
+                      {"Total", 118, B_ALIGN_RIGHT},
                       {"Auto", 36, B_ALIGN_CENTER}})
 {}
