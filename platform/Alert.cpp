@@ -4,8 +4,12 @@
 #include "platform/Labels.h"
 
 #include <QApplication>
-#include <QMessageBox>
+#include <QDialog>
+#include <QHBoxLayout>
+#include <QLabel>
 #include <QPushButton>
+#include <QStyle>
+#include <QVBoxLayout>
 
 BAlert::BAlert(const char* title, const char* text, const char* button0, const char* button1, const char* button2)
     : title_(title), text_(text)
@@ -26,22 +30,39 @@ int32 BAlert::Go()
 
 int32 BAlert::ask() const
 {
-    QMessageBox box(QMessageBox::Warning, QString::fromStdString(title_), QString::fromStdString(text_),
-                    QMessageBox::NoButton, QApplication::activeWindow());
-    box.setObjectName("Alert");
-    box.setTextFormat(Qt::PlainText);
-    // The desktop's own order of roles would move buttons about; these stay as they were given.
-    for (const auto& label : buttons_) {
-        QPushButton* button = box.addButton(labelText(label.c_str()), QMessageBox::ResetRole);
-        box.setDefaultButton(button);
-        if (&label == &buttons_.front())
-            box.setEscapeButton(button);
+    constexpr int kMargin = 16;
+    QDialog dialog(QApplication::activeWindow());
+    dialog.setObjectName("Alert");
+    dialog.setWindowTitle(QString::fromStdString(title_));
+    auto* rows = new QVBoxLayout(&dialog); // the dialog owns what is laid out in it
+    rows->setContentsMargins(kMargin, kMargin, kMargin, kMargin);
+    rows->setSpacing(kMargin);
+
+    auto* message = new QHBoxLayout;
+    message->setSpacing(kMargin);
+    auto* icon = new QLabel;
+    icon->setPixmap(dialog.style()->standardIcon(QStyle::SP_MessageBoxWarning).pixmap(2 * kMargin));
+    auto* text = new QLabel(QString::fromStdString(text_));
+    text->setObjectName("AlertText");
+    text->setTextFormat(Qt::PlainText);
+    message->addWidget(icon);
+    message->addWidget(text, 1);
+    rows->addLayout(message);
+
+    // From left to right as they were given, at the right.
+    auto* answers = new QHBoxLayout;
+    answers->addStretch(1);
+    for (std::size_t i = 0; i < buttons_.size(); ++i) {
+        auto* button = new QPushButton(labelText(buttons_[i].c_str()));
+        button->setObjectName(QString::fromStdString(buttons_[i]));
+        button->setAccessibleName(QString::fromStdString(buttons_[i]));
+        button->setDefault(i + 1 == buttons_.size());
+        button->setAutoDefault(true);
+        QObject::connect(button, &QPushButton::clicked, [&dialog, i] { dialog.done(static_cast<int>(i)); });
+        answers->addWidget(button);
+        if (i + 1 == buttons_.size())
+            button->setFocus();
     }
-    box.exec();
-    const auto buttons = box.buttons();
-    for (int i = 0; i < buttons.size(); ++i) {
-        if (buttons[i] == box.clickedButton())
-            return i;
-    }
-    return 0;
+    rows->addLayout(answers);
+    return dialog.exec(); // Escape gives 0, as the first button does
 }

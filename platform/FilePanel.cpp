@@ -9,6 +9,7 @@
 #include "platform/WindowWidget.h"
 
 #include <QFileDialog>
+#include <QLineEdit>
 
 BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const entry_ref* start, uint32,
                        bool allowMultiple, BMessage* message, bool modal, bool hideWhenDone)
@@ -37,6 +38,9 @@ QFileDialog& BFilePanel::dialog()
     const auto openMode = allowMultiple_ ? QFileDialog::ExistingFiles : QFileDialog::ExistingFile;
     dialog_->setFileMode(mode_ == B_OPEN_PANEL ? openMode : QFileDialog::AnyFile);
     dialog_->setModal(modal_);
+    // Who types a name fast and presses Enter would leave its list of proposals open behind the panel.
+    if (auto* field = dialog_->findChild<QLineEdit*>("fileNameEdit"))
+        field->setCompleter(nullptr);
     QObject::connect(dialog_.get(), &QFileDialog::accepted, [this] { accept(); });
     QObject::connect(dialog_.get(), &QFileDialog::rejected, [this] { sendAll(BMessage(B_CANCEL)); });
     return *dialog_;

@@ -5,10 +5,12 @@
 
 #include <QApplication>
 #include <QPixmap>
+#include <QScreen>
 
 status_t save_screenshot(const BWindow& window, const char* path)
 {
-    return window.widget().grab().save(QString::fromUtf8(path), "PNG") ? B_OK : B_ERROR;
+    WindowWidget& shown = window.widget();
+    return shown.screen()->grabWindow(shown.winId()).save(QString::fromUtf8(path), "PNG") ? B_OK : B_ERROR;
 }
 
 void handle_pending_messages()

@@ -3,6 +3,7 @@
 #include "platform/Keys.h"
 #include "platform/Labels.h"
 
+#include <QFont>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
@@ -74,7 +75,7 @@ void BTextControl::AttachedToWindow()
 
 void BTextControl::layOut()
 {
-    constexpr int kGap = 6; // between label and field
+    constexpr int kGap = 4; // between label and field
     const int width = static_cast<int>(Bounds().Width());
     const int height = static_cast<int>(Bounds().Height());
     const int divider = static_cast<int>(divider_);
@@ -112,6 +113,15 @@ void BTextControl::SetDivider(float x)
 {
     divider_ = x;
     layOut();
+}
+
+void BTextControl::SetFont(const BFont* font, uint32 mask)
+{
+    BControl::SetFont(font, mask);
+    BFont used;
+    GetFont(&used);
+    caption_->setFont(used.toQt());
+    field_->setFont(used.toQt());
 }
 
 void BTextControl::SetAlignment(alignment label, alignment text)

@@ -18,6 +18,13 @@ int whole(float length)
 
 } // namespace
 
+/// The stroke at the end of the lines that were added so far.
+class LineArray {
+public:
+    std::vector<BPoint> points;
+    rgb_color color;
+};
+
 BView::BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags)
     : BView(frame, name, resizingMode, flags, new ViewWidget(*this))
 {}
@@ -281,7 +288,8 @@ void BView::SetFont(const BFont* font, uint32 mask)
 
 void BView::SetFontSize(float size)
 {
-    canvas_->font.SetSize(size);
+    const BFont font(size, false);
+    SetFont(&font, B_FONT_SIZE);
 }
 
 void BView::GetFont(BFont* font) const
@@ -346,6 +354,17 @@ QPolygonF polygon(const BPoint* points, int32 count)
     return result;
 }
 
+void strokePolygon(QPainter& painter, const BPoint* points, int32 count, bool closed, float pen, const QColor& color)
+{
+    painter.setRenderHint(QPainter::Antialiasing);
+    painter.setPen(QPen(color, pen, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
+    painter.setBrush(Qt::NoBrush);
+    if (closed)
+        painter.drawPolygon(polygon(points, count));
+    else
+        painter.drawPolyline(polygon(points, count));
+}
+
 } // namespace
 
 void BView::StrokeLine(BPoint from, BPoint to, pattern p)
@@ -353,12 +372,42 @@ void BView::StrokeLine(BPoint from, BPoint to, pattern p)
     canvas_->paint([&](QPainter& painter) { strokeLine(painter, from, to, canvas_->penSize, canvas_->color(p)); });
 }
 
-void BView::BeginLineArray(int32) {}
-void BView::EndLineArray() {}
+void BView::BeginLineArray(int32 count)
+{
+    lines_ = std::make_unique<LineArray>();
+    lines_->points.reserve(static_cast<std::size_t>(count) + 1);
+}
 
 void BView::AddLine(BPoint from, BPoint to, rgb_color color)
 {
-    canvas_->paint([&](QPainter& painter) { strokeLine(painter, from, to, canvas_->penSize, canvas_->color(color)); });
+    if (lines_ == nullptr)
+        return;
+    auto& points = lines_->points;
+    if (points.empty() || !(points.back() == from) || !(lines_->color == color))
+        flushLines();
+    if (points.empty())
+        points.push_back(from);
+    points.push_back(to);
+    lines_->color = color;
+}
+
+void BView::EndLineArray()
+{
+    flushLines();
+    lines_.reset();
+}
+
+void BView::flushLines()
+{
+    auto& points = lines_->points;
+    canvas_->paint([&](QPainter& painter) {
+        const QColor color = canvas_->color(lines_->color);
+        if (points.size() == 2)
+            strokeLine(painter, points[0], points[1], canvas_->penSize, color);
+        else if (!points.empty())
+            strokePolygon(painter, points.data(), static_cast<int32>(points.size()), false, canvas_->penSize, color);
+    });
+    points.clear();
 }
 
 void BView::FillPolygon(const BPoint* points, int32 count, pattern p)
@@ -373,15 +422,8 @@ void BView::FillPolygon(const BPoint* points, int32 count, pattern p)
 
 void BView::StrokePolygon(const BPoint* points, int32 count, bool closed, pattern p)
 {
-    canvas_->paint([&](QPainter& painter) {
-        painter.setRenderHint(QPainter::Antialiasing);
-        painter.setPen(QPen(canvas_->color(p), canvas_->penSize, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin));
-        painter.setBrush(Qt::NoBrush);
-        if (closed)
-            painter.drawPolygon(polygon(points, count));
-        else
-            painter.drawPolyline(polygon(points, count));
-    });
+    canvas_->paint(
+        [&](QPainter& painter) { strokePolygon(painter, points, count, closed, canvas_->penSize, canvas_->color(p)); });
 }
 
 void BView::FillTriangle(BPoint a, BPoint b, BPoint c, pattern p)

@@ -13,6 +13,7 @@
 class BMessage;
 class BWindow;
 class Canvas;
+class LineArray;
 class QPainter;
 class QWidget;
 
@@ -84,7 +85,7 @@ public:
     void SetPenSize(float size);
     float PenSize() const;
     void SetDrawingMode(drawing_mode mode);
-    void SetFont(const BFont* font, uint32 mask = B_FONT_ALL);
+    virtual void SetFont(const BFont* font, uint32 mask = B_FONT_ALL);
     void SetFontSize(float size);
     void GetFont(BFont* font) const;
     float StringWidth(const char* text) const;
@@ -95,7 +96,8 @@ public:
     void FillRect(BRect rect, pattern p = B_SOLID_HIGH);
     void StrokeRect(BRect rect, pattern p = B_SOLID_HIGH);
     void StrokeLine(BPoint from, BPoint to, pattern p = B_SOLID_HIGH);
-    /// Lines that are drawn together, each in its own colour: begin, add them, end.
+    /// Lines that are drawn together, each in its own colour: begin, add them, end. Those of one colour that go on
+    /// where the one before has ended are drawn in one stroke.
     void BeginLineArray(int32 count);
     void AddLine(BPoint from, BPoint to, rgb_color color);
     void EndLineArray();
@@ -128,6 +130,7 @@ private:
     void placeWidget();
     void followParent(float dx, float dy);
     void drawAll();
+    void flushLines();
 
     BRect frame_;
     uint32 resizingMode_;
@@ -138,4 +141,5 @@ private:
     std::vector<BView*> children_; // owned
     QWidget* widget_;              // owned
     std::unique_ptr<Canvas> canvas_;
+    std::unique_ptr<LineArray> lines_; // between begin and end
 };

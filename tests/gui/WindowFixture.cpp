@@ -12,9 +12,10 @@
 #include <QAbstractItemView>
 #include <QApplication>
 #include <QComboBox>
+#include <QDialog>
 #include <QFileDialog>
+#include <QLabel>
 #include <QLineEdit>
-#include <QMessageBox>
 #include <QTabBar>
 #include <QTemporaryDir>
 #include <QTest>
@@ -198,14 +199,14 @@ void WindowTest::watchForAlert()
     constexpr int kMilliseconds = 2;
     auto timer = std::make_unique<QTimer>();
     QObject::connect(timer.get(), &QTimer::timeout, [this] {
-        auto* alert = qobject_cast<QMessageBox*>(QApplication::activeModalWidget());
+        auto* alert = qobject_cast<QDialog*>(QApplication::activeModalWidget());
         if (alert == nullptr || alert->objectName() != "Alert")
             return;
-        alerts_.push_back(alert->text().toStdString());
+        alerts_.push_back(alert->findChild<QLabel*>("AlertText")->text().toStdString());
         EXPECT_EQ(alert->windowTitle().toStdString(), "Warning");
         EXPECT_FALSE(alertAnswer_.empty()) << "nobody expected: " << alerts_.back();
         const std::string answer = std::exchange(alertAnswer_, "");
-        for (QAbstractButton* button : alert->buttons()) {
+        for (auto* button : alert->findChildren<QAbstractButton*>()) {
             if (button->text().toStdString() == answer || (answer.empty() && button->text() == "Cancel"))
                 QTest::mouseClick(button, Qt::LeftButton);
         }
