@@ -41,7 +41,8 @@ constexpr float kRight = 185;
 constexpr float kTop = 23;
 constexpr float kPitch = 30;
 constexpr float kHeight = 20;
-constexpr float kDivider = 118;
+constexpr float kDivider = 123;
+constexpr float kTextSize = 11; // the longest label must stand beside its field within that width
 
 constexpr const char* kAmount = "%.2f";
 constexpr const char* kPercent = "%.2f %%";
@@ -79,6 +80,7 @@ ParameterView::ParameterView(BRect frame, const char* name, BWindow* window) : P
         const float top = kTop + kPitch * static_cast<float>(i);
         fields_[i] = addNumber(this, {kLeft, top, kRight, top + kHeight}, kPlan[i].name, kPlan[i].label, kPlan[i].code,
                                kDivider);
+        fields_[i]->SetFontSize(kTextSize);
         fields_[i]->SetToolTip(kPlan[i].help);
     }
 }

@@ -56,7 +56,8 @@ Cell ShareStateItem::cell(int column) const
     }
 }
 
-/// The day of the quote, where that is not the day shown: a price of another day, or one estimated from others.
+/// The day of the quote where that is not the day shown, which then is the last one there was or, after the last one of
+/// all, an estimate; before the first one an estimate as well.
 Cell ShareStateItem::quoteDay() const
 {
     const Company* company = companyOf(share_);
@@ -64,7 +65,7 @@ Cell ShareStateItem::quoteDay() const
     if (company == nullptr || company->getNbrQuotes() == 0)
         return {};
     if (day < company->getFirstQuote())
-        return {"before " + dateText(company->getFirstQuote()), look::kWarning};
+        return {"< " + dateText(company->getFirstQuote()), look::kWarning};
     CompanyQuote* quote = nullptr;
     if (company->getQuote(day, &quote) == 0)
         return {};
@@ -82,13 +83,13 @@ Cell ShareStateItem::gain() const
 
 ShareStateListView::ShareStateListView(const char* name)
     : ObjectListView({}, name, B_SINGLE_SELECTION_LIST,
-                     {{"Ticker", 62},
-                      {"Company", 150},
-                      {"Quantity", 66, B_ALIGN_RIGHT},
+                     {{"Ticker", 58},
+                      {"Company", 124},
+                      {"Quantity", 62, B_ALIGN_RIGHT},
                       {"Buy Quote", 74, B_ALIGN_RIGHT},
-                      {"Quote", 74, B_ALIGN_RIGHT},
-                      {"Quote of", 76, B_ALIGN_RIGHT},
-                      {"Value", 112, B_ALIGN_RIGHT},
-                      {"Gain", 62, B_ALIGN_RIGHT},
-                      {"End Date", 76, B_ALIGN_RIGHT}})
+                      {"Quote", 70, B_ALIGN_RIGHT},
+                      {"Quote of", 88, B_ALIGN_RIGHT},
+                      {"Value", 114, B_ALIGN_RIGHT},
+                      {"Gain", 74, B_ALIGN_RIGHT},
+                      {"End Date", 84, B_ALIGN_RIGHT}})
 {}
