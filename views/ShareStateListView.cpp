@@ -83,13 +83,13 @@ Cell ShareStateItem::gain() const
 
 ShareStateListView::ShareStateListView(const char* name)
     : ObjectListView({}, name, B_SINGLE_SELECTION_LIST,
-                     {{"Ticker", 58},
-                      {"Company", 124},
-                      {"Quantity", 62, B_ALIGN_RIGHT},
-                      {"Buy Quote", 74, B_ALIGN_RIGHT},
-                      {"Quote", 70, B_ALIGN_RIGHT},
-                      {"Quote of", 88, B_ALIGN_RIGHT},
-                      {"Value", 114, B_ALIGN_RIGHT},
-                      {"Gain", 74, B_ALIGN_RIGHT},
-                      {"End Date", 84, B_ALIGN_RIGHT}})
+                     {{"Ticker", 56},
+                      {"Company", 150},
+                      {"Quantity", 60, B_ALIGN_RIGHT},
+                      {"Buy Quote", 72, B_ALIGN_RIGHT},
+                      {"Quote", 64, B_ALIGN_RIGHT},
+                      {"Quote of", 86, B_ALIGN_RIGHT},
+                      {"Value", 110, B_ALIGN_RIGHT},
+                      {"Gain", 66, B_ALIGN_RIGHT},
+                      {"End Date", 82, B_ALIGN_RIGHT}})
 {}

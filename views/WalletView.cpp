@@ -81,19 +81,20 @@ void WalletView::makeTop()
 void WalletView::makeTotals()
 {
     totalsBox_ = addBox(this, {kMargin, kTotalsTop, kRight, kTotalsEnd}, "Totals");
-    const float width = (kRight - kMargin - 2 * kBoxSide - 3 * kMargin) / 4;
+    constexpr float kAmount = 124; // room for millions
+    constexpr float kPercent = 70;
     float left = kBoxSide;
-    const auto add = [&](const char* name, const char* label, uint32 code, float divider) {
-        BTextControl* field = addNumber(totalsBox_, {left, kBoxTop + 2, left + width, kBoxTop + 2 + kFieldHeight}, name,
-                                        label, code, divider);
+    const auto add = [&](const char* name, const char* label, uint32 code, float labelWidth, float valueWidth) {
+        const BRect frame(left, kBoxTop + 2, left + labelWidth + valueWidth, kBoxTop + 2 + kFieldHeight);
+        BTextControl* field = addNumber(totalsBox_, frame, name, label, code, labelWidth);
         field->SetEditable(false);
-        left += width + kMargin;
+        left = frame.right + kMargin;
         return field;
     };
-    totalDeposit_ = add("txtTotalDeposit", "Total Deposit", 'WTTd', 86);
-    totalValue_ = add("txtTotalValue", "Total Value", 'WTTv', 74);
-    profit_ = add("txtProfit", "Profit", 'WTPr', 42);
-    annualRevenu_ = add("txtAnnualRevenu", "Annual Revenu", 'WTAr', 96);
+    totalDeposit_ = add("txtTotalDeposit", "Total Deposit", 'WTTd', 84, kAmount);
+    totalValue_ = add("txtTotalValue", "Total Value", 'WTTv', 74, kAmount);
+    profit_ = add("txtProfit", "Profit", 'WTPr', 42, kAmount);
+    annualRevenu_ = add("txtAnnualRevenu", "Annual Revenu", 'WTAr', 96, kPercent);
 }
 
 void WalletView::makeAccounts()
