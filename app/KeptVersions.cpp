@@ -108,7 +108,7 @@ std::vector<Moment> momentsIn(const std::string& folder, const std::string& stem
         if (name.starts_with(stem + ' ') && moment.read(std::string_view(name).substr(stem.size() + 1)))
             moments.push_back(moment);
     }
-    std::ranges::sort(moments);
+    std::sort(moments.begin(), moments.end());
     return moments;
 }
 
@@ -141,7 +141,7 @@ void removeLinkTo(const struct stat& file, const Shelf& shelf, const std::vector
 /// older than all others.
 void removeOldest(const Shelf& shelf, std::vector<Moment> moments, const Moment& present)
 {
-    std::ranges::rotate(moments, std::ranges::upper_bound(moments, present));
+    std::rotate(moments.begin(), std::upper_bound(moments.begin(), moments.end(), present), moments.end());
     for (std::size_t i = 0; i + KeptVersions::kVersions < moments.size(); ++i)
         unlink(shelf.pathOf(moments[i]).c_str());
 }
@@ -260,7 +260,8 @@ void KeptVersions::prune(const std::string& path, const std::string& newest) con
 {
     const Shelf shelf(folderFor(path), path);
     const std::vector<Moment> moments = shelf.moments();
-    const auto present = std::ranges::find(moments, newest, [&shelf](const Moment& m) { return shelf.pathOf(m); });
+    const auto present =
+        std::find_if(moments.begin(), moments.end(), [&](const Moment& m) { return shelf.pathOf(m) == newest; });
     if (present != moments.end())
         removeOldest(shelf, moments, *present);
 }
