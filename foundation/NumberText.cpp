@@ -1,6 +1,7 @@
 #include "foundation/NumberText.h"
 
 #include <algorithm>
+#include <cctype>
 #include <charconv>
 #include <cmath>
 #include <cstdio>
@@ -19,15 +20,16 @@ std::string withSeparators(std::string digits, std::size_t end)
     return digits;
 }
 
-std::string formatted(const char* format, double value)
+/// `value` with so many decimals and `unit` behind it, or "?".
+std::string fixedText(double value, int decimals, const char* unit = "")
 {
     if (!std::isfinite(value))
         return "?";
     char text[400]; // the largest double has 309 digits before the point
-    std::snprintf(text, sizeof text, format, value);
+    std::snprintf(text, sizeof text, "%.*f", decimals, value);
     if (std::strtod(text, nullptr) == 0)
-        std::snprintf(text, sizeof text, format, 0.0);
-    return text;
+        std::snprintf(text, sizeof text, "%.*f", decimals, 0.0);
+    return std::string(text) + unit;
 }
 
 /// What a text says as a number, and whether it says nothing else.
@@ -63,7 +65,7 @@ Parsed parsed(const std::string& text)
 
 std::string amountText(double amount)
 {
-    const std::string text = formatted("%.2f", amount);
+    const std::string text = fixedText(amount, 2);
     return std::isfinite(amount) ? withSeparators(text, text.find('.')) : text;
 }
 
@@ -75,17 +77,18 @@ std::string countText(int count)
 
 std::string percentText(double fraction)
 {
-    return formatted("%.2f %%", fraction * 100);
+    return fixedText(fraction * 100, 2, " %");
 }
 
 std::string finePercentText(double fraction)
 {
-    return formatted("%.4f %%", fraction * 100);
+    return fixedText(fraction * 100, 4, " %");
 }
 
 std::string changeText(double fraction)
 {
-    return formatted("%+.1f%%", fraction * 100);
+    const std::string text = fixedText(fraction * 100, 1, "%");
+    return std::isdigit(static_cast<unsigned char>(text.front())) != 0 ? '+' + text : text;
 }
 
 std::string exactText(float value)
