@@ -1,0 +1,247 @@
+// Quotes on the company page: by hand, from servers, in a chart, and thousands of them.
+
+#include "chart/GraphLine.h"
+#include "chart/GraphPoint.h"
+#include "chart/GraphPolygon.h"
+#include "chart/GraphView.h"
+#include "net/QuoteServers.h"
+#include "platform/ListItem.h"
+#include "tests/gui/CatalogueFixture.h"
+#include "tests/support/Peer.h"
+
+#include <gmock/gmock.h>
+#include <map>
+
+namespace {
+
+using testing::ElementsAre;
+using testing::FloatNear;
+using testing::IsEmpty;
+using testing::SizeIs;
+
+using QuoteTest = CatalogueTest;
+
+TEST_F(QuoteTest, FieldsReadDatesAndNumbersAsTypedAndMarkWhatTheyCannot)
+{
+    addSmallCatalogue();
+    const struct {
+        const char* date;
+        const char* value;
+        const char* row; // null: not added
+        bool isDateMarked, isValueMarked;
+    } cases[] = {
+        {"2.3.2024", "1,5", "02/03/2024\t1.50", false, false},
+        {"2-3-2024", "0.123456789", "02/03/2024\t0.12345679", false, false},
+        {"02/03/2024", "", "02/03/2024\t0.00", false, false},
+        {"2/3/2024", "abc", "02/03/2024\t0.00", false, true},
+        {"2/3/2024", "12 EUR", "02/03/2024\t12.00", false, true},
+        {"2/3/99", "-7", "02/03/99\t-7.00", false, false},
+        {"30/2/2024", "1", nullptr, true, false},
+        {"2/3", "1", nullptr, true, false},
+    };
+    for (const auto& c : cases) {
+        type("txtQuoteDate", c.date);
+        type("txtQuoteValue", c.value);
+        EXPECT_EQ(isMarked("txtQuoteDate"), c.isDateMarked) << c.date;
+        EXPECT_EQ(isMarked("txtQuoteValue"), c.isValueMarked) << c.value;
+        click("btnAddQuote");
+        if (c.row != nullptr) {
+            EXPECT_THAT(rows("lstQuotes"), testing::Contains(c.row));
+        }
+    }
+    EXPECT_THAT(rows("lstQuotes"), SizeIs(5)) << "the days of 2024, and one of the first century";
+    select("lstQuotes", 0);
+    EXPECT_FALSE(isMarked("txtQuoteDate"));
+}
+
+TEST_F(QuoteTest, AQuoteIsReplacedMovedAndKeptBesideAnotherOfItsDay)
+{
+    addSmallCatalogue();
+    BListItem* last = list("lstQuotes").ItemAt(2);
+    select("lstQuotes", 2);
+    addQuote("6/3/2024", "13");
+    addQuote("7/3/2024", "14");
+    EXPECT_THAT(rows("lstQuotes"),
+                ElementsAre("01/03/2024\t10.00", "06/03/2024\t13.00", "07/03/2024\t14.00", "11/03/2024\t20.00"));
+    EXPECT_EQ(list("lstQuotes").ItemAt(3), last) << "one row comes in, the others stay";
+    EXPECT_EQ(list("lstQuotes").CurrentSelection(), 3);
+
+    follow({{{{"txtQuoteDate", "6/3/2024"}, {"txtQuoteValue", "15"}}, "btnUpdateQuote", ""}});
+    EXPECT_EQ(company()->getNbrQuotes(), 4U) << "both quotes of the day stay";
+    EXPECT_THAT(rows("lstQuotes"),
+                ElementsAre("01/03/2024\t10.00", "06/03/2024\t15.00", "06/03/2024\t13.00", "07/03/2024\t14.00"))
+        << "in the order of their addition";
+    EXPECT_EQ(list("lstQuotes").CurrentSelection(), 1) << "it is still selected, where it is now";
+    follow({{{{"txtQuoteDate", "8/3/2024"}, {"txtQuoteValue", "16"}}, "btnUpdateQuote", ""}});
+    EXPECT_EQ(rows("lstQuotes")[3], "08/03/2024\t16.00");
+
+    select("lstQuotes", 1);
+    select("lstQuotes", 3, true);
+    EXPECT_EQ(text("txtQuoteDate"), "06/03/2024");
+    follow({{{{"txtSplitRangeNum", "1"}, {"txtSplitRangeDenum", "2"}}, "btnSplitQuotes", ""}});
+    EXPECT_THAT(rows("lstQuotes"),
+                ElementsAre("01/03/2024\t10.00", "06/03/2024\t6.50", "07/03/2024\t14.00", "08/03/2024\t8.00"));
+    EXPECT_EQ(list("lstQuotes").CountSelected(), 2);
+    click("btnRemoveQuote");
+    EXPECT_THAT(rows("lstQuotes"), ElementsAre("01/03/2024\t10.00", "07/03/2024\t14.00"));
+    selectAll("lstQuotes");
+    click("btnRemoveQuote");
+    EXPECT_THAT(rows("lstQuotes"), IsEmpty());
+    EXPECT_EQ(company()->getNbrQuotes(), 0U);
+    select("lstCompanies", 0);
+    EXPECT_EQ(text("txtRelativeDailyChange"), "?") << "there is no trend to divide by";
+}
+
+TEST_F(QuoteTest, ChartShowsQuotesAndTrendAndABandOnRequest)
+{
+    addSmallCatalogue();
+    auto& chart = dynamic_cast<GraphView&>(*window().FindView("CompanyView")->FindView("grvQuotes"));
+    // The values of each element's points, by the element's legend.
+    const auto shown = [&chart] {
+        std::map<std::string, std::vector<float>> values;
+        unsigned nElements;
+        GraphElement** elements = chart.getAllGraphElements(&nElements);
+        for (unsigned i = 0; i < nElements; ++i) {
+            unsigned n;
+            auto* line = dynamic_cast<GraphLine*>(elements[i]);
+            GraphPoint** points = line != nullptr ? line->getAllGraphPoints(&n)
+                                                  : dynamic_cast<GraphPolygon&>(*elements[i]).getAllGraphPoints(&n);
+            auto& list = values[elements[i]->getLegend().getCharacterArray()];
+            std::transform(points, points + n, std::back_inserter(list), [](GraphPoint* p) { return p->getY(); });
+        }
+        return values;
+    };
+    const char* band = "Trend \u00B1 one standard deviation";
+    EXPECT_STREQ(chart.getXLegend().getCharacterArray(), "Value in EUR");
+    EXPECT_THAT(shown()["AL"], ElementsAre(10, 12.5F, 20));
+    EXPECT_THAT(shown()["Trend"], ElementsAre(FloatNear(9.16667F, 1e-4F), FloatNear(19.16667F, 1e-4F)));
+    EXPECT_THAT(shown()[band], IsEmpty());
+    click("cbWithSafe");
+    // The quotes are 5/6, -10/6 and 5/6 from the trend: a deviation of 1.17851.
+    EXPECT_THAT(shown()[band], ElementsAre(FloatNear(10.34518F, 1e-4F), FloatNear(20.34518F, 1e-4F),
+                                           FloatNear(17.98816F, 1e-4F), FloatNear(7.98816F, 1e-4F)));
+    addQuote("21/3/2024", "30");
+    EXPECT_THAT(shown()["AL"], ElementsAre(10, 12.5F, 20, 30));
+    click("cbWithSafe");
+    EXPECT_THAT(shown()[band], IsEmpty());
+    select("lstCompanies", 0, true); // now none is
+    EXPECT_STREQ(chart.getXLegend().getCharacterArray(), "Value in ???");
+    EXPECT_THAT(rows("lstQuotes"), IsEmpty());
+}
+
+class FetchCommandTest : public CatalogueTest {
+protected:
+    FetchCommandTest() { quoteServers() = {"localhost", "localhost", 1, std::chrono::seconds(1)}; } // nobody there
+    ~FetchCommandTest() override { quoteServers() = before_; }
+
+    /// Clicks while a server answers with `page`. @return the request.
+    std::string clickWithServer(const char* button, const std::string& page)
+    {
+        std::string request;
+        const Peer server([&](int client) {
+            request = Peer::receiveLine(client);
+            Peer::send(client, page);
+        });
+        quoteServers().port = server.port();
+        click(button);
+        return request;
+    }
+
+private:
+    QuoteServers before_ = quoteServers();
+};
+
+TEST_F(FetchCommandTest, UpdateRenamesAndFetchesByTheFormerTicker)
+{
+    addSmallCatalogue();
+    type("txtAbbreviation", "AX");
+    type("txtName", "Alphax");
+    click("btnUpdateCompany");
+    EXPECT_EQ(message(), "Error Getting the latest quote on the Internet");
+    EXPECT_THAT(rows("lstCompanies"), ElementsAre("AX\tAlphax")) << "it is renamed all the same";
+    EXPECT_THAT(rows("lstQuotes"), SizeIs(3));
+
+    type("txtAbbreviation", "AL");
+    for (const char* price : {"30", "31"}) {
+        const std::string page = std::string("<td nowrap><b>") + price + "</b></td>";
+        EXPECT_EQ(clickWithServer("btnUpdateCompany", page),
+                  price == std::string("30") ? "GET /quotes?symbol=AX\r\n" : "GET /quotes?symbol=AL\r\n");
+        EXPECT_EQ(message(), "Successful update to the latest quote on the Internet");
+        EXPECT_THAT(rows("lstQuotes"), SizeIs(4));
+        EXPECT_EQ(rows("lstQuotes").back(), std::string("21/11/2024\t") + price + ".00");
+    }
+}
+
+TEST_F(FetchCommandTest, ThreeMonthsComeInByMarketName)
+{
+    addSmallCatalogue();
+    click("btnSetLastThreeMonths");
+    EXPECT_EQ(message(), "Error getting the last three months of quotes") << "Paris is not one of its markets";
+    follow({{{{"txtMarketName", "NYSE"}}, "btnUpdateMarket", ""}});
+    clickWithServer("btnSetLastThreeMonths", "(00s)</b>\r\n11/20/2024 21.5000 1\r\n11/19/2024 20.0000 1\r\n</table>");
+    EXPECT_EQ(message(), "Last three months added...");
+    EXPECT_THAT(rows("lstQuotes"), SizeIs(5));
+    EXPECT_EQ(rows("lstQuotes").back(), "20/11/2024\t21.50");
+}
+
+TEST_F(FetchCommandTest, PortfolioQuotesComeInWithoutAValuation)
+{
+    addSmallCatalogue();
+    buy(company());
+    show(kPortoFolioPage);
+    clickWithServer("btnUpdateAllQuotes", "<td nowrap><b>45</b></td>");
+    EXPECT_EQ(message(), "All portofolio quotes are up-to-date.");
+    EXPECT_EQ(company()->getRealQuote(Date(21, 11, 2024)), 45);
+    EXPECT_THAT(rows("lstShares"), ElementsAre(testing::HasSubstr("2,750.00 EUR"))) << "as it was valued before";
+    quoteServers().port = 1;
+    click("btnUpdateAllQuotes");
+    EXPECT_EQ(message(), "All portofolio quotes are up-to-date.") << "also after a failure";
+    show(kCompanyPage);
+    EXPECT_EQ(rows("lstQuotes").back(), "21/11/2024\t45.00") << "the page of the selected company was told";
+}
+
+class LongListTest : public CatalogueTest {
+protected:
+    static constexpr int kQuotes = 15000;
+    static constexpr int kCompanies = 2000;
+
+    LongListTest()
+    {
+        addSmallCatalogue();
+        for (int i = 1; i < kQuotes - 2; ++i)
+            new CompanyQuote(company(), Date(Date(11, 3, 2024)).moveBy(-10 - i), 10);
+        for (int i = 1; i < kCompanies; ++i)
+            new Company(window().catalogue().getMarkets()[0], "Many", ("T" + std::to_string(i)).c_str());
+        window().MarketSelection();
+        window().CompanySelection();
+        settle();
+    }
+};
+
+TEST_F(LongListTest, ManyRowsAreFoundSelectedAndRemovedTogether)
+{
+    ASSERT_EQ(list("lstQuotes").CountItems(), kQuotes);
+    ASSERT_EQ(list("lstCompanies").CountItems(), kCompanies);
+    select("lstQuotes", 100);
+    const int32 top = list("lstQuotes").TopRow();
+    BListItem* row = list("lstQuotes").ItemAt(100);
+    window().UpdateState(); // which refreshes the page
+    settle();
+    EXPECT_EQ(list("lstQuotes").ItemAt(100), row);
+    EXPECT_EQ(list("lstQuotes").CurrentSelection(), 100);
+    EXPECT_EQ(list("lstQuotes").TopRow(), top);
+
+    selectAll("lstQuotes");
+    follow({{{{"txtSplitRangeNum", "3"}, {"txtSplitRangeDenum", "1"}}, "btnSplitQuotes", ""}});
+    EXPECT_EQ(list("lstQuotes").CountSelected(), kQuotes);
+    EXPECT_EQ(rows("lstQuotes").back(), "11/03/2024\t60.00");
+    click("btnRemoveQuote");
+    EXPECT_EQ(list("lstQuotes").CountItems(), 0);
+
+    select("lstCompanies", 0);
+    QTest::keyClicks(list("lstCompanies").widget(), "T1234");
+    settle();
+    EXPECT_EQ(text("txtAbbreviation"), "T1234");
+}
+
+} // namespace
