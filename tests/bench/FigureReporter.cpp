@@ -31,6 +31,10 @@ constexpr Figure kFigures[] = {
     {"Files to chart, large portfolio", "BM_Files/chart_large", nullptr, "ms", "< 640"},
     {"Removal from a list, cost of an element, 4 n / n", "BM_RemoveQuotes/40000", "BM_RemoveQuotes/10000", "",
      "about 1"},
+    {"The window opens, until it is painted", "BM_Window/open", nullptr, "ms", ""},
+    {"100 pages come up", "BM_Window/switch_page", nullptr, "ms", ""},
+    {"Load of a market file in the window / without", "BM_Window/load_market", "BM_Files/load_market", "", "about 1"},
+    {"Evolution of 20 years in the window / without", "BM_Window/evolve_20_years", "BM_Files/evolve_20_years", "", ""},
     {"Drawing of a line, 100,000 / 5,000 points", "BM_DrawLine/100000", "BM_DrawLine/5000", "", "< 3"},
     {"Filling and clearing a line, a point, 4 n / n", "BM_FillLine/80000", "BM_FillLine/20000", "", "about 1"},
 };

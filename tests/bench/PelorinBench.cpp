@@ -2,9 +2,10 @@
 // of its own.
 
 #include "market/Company.h"
+#include "tests/bench/AppBench.h"
 #include "tests/bench/ChildRun.h"
-#include "tests/bench/DataFolder.h"
 #include "tests/bench/FigureReporter.h"
+#include "tests/bench/GeneratedFiles.h"
 #include "tests/bench/Portfolio.h"
 #include "valuation/Evolution.h"
 #include "valuation/State.h"
@@ -14,9 +15,9 @@
 
 namespace {
 
-using Files = DataFolder::Files;
+using Files = GeneratedFiles::Files;
 
-std::unique_ptr<DataFolder> folder; // of this run
+std::unique_ptr<GeneratedFiles> folder; // of this run
 
 constexpr DataSize kLarge{1000, 20, 500, 20, 50000};
 
@@ -32,7 +33,7 @@ double daysOf(const DataSize& size)
 }
 double quotesOf(const DataSize& size)
 {
-    return daysOf(size) * (5.0 / 7 * size.companies + DataFolder::kCurrencies);
+    return daysOf(size) * (5.0 / 7 * size.companies + GeneratedFiles::kCurrencies);
 }
 /// One of each holding and each day.
 double shareStatesOf(const DataSize& size)
@@ -173,7 +174,8 @@ int main(int argc, char** argv)
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv))
         return 2;
-    folder = std::make_unique<DataFolder>();
+    folder = std::make_unique<GeneratedFiles>();
+    registerAppBenchmarks(*folder, {kLarge, quotesOf(kLarge)}, {small(20), shareStatesOf(small(20))});
     FigureReporter reporter;
     benchmark::RunSpecifiedBenchmarks(&reporter);
     folder.reset();

@@ -16,7 +16,7 @@ struct DataSize {
 };
 
 /// A temporary folder with generated files, which are the same in every run. It is removed in the end.
-class DataFolder {
+class GeneratedFiles {
 public:
     struct Files {
         std::filesystem::path market;
@@ -25,10 +25,10 @@ public:
 
     static constexpr int kCurrencies = 4; // with a market each
 
-    DataFolder();
-    ~DataFolder();
-    DataFolder(const DataFolder&) = delete;
-    DataFolder& operator=(const DataFolder&) = delete;
+    GeneratedFiles();
+    ~GeneratedFiles();
+    GeneratedFiles(const GeneratedFiles&) = delete;
+    GeneratedFiles& operator=(const GeneratedFiles&) = delete;
 
     /// Generates the files when they are asked for the first time.
     const Files& files(const DataSize& size);

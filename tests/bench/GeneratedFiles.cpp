@@ -1,4 +1,4 @@
-#include "tests/bench/DataFolder.h"
+#include "tests/bench/GeneratedFiles.h"
 
 #include "market/Company.h"
 #include "portfolio/DepositAccountOperation.h"
@@ -20,7 +20,7 @@ public:
         : size_(size), portfolio_(portfolio), first_(Portfolio::lastDay())
     {
         first_.setYear(first_.getYear() - size.years);
-        for (int i = 0; i < DataFolder::kCurrencies; ++i)
+        for (int i = 0; i < GeneratedFiles::kCurrencies; ++i)
             makeCurrency(std::to_string(i));
         portfolio.wallet.setCatalogue(portfolio.catalogue);
         makeWallet();
@@ -44,7 +44,7 @@ private:
             new CurrencyQuote(currency, day, isReference ? 1 : between(0.5, 1.5));
         auto* market = new Market(("Market " + number).c_str());
         market->setCurrency(currency);
-        for (int i = 0; i < size_.companies / DataFolder::kCurrencies; ++i)
+        for (int i = 0; i < size_.companies / GeneratedFiles::kCurrencies; ++i)
             makeCompany(market, std::to_string(i) + "." + number);
     }
 
@@ -64,13 +64,13 @@ private:
             accounts_.push_back(new Account(("Account " + std::to_string(i)).c_str()));
             accounts_.back()->setWallet(&portfolio_.wallet);
             accounts_.back()->setCurrency(
-                portfolio_.catalogue.getCurrencies()[static_cast<unsigned>(i % DataFolder::kCurrencies)]);
+                portfolio_.catalogue.getCurrencies()[static_cast<unsigned>(i % GeneratedFiles::kCurrencies)]);
         }
         const std::vector<Market*> markets = portfolio_.catalogue.getMarkets();
         for (int i = 0; i < size_.holdings; ++i) {
             unsigned n;
-            Company** companies = markets[static_cast<unsigned>(i % DataFolder::kCurrencies)]->getAllCompanies(&n);
-            shares_.push_back(new Share(&portfolio_.wallet, companies[i / DataFolder::kCurrencies]));
+            Company** companies = markets[static_cast<unsigned>(i % GeneratedFiles::kCurrencies)]->getAllCompanies(&n);
+            shares_.push_back(new Share(&portfolio_.wallet, companies[i / GeneratedFiles::kCurrencies]));
         }
         const int days = Portfolio::lastDay() - first_;
         for (int i = 0; i < size_.operations; ++i) {
@@ -117,7 +117,7 @@ bool save(const Object& object, const std::filesystem::path& path)
 
 } // namespace
 
-DataFolder::DataFolder()
+GeneratedFiles::GeneratedFiles()
 {
     std::string folder = std::filesystem::temp_directory_path() / "pelorin-bench-XXXXXX";
     if (mkdtemp(folder.data()) == nullptr)
@@ -125,13 +125,13 @@ DataFolder::DataFolder()
     folder_ = folder;
 }
 
-DataFolder::~DataFolder()
+GeneratedFiles::~GeneratedFiles()
 {
     std::error_code ignored;
     std::filesystem::remove_all(folder_, ignored);
 }
 
-const DataFolder::Files& DataFolder::files(const DataSize& size)
+const GeneratedFiles::Files& GeneratedFiles::files(const DataSize& size)
 {
     const auto found = files_.find(size);
     if (found != files_.end())
