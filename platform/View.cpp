@@ -382,8 +382,9 @@ void BView::AddLine(BPoint from, BPoint to, rgb_color color)
 {
     if (lines_ == nullptr)
         return;
+    constexpr std::size_t kLongest = 16; // of a stroke: the time for one grows faster than its length
     auto& points = lines_->points;
-    if (points.empty() || !(points.back() == from) || !(lines_->color == color))
+    if (points.empty() || points.size() > kLongest || !(points.back() == from) || !(lines_->color == color))
         flushLines();
     if (points.empty())
         points.push_back(from);
