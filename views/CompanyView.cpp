@@ -30,7 +30,7 @@ constexpr float kListsTop = kTopEnd + kMargin;
 constexpr float kListsEnd = kListsTop + 194;
 constexpr float kMarketsEnd = kMargin + 292;
 constexpr float kQuotesTop = kListsEnd + kMargin;
-constexpr float kQuotesEnd = kQuotesTop + 248;
+constexpr float kQuotesEnd = kQuotesTop + 266;
 constexpr float kQuotesRight = kMargin + 414;
 constexpr float kChartTop = kQuotesEnd + kMargin;
 

@@ -59,6 +59,7 @@ BMenuField* EventBox::makeMenu(BRect frame)
     kinds->AddItem(new BMenuItem("Note", new BMessage('CMNo')));
     auto* field = new BMenuField(frame, "companyEventType", "Kind", kinds);
     field->SetDivider(kDivider);
+    field->SetAlignment(B_ALIGN_RIGHT);
     AddChild(field);
     return field;
 }
