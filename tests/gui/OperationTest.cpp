@@ -2,13 +2,9 @@
 
 #include "platform/ListView.h"
 #include "platform/WindowWidget.h"
-#include "portfolio/DepositAccountOperation.h"
-#include "portfolio/Share.h"
-#include "portfolio/ShareOperation.h"
-#include "portfolio/TransferAccountOperation.h"
-#include "portfolio/Wallet.h"
 #include "tests/gui/SmallCatalogue.h"
 #include "tests/gui/WindowFixture.h"
+#include "tests/support/SmallPortfolio.h"
 
 #include <QCheckBox>
 #include <QComboBox>
@@ -32,9 +28,10 @@ protected:
     OperationTest()
     {
         addSmallCatalogue(window());
-        cash_ = addAccount(window(), "Cash", "EUR");
-        addAccount(window(), "Broker", "EUR");
-        addAccount(window(), "Dollars", "USD");
+        const auto& currencies = window().catalogue().getCurrencies();
+        cash_ = addAccount(wallet(), "Cash", currencies[1]);
+        addAccount(wallet(), "Broker", currencies[1]);
+        addAccount(wallet(), "Dollars", currencies[0]);
         showAccounts();
         show(kOperationPage);
     }

@@ -4,10 +4,6 @@
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "market/Market.h"
-#include "portfolio/Account.h"
-
-#include <initializer_list>
-#include <string>
 
 /// The market data that the tests of accounts and operations work with: the euro, which is the reference, and the
 /// dollar at half of it; two markets of the name Paris, the first with AAA, in dollars, the second with BBB, in euros,
@@ -28,13 +24,4 @@ inline void addSmallCatalogue(PLWindow& window)
     auto* beta = new Company(markets[1], "Beta", "BBB");
     new CompanyQuote(beta, Date(1, 11, 2024), 10);
     window.UpdateState();
-}
-
-/// The wallet owns the account. To be followed by an update of the page.
-inline Account* addAccount(PLWindow& window, const char* name, const char* currency)
-{
-    auto* account = new Account(name);
-    account->setCurrency(window.getCurrencyByRepresentation(currency));
-    account->setWallet(window.getWallet());
-    return account;
 }
