@@ -1,7 +1,7 @@
 // The account commands, by their controls on the portfolio page.
 
-#include "platform/ListView.h"
 #include "portfolio/Account.h"
+#include "platform/ListView.h"
 #include "portfolio/DepositAccountOperation.h"
 #include "portfolio/TransferAccountOperation.h"
 #include "portfolio/Wallet.h"
