@@ -228,6 +228,10 @@ void CompanyView::AddCompany(Company* company, bool selected)
 void CompanyView::ModifyCompany(Company* company)
 {
     companies_->modify(company);
+    if (company != quotesOf_)
+        return;
+    SetQuoteList(company);
+    UpdateQuotesChart();
 }
 
 void CompanyView::DeleteCompany(Company* company)

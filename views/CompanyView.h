@@ -52,6 +52,7 @@ public:
     void setDiffWithAverage(float difference);
     Company* GetSelectedCompany() const;
     void AddCompany(Company* company, bool selected);
+    /// Its quotes may have changed, too.
     void ModifyCompany(Company* company);
     void DeleteCompany(Company* company);
     /// Shows the companies of `market`; null shows none.

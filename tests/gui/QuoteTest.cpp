@@ -175,6 +175,9 @@ TEST_F(FetchCommandTest, UpdateRenamesAndFetchesByTheFormerTicker)
 TEST_F(FetchCommandTest, ThreeMonthsComeInByMarketName)
 {
     addSmallCatalogue();
+    show(kPortoFolioPage);
+    enter("txtDate", ""); // without a day nothing is valued, and the page is refreshed all the same
+    show(kCompanyPage);
     click("btnSetLastThreeMonths");
     EXPECT_EQ(message(), "Error getting the last three months of quotes") << "Paris is not one of its markets";
     follow({{{{"txtMarketName", "NYSE"}}, "btnUpdateMarket", ""}});

@@ -162,7 +162,12 @@ protected:
         trade(new Share(&wallet(), companies[under(companies.size())]), account, 10, 5, 2);
         window().UpdateState();
     }
-    void revalue() { send({'WCCe', 'OCPr'}); }
+    /// Also for no day at all, when nothing is valued.
+    void revalue()
+    {
+        put("WalletView", "txtDate", under(3) == 0 ? "" : "21/11/2024");
+        send({'WTDa', 'WTDa', 'WCCe', 'OCPr'});
+    }
 
     /// Everything that the lists of the two pages show, and that it is what the selection is about.
     void expectListsShowTheModel()
