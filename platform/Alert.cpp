@@ -2,8 +2,9 @@
 
 #include "platform/DialogAnswers.h"
 #include "platform/Labels.h"
+#include "platform/Window.h"
+#include "platform/WindowWidget.h"
 
-#include <QApplication>
 #include <QDialog>
 #include <QHBoxLayout>
 #include <QLabel>
@@ -31,7 +32,7 @@ int32 BAlert::Go()
 int32 BAlert::ask() const
 {
     constexpr int kMargin = 16;
-    QDialog dialog(QApplication::activeWindow());
+    QDialog dialog(BWindow::front());
     dialog.setObjectName("Alert");
     dialog.setWindowTitle(QString::fromStdString(title_));
     auto* rows = new QVBoxLayout(&dialog); // the dialog owns what is laid out in it

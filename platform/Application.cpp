@@ -9,6 +9,8 @@
 #include <QPalette>
 #include <QStyleFactory>
 
+#include <clocale>
+
 BApplication* be_app = nullptr;
 
 namespace {
@@ -42,6 +44,8 @@ BApplication::BApplication(const char* signature) : BLooper(signature), signatur
     // A test program makes the connection to the desktop itself, and several applications on it one after the other.
     if (QCoreApplication::instance() == nullptr) {
         new QApplication(argumentCount, arguments); // lives as long as the process
+        // It has taken over the desktop's way to write numbers. The program's own has a point, whatever the desktop's.
+        std::setlocale(LC_NUMERIC, "C");
         const std::string name = signature_.substr(signature_.find_last_of("./") + 1);
         QApplication::setApplicationName(QString::fromStdString(name));
         QApplication::setDesktopFileName(QString::fromStdString(name).toLower());

@@ -10,6 +10,7 @@
 
 #include <QFileDialog>
 #include <QLineEdit>
+#include <QTreeView>
 
 BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const entry_ref* start, uint32,
                        bool allowMultiple, BMessage* message, bool modal, bool hideWhenDone)
@@ -41,6 +42,9 @@ QFileDialog& BFilePanel::dialog()
     // Who types a name fast and presses Enter would leave its list of proposals open behind the panel.
     if (auto* field = dialog_->findChild<QLineEdit*>("fileNameEdit"))
         field->setCompleter(nullptr);
+    // The files have no types.
+    if (auto* columns = dialog_->findChild<QTreeView*>("treeView"))
+        columns->hideColumn(2);
     QObject::connect(dialog_.get(), &QFileDialog::accepted, [this] { accept(); });
     QObject::connect(dialog_.get(), &QFileDialog::rejected, [this] { sendAll(BMessage(B_CANCEL)); });
     return *dialog_;

@@ -232,6 +232,7 @@ int32 BListView::TopRow() const
 
 void BListView::SetTopRow(int32 index)
 {
+    index = std::min(index, CountItems() - 1);
     if (ItemAt(index) != nullptr)
         listWidget().scrollTo(listWidget().rows().index(index), QAbstractItemView::PositionAtTop);
 }

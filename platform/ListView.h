@@ -59,6 +59,7 @@ public:
     void ScrollToSelection();
     /// Index of the row at the upper edge, for `SetTopRow` to bring back; 0 in an empty list.
     int32 TopRow() const;
+    /// The last row, when there are not so many.
     void SetTopRow(int32 index);
 
     /// Owns `message`; null sends none.

@@ -2,17 +2,27 @@
 
 #include "platform/Labels.h"
 
+#include <QShortcut>
 #include <QTabBar>
 #include <QTabWidget>
 
 BTabView::BTabView(BRect frame, const char* name, button_width, uint32 resizingMode, uint32 flags)
     : BView(frame, name, resizingMode, flags, new QTabWidget)
 {
-    tabWidget().setFocusPolicy(Qt::NoFocus); // its bar has the keyboard
     tabWidget().setDocumentMode(true);
     tabWidget().tabBar()->setObjectName(QString::fromUtf8(Name()) + "Bar");
     tabWidget().tabBar()->setAccessibleName(QString::fromUtf8(Name()));
     tabWidget().tabBar()->setExpanding(false);
+    tabWidget().tabBar()->setFocusPolicy(Qt::TabFocus);
+    const auto step = [this](const QKeySequence& keys, int direction) {
+        auto* shortcut = new QShortcut(keys, widget()); // the widget owns it
+        QObject::connect(shortcut, &QShortcut::activated, [this, direction] {
+            if (CountTabs() > 0)
+                Select((Selection() + direction + CountTabs()) % CountTabs());
+        });
+    };
+    step(QKeySequence(Qt::CTRL | Qt::Key_PageDown), 1);
+    step(QKeySequence(Qt::CTRL | Qt::Key_PageUp), -1);
 }
 
 BTabView::~BTabView()

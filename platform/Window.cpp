@@ -4,6 +4,8 @@
 #include "platform/WindowWidget.h"
 
 #include <QApplication>
+#include <QPoint>
+#include <QSize>
 
 #include <algorithm>
 #include <cmath>
@@ -46,8 +48,8 @@ BWindow::BWindow(BRect frame, const char* title, window_type, uint32 flags, uint
 {
     widget_->setWindowTitle(QString::fromUtf8(title));
     const QSize size(static_cast<int>(frame.Width()), static_cast<int>(frame.Height()));
-    widget_->fitTo(size, (flags & B_NOT_RESIZABLE) == 0);
-    widget_->move(static_cast<int>(frame.left), static_cast<int>(frame.top));
+    const QPoint place(static_cast<int>(frame.left), static_cast<int>(frame.top));
+    widget_->fitTo(place, size, (flags & B_NOT_RESIZABLE) == 0);
     root_->setWindow(this);
     widget_->setWidget(root_->widget());
     windows().push_back(this);
@@ -124,6 +126,13 @@ bool BWindow::closeByHand()
         },
         Qt::QueuedConnection);
     return true;
+}
+
+QWidget* BWindow::front()
+{
+    if (QWidget* active = QApplication::activeWindow())
+        return active;
+    return windows().empty() ? nullptr : &windows().back()->widget();
 }
 
 void BWindow::closeAll()

@@ -7,6 +7,7 @@
 #include <string>
 
 class BView;
+class QWidget;
 class WindowWidget;
 
 enum window_type { B_TITLED_WINDOW };
@@ -48,6 +49,9 @@ public:
     /// The window is asked to close by the person. @return false to stay.
     bool closeByHand();
     static void closeAll();
+    /// What a dialog comes up before: the window that has the keyboard, otherwise the one opened last; null without
+    /// any.
+    static QWidget* front();
 
 private:
     BRect frame_;

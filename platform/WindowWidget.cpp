@@ -4,27 +4,31 @@
 
 #include <QCloseEvent>
 #include <QScreen>
-#include <QScrollBar>
 #include <QStyle>
 
-void WindowWidget::fitTo(QSize content, bool resizable)
+#include <algorithm>
+
+void WindowWidget::fitTo(QPoint place, QSize content, bool resizable)
 {
     setFrameShape(QFrame::NoFrame);
     setFocusPolicy(Qt::NoFocus);
-    QSize size = content;
-    const QSize available = screen()->availableSize();
+    // The desktop's borders are not known before the window is shown; they are about those of a window within one.
+    const int border = style()->pixelMetric(QStyle::PM_MdiSubWindowFrameWidth);
+    const int title = style()->pixelMetric(QStyle::PM_TitleBarHeight);
+    const QRect room = screen()->availableGeometry().adjusted(border, title, -border, -border);
     const int bar = style()->pixelMetric(QStyle::PM_ScrollBarExtent);
-    if (available.height() < content.height())
-        size = {content.width() + bar, available.height()};
-    if (available.width() < size.width()) {
-        size.setWidth(available.width());
-        if (available.height() >= content.height() + bar)
-            size.setHeight(content.height() + bar);
-    }
+    QSize size = content;
+    if (room.height() < size.height())
+        size.rwidth() += bar;
+    if (room.width() < size.width() && room.height() >= content.height() + bar)
+        size.rheight() += bar;
+    size = size.boundedTo(room.size());
     if (resizable)
         resize(size);
     else
         setFixedSize(size);
+    move(std::max(room.left(), std::min(place.x(), room.right() + 1 - size.width())),
+         std::max(room.top(), std::min(place.y(), room.bottom() + 1 - size.height())));
 }
 
 void WindowWidget::closeEvent(QCloseEvent* event)

@@ -9,8 +9,9 @@ class WindowWidget final : public QScrollArea {
 public:
     explicit WindowWidget(BWindow& window) : window_(window) {}
 
-    /// Gives the window the size `content`, or what of it fits on the screen.
-    void fitTo(QSize content, bool resizable);
+    /// Gives the window the size `content` at `place`, or what of it fits on the screen, moved up and left until it
+    /// does.
+    void fitTo(QPoint place, QSize content, bool resizable);
 
 protected:
     void closeEvent(QCloseEvent* event) override;
