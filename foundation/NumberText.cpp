@@ -65,6 +65,11 @@ Parsed parsed(const std::string& text)
 
 std::string amountText(double amount)
 {
+    constexpr double kLongest = 1e15;
+    if (std::isfinite(amount) && std::abs(amount) >= kLongest) {
+        char text[32];
+        return {text, std::to_chars(text, text + sizeof text, amount, std::chars_format::scientific, 5).ptr};
+    }
     const std::string text = fixedText(amount, 2);
     return std::isfinite(amount) ? withSeparators(text, text.find('.')) : text;
 }

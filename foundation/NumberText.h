@@ -4,7 +4,7 @@
 
 /// Numbers as a person reads them. A number that is not finite is "?", and one that is too small to show has no sign.
 
-/// "1,234.50"
+/// "1,234.50"; from 1e15 on "1.23457e+15".
 std::string amountText(double amount);
 /// "1,234"
 std::string countText(int count);

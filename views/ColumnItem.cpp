@@ -37,8 +37,11 @@ std::string fitted(const BView& view, std::string text, float width)
 std::string ColumnItem::Text() const
 {
     std::string line;
-    for (int i = 0; i < columns_; ++i)
-        line += (i > 0 ? "\t" : "") + cell(i).text;
+    for (int i = 0; i < columns_; ++i) {
+        if (i > 0)
+            line += '\t';
+        line += cell(i).text;
+    }
     return line;
 }
 

@@ -134,6 +134,8 @@ public:
     /// emptied and filled.
     void remember()
     {
+        if (CountItems() == 0)
+            return; // it was emptied before, and what was kept in mind then still stands
         remembered_.clear();
         for (int32 i = 0; i < CountSelected(); ++i) {
             if (const void* key = static_cast<const Row*>(ItemAt(CurrentSelection(i)))->key())

@@ -61,6 +61,15 @@ void QuoteChart::fill()
     const auto& days = shown_.days;
     if (days.empty())
         return;
+    if (days.front().date == days.back().date) { // no line, and no trend
+        auto* point = new GraphPoint;            // the chart's own
+        point->setDateBased(true);
+        point->setDateX(days.back().date);
+        point->setY(days.back().value);
+        point->setColor(look::kSeries);
+        addGraphElement(point);
+        return;
+    }
     for (const Day& day : days)
         add(line_, day.date, day.value);
     for (const Day& day : {days.front(), days.back()})

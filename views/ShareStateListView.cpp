@@ -2,6 +2,8 @@
 
 #include "foundation/NumberText.h"
 #include "market/Company.h"
+#include "market/Currency.h"
+#include "market/Market.h"
 #include "portfolio/Share.h"
 #include "views/DateText.h"
 #include "views/Look.h"
@@ -16,6 +18,13 @@ const Company* companyOf(const Share* share)
     if (share != nullptr)
         share->getCompany(&company);
     return company;
+}
+
+bool hasRate(const Company& company)
+{
+    Market* market = nullptr;
+    Currency* currency = nullptr;
+    return company.getMarket(&market) == 0 && market->getCurrency(&currency) == 0 && currency->getNbrQuotes() > 0;
 }
 
 std::string withCurrency(const ShareState& state, double amount)
@@ -46,6 +55,8 @@ Cell ShareStateItem::cell(int column) const
     case kQuoteDay:
         return quoteDay();
     case kValue:
+        if (hasQuote && isHeld() && !hasRate(*company))
+            return {"no rate", look::kWarning}; // and so it counts as 0 in the totals
         return {hasQuote && isHeld() ? withCurrency(*state_, 1.0 * state_->getQuantity() * state_->getQuote()) : ""};
     case kGain:
         return gain();
@@ -56,20 +67,20 @@ Cell ShareStateItem::cell(int column) const
     }
 }
 
-/// The day of the quote where that is not the day shown, which then is the last one there was or, after the last one of
-/// all, an estimate; before the first one an estimate as well.
+/// Empty where there is a quote of the day shown; otherwise the day of the one that counts, with "~" before the day
+/// that an estimate starts from: outside the series the quote is on a straight line.
 Cell ShareStateItem::quoteDay() const
 {
     const Company* company = companyOf(share_);
-    const Date day = state_->getDate();
     if (company == nullptr || company->getNbrQuotes() == 0)
         return {};
-    if (day < company->getFirstQuote())
-        return {"< " + dateText(company->getFirstQuote()), look::kWarning};
-    CompanyQuote* quote = nullptr;
-    if (company->getQuote(day, &quote) == 0)
+    const Date day = state_->getDate();
+    const Date quoted = company->getLastQuoteUpTo(day);
+    if (quoted == day)
         return {};
-    return {dateText(company->getLastQuoteUpTo(day)), look::kFaint};
+    const bool isEstimate = company->getNbrQuotes() > 1 && (quoted.isUndefined() || day > company->getLastQuote());
+    const std::string text = dateText(quoted.isUndefined() ? company->getFirstQuote() : quoted);
+    return {(isEstimate ? "~ " : "") + text, quoted.isUndefined() ? look::kWarning : look::kFaint};
 }
 
 Cell ShareStateItem::gain() const

@@ -8,6 +8,7 @@
 #include "platform/Box.h"
 #include "platform/Button.h"
 #include "platform/CheckBox.h"
+#include "platform/StringView.h"
 #include "valuation/Evolution.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
@@ -142,6 +143,9 @@ void WalletView::makeChart()
     line_.setDateBased(true);
     line_.setColor(kSeries);
     evolution_->addGraphElement(&line_);
+    const BRect reasonPlace(10, 30, 700, 50); // below the chart's own "No data"
+    noEvolution_ = new BStringView(reasonPlace, "", "");
+    evolution_->AddChild(noEvolution_);
     AddChild(evolution_);
 }
 
@@ -225,9 +229,9 @@ void WalletView::UpdateEvolution(const Wallet& wallet, const Catalogue& catalogu
     const std::string symbol = reference != nullptr ? std::string(reference->getRepresentation().bytes()) : "???";
     evolution_->setXLegend(("Value in " + symbol).c_str());
     if (outcome != EvolutionOutcome::Built)
-        evolution_->setYLegend(outcome == EvolutionOutcome::TooLong
-                                   ? "The evolution would be too long: is the date of an operation mistyped?"
-                                   : "The first operation has no real date");
+        noEvolution_->SetText(outcome == EvolutionOutcome::TooLong
+                                  ? "The evolution would be too long: is the date of an operation mistyped?"
+                                  : "The first operation has no real date.");
     for (const auto& point : evolutionPoints(wallet, catalogue)) {
         auto* shown = new GraphPoint;
         shown->setDateBased(true);
@@ -242,7 +246,7 @@ void WalletView::ClearEvolution()
     line_.clearAll();
     evolution_->removeAllGraphPoints();
     evolution_->setXLegend(String());
-    evolution_->setYLegend(String());
+    noEvolution_->SetText("");
     evolution_->Invalidate();
 }
 

@@ -6,6 +6,7 @@
 #include "views/PageView.h"
 
 class AccountState;
+class BStringView;
 class AccountStateListView;
 class Catalogue;
 class DateControl;
@@ -72,5 +73,6 @@ private:
     BCheckBox* defaultTransferAccount_ = nullptr;
     ShareStateListView* shares_ = nullptr;
     GraphView* evolution_ = nullptr;
-    GraphLine line_; // in the chart
+    BStringView* noEvolution_ = nullptr; // why there is none, in the chart
+    GraphLine line_;                     // in the chart
 };
