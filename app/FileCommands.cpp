@@ -2,6 +2,7 @@
 // about.
 
 #include "app/DurableSave.h"
+#include "app/MessageView.h"
 #include "app/PLWindow.h"
 #include "app/WindowLock.h"
 #include "foundation/InputFile.h"
@@ -112,6 +113,7 @@ void PLWindow::RefsReceived(BMessage* message)
 void PLWindow::replaceWallet()
 {
     SetState(nullptr);
+    walletView_->ClearEvolution();
     walletView_->ForgetSelection();
     operationView_->ForgetSelection();
     wallet_ = std::make_unique<Wallet>();
@@ -135,8 +137,10 @@ void PLWindow::loadMarkets(FILE* file, const String& path)
     companyView_->SetMarketList(catalogue_.getMarkets());
     showParameters();
     UpdateState();
+    // A save must not put what could be read in the place of a damaged file, nor in that of the one loaded before.
+    isMarketPathAsked_ = !isWhole;
     if (isWhole)
-        marketPath_ = path; // a save must not put what could be read in the place of a damaged file
+        marketPath_ = path;
     SetMessage(isWhole ? "Markets successfully loaded..." : "Failed to load the markets");
 }
 
@@ -162,7 +166,7 @@ void PLWindow::SaveSomething()
         return;
     const bool isMarkets = kind == Kind::kMarkets;
     const String& path = isMarkets ? marketPath_ : walletPath_;
-    if (!path.isUndefined()) {
+    if (!path.isUndefined() && !(isMarkets && isMarketPathAsked_)) {
         Save(path);
         return;
     }
@@ -188,6 +192,8 @@ status_t PLWindow::Save(BMessage* message)
     if (status != B_OK || !kind)
         return status;
     (kind == Kind::kMarkets ? marketPath_ : walletPath_) = path.Path();
+    if (kind == Kind::kMarkets)
+        isMarketPathAsked_ = false;
     Save(String(path.Path()));
     return B_OK;
 }
@@ -206,7 +212,8 @@ void PLWindow::Save(const String& path)
             return catalogue_.wrt(file, today());
         return wallet_ != nullptr ? wallet_->wrt(file, today()) : 0; // without a wallet the file is left empty
     };
-    switch (DurableSave(folder_).save(path.getCharacterArray(), write).outcome) {
+    const auto result = DurableSave(folder_).save(path.getCharacterArray(), write);
+    switch (result.outcome) {
     case DurableSave::Outcome::kOpenFailed:
         SetMessage("Failed to open the file.");
         break;
@@ -220,6 +227,7 @@ void PLWindow::Save(const String& path)
             SetMessage(wallet_ != nullptr ? "Wallet successfully saved..." : "No wallet to save...");
         break;
     }
+    messageView_->SetToolTip(result.reason.c_str());
 }
 
 void PLWindow::ReinitWallet()

@@ -9,7 +9,7 @@ MessageView::MessageView(BRect frame, const char* name, PLWindow* window)
 {
     constexpr rgb_color kGrey = {216, 216, 216, 255};
     SetFont(be_bold_font);
-    SetFontSize(24); // `DrawMsg` draws at 14; the size of the view itself is 24 on purpose
+    SetFontSize(24); // kept as it is; nothing is drawn at this size, messages are at 14
     SetPenSize(3);
     SetLowColor(kGrey);
 }

@@ -164,8 +164,10 @@ bool PLWindow::QuitRequested()
 void PLWindow::SetMessage(const char* text)
 {
     const WindowLock lock(*this);
-    if (lock.isHeld())
-        messageView_->SetMessage(text);
+    if (!lock.isHeld())
+        return;
+    messageView_->SetToolTip(""); // of the message before
+    messageView_->SetMessage(text);
 }
 
 bool PLWindow::confirm(const char* question)

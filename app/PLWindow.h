@@ -186,8 +186,9 @@ private:
 
     Catalogue catalogue_;
     std::unique_ptr<Wallet> wallet_;
-    State* state_ = nullptr; // in the wallet
-    String marketPath_;      // of the file loaded or saved last; undefined before the first
+    State* state_ = nullptr;         // in the wallet
+    String marketPath_;              // of the file loaded or saved last; undefined before the first
+    bool isMarketPathAsked_ = false; // the next save asks for a name, whatever the path
     String walletPath_;
     DataFolder folder_;
     std::unique_ptr<BFilePanel> openPanel_;

@@ -43,6 +43,7 @@ void PLWindow::ChangeParameter(uint32 code)
     if (parameter == std::end(kParameters))
         return;
     parameter->store(*wallet_, *parameterView_);
+    showParameters(); // what was understood, in place of what was typed
     if (parameter->revalues)
         UpdateState();
 }

@@ -83,11 +83,14 @@ int tour(PLWindow& window, const std::string& pictures)
 
 int main(int argc, char** argv)
 {
-    if (argc != 3) {
-        std::cerr << "usage: pelorin-tour DATA_FOLDER PICTURE_FOLDER\n";
+    const bool isCheck = argc == 2 && std::string(argv[1]) == "--check-display";
+    if (argc != 3 && !isCheck) {
+        std::cerr << "usage: pelorin-tour DATA_FOLDER PICTURE_FOLDER | --check-display\n";
         return 2;
     }
-    BApplication application("application/x-vnd.Pelorin");
+    BApplication application("application/x-vnd.Pelorin"); // ends the process where there is no display
+    if (isCheck)
+        return 0;
     const DataFolder folder(argv[1]);
     answerFor(folder);
     auto* window = new PLWindow({50, 50, 850, 850}, folder); // the application closes it
