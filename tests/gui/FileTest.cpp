@@ -170,6 +170,16 @@ TEST_F(FileTest, DamagedMarketFileKeepsWhatWasReadAndIsNotSavedOver)
     EXPECT_EQ(panelFolder("SavePanel"), folder() + "/Companies");
     answerPanel("SavePanel", "");
     EXPECT_EQ(contentOf(damaged).size(), whole.size() / 2);
+
+    // Nor do the remains go into the place of the file that was loaded before, until a name is given.
+    loadMarkets(marketFile());
+    loadMarkets(damaged);
+    click("btnSaveMarket");
+    answerPanel("SavePanel", "Rest");
+    EXPECT_EQ(message(), "Currencies successfully saved...");
+    EXPECT_EQ(contentOf(marketFile()), whole);
+    click("btnSaveMarket");
+    EXPECT_FALSE(isPanelOpen("SavePanel"));
 }
 
 TEST_F(FileTest, DamagedPortfolioGivesAnEmptyOneAndTheVersionSavedOverIsKept)

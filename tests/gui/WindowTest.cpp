@@ -1,8 +1,13 @@
 // The window itself, the portfolio page and the parameter page.
 
 #include "app/MessageView.h"
+#include "chart/GraphLine.h"
+#include "chart/GraphView.h"
 #include "market/Company.h"
+#include "market/Currency.h"
+#include "market/Market.h"
 #include "platform/ListView.h"
+#include "platform/StringView.h"
 #include "platform/TabView.h"
 #include "platform/WindowWidget.h"
 #include "portfolio/Account.h"
@@ -10,6 +15,7 @@
 #include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"
 #include "valuation/State.h"
+#include "views/DateText.h"
 
 #include <QAbstractButton>
 #include <QAbstractItemView>
@@ -19,6 +25,7 @@
 #include <QPlainTextEdit>
 #include <QTabBar>
 #include <QTest>
+#include <clocale>
 #include <gmock/gmock.h>
 
 namespace {
@@ -63,6 +70,21 @@ TEST_F(MainWindowTest, EveryControlHasANameForTestsAndForAssistiveTools)
             EXPECT_NE(widget->focusPolicy() & Qt::TabFocus, 0) << name;
         }
     }
+}
+
+TEST_F(MainWindowTest, NumbersHaveAPointWhateverTheDesktopWrites)
+{
+    EXPECT_EQ(std::localeconv()->decimal_point, std::string("."));
+}
+
+TEST_F(MainWindowTest, KeysWalkThroughTheTabs)
+{
+    auto* tabs = static_cast<BTabView*>(window().FindView("TabView"));
+    QTest::keyClick(&window().widget(), Qt::Key_PageUp, Qt::ControlModifier);
+    EXPECT_EQ(tabs->Selection(), kParameterPage);
+    QTest::keyClick(&window().widget(), Qt::Key_PageDown, Qt::ControlModifier);
+    EXPECT_EQ(tabs->Selection(), kCompanyPage);
+    EXPECT_NE(window().widget().findChild<QTabBar*>()->focusPolicy() & Qt::TabFocus, 0);
 }
 
 TEST_F(MainWindowTest, UnknownCodesAndTypingChangeNothing)
@@ -135,14 +157,34 @@ TEST_F(PortoFolioPageTest, SelectionAndScrollingSurviveARecomputation)
     EXPECT_EQ(list("lstAccounts").CurrentSelection(), 1);
     EXPECT_EQ(list("lstShares").CurrentSelection(), 9);
     EXPECT_EQ(list("lstShares").TopRow(), top);
+    // Also over a date that was mistyped.
+    enter("txtDate", "1/6");
+    enter("txtDate", "2/6/2024");
+    EXPECT_EQ(list("lstShares").CurrentSelection(), 9);
 }
 
 TEST_F(PortoFolioPageTest, EvolutionIsBuiltAndEmptied)
 {
+    auto* chart = static_cast<GraphView*>(window().FindView("grvEvolution"));
+    unsigned n;
+    auto* line = static_cast<GraphLine*>(chart->getAllGraphElements(&n)[0]);
     click("cbxComputeEvolution");
     EXPECT_GT(wallet().getNbrStates(), 300U);
+    EXPECT_EQ(line->getNbrGraphPoints(), wallet().getNbrStates());
+    EXPECT_STREQ(chart->getXLegend().getCharacterArray(), "Value in EUR");
+    window().setReferenceCurrency(nullptr);
+    enter("txtDate", "20/11/2024");
+    EXPECT_EQ(line->getNbrGraphPoints(), 0U);
+    EXPECT_STREQ(chart->getXLegend().getCharacterArray(), "Value in ???");
+    window().setReferenceCurrency(window().catalogue().getCurrencies()[0]);
+    enter("txtDate", "31/12/32767");
+    auto* reason = static_cast<BStringView*>(chart->ChildAt(0));
+    EXPECT_THAT(reason->Text(), HasSubstr("too long"));
+    enter("txtDate", "20/11/2024");
+    EXPECT_STREQ(reason->Text(), "");
     click("cbxComputeEvolution");
     EXPECT_EQ(wallet().getNbrStates(), 1U);
+    EXPECT_EQ(line->getNbrGraphPoints(), 0U);
 }
 
 TEST_F(PortoFolioPageTest, RowsSayWhatIsOldOrMissing)
@@ -156,6 +198,17 @@ TEST_F(PortoFolioPageTest, RowsSayWhatIsOldOrMissing)
         delete company->getQuote(0U);
     enter("txtDate", "22/11/2024");
     EXPECT_THAT(rows("lstShares")[0], HasSubstr("no quote"));
+    wallet().getAllShares(&n)[1]->getCompany(&company);
+    enter("txtDate", "1/1/2030"); // far behind the last quote
+    EXPECT_THAT(rows("lstShares")[1], HasSubstr("~ " + dateText(company->getLastQuote())));
+    Market* market = nullptr;
+    Currency* currency = nullptr;
+    company->getMarket(&market);
+    market->getCurrency(&currency);
+    while (currency->getNbrQuotes() > 0)
+        delete currency->getQuote(0U);
+    enter("txtDate", "22/11/2024");
+    EXPECT_THAT(rows("lstShares")[1], HasSubstr("no rate"));
     wallet().getAccount(0)->setCurrency(nullptr);
     enter("txtDate", "21/11/2024");
     EXPECT_THAT(rows("lstAccounts")[0], HasSubstr("no currency"));
@@ -202,6 +255,8 @@ TEST_F(ParameterPageTest, CommitsStoreWhatTheFieldBeginsWith)
         enter("txtBuyCost", c.text);
         EXPECT_EQ(wallet().getBuyCost(), c.cost) << c.text;
     }
+    enter("txtBuyCost", "12abc");
+    EXPECT_EQ(text("txtBuyCost"), "12.00") << "the page shows what was understood";
     for (const char* text : {"0.25 %", "0.25", "%0.25"}) {
         enter("txtSellRateCost", text);
         EXPECT_EQ(wallet().getSellRateCost(), 0.0025F) << text;

@@ -6,9 +6,9 @@
 int main(int argc, char** argv)
 {
     testing::InitGoogleTest(&argc, argv);
-    // Without a screen, unless a platform is asked for.
+    // Without a screen, but with room for one, unless a platform is asked for.
     if (!qEnvironmentVariableIsSet("QT_QPA_PLATFORM"))
-        qputenv("QT_QPA_PLATFORM", QByteArray("offscreen"));
+        qputenv("QT_QPA_PLATFORM", QByteArray("offscreen:configfile=" PELORIN_SCREEN));
     BApplication application("application/x-vnd.Pelorin");
     return RUN_ALL_TESTS();
 }
