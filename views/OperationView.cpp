@@ -188,15 +188,12 @@ void OperationView::Draw(BRect)
 {
     // What the ground of some rows means, at the right above the list.
     constexpr const char* kLegend = "Automatic operations";
-    constexpr float kPatch = 12;
-    const float left = kRight - StringWidth(kLegend) - kPatch - kGap;
-    const float top = kMargin + (kFieldHeight - kPatch) / 2;
+    constexpr float kPadding = 8;
+    const float left = kRight - StringWidth(kLegend) - 2 * kPadding;
     SetHighColor(kGenerated);
-    FillRect({left, top, left + kPatch, top + kPatch});
-    SetHighColor(kLine);
-    StrokeRect({left, top, left + kPatch, top + kPatch});
+    FillRect({left, kMargin + 2, kRight, kMargin + kFieldHeight - 2});
     SetHighColor(kText);
-    DrawString(kLegend, {left + kPatch + kGap, top + kPatch - 1});
+    DrawString(kLegend, {left + kPadding, kMargin + kFieldHeight - kPadding + 1});
 }
 
 bool OperationView::isPrevision() const

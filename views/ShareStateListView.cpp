@@ -95,11 +95,11 @@ Cell ShareStateItem::gain() const
 ShareStateListView::ShareStateListView(const char* name)
     : ObjectListView({}, name, B_SINGLE_SELECTION_LIST,
                      {{"Ticker", 56},
-                      {"Company", 150},
+                      {"Company", 136},
                       {"Quantity", 60, B_ALIGN_RIGHT},
                       {"Buy Quote", 72, B_ALIGN_RIGHT},
                       {"Quote", 64, B_ALIGN_RIGHT},
-                      {"Quote of", 86, B_ALIGN_RIGHT},
+                      {"Quote of", 100, B_ALIGN_RIGHT},
                       {"Value", 110, B_ALIGN_RIGHT},
                       {"Gain", 66, B_ALIGN_RIGHT},
                       {"End Date", 82, B_ALIGN_RIGHT}})
