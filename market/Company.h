@@ -45,8 +45,8 @@ public:
 
     // Defined in net/, with the transfers:
 
-    /// Fetches today's price from a quote server; `path` is the request without the ticker. `*date` becomes today in any
-    /// case, `*value` changes once the server is connected. Nothing is stored.
+    /// Fetches today's price from a quote server; `path` is the request without the ticker. `*date` becomes today in
+    /// any case, `*value` changes once the server is connected. Nothing is stored.
     /// @return 0; -1 when the server or the price is not found.
     int getInternetLastQuote(const String& host, const String& path, float* value, Date* date) const;
     /// Fetches and stores the quotes of the last three months, as the company's market can; -1 also without a market.

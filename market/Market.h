@@ -33,8 +33,8 @@ public:
 
     /// Fetches the daily prices of the last three months of a company of this market, and stores them. Defined in net/,
     /// with the transfer.
-    /// @return 0; -1 when this is not one of the markets that the server knows, "NASDAQ", "NYSE" and "AMEX", or when the
-    /// page is not found or not whole. What stands before an error is stored.
+    /// @return 0; -1 when this is not one of the markets that the server knows, "NASDAQ", "NYSE" and "AMEX", or when
+    /// the page is not found or not whole. What stands before an error is stored.
     int setInternetLastThreeMonthsQuote(Company* company) const;
 
 private:

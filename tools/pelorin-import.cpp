@@ -1,5 +1,5 @@
-#include "market/Catalogue.h"
 #include "foundation/AtomicFile.h"
+#include "market/Catalogue.h"
 #include "tools/Importer.h"
 #include "tools/Program.h"
 
