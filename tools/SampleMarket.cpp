@@ -180,17 +180,20 @@ Market* findMarket(const Catalogue& catalogue, const String& name)
 
 } // namespace
 
-std::vector<Date> sampleDays(const Date& last)
+bool isWeekday(const Date& day)
 {
     const Date someMonday(1, 1, 2001);
+    return ((day - someMonday) % 7 + 7) % 7 < 5;
+}
+
+std::vector<Date> sampleDays(const Date& last)
+{
     Date day = last;
     day.moveBy(1 - 7 * kWeeks);
     std::vector<Date> days;
-    for (; day <= last; day = day.getNext()) {
-        const int weekday = ((day - someMonday) % 7 + 7) % 7;
-        if (weekday < 5)
+    for (; day <= last; day = day.getNext())
+        if (isWeekday(day))
             days.push_back(day);
-    }
     return days;
 }
 
@@ -215,4 +218,12 @@ void fillSampleMarket(Catalogue& catalogue, const std::vector<Date>& days)
         addQuotes(company, plan, ++seed, days, world);
         addNotes(company, days);
     }
+}
+
+std::vector<SampleTicker> sampleTickers()
+{
+    std::vector<SampleTicker> tickers;
+    for (const CompanyPlan& plan : kCompanies)
+        tickers.push_back({plan.ticker, static_cast<float>(plan.price), plan.volatility, tickers.size() + 1});
+    return tickers;
 }

@@ -1,10 +1,12 @@
+#include "foundation/AtomicFile.h"
+#include "foundation/InputFile.h"
 #include "market/Catalogue.h"
 #include "portfolio/Wallet.h"
-#include "foundation/AtomicFile.h"
 #include "tools/DateText.h"
 #include "tools/Program.h"
 #include "tools/SampleMarket.h"
 #include "tools/SamplePortfolio.h"
+#include "tools/SampleQuotes.h"
 
 #include <filesystem>
 #include <iostream>
@@ -17,12 +19,19 @@ const char* const kPurpose = "Writes a made-up market file and portfolio into a 
                              "PortoFolios/Sample. A file that is there is left as it is.\n"
                              "Example: pelorin-sample ~/Documents/Pelorin";
 
-const char* const kOutput = "The same date gives the same files. Companies and prices are invented.\n\n"
-                            "Exit status: 0, 1 when a file cannot be written, 2 for bad arguments.";
+const char* const kOutput =
+    R"(The same date gives the same files. Companies and prices are invented.
+
+With --quotes there are also tables to serve with pelorin-quotes: of the companies in Companies/Sample that the sample
+has invented, the quotes of the last 100 days in it, and prices for the days since and for the last one, which are news
+to that file. Tables that are there are renewed.
+
+Exit status: 0, 1 when a file cannot be read or written, 2 for bad arguments.)";
 
 struct Arguments {
     std::string folder;
     std::string date;
+    std::string quotes;
     bool quiet = false;
 };
 
@@ -35,6 +44,9 @@ void describe(CLI::App& app, Arguments& arguments)
     app.add_option("--date", arguments.date, "Day up to which there are quotes and rates; without it today")
         ->type_name("DD/MM/YYYY")
         ->check(checkDateArgument);
+    app.add_option("--quotes", arguments.quotes, "Folder of tables TICKER.csv to write; made when it is missing")
+        ->type_name("FOLDER")
+        ->check(checkNotEmpty);
     app.add_flag("--quiet", arguments.quiet, "Do not tell what was written");
 }
 
@@ -62,6 +74,16 @@ std::string writeSample(const std::filesystem::path& folder, const Object& objec
     return path + ": written";
 }
 
+/// Goes by the market file that is there, which may be older than `last`, and changed by its owner.
+void writeQuotes(const std::string& folder, const std::string& marketFile, const Date& last)
+{
+    const InputFile file(marketFile);
+    Catalogue catalogue;
+    if (catalogue.rd(file.stream()) != 0)
+        throw std::runtime_error(marketFile + ": cannot be read as a market file");
+    writeSampleQuotes(folder, catalogue, last);
+}
+
 void run(const Arguments& arguments)
 {
     const Date last = dateArgument(arguments.date);
@@ -76,6 +98,11 @@ void run(const Arguments& arguments)
     const std::string portfolio = writeSample(folder / "PortoFolios", wallet, last);
     if (!arguments.quiet)
         std::cout << market << '\n' << portfolio << '\n';
+    if (arguments.quotes.empty())
+        return;
+    writeQuotes(arguments.quotes, folder / "Companies" / "Sample", last);
+    if (!arguments.quiet)
+        std::cout << arguments.quotes << ": quotes up to " << last.toString().bytes() << " written\n";
 }
 
 } // namespace

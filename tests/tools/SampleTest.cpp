@@ -1,5 +1,7 @@
+#include "net/QuoteHistory.h"
 #include "tests/support/SmallPortfolio.h"
 #include "tests/support/ToolRun.h"
+#include "tools/QuoteFolder.h"
 #include "tools/SampleMarket.h"
 #include "tools/SamplePortfolio.h"
 #include "tools/Valuation.h"
@@ -69,6 +71,45 @@ TEST_F(SampleTest, FilesThatAreThereAreLeftAlone)
     EXPECT_EQ(make("a").status, 0);
     EXPECT_TRUE(fs::is_symlink(file("a/Companies/Sample")));
     EXPECT_FALSE(fs::exists(file("a/Companies/nowhere")));
+}
+
+TEST_F(SampleTest, TablesOfQuotesGoOnWhereTheMarketFileEnds)
+{
+    make("a --date 16/07/2025 --quotes q");
+    EXPECT_THAT(make("a --date 20/07/2025 --quotes q").out, HasSubstr("q: quotes up to 20/07/2025 written\n"));
+    std::ostringstream log;
+    const QuoteFolder served(file("q"), log);
+    const Valuation valuation(file("a/Companies/Sample"), file("a/PortoFolios/Sample"));
+    unsigned tables = 0;
+    for (const Market* market : valuation.catalogue().getMarkets())
+        for (const Company* company : all(*market, &Market::getAllCompanies)) {
+            const std::string ticker(company->getAbbreviation().bytes());
+            const std::string page = served.answer("GET /idc/nasdgraph.idc?usymbol=" + ticker + "&umos=03&site=nasdaq");
+            std::vector<DatedPrice> rows;
+            ASSERT_EQ(parseHistoryPage(page, &rows), 0) << ticker << log.str();
+            float former = rows[0].price;
+            for (const auto& [day, price] : rows) {
+                if (day <= Date(16, 7, 2025)) {
+                    EXPECT_EQ(price, company->getRealQuote(day)) << ticker;
+                }
+                EXPECT_NEAR(price / former, 1, 0.25) << ticker;
+                former = price;
+            }
+            // Thursday and Friday, and the Sunday itself.
+            ASSERT_GT(rows.size(), 60U);
+            EXPECT_EQ(rows.end()[-4].date, Date(16, 7, 2025));
+            EXPECT_EQ(rows.end()[-2].date, kFriday);
+            EXPECT_EQ(rows.end()[-1].date, kLast);
+            EXPECT_NE(rows.end()[-1].price, rows.end()[-2].price) << ticker << ": there is news";
+            ++tables;
+        }
+    EXPECT_EQ(tables, 20U);
+    const std::string table = contentOf(file("q/QLLN.csv"));
+    make("a --date 20/07/2025 --quotes q2");
+    EXPECT_EQ(contentOf(file("q2/QLLN.csv")), table);
+    std::ofstream(file("a/Companies/Sample")) << "mine";
+    EXPECT_EQ(make("a --quotes q").err, "pelorin-sample: a/Companies/Sample: cannot be read as a market file\n");
+    EXPECT_EQ(contentOf(file("q/QLLN.csv")), table);
 }
 
 TEST_F(SampleTest, FailureIsOneLine)
