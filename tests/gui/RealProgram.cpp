@@ -81,15 +81,17 @@ void RealProgram::startServer()
     int ends[2];
     if (pipe(ends) != 0)
         throw std::runtime_error("no pipe");
+    // Servers that look for a free number at the same time take each other's socket away.
+    const std::string own = ":" + std::to_string(100 + getpid() % 50000);
     server_ = fork();
     if (server_ == 0) {
         const std::string end = std::to_string(ends[1]);
-        execlp("Xvfb", "Xvfb", "-displayfd", end.c_str(), "-screen", "0", "1000x900x24", "-nolisten", "tcp",
-               static_cast<char*>(nullptr));
+        execlp("Xvfb", "Xvfb", own.c_str(), "-displayfd", end.c_str(), "-screen", "0", "1000x900x24", "-nolisten",
+               "tcp", static_cast<char*>(nullptr));
         _exit(127);
     }
     close(ends[1]);
-    // The server takes a free number and tells which.
+    // It tells its number when it is ready.
     char number[16] = {};
     const auto length = read(ends[0], number, sizeof number - 1);
     close(ends[0]);
@@ -189,6 +191,31 @@ std::string RealProgram::textOtherThan(const std::string& other, QPoint place)
     std::string text;
     await("a text other than '" + other + "'", [&] { return (text = textAt(place)) != other; });
     return text;
+}
+
+std::string RealProgram::picture(QRect part) const
+{
+    Display* display = XOpenDisplay(display_.c_str());
+    if (display == nullptr)
+        throw std::runtime_error("no connection to " + display_);
+    const QRect place = part.translated(kWindowPlace);
+    XImage* image =
+        XGetImage(display, DefaultRootWindow(display), place.x(), place.y(), static_cast<unsigned>(place.width()),
+                  static_cast<unsigned>(place.height()), AllPlanes, ZPixmap);
+    std::string pixels;
+    if (image != nullptr) {
+        pixels.assign(image->data, static_cast<std::size_t>(image->bytes_per_line * image->height));
+        image->f.destroy_image(image);
+    }
+    XCloseDisplay(display);
+    return pixels;
+}
+
+std::string RealProgram::pictureOtherThan(const std::string& former, QRect part) const
+{
+    std::string pixels;
+    await("another picture", [&] { return (pixels = picture(part)) != former; });
+    return pixels;
 }
 
 int RealProgram::quit()

@@ -4,10 +4,10 @@
 #include "net/QuoteHistory.h"
 #include "net/QuoteServers.h"
 #include "net/Socket.h"
+#include "tests/support/ServerRun.h"
 #include "tests/support/ToolRun.h"
 #include "tools/QuoteFolder.h"
 
-#include <csignal>
 #include <gmock/gmock.h>
 #include <sys/stat.h>
 
@@ -17,51 +17,6 @@ using testing::StartsWith;
 namespace {
 
 namespace fs = std::filesystem;
-
-/// A running pelorin-quotes, at a port that the system has chosen.
-class ServerRun {
-public:
-    explicit ServerRun(const fs::path& folder)
-    {
-        int ends[2];
-        EXPECT_EQ(pipe(ends), 0);
-        pid_ = fork();
-        if (pid_ == 0) {
-            dup2(ends[1], STDOUT_FILENO);
-            close(ends[0]);
-            execl(PELORIN_QUOTES, PELORIN_QUOTES, folder.c_str(), "--port", "0", nullptr);
-            _exit(127);
-        }
-        close(ends[1]);
-        for (char c; read(ends[0], &c, 1) == 1 && c != '\n';)
-            address_ += c;
-        close(ends[0]);
-    }
-    ~ServerRun() { stop(SIGKILL); }
-    ServerRun(const ServerRun&) = delete;
-    ServerRun& operator=(const ServerRun&) = delete;
-
-    const std::string& address() const { return address_; }
-    unsigned short port() const
-    {
-        return static_cast<unsigned short>(std::stoi("0" + address_.substr(address_.find(':') + 1)));
-    }
-    /// @return the exit status; -1 when it did not exit by itself.
-    int stop(int signal)
-    {
-        int status = -1;
-        if (pid_ > 0) {
-            kill(pid_, signal);
-            waitpid(pid_, &status, 0);
-        }
-        pid_ = 0;
-        return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    }
-
-private:
-    pid_t pid_;
-    std::string address_;
-};
 
 class QuotesTest : public testing::Test {
 protected:
@@ -123,7 +78,7 @@ TEST_F(QuotesTest, TheProgramServesWhatTheFetchesRead)
     }
     file("BRK.B.csv", table);
     file("^X&Y.csv", "2005-01-04,8.25\r\n2005-01-03,7.75\r\n");
-    ServerRun server(folder_.path);
+    ServerRun server(PELORIN_QUOTES, folder_.path);
     EXPECT_THAT(server.address(), StartsWith("127.0.0.1:"));
     EXPECT_EQ(latest(server, "^X&Y"), 8.25F) << "of the last day, not of the last line";
     EXPECT_EQ(latest(server, "BRK.B"), closes.rbegin()->second);
@@ -169,7 +124,7 @@ TEST_F(QuotesTest, OtherRequestsGetAPageWithoutAPrice)
 TEST_F(QuotesTest, ASilentClientHoldsTheServerForSecondsOnly)
 {
     file("A.csv", "2005-01-03,97.75\n");
-    ServerRun server(folder_.path);
+    ServerRun server(PELORIN_QUOTES, folder_.path);
     Socket silent, another;
     {
         Socket hangsUp;
@@ -187,7 +142,7 @@ TEST_F(QuotesTest, ASilentClientHoldsTheServerForSecondsOnly)
 
 TEST_F(QuotesTest, WhatCannotBeServedIsTold)
 {
-    const ServerRun server(folder_.path);
+    const ServerRun server(PELORIN_QUOTES, folder_.path);
     const std::string taken = ". --port " + std::to_string(server.port());
     const struct {
         std::string arguments;
