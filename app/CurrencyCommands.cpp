@@ -124,7 +124,7 @@ void PLWindow::CurrencySelection()
     currencyView_->setCurrencyRepresentation(currency->getRepresentation());
     const Date last = currency->getLastQuote();
     const float trend = currency->getPrevisionQuote(last);
-    // On the company page, until a company is selected there. Intended, as is that the chart is not drawn here: it
+    // On the company page, until that is refreshed. Intended, as is that the chart is not drawn here: it
     // shows the rates of the currency that is named in it until a rate is selected.
     companyView_->setRelativeDailyChange(currency->getPente() / trend);
     companyView_->setDiffWithAverage((currency->getRealQuote(last) - trend) / trend);

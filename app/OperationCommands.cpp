@@ -56,8 +56,10 @@ void PLWindow::showMadeOperation(Operation* made, Operation* former)
             destroyOperation(former);
         UpdateState();
     }
-    if (stays)
-        operationView_->ShowOperation(made);
+    if (!stays)
+        return;
+    operationView_->ShowOperation(made);
+    UpdateOperationTotal();
 }
 
 void PLWindow::destroyOperation(Operation* operation)
@@ -94,7 +96,7 @@ Operation* PLWindow::makeTransfer(const Date& date, Account* from)
     const String name = operationView_->getTransferAccount();
     Account* to = name.isUndefined() ? nullptr : wallet_->getAccountByName(name);
     if (to == nullptr)
-        return nullptr; // Intended: without a message.
+        return nullptr; // without a message: the menu shows that nothing is chosen
     auto* transfer =
         new TransferAccountOperation(date, from, to, operationView_->getAmount(), operationView_->getAutomatic());
     transfer->setCost(operationView_->getTransferCost());
@@ -122,7 +124,8 @@ Operation* PLWindow::makeTrade(const Date& date, Account* account, bool isBuy)
         share = new Share(wallet_.get(), company); // the wallet owns it
     const int quantity = operationView_->getQuantity();
     if (quantity <= 0) {
-        SetMessage("Quantity must be higher than 0."); // Intended: the new holding stays.
+        SetMessage("Quantity must be higher than 0."); // The new holding stays; it is empty and is found again when the
+                                                       // quantity is mended.
         return nullptr;
     }
     auto* trade = new ShareOperation(date, share, isBuy, quantity, operationView_->getQuote(),

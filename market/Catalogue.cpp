@@ -87,7 +87,7 @@ void Catalogue::removeCurrency(Currency* currency)
     }
     // Nobody may be left with a pointer to what its new owner may destroy.
     for (Currency* other : currencies_) {
-        Currency* stored;
+        Currency* stored = nullptr;
         other->getReferenceCurrency(&stored);
         if (stored == currency)
             other->setReferenceCurrency(reference_);

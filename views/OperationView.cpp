@@ -251,6 +251,8 @@ void OperationView::UpdateShareOperation(ShareOperation* operation)
 
 void OperationView::ShowOperation(const Operation* operation)
 {
+    if (operations_->indexOf(operation) < 0)
+        return; // while the page has no date to value at, the list is not filled
     operations_->SetQuiet(true);
     operations_->select(operation);
     operations_->SetQuiet(false);
