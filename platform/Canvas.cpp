@@ -49,14 +49,6 @@ const QPixmap& Canvas::picture(bool* fresh)
     return picture_;
 }
 
-void Canvas::setUp(QPainter& painter) const
-{
-    painter.setFont(font.toQt());
-    painter.setClipping(false);
-    if (clipping.IsValid())
-        painter.setClipRect(toQt(clipping));
-}
-
 void Canvas::paint(const std::function<void(QPainter&)>& draw)
 {
     if (painter_ != nullptr) {
@@ -65,7 +57,6 @@ void Canvas::paint(const std::function<void(QPainter&)>& draw)
     }
     fit();
     QPainter painter(&picture_);
-    setUp(painter);
     draw(painter);
     painter.end();
     widget_.update();
@@ -75,7 +66,6 @@ void Canvas::drawAll(const std::function<void()>& draw)
 {
     fit();
     stale_ = false;
-    clipping = BRect();
     if (view != B_TRANSPARENT_COLOR)
         picture_.fill(toQt(view));
     else

@@ -28,7 +28,6 @@ public:
     float penSize = 1;
     drawing_mode mode = B_OP_COPY;
     BFont font;
-    BRect clipping; // not valid: none
 
     explicit Canvas(QWidget& widget) : widget_(widget) {}
 
@@ -49,7 +48,6 @@ public:
 
 private:
     void fit();
-    void setUp(QPainter& painter) const;
 
     QWidget& widget_;
     QPixmap picture_;

@@ -29,7 +29,6 @@ public:
     BFilePanel(const BFilePanel&) = delete;
     BFilePanel& operator=(const BFilePanel&) = delete;
 
-    file_panel_mode PanelMode() const { return mode_; }
     void SetPanelDirectory(const char* path);
     const std::string& PanelDirectory() const { return directory_; }
     void Show();

@@ -64,7 +64,6 @@ public:
 
     /// Owns `message`; null sends none.
     void SetSelectionMessage(BMessage* message) { selectionMessage_.reset(message); }
-    BMessage* SelectionMessage() const { return selectionMessage_.get(); }
     /// As long as `quiet` is set, changes of the selection send nothing.
     void SetQuiet(bool quiet) { quiet_ = quiet; }
     /// Hook: the selection has changed.

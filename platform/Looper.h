@@ -21,7 +21,6 @@ public:
 
     bool Lock();
     void Unlock();
-    bool IsLocked() const { return locks_ > 0; }
 
     /// Asked before the looper ends; false refuses.
     virtual bool QuitRequested() { return true; }

@@ -70,12 +70,6 @@ int32 BMenu::IndexOf(const BMenuItem* item) const
     return found != items_.end() ? static_cast<int32>(found - items_.begin()) : -1;
 }
 
-void BMenu::SetTargetForItems(const BHandler* target)
-{
-    for (const auto& item : items_)
-        item->SetTarget(target);
-}
-
 void BMenu::mark(BMenuItem* item, bool marked)
 {
     for (const auto& other : items_) {

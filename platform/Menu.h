@@ -32,8 +32,6 @@ public:
     BMenuItem* FindItem(const char* label) const;
     BMenuItem* FindMarked() const;
     int32 IndexOf(const BMenuItem* item) const;
-    /// All items present send to `target`.
-    void SetTargetForItems(const BHandler* target);
 
     /// For the platform's own use: told of every change, so that what shows the menu can follow.
     void setObserver(std::function<void()> observer) { observer_ = std::move(observer); }

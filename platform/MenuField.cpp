@@ -85,11 +85,6 @@ void BMenuField::SetAlignment(alignment label)
                                                    : Qt::AlignCenter);
 }
 
-void BMenuField::SetEnabled(bool enabled)
-{
-    widget()->setEnabled(enabled);
-}
-
 void BMenuField::AttachedToWindow()
 {
     for (int32 i = 0; i < menu_->CountItems(); ++i) {

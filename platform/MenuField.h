@@ -22,7 +22,6 @@ public:
     /// Where the menu begins, in pixels from the left.
     void SetDivider(float x);
     void SetAlignment(alignment label);
-    void SetEnabled(bool enabled);
     /// Items that have no target send to the window.
     void AttachedToWindow() override;
     void FrameResized(float width, float height) override;

@@ -46,15 +46,6 @@ status_t BMessage::FindString(const char* name, int32 index, const char** value)
     return status;
 }
 
-status_t BMessage::FindPointer(const char* name, void** value) const
-{
-    void* const* held = nullptr;
-    const status_t status = find(name, 0, &held);
-    if (status == B_OK)
-        *value = *held;
-    return status;
-}
-
 status_t BMessage::FindRef(const char* name, int32 index, entry_ref* ref) const
 {
     const Place* held = nullptr;

@@ -28,8 +28,6 @@ public:
 
     status_t AddInt32(const char* name, int32 value) { return add(name, value); }
     status_t AddString(const char* name, const char* value) { return add(name, std::string(value)); }
-    /// The pointer is only carried, never followed.
-    status_t AddPointer(const char* name, void* value) { return add(name, value); }
     status_t AddRef(const char* name, const entry_ref* ref);
 
     status_t FindInt32(const char* name, int32* value) const { return FindInt32(name, 0, value); }
@@ -37,7 +35,6 @@ public:
     /// The text belongs to the message.
     status_t FindString(const char* name, const char** value) const { return FindString(name, 0, value); }
     status_t FindString(const char* name, int32 index, const char** value) const;
-    status_t FindPointer(const char* name, void** value) const;
     status_t FindRef(const char* name, entry_ref* ref) const { return FindRef(name, 0, ref); }
     status_t FindRef(const char* name, int32 index, entry_ref* ref) const;
 
@@ -46,7 +43,7 @@ private:
         std::string directory;
         std::string name;
     };
-    using Value = std::variant<int32, std::string, void*, Place>;
+    using Value = std::variant<int32, std::string, Place>;
 
     status_t add(const char* name, Value value);
     template <class T>

@@ -21,7 +21,6 @@ public:
     void SetText(const char* text);
     /// Where the field begins, in pixels from the left; 0 leaves no room for the label.
     void SetDivider(float x);
-    float Divider() const { return divider_; }
     void SetAlignment(alignment label, alignment text);
     void SetLabel(const char* label) override;
     void SetEditable(bool editable);

@@ -102,8 +102,6 @@ void BView::setWindow(BWindow* window)
         AttachedToWindow();
     for (BView* child : children_)
         child->setWindow(window);
-    if (window != nullptr)
-        AllAttached();
 }
 
 // --- Place and size.
@@ -300,17 +298,6 @@ void BView::GetFont(BFont* font) const
 float BView::StringWidth(const char* text) const
 {
     return canvas_->font.StringWidth(text);
-}
-
-void BView::SetClipping(BRect area)
-{
-    canvas_->clipping = area;
-    canvas_->paint([&](QPainter& painter) {
-        if (area.IsValid())
-            painter.setClipRect(toQt(area));
-        else
-            painter.setClipping(false);
-    });
 }
 
 void BView::FillRect(BRect rect, pattern p)

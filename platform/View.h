@@ -37,7 +37,6 @@ public:
     /// @return null out of range.
     BView* ChildAt(int32 index) const;
     int32 CountChildren() const { return static_cast<int32>(children_.size()); }
-    BView* Parent() const { return parent_; }
     /// The window the view stands in, null while it stands in none.
     BWindow* Window() const { return window_; }
     BLooper* Looper() const override;
@@ -65,7 +64,6 @@ public:
 
     // Hooks.
     virtual void AttachedToWindow() {}
-    virtual void AllAttached() {}
     virtual void Draw(BRect updateRect);
     virtual void FrameResized(float width, float height);
     virtual void MouseDown(BPoint where);
@@ -89,8 +87,6 @@ public:
     void SetFontSize(float size);
     void GetFont(BFont* font) const;
     float StringWidth(const char* text) const;
-    /// Nothing is drawn outside `area` until the next call; an invalid rectangle lifts the limit.
-    void SetClipping(BRect area);
 
     // Drawing. Upright and level lines are sharp, others smooth.
     void FillRect(BRect rect, pattern p = B_SOLID_HIGH);

@@ -29,17 +29,6 @@ public:
     }
 };
 
-BView* viewOf(BView* view, const QWidget* widget)
-{
-    if (view->widget() == widget)
-        return view;
-    for (int32 i = 0; i < view->CountChildren(); ++i) {
-        if (BView* found = viewOf(view->ChildAt(i), widget))
-            return found;
-    }
-    return nullptr;
-}
-
 } // namespace
 
 BWindow::BWindow(BRect frame, const char* title, window_type, uint32 flags, uint32)
@@ -72,16 +61,6 @@ void BWindow::AddChild(BView* view)
 BView* BWindow::FindView(const char* name) const
 {
     return root_->FindView(name);
-}
-
-BView* BWindow::CurrentFocus() const
-{
-    // A native control may have the keyboard in a part of its own.
-    for (const QWidget* widget = widget_->focusWidget(); widget != nullptr; widget = widget->parentWidget()) {
-        if (BView* view = viewOf(root_.get(), widget))
-            return view != root_.get() ? view : nullptr;
-    }
-    return nullptr;
 }
 
 void BWindow::Show()

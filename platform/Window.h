@@ -34,8 +34,6 @@ public:
     /// Takes ownership of `view`.
     void AddChild(BView* view);
     BView* FindView(const char* name) const;
-    /// The view that has the keyboard, null when none has.
-    BView* CurrentFocus() const;
 
     void Show();
     void Hide();
