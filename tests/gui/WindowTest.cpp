@@ -25,7 +25,6 @@
 #include <QPlainTextEdit>
 #include <QTabBar>
 #include <QTest>
-#include <clocale>
 #include <gmock/gmock.h>
 
 namespace {
@@ -70,11 +69,6 @@ TEST_F(MainWindowTest, EveryControlHasANameForTestsAndForAssistiveTools)
             EXPECT_NE(widget->focusPolicy() & Qt::TabFocus, 0) << name;
         }
     }
-}
-
-TEST_F(MainWindowTest, NumbersHaveAPointWhateverTheDesktopWrites)
-{
-    EXPECT_EQ(std::localeconv()->decimal_point, std::string("."));
 }
 
 TEST_F(MainWindowTest, KeysWalkThroughTheTabs)
