@@ -1,21 +1,22 @@
-// Shows every page of the window, with a sample loaded through the same commands that a person gives, and writes a
-// picture of each.
+// Makes the pictures of the documents: those of the guide, and every page of the window with a sample in it.
 
+#include "app/GuideTour.h"
 #include "app/PLWindow.h"
+#include "app/TourHand.h"
 #include "platform/Application.h"
-#include "platform/CheckBox.h"
 #include "platform/DialogAnswers.h"
 #include "platform/FilePanel.h"
-#include "platform/ListView.h"
-#include "platform/Message.h"
 #include "platform/Screenshot.h"
-#include "platform/TabView.h"
 
+#include <functional>
 #include <iostream>
+#include <stdexcept>
 #include <string>
 #include <vector>
 
 namespace {
+
+const BRect kWindow(0, 0, 800, 800);
 
 /// The files of the tour are `Sample` in both folders.
 void answerFor(const DataFolder& folder)
@@ -28,35 +29,18 @@ void answerFor(const DataFolder& folder)
     };
 }
 
-void send(PLWindow& window, uint32 code)
-{
-    window.PostMessage(code);
-    handle_pending_messages();
-}
-
-/// Selects a row of a list of the page, as a click does.
-void select(BTabView& tabs, const char* list, int32 row)
-{
-    auto* rows = dynamic_cast<BListView*>(tabs.TabAt(tabs.Selection())->View()->FindView(list));
-    if (rows != nullptr)
-        rows->Select(row);
-    handle_pending_messages();
-}
-
 struct Stop {
-    int32 tab;
+    int32 page;
     const char* picture;
     std::vector<std::pair<const char*, int32>> selections; // list and row
 };
 
-int tour(PLWindow& window, const std::string& pictures)
+void tourPages(TourHand& hand)
 {
-    auto& tabs = dynamic_cast<BTabView&>(*window.FindView("TabView"));
-    send(window, 'CBLd');
-    tabs.Select(2);
-    send(window, 'WBLd');
-    dynamic_cast<BCheckBox&>(*window.FindView("cbxComputeEvolution")).SetValue(B_CONTROL_ON);
-    send(window, 'WCCe');
+    hand.press("btnLoadMarket");
+    hand.turnTo(2);
+    hand.press("btnLoadPortoFolio");
+    hand.tick("cbxComputeEvolution", true);
     const Stop stops[] = {
         {0, "company", {{"lstMarkets", 0}, {"lstCompanies", 0}}},
         {1, "currency", {{"lstCurrencies", 1}}},
@@ -65,18 +49,22 @@ int tour(PLWindow& window, const std::string& pictures)
         {4, "parameters", {}},
     };
     for (const auto& stop : stops) {
-        tabs.Select(stop.tab);
+        hand.turnTo(stop.page);
         for (const auto& [list, row] : stop.selections)
-            select(tabs, list, row);
-        const std::string path = pictures + '/' + stop.picture + ".png";
-        handle_pending_messages();
-        if (save_screenshot(window, path.c_str()) != B_OK) {
-            std::cerr << path << ": cannot be written\n";
-            return 1;
-        }
-        std::cout << path << '\n';
+            hand.select(list, row);
+        hand.picture(stop.picture, kWindow);
     }
-    return 0;
+}
+
+/// Lets `tour` have a new window for itself.
+void inNewWindow(const DataFolder& folder, const std::string& pictures, const std::function<void(TourHand&)>& tour)
+{
+    auto* window = new PLWindow({50, 50, 850, 850}, folder); // the application closes it
+    window->Show();
+    handle_pending_messages();
+    TourHand hand(*window, pictures);
+    tour(hand);
+    window->Hide();
 }
 
 } // namespace
@@ -93,8 +81,12 @@ int main(int argc, char** argv)
         return 0;
     const DataFolder folder(argv[1]);
     answerFor(folder);
-    auto* window = new PLWindow({50, 50, 850, 850}, folder); // the application closes it
-    window->Show();
-    handle_pending_messages();
-    return tour(*window, argv[2]);
+    try {
+        inNewWindow(folder, argv[2], tourGuide);
+        inNewWindow(folder, argv[2], tourPages);
+    } catch (const std::runtime_error& error) {
+        std::cerr << "pelorin-tour: " << error.what() << '\n';
+        return 1;
+    }
+    return 0;
 }

@@ -7,10 +7,13 @@
 #include <QPixmap>
 #include <QScreen>
 
-status_t save_screenshot(const BWindow& window, const char* path)
+status_t save_screenshot(const BWindow& window, BRect part, const char* path)
 {
     WindowWidget& shown = window.widget();
-    return shown.screen()->grabWindow(shown.winId()).save(QString::fromUtf8(path), "PNG") ? B_OK : B_ERROR;
+    const QRect place = QRectF(part.left, part.top, part.Width(), part.Height()).toRect();
+    const QPixmap picture =
+        shown.screen()->grabWindow(shown.winId(), place.x(), place.y(), place.width(), place.height());
+    return picture.save(QString::fromUtf8(path), "PNG") ? B_OK : B_ERROR;
 }
 
 void handle_pending_messages()

@@ -1,10 +1,12 @@
 #pragma once
 
+#include "platform/Rect.h"
 #include "platform/SupportDefs.h"
 
 class BWindow;
 
-/// Writes what the window shows as a PNG, at the resolution of its screen.
-status_t save_screenshot(const BWindow& window, const char* path);
+/// Writes what the window shows within `part`, which is in its own coordinates, as a PNG at the resolution of its
+/// screen.
+status_t save_screenshot(const BWindow& window, BRect part, const char* path);
 /// Handles what waits in the queues, until nothing does.
 void handle_pending_messages();

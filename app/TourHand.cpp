@@ -1,0 +1,93 @@
+#include "app/TourHand.h"
+
+#include "platform/Button.h"
+#include "platform/CheckBox.h"
+#include "platform/ListView.h"
+#include "platform/Menu.h"
+#include "platform/MenuField.h"
+#include "platform/MenuItem.h"
+#include "platform/Screenshot.h"
+#include "platform/TabView.h"
+#include "platform/TextControl.h"
+#include "platform/Window.h"
+
+#include <iostream>
+#include <stdexcept>
+
+namespace {
+
+BTabView& tabsOf(const BWindow& window)
+{
+    return dynamic_cast<BTabView&>(*window.FindView("TabView"));
+}
+
+} // namespace
+
+template <class View>
+View& TourHand::find(const char* name)
+{
+    const BTabView& tabs = tabsOf(window_);
+    auto* view = dynamic_cast<View*>(tabs.TabAt(tabs.Selection())->View()->FindView(name));
+    if (view == nullptr)
+        throw std::runtime_error(std::string(name) + ": is not on the page");
+    return *view;
+}
+
+void TourHand::turnTo(int32 page)
+{
+    tabsOf(window_).Select(page);
+    handle_pending_messages();
+}
+
+void TourHand::type(const std::vector<std::pair<const char*, const char*>>& fields)
+{
+    for (const auto& [name, text] : fields) {
+        auto& field = find<BTextControl>(name);
+        field.SetText(text);
+        field.TextModified();
+        field.Invoke();
+    }
+    handle_pending_messages();
+}
+
+void TourHand::press(const char* button)
+{
+    find<BButton>(button).Invoke();
+    handle_pending_messages();
+}
+
+void TourHand::tick(const char* box, bool on)
+{
+    auto& shown = find<BCheckBox>(box);
+    shown.SetValue(on ? B_CONTROL_ON : B_CONTROL_OFF);
+    shown.Invoke();
+    handle_pending_messages();
+}
+
+void TourHand::choose(const char* menu, const char* item)
+{
+    BMenuItem* chosen = find<BMenuField>(menu).Menu()->FindItem(item);
+    if (chosen == nullptr)
+        throw std::runtime_error(std::string(item) + ": is not in the menu " + menu);
+    chosen->SetMarked(true);
+    chosen->Invoke();
+    handle_pending_messages();
+}
+
+void TourHand::select(const char* list, int32 first, int32 last)
+{
+    auto& rows = find<BListView>(list);
+    if (rows.CountItems() <= last)
+        throw std::runtime_error(std::string(list) + ": has no row " + std::to_string(last));
+    rows.Select(first, last, false);
+    handle_pending_messages();
+}
+
+void TourHand::picture(const char* name, BRect part)
+{
+    handle_pending_messages();
+    const std::string path = pictures_ + '/' + name + ".png";
+    if (save_screenshot(window_, part, path.c_str()) != B_OK)
+        throw std::runtime_error(path + ": cannot be written");
+    std::cout << path << '\n';
+}

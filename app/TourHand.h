@@ -1,0 +1,43 @@
+#pragma once
+
+#include "platform/Rect.h"
+#include "platform/SupportDefs.h"
+
+#include <string>
+#include <utility>
+#include <vector>
+
+class BView;
+class BWindow;
+
+/// Works the window by the names of its controls, as a person does by mouse and keyboard, and takes pictures of it.
+///
+/// A name is looked for on the page that is shown. What is asked for and is not there throws std::runtime_error with
+/// one line that names it.
+class TourHand {
+public:
+    /// The pictures go into the folder `pictures`, which is there.
+    TourHand(BWindow& window, std::string pictures) : window_(window), pictures_(std::move(pictures)) {}
+
+    /// Shows a page, counted from the left.
+    void turnTo(int32 page);
+    /// Types into fields and leaves them.
+    void type(const std::vector<std::pair<const char*, const char*>>& fields);
+    void press(const char* button);
+    /// Sets a check box.
+    void tick(const char* box, bool on);
+    /// Chooses the item of that label in a menu.
+    void choose(const char* menu, const char* item);
+    /// Selects the rows of a list from `first` to `last`.
+    void select(const char* list, int32 first, int32 last);
+    void select(const char* list, int32 row) { select(list, row, row); }
+    /// Writes what the window shows within `part` as NAME.png, and tells the path on standard output.
+    void picture(const char* name, BRect part);
+
+private:
+    template <class View>
+    View& find(const char* name);
+
+    BWindow& window_;
+    std::string pictures_;
+};
