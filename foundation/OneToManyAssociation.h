@@ -104,12 +104,12 @@ public:
         return count_ > 0 ? elements_ : nullptr; // a refused addition leaves room behind
     }
     unsigned getNbr() const { return count_; }
-    /// `*index` becomes the element's place. @return 0; -1 when it is not here.
+    /// `*index` becomes the element's place as the list stands: only `getAt` and `getAll` put a sorted one in order.
+    /// @return 0; -1 when it is not here.
     int getElement(Element* e, unsigned* index) const
     {
         if (e == nullptr || !contains(e))
             return -1;
-        sortWhenDirty();
         *index = placeOf(e);
         return 0;
     }
@@ -144,12 +144,6 @@ public:
 
     /// Makes room for `count` elements at once; only a saving, never needed.
     void reserve(std::uint32_t count)
-    {
-        if (count > capacity_)
-            setCapacity(std::max(count, capacity_ + capacity_ / 2 + 2));
-    }
-    /// Makes room for exactly `count` elements when there is less.
-    void reserveExactly(std::uint32_t count)
     {
         if (count > capacity_)
             setCapacity(count);
@@ -190,7 +184,8 @@ private:
 
     void append(Element* e)
     {
-        reserve(count_ + 1);
+        if (count_ == capacity_)
+            setCapacity(capacity_ + capacity_ / 2 + 2);
         if (!dirty_ && isSorted() && count_ > 0 && compare_(&elements_[count_ - 1], &e) > 0)
             dirty_ = true;
         elements_[count_++] = e;

@@ -242,7 +242,7 @@ int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
     while (missing > 0 && !reachedEnd(file)) {
         const unsigned wanted = std::min(missing, kQuotesInBlock);
         const auto whole = static_cast<unsigned>(std::fread(block, SeriesQuote::kFileSize, wanted, file));
-        quotes_.reserveExactly(quotes_.getNbr() + whole);
+        quotes_.reserve(quotes_.getNbr() + whole);
         for (unsigned i = 0; i < whole; ++i) {
             auto* q = new SeriesQuote;
             q->decode(block + i * SeriesQuote::kFileSize);

@@ -42,7 +42,7 @@ public:
     ShareState** getAllShareStates(unsigned* n) const { return states_.getAll(n); }
     ShareState* getShareState(unsigned i) const { return states_.at(i); }
     /// Makes room for as many states; only a saving.
-    void reserveShareStates(unsigned n) { states_.reserveExactly(n); }
+    void reserveShareStates(unsigned n) { states_.reserve(n); }
 
     /// Names of the company and its market; Strings without text where the link is missing.
     String getMarketName() const;

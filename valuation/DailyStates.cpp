@@ -153,7 +153,7 @@ void DailyStates::buildDay(std::size_t day)
     state->setTotalDeposit(deposits_.balance());
     for (std::size_t i = 0; i < accounts_.size(); ++i)
         new AccountState(accounts_[i], state, cash_[i].balance());
-    state->shareStates_.reserveExactly(static_cast<unsigned>(lines_.size()));
+    state->shareStates_.reserve(static_cast<unsigned>(lines_.size()));
     for (Line& line : lines_) {
         for (; line.replayed < line.operations.size() && line.operations[line.replayed].first <= day; ++line.replayed) {
             const ShareOperation& operation = *line.operations[line.replayed].second;

@@ -204,6 +204,18 @@ TEST(AssociationTest, RandomChangesFromBothEndsAgreeWithPlainLists)
     }
 }
 
+TEST(AssociationTest, OnlyAReadOfTheListPutsItInOrder)
+{
+    Box box(true);
+    Item late('b', 2), early('a', 1);
+    box.items.add(&late);
+    box.items.add(&early);
+    unsigned index = 0;
+    EXPECT_EQ(box.items.getElement(&early, &index), 0);
+    EXPECT_EQ(index, 1U) << "as it was added";
+    EXPECT_EQ(names(box), "ab");
+}
+
 TEST(AssociationTest, AdditionsInOrderDoNotMakeTheListSortAgain)
 {
     Box box(true);
