@@ -191,8 +191,8 @@ void AtomicFile::keepPermissions() const
     const int file = fileno(stream_);
     mode_t mode = former.st_mode & 0777;
     if (fchown(file, former.st_uid, former.st_gid) != 0 && fchown(file, kSameOwner, former.st_gid) != 0)
-        mode = (mode & ~static_cast<mode_t>(S_IRWXG)) | (mode & S_IRWXO)
-                                                            << 3; // another group may do what everybody may
+        // Another group may do what everybody may.
+        mode = (mode & ~static_cast<mode_t>(S_IRWXG)) | (mode & S_IRWXO) << 3;
     (void)fchmod(file, mode);
 }
 

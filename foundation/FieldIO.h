@@ -28,13 +28,6 @@ bool reachedEnd(FILE* file);
 void freadbytes(FILE* file, unsigned char* bytes, std::size_t size);
 
 /// The same fields in memory, for records that are read and written in one piece.
-std::uint16_t decodeShort(const unsigned char* bytes);
-std::uint32_t decodeInt(const unsigned char* bytes);
-float decodeFloat(const unsigned char* bytes);
-void encodeShort(unsigned char* bytes, std::uint16_t value);
-void encodeInt(unsigned char* bytes, std::uint32_t value);
-void encodeFloat(unsigned char* bytes, float value);
-
 inline std::uint16_t decodeShort(const unsigned char* bytes)
 {
     return static_cast<std::uint16_t>(bytes[0] | bytes[1] << 8);
@@ -45,6 +38,11 @@ inline std::uint32_t decodeInt(const unsigned char* bytes)
     return static_cast<std::uint32_t>(bytes[0]) | static_cast<std::uint32_t>(bytes[1]) << 8 |
            static_cast<std::uint32_t>(bytes[2]) << 16 | static_cast<std::uint32_t>(bytes[3]) << 24;
 }
+
+float decodeFloat(const unsigned char* bytes);
+void encodeShort(unsigned char* bytes, std::uint16_t value);
+void encodeInt(unsigned char* bytes, std::uint32_t value);
+void encodeFloat(unsigned char* bytes, float value);
 
 /// Receives exactly one byte from `socket` into `*c`.
 /// @return what `recv` returned: 1, 0 at the end of the stream, negative on error.

@@ -4,8 +4,8 @@
 
 /// An object that has a record in one of the data files.
 ///
-/// Both operations work at the stream's current position and return 0, or -1 on failure. A reader that meets the
-/// end of the file returns -1; fields it could not read hold the bytes 0xFF.
+/// Both operations work at the stream's current position and return 0, or -1 on failure. A reader that meets the end of
+/// the file returns -1, unless its class says otherwise; numbers it could not read hold the bytes 0xFF.
 class Serializable {
 public:
     virtual int wrt(FILE* file) const = 0;

@@ -48,7 +48,7 @@ public:
     /// What comparisons look at: the bytes before the first zero.
     std::string_view comparedBytes() const { return {text_ != nullptr ? text_ : ""}; }
 
-    /// Adds 32 to the codes 64..89. Intended: '@' becomes '`' and 'Z' stays; texts lowered before rely on it.
+    /// Adds 32 to the codes 64..89. Intended: '@' becomes '`' and 'Z' stays.
     void toLowerCase();
     /// Subtracts 32 from the codes 96..121. Intended: '`' becomes '@' and 'z' stays, the mirror of `toLowerCase`.
     void toUpperCase();
