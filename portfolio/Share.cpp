@@ -5,6 +5,10 @@
 #include "portfolio/ShareOperation.h"
 #include "portfolio/Wallet.h"
 
+#include <algorithm>
+#include <iterator>
+#include <vector>
+
 Share::Share() : operations_(this), states_(this) {}
 
 Share::Share(Wallet* wallet, Company* company) : Share()
@@ -65,9 +69,14 @@ float Share::getPrevisionQuote(const Date& date) const
 
 void Share::removeAutomaticShareOperations()
 {
-    for (unsigned i = getNbrShareOperations(); i-- > 0;)
-        if (getShareOperation(i)->isAutomatic())
-            delete getShareOperation(i);
+    // Gathered first: each removal disturbs the order, and the list is to be sorted once.
+    unsigned n;
+    ShareOperation** operations = getAllShareOperations(&n);
+    std::vector<ShareOperation*> automatic;
+    std::copy_if(operations, operations + n, std::back_inserter(automatic),
+                 [](const ShareOperation* operation) { return operation->isAutomatic(); });
+    for (ShareOperation* operation : automatic)
+        delete operation;
 }
 
 ManyToOneAssociation<Share, Company>& CompanyToShares::backLink(Share& e) const

@@ -1,6 +1,8 @@
 #include "portfolio/Share.h"
 #include "tests/support/SmallPortfolio.h"
 
+#include <ctime>
+
 TEST(ShareTest, WithoutCompanyThereAreNoNamesAndNoQuotes)
 {
     const Share share;
@@ -38,4 +40,16 @@ TEST(ShareTest, OnlyTheAutomaticOperationsCanBeRemovedAtOnce)
         share.removeAutomaticShareOperations();
         EXPECT_EQ(all(share, &Share::getAllShareOperations), manual) << pattern;
     }
+}
+
+TEST(ShareTest, RemovingTheAutomaticOperationsTakesTimeInProportionToThem)
+{
+    Share share;
+    constexpr int kMany = 40000; // sorting anew for each would take many times the limit
+    for (int day = 0; day < kMany; ++day)
+        new ShareOperation(daysAfterStart(day), &share, true, 1, 1, day % 2 == 0, 0);
+    const std::clock_t start = std::clock();
+    share.removeAutomaticShareOperations();
+    EXPECT_LT(std::clock() - start, CLOCKS_PER_SEC);
+    EXPECT_EQ(share.getNbrShareOperations(), kMany / 2U);
 }
