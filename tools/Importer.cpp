@@ -185,8 +185,8 @@ Importer::CompanyValues* Importer::placeCompany(const Table& row, const std::str
     if (currency.empty() && marketName == listed.market)
         currency = listed.currency;
     Market* market = findMarket(marketName, currency);
-    Company* company;
-    if (market->getCompany(toString(ticker), &company) != 0)
+    Company*& company = companies_[{market, ticker.c_str()}];
+    if (company == nullptr)
         company = new Company(market, toString(listed.name.empty() ? ticker : listed.name), toString(ticker));
     return &*quotes_.try_emplace(company).first;
 }
@@ -199,23 +199,22 @@ Market* Importer::findMarket(const std::string& nameOrNone, const std::string& c
     if (nameOrNone.empty() && !currency.empty() && currency != options_.currency)
         throw UnusableRow("has the currency " + shown(currency) + " but no market");
     const std::string& name = nameOrNone.empty() ? options_.market : nameOrNone;
-    for (Market* market : catalogue_.getMarkets()) {
-        if (market->getName() != toString(name))
-            continue;
-        const std::string known(market->getCurrencyRepresentation().bytes());
-        if (!currency.empty() && currency != known)
-            throw UnusableRow("has " + shown(currency) + " for the market " + shown(name) + ", which trades in " +
-                              shown(known));
+    Market*& market = markets_[name.c_str()];
+    if (market == nullptr) {
+        market = new Market(toString(name)); // owned by its currency
+        market->setCurrency(findCurrency(currency.empty() ? options_.currency : currency));
         return market;
     }
-    auto* market = new Market(toString(name)); // owned by its currency
-    market->setCurrency(findCurrency(currency.empty() ? options_.currency : currency));
+    const std::string known(market->getCurrencyRepresentation().bytes());
+    if (!currency.empty() && currency != known)
+        throw UnusableRow("has " + shown(currency) + " for the market " + shown(name) + ", which trades in " +
+                          shown(known));
     return market;
 }
 
 Currency* Importer::findCurrency(const std::string& symbol)
 {
-    Currency* currency = catalogue_.getCurrencyByRepresentation(toString(symbol));
+    Currency*& currency = currencies_[symbol.c_str()];
     if (currency == nullptr) {
         currency = new Currency(toString(symbol), toString(symbol), catalogue_.getReferenceCurrency());
         catalogue_.addCurrency(currency);

@@ -89,6 +89,12 @@ private:
 
     std::unordered_map<std::string, Listed> listing_;      // by ticker
     std::unordered_map<std::string, CompanyValues*> rows_; // by all cells that tell a row's company
+
+    // What is in the catalogue, found without a search. The keys are cut at a zero byte, as a String cuts its text.
+    std::unordered_map<std::string, Currency*> currencies_;               // by symbol
+    std::unordered_map<std::string, Market*> markets_;                    // by name
+    std::map<std::pair<const Market*, std::string>, Company*> companies_; // by market and ticker
+
     std::unordered_map<Company*, Values> quotes_;
     std::unordered_map<Currency*, Values> rates_;
 };

@@ -8,6 +8,7 @@
 #include "tools/Importer.h"
 
 #include <cstdlib>
+#include <ctime>
 #include <filesystem>
 #include <fstream>
 #include <gmock/gmock.h>
@@ -215,6 +216,20 @@ TEST_F(ImportTest, TheRowComesBeforeTheListingAndThatBeforeTheOptions)
                                          "XETRA/VOW/VOW/EUR 03/01/2005=7", "NYSE/IBM/IBM/USD 03/01/2005=3",
                                          "Wien/BMW/BMW AG/USD 03/01/2005=4", "SIX/ABB/ABB/CHF 03/01/2005=5"));
     EXPECT_EQ(importer.counts().skipped, 4U) << "XETRA in USD, CHF without a market, no ticker, SIX in EUR";
+}
+
+TEST_F(ImportTest, AMarketOfManyCompaniesIsNotSearchedForEach)
+{
+    constexpr int kMany = 30000; // a search for each would take several times the limit
+    std::string table;
+    for (int i = 0; i < kMany; ++i)
+        table += "3/1/2005,T" + std::to_string(i) + ",1\n";
+    Importer importer(options_, catalogue_, log_);
+    const std::clock_t start = std::clock();
+    importer.addQuotes(file("q.csv", table));
+    EXPECT_LT(std::clock() - start, 2 * CLOCKS_PER_SEC);
+    importer.finish();
+    EXPECT_EQ(importer.counts().companies, static_cast<std::size_t>(kMany));
 }
 
 TEST_F(ImportTest, TheProgramWritesAFileThatTheCatalogueReads)
