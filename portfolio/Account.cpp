@@ -67,7 +67,7 @@ int Account::readOperation(FILE* file)
         // Its body comes later; its turn among the operations of its day is kept, so that the next save writes the
         // same order again.
         transferTurns_.push_back(operations_.reserveTurn());
-        return reachedEnd(file) ? -1 : 0;
+        return 0;
     }
     std::unique_ptr<Operation> operation;
     if (letter == kLetters[Operation::kDeposit])

@@ -21,6 +21,16 @@ int takeCharacter(std::string_view& text, std::string_view* character)
     return isCharacter ? wcwidth(code) : -1;
 }
 
+/// Columns the text takes on a terminal; `text` is printable.
+int displayWidth(std::string_view text)
+{
+    int width = 0;
+    std::string_view character;
+    while (!text.empty())
+        width += std::max(takeCharacter(text, &character), 0);
+    return width;
+}
+
 } // namespace
 
 std::string printable(std::string_view bytes)
@@ -35,15 +45,6 @@ std::string printable(std::string_view bytes)
         result += taken >= 0 ? character : "?";
     }
     return result;
-}
-
-int displayWidth(std::string_view text)
-{
-    int width = 0;
-    std::string_view character;
-    while (!text.empty())
-        width += std::max(takeCharacter(text, &character), 0);
-    return width;
 }
 
 TextTable::TextTable(std::vector<Column> columns)

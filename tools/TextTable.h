@@ -8,9 +8,6 @@
 /// take more than 60 columns is cut with "...". Needs a UTF-8 locale for what lies outside ASCII.
 std::string printable(std::string_view bytes);
 
-/// Columns the text takes on a terminal; `text` is printable.
-int displayWidth(std::string_view text);
-
 /// A table in columns as wide as their widest cell, for a terminal.
 class TextTable {
 public:

@@ -11,7 +11,7 @@ class Wallet;
 /// What came of an evolution.
 enum class EvolutionOutcome {
     Built,       ///< a state for every day from the first operation up to the current state's day
-    BadFirstDay, ///< the first operation has no real date to begin at: no daily states
+    BadFirstDay, ///< the first operation, or the day to end at, has no real date: no daily states
     TooLong,     ///< too many days for that many holdings: no daily states
 };
 
