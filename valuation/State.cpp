@@ -46,6 +46,8 @@ void State::noteOperationDate(const Date& date)
 
 AccountState* State::findAccountState(Account* account) const
 {
+    if (account == nullptr)
+        return nullptr;
     // A state lists the accounts in the order of the wallet: only when that has changed since is there a search.
     unsigned place;
     if (wallet_.partner() != nullptr && wallet_.partner()->getAccountPlace(account, &place) == 0) {
@@ -56,7 +58,7 @@ AccountState* State::findAccountState(Account* account) const
     unsigned n;
     AccountState** states = getAllAccountStates(&n);
     for (unsigned i = 0; i < n; ++i)
-        if (states[i]->listed() != nullptr && states[i]->listed() == account)
+        if (states[i]->listed() == account)
             return states[i];
     return nullptr;
 }
