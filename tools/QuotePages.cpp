@@ -44,6 +44,18 @@ std::string priceText(float price)
     return {text, end};
 }
 
+std::string cellText(float close)
+{
+    const float whole = std::floor(close);
+    if (close == whole)
+        return integerText(whole);
+    const auto [numerator, denominator] = fractionOf(close, whole);
+    if (std::isinf(denominator)) // no fraction is that small; a decimal number is understood as well
+        return priceText(close);
+    return integerText(whole) + " <sup>" + integerText(numerator) + "</sup>/<sub>" + integerText(denominator) +
+           "</sub>";
+}
+
 /// The day three months before; it may be one that the month does not have, which serves for a comparison.
 Date threeMonthsBefore(const Date& day)
 {
@@ -65,13 +77,7 @@ std::string rowOf(const Date& day, float close)
 
 std::string latestQuotePage(float close)
 {
-    const float whole = std::floor(close);
-    std::string cell = integerText(whole);
-    if (close != whole) {
-        const auto [numerator, denominator] = fractionOf(close, whole);
-        cell += " <sup>" + integerText(numerator) + "</sup>/<sub>" + integerText(denominator) + "</sub>";
-    }
-    return "<html><body><table><tr><td nowrap><b>" + cell + "</b></td></tr></table></body></html>\n";
+    return "<html><body><table><tr><td nowrap><b>" + cellText(close) + "</b></td></tr></table></body></html>\n";
 }
 
 std::string historyPage(const Closes& closes)

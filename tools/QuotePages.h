@@ -11,6 +11,7 @@ using Closes = std::map<Date, float>;
 // The pages that the fetches of net/ cut prices out of. What they read is the very float that was written.
 
 /// A price as whole number and fraction; the latter in halves to sixty-fourths, in hundredths, or as fine as it takes.
+/// A price below 2^-104, for which there is no such fraction, is a decimal number.
 std::string latestQuotePage(float close);
 
 /// A table of the three months up to the last day, oldest first; `closes` is not empty.

@@ -43,7 +43,8 @@ protected:
 
 TEST_F(QuotesTest, APageReadsBackToTheVeryPrice)
 {
-    std::vector<float> prices = {0.0001F, 1e-7F, 1.0F / 3, 97.765F, 16777218, 123456.78F, 1e10F, 3e38F};
+    std::vector<float> prices = {0.0001F, 1e-7F,    1e-31F,     1e-32F, 1e-45F, 1.0F / 3,
+                                 97.765F, 16777218, 123456.78F, 1e10F,  3e38F};
     for (int cents = 1; cents < 30000; ++cents)
         prices.push_back(static_cast<float>(cents / 100.0));
     for (int cents = 30001; cents < 90000000; cents += 44449)
