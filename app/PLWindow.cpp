@@ -1,6 +1,7 @@
 #include "app/PLWindow.h"
 
 #include "app/MessageView.h"
+#include "app/Shortcuts.h"
 #include "app/WindowLock.h"
 #include "foundation/Today.h"
 #include "market/Currency.h"
@@ -63,7 +64,7 @@ constexpr Command kCommands[] = {
     {'RBRq', [](PLWindow& w, BMessage*) { w.RemoveCurrencyQuote(); }},
     {'RQSe', [](PLWindow& w, BMessage*) { w.CurrencyQuoteSelection(); }},
     // The portfolio page.
-    {'WTDa', [](PLWindow& w, BMessage*) { w.UpdateState(); }},
+    {'WTDa', [](PLWindow& w, BMessage*) { w.UpdateStateUnlessAgain('WTDa'); }},
     {'WCCe', [](PLWindow& w, BMessage*) { w.UpdateState(); }},
     {'WBLd', [](PLWindow& w, BMessage*) { w.LoadSomething(); }},
     {'WBSv', [](PLWindow& w, BMessage*) { w.SaveSomething(); }},
@@ -124,6 +125,7 @@ void PLWindow::makePages()
     const auto add = [this](BView* page, const char* label) {
         auto* tab = new BTab(page);
         tab->SetLabel(label);
+        tab->SetToolTip(("Alt+" + std::to_string(tabView_->CountTabs() + 1)).c_str());
         tabView_->AddTab(page, tab);
     };
     add(companyView_ = new CompanyView(kPageFrame, "CompanyView", this), "Company");
@@ -135,6 +137,7 @@ void PLWindow::makePages()
     messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
+    shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
 }
 
 void PLWindow::makePanels()

@@ -22,6 +22,7 @@ class OperationView;
 class ParameterView;
 class Share;
 class ShareOperation;
+class Shortcuts;
 class State;
 class Wallet;
 class WalletView;
@@ -65,6 +66,9 @@ public:
     // The valuation (StateCommands.cpp).
     /// Values the portfolio anew at its page's date and shows it. Within a `StateHold` that waits for its end.
     void UpdateState();
+    /// The same, unless the next message is another one of `code`: while a key is held in the date field, each day
+    /// would be valued long after it has gone by.
+    void UpdateStateUnlessAgain(uint32 code);
     /// Makes `state` the one that is shown; null shows none. The former one is not destroyed here.
     void SetState(State* state);
 
@@ -201,6 +205,7 @@ private:
     WalletView* walletView_ = nullptr;
     OperationView* operationView_ = nullptr;
     ParameterView* parameterView_ = nullptr;
+    std::unique_ptr<Shortcuts> shortcuts_;
     int holds_ = 0;            // of the valuation
     bool isUpdateDue_ = false; // it was asked for meanwhile
 };

@@ -26,6 +26,9 @@ enum view_flags : uint32 {
 enum button_width { B_WIDTH_AS_USUAL, B_WIDTH_FROM_WIDEST, B_WIDTH_FROM_LABEL };
 enum alignment { B_ALIGN_LEFT, B_ALIGN_RIGHT, B_ALIGN_CENTER };
 
+/// Keys that are held while another one is pressed.
+enum : uint32 { B_SHIFT_KEY = 1, B_COMMAND_KEY = 2, B_CONTROL_KEY = 4 };
+
 constexpr int32 B_CONTROL_OFF = 0;
 constexpr int32 B_CONTROL_ON = 1;
 

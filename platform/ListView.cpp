@@ -206,6 +206,14 @@ bool BListView::IsItemSelected(int32 index) const
     return item != nullptr && item->selected_;
 }
 
+std::string BListView::SelectedText() const
+{
+    std::string text;
+    for (int32 i = 0; i < CountSelected(); ++i)
+        text += (i > 0 ? "\n" : "") + ItemAt(CurrentSelection(i))->Text();
+    return text;
+}
+
 void BListView::invokedByWidget()
 {
     if (CountSelected() > 0 && Message() != nullptr)

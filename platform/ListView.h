@@ -4,6 +4,7 @@
 #include "platform/View.h"
 
 #include <memory>
+#include <string>
 #include <vector>
 
 class BListItem;
@@ -55,6 +56,8 @@ public:
     int32 CurrentSelection(int32 which = 0) const;
     int32 CountSelected() const;
     bool IsItemSelected(int32 index) const;
+    /// The texts of the selected rows, a line each: what Ctrl+C copies.
+    std::string SelectedText() const;
     void ScrollTo(int32 index);
     void ScrollToSelection();
     /// Index of the row at the upper edge, for `SetTopRow` to bring back; 0 in an empty list.

@@ -3,6 +3,8 @@
 #include "platform/ListItem.h"
 #include "platform/ListView.h"
 
+#include <QApplication>
+#include <QClipboard>
 #include <QKeyEvent>
 #include <QPainter>
 
@@ -31,6 +33,15 @@ QVariant ListModel::data(const QModelIndex& index, int role) const
     if (item == nullptr || (role != Qt::DisplayRole && role != Qt::AccessibleTextRole))
         return {};
     return QString::fromStdString(item->Text());
+}
+
+QModelIndexList ListModel::match(const QModelIndex& start, int role, const QVariant& value, int hits,
+                                 Qt::MatchFlags flags) const
+{
+    const QModelIndexList beginning = QAbstractListModel::match(start, role, value, hits, flags);
+    if (!beginning.empty())
+        return beginning;
+    return QAbstractListModel::match(start, role, '\t' + value.toString(), hits, Qt::MatchContains | Qt::MatchWrap);
 }
 
 void ListRows::paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const
@@ -92,6 +103,8 @@ void ListWidget::keyPressEvent(QKeyEvent* event)
 {
     if (event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter)
         list_.invokedByWidget();
+    else if (event->matches(QKeySequence::Copy))
+        QApplication::clipboard()->setText(QString::fromStdString(list_.SelectedText()));
     else
         QListView::keyPressEvent(event);
 }

@@ -13,6 +13,9 @@ public:
 
     int rowCount(const QModelIndex& parent) const override;
     QVariant data(const QModelIndex& index, int role) const override;
+    /// What typing finds: the next row whose text begins so, or, without any, one with another cell that does.
+    QModelIndexList match(const QModelIndex& start, int role, const QVariant& value, int hits,
+                          Qt::MatchFlags flags) const override;
 
     // Changes of the list's rows happen between begin and end.
     void beginInsert(int first, int last) { beginInsertRows({}, first, last); }

@@ -17,6 +17,11 @@ status_t BLooper::PostMessage(uint32 what, BHandler* handler)
     return PostMessage(&message, handler);
 }
 
+bool BLooper::IsNextMessage(uint32 what) const
+{
+    return MessageQueue::isNext(what, *this);
+}
+
 void BLooper::DispatchMessage(BMessage* message, BHandler* handler)
 {
     if (!Lock())

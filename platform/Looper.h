@@ -16,6 +16,9 @@ public:
     /// turn is dropped.
     status_t PostMessage(const BMessage* message, BHandler* handler = nullptr);
     status_t PostMessage(uint32 what, BHandler* handler = nullptr);
+    /// Whether the message that will be handled after this one is of that code: then a command whose result would not
+    /// last can be left to the next one.
+    bool IsNextMessage(uint32 what) const;
     /// Handles one message, with the looper locked.
     virtual void DispatchMessage(BMessage* message, BHandler* handler);
 

@@ -9,7 +9,8 @@
 
 namespace {
 
-const QEvent::Type kMessage = static_cast<QEvent::Type>(QEvent::registerEventType());
+// The next message has its turn.
+const QEvent::Type kTurn = static_cast<QEvent::Type>(QEvent::registerEventType());
 
 void deliver(BMessage& message, std::uint64_t looperToken, std::uint64_t handlerToken)
 {
@@ -21,27 +22,32 @@ void deliver(BMessage& message, std::uint64_t looperToken, std::uint64_t handler
 
 } // namespace
 
-class MessageQueue::MessageEvent final : public QEvent {
-public:
-    explicit MessageEvent(Delivery carried) : QEvent(kMessage), delivery(std::move(carried)) {}
-
-    Delivery delivery;
-};
+MessageQueue& MessageQueue::queue()
+{
+    static MessageQueue queue;
+    return queue;
+}
 
 void MessageQueue::post(const BMessage& message, BLooper& looper, BHandler& handler)
 {
-    static MessageQueue queue;
-    QCoreApplication::postEvent(&queue, new MessageEvent({message, looper.token(), handler.token()}));
+    queue().waiting_.push_back({message, looper.token(), handler.token()});
+    QCoreApplication::postEvent(&queue(), new QEvent(kTurn));
+}
+
+bool MessageQueue::isNext(uint32 what, const BLooper& looper)
+{
+    const auto& waiting = queue().waiting_;
+    return !waiting.empty() && waiting.front().message.what == what && waiting.front().looper == looper.token();
 }
 
 bool MessageQueue::event(QEvent* event)
 {
-    if (event->type() != kMessage)
+    if (event->type() != kTurn)
         return QObject::event(event);
-    waiting_.push_back(std::move(static_cast<MessageEvent*>(event)->delivery));
+    ++turns_;
     if (std::exchange(isDelivering_, true))
         return true;
-    while (!waiting_.empty()) {
+    for (; turns_ > 0; --turns_) {
         Delivery next = std::move(waiting_.front());
         waiting_.pop_front();
         deliver(next.message, next.looper, next.handler);

@@ -15,6 +15,8 @@ class BLooper;
 class MessageQueue final : public QObject {
 public:
     static void post(const BMessage& message, BLooper& looper, BHandler& handler);
+    /// Whether the message that will be handled next is one of that code in that looper's queue.
+    static bool isNext(uint32 what, const BLooper& looper);
 
 protected:
     bool event(QEvent* event) override;
@@ -25,8 +27,9 @@ private:
         std::uint64_t looper; // tokens: either may be gone when the message arrives
         std::uint64_t handler;
     };
-    class MessageEvent;
+    static MessageQueue& queue();
 
     std::deque<Delivery> waiting_;
+    int turns_ = 0; // that the event loop has given, one for each message, and that are not over
     bool isDelivering_ = false;
 };

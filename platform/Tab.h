@@ -12,9 +12,13 @@ public:
 
     void SetLabel(const char* label) { label_ = label; }
     const char* Label() const { return label_.c_str(); }
+    /// To be set before the tab stands in a tab view.
+    void SetToolTip(const char* text) { toolTip_ = text; }
+    const char* ToolTip() const { return toolTip_.c_str(); }
     BView* View() const { return view_; }
 
 private:
     BView* view_;
     std::string label_;
+    std::string toolTip_;
 };

@@ -40,7 +40,7 @@ void BTabView::AddTab(BView* target, BTab* tab)
 {
     tabs_.emplace_back(tab);
     host_ = new QWidget;
-    tabWidget().addTab(host_, labelText(tab->Label()));
+    tabWidget().setTabToolTip(tabWidget().addTab(host_, labelText(tab->Label())), QString::fromUtf8(tab->ToolTip()));
     AddChild(target);
 }
 

@@ -93,6 +93,17 @@ BView* BView::FindView(const char* name)
     return nullptr;
 }
 
+BView* BView::viewAround(const QWidget& inner)
+{
+    if (widget_ != &inner && !widget_->isAncestorOf(&inner))
+        return nullptr;
+    for (BView* child : children_) {
+        if (BView* found = child->viewAround(inner))
+            return found;
+    }
+    return this;
+}
+
 void BView::setWindow(BWindow* window)
 {
     if (window == window_)

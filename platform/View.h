@@ -37,6 +37,8 @@ public:
     /// @return null out of range.
     BView* ChildAt(int32 index) const;
     int32 CountChildren() const { return static_cast<int32>(children_.size()); }
+    /// Null at the top.
+    BView* Parent() const { return parent_; }
     /// The window the view stands in, null while it stands in none.
     BWindow* Window() const { return window_; }
     BLooper* Looper() const override;
@@ -116,6 +118,8 @@ public:
     virtual QWidget* childHost() const { return widget_; }
     Canvas& canvas() const { return *canvas_; }
     void setWindow(BWindow* window);
+    /// The innermost view, this one or within it, that `inner` is a part of; null when there is none.
+    BView* viewAround(const QWidget& inner);
     void paintOn(QPainter& screen);
 
 protected:

@@ -1,5 +1,7 @@
 #include "platform/Window.h"
 
+#include "platform/Message.h"
+#include "platform/Messenger.h"
 #include "platform/View.h"
 #include "platform/WindowWidget.h"
 
@@ -61,6 +63,19 @@ void BWindow::AddChild(BView* view)
 BView* BWindow::FindView(const char* name) const
 {
     return root_->FindView(name);
+}
+
+BView* BWindow::CurrentFocus() const
+{
+    const QWidget* focus = widget_->focusWidget();
+    return focus != nullptr ? root_->viewAround(*focus) : nullptr;
+}
+
+void BWindow::AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHandler* target)
+{
+    const std::shared_ptr<const BMessage> sent(message);
+    const BMessenger messenger(target != nullptr ? target : this);
+    widget_->addShortcut(static_cast<int>(key), modifiers, [messenger, sent] { messenger.SendMessage(sent.get()); });
 }
 
 void BWindow::Show()

@@ -34,6 +34,13 @@ public:
     /// Takes ownership of `view`.
     void AddChild(BView* view);
     BView* FindView(const char* name) const;
+    /// The view that the keyboard goes to, null when there is none.
+    BView* CurrentFocus() const;
+
+    /// Has `message`, which it takes ownership of, sent to `target`, or to itself when that is null, when `key` (a
+    /// letter in capitals or a digit) is pressed with `modifiers`. As by a click elsewhere, a field that is being typed
+    /// in sends its text before. Ctrl+Q, which closes the window, is there from the start.
+    void AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHandler* target = nullptr);
 
     void Show();
     void Hide();

@@ -1,12 +1,40 @@
 #include "platform/WindowWidget.h"
 
+#include "platform/InterfaceDefs.h"
 #include "platform/Window.h"
 
 #include <QCloseEvent>
 #include <QScreen>
+#include <QShortcut>
 #include <QStyle>
 
 #include <algorithm>
+
+WindowWidget::WindowWidget(BWindow& window) : window_(window)
+{
+    addShortcut(Qt::Key_Q, B_CONTROL_KEY, [this] { close(); });
+}
+
+void WindowWidget::addShortcut(int key, uint32 modifiers, const std::function<void()>& action)
+{
+    constexpr struct {
+        uint32 modifier;
+        Qt::KeyboardModifier ours;
+    } kModifiers[] = {
+        {B_SHIFT_KEY, Qt::ShiftModifier}, {B_COMMAND_KEY, Qt::AltModifier}, {B_CONTROL_KEY, Qt::ControlModifier}};
+    int combination = key;
+    for (const auto& m : kModifiers)
+        combination |= (modifiers & m.modifier) != 0 ? static_cast<int>(m.ours) : 0;
+    auto* shortcut = new QShortcut(QKeySequence(combination), this); // this owns it
+    shortcut->setAutoRepeat(false);
+    QObject::connect(shortcut, &QShortcut::activated, [this, action] {
+        if (QWidget* field = focusWidget()) {
+            field->clearFocus();
+            field->setFocus(Qt::OtherFocusReason);
+        }
+        action();
+    });
+}
 
 void WindowWidget::fitTo(QPoint place, QSize content, bool resizable)
 {

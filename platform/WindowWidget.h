@@ -1,17 +1,24 @@
 #pragma once
 
+#include "platform/SupportDefs.h"
+
 #include <QScrollArea>
+
+#include <functional>
 
 class BWindow;
 
 /// The desktop's side of a window: its content in full size, behind scroll bars where the screen is too small.
 class WindowWidget final : public QScrollArea {
 public:
-    explicit WindowWidget(BWindow& window) : window_(window) {}
+    explicit WindowWidget(BWindow& window);
 
     /// Gives the window the size `content` at `place`, or what of it fits on the screen, moved up and left until it
     /// does.
     void fitTo(QPoint place, QSize content, bool resizable);
+    /// Calls `action` when the key is pressed with `modifiers` of InterfaceDefs.h, once however long it is held, after
+    /// the field that is being typed in has sent its text.
+    void addShortcut(int key, uint32 modifiers, const std::function<void()>& action);
 
 protected:
     void closeEvent(QCloseEvent* event) override;

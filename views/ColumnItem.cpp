@@ -4,6 +4,7 @@
 #include "views/ColumnListView.h"
 #include "views/Look.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace {
@@ -38,9 +39,11 @@ std::string ColumnItem::Text() const
 {
     std::string line;
     for (int i = 0; i < columns_; ++i) {
-        if (i > 0)
-            line += '\t';
-        line += cell(i).text;
+        std::string text = cell(i).text;
+        // A name from a file may hold anything, and would tear the row apart where it is copied to.
+        std::replace_if(
+            text.begin(), text.end(), [](char c) { return c == '\t' || c == '\n' || c == '\r'; }, ' ');
+        line += (i > 0 ? "\t" : "") + text;
     }
     return line;
 }

@@ -1,6 +1,22 @@
 #include "views/DateControl.h"
 
+#include "foundation/Today.h"
 #include "views/DateText.h"
+
+#include <algorithm>
+
+namespace {
+
+/// The same day of another month, or its last one where it has no such day.
+Date monthsFrom(const Date& date, int months)
+{
+    const int month = 12 * date.getYear() + date.getMonth() - 1 + months;
+    Date result(1, static_cast<short>(month % 12 + 1), month / 12);
+    result.setDay(std::min(date.getDay(), result.getMonthLength()));
+    return result;
+}
+
+} // namespace
 
 void DateControl::setDate(const Date& date)
 {
@@ -16,6 +32,37 @@ Date DateControl::getDate() const
 void DateControl::TextModified()
 {
     mark();
+}
+
+void DateControl::KeyDown(const char* bytes, int32)
+{
+    Date date = getDate();
+    if (date.isUndefined()) {
+        if (*Text() == '\0')
+            enter(today());
+        return;
+    }
+    switch (*bytes) {
+    case B_UP_ARROW:
+        return enter(date.moveBy(1));
+    case B_DOWN_ARROW:
+        return enter(date.moveBy(-1));
+    case B_PAGE_UP:
+        return enter(monthsFrom(date, 1));
+    case B_PAGE_DOWN:
+        return enter(monthsFrom(date, -1));
+    default:
+        return;
+    }
+}
+
+void DateControl::enter(const Date& date)
+{
+    if (readDate(dateText(date)).isUndefined())
+        return; // beyond the first or the last year
+    setDate(date);
+    TextModified();
+    Invoke();
 }
 
 void DateControl::mark()

@@ -9,6 +9,7 @@
 #include "views/NumberControl.h"
 
 #include <cmath>
+#include <cstring>
 
 namespace {
 
@@ -66,6 +67,8 @@ NumberControl* PageView::addTypedNumber(BView* parent, BRect frame, const char* 
 BButton* PageView::addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code)
 {
     auto* button = new BButton(frame, name, label, new BMessage(code));
+    if (std::strcmp(label, kAddLabel) == 0)
+        button->SetToolTip("Adds what the fields of this box say.  Ctrl+N, while the keyboard is in the box");
     parent->AddChild(button);
     return button;
 }
@@ -89,6 +92,13 @@ void PageView::addLoadAndSave(BView* page)
     constexpr float kRight = look::kPageWidth - look::kMargin;
     addButtons(page, {kRight - 2 * kWidth - look::kGap, look::kMargin, kRight, look::kMargin + look::kButtonHeight},
                {{"btnLoadMarket", "Load", 'CBLd'}, {"btnSaveMarket", "Save", 'CBSv'}});
+    explainLoadAndSave(page, "btnLoadMarket", "btnSaveMarket", "the currencies, markets and companies");
+}
+
+void PageView::explainLoadAndSave(BView* page, const char* load, const char* save, const std::string& contents)
+{
+    page->FindView(load)->SetToolTip(("Loads " + contents + " from a file.  Ctrl+O").c_str());
+    page->FindView(save)->SetToolTip(("Saves " + contents + " to a file.  Ctrl+S").c_str());
 }
 
 BCheckBox* PageView::addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code)

@@ -3,6 +3,7 @@
 #include "foundation/String.h"
 #include "platform/View.h"
 
+#include <string>
 #include <vector>
 
 class BBox;
@@ -16,6 +17,9 @@ class NumberControl;
 /// What the five pages have in common: the panel's grey, and how their controls are made.
 class PageView : public BView {
 public:
+    /// The label of the button in a box that adds what the box's fields say.
+    static constexpr const char* kAddLabel = "Add";
+
     PageView(BRect frame, const char* name);
 
     // All of these put what they make into `parent`, which owns it.
@@ -42,6 +46,8 @@ public:
     static void addButtons(BView* parent, BRect area, const std::vector<ButtonPlan>& buttons);
     /// The buttons for the market data file, at the right of the page's upper edge.
     static void addLoadAndSave(BView* page);
+    /// Gives the page's buttons of those names tool tips with their keys.
+    static void explainLoadAndSave(BView* page, const char* load, const char* save, const std::string& contents);
     static BCheckBox* addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code);
 
     /// Shows a text of the model; nothing for a String without text.

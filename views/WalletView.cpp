@@ -56,6 +56,7 @@ void WalletView::makeTop()
     constexpr float kDateDivider = 38;
     date_ = new DateControl({kMargin, kMargin + 1, kMargin + 132, kMargin + 1 + kFieldHeight}, "txtDate", "Date", "",
                             new BMessage('WTDa'));
+    date_->SetToolTip("The day to value at.  Up and Down: a day on and back; Page Up and Page Down: a month");
     date_->SetDivider(kDateDivider);
     date_->SetAlignment(B_ALIGN_RIGHT, B_ALIGN_LEFT);
     AddChild(date_);
@@ -77,6 +78,7 @@ void WalletView::makeTop()
         addButton(this, {left, kMargin, left + kWidth, kTopEnd}, b.name, b.label, b.code);
         left += kWidth + kGap;
     }
+    explainLoadAndSave(this, "btnLoadPortoFolio", "btnSavePortoFolio", "the portfolio");
 }
 
 void WalletView::makeTotals()

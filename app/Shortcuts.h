@@ -1,0 +1,29 @@
+#pragma once
+
+#include "platform/Handler.h"
+
+class BTabView;
+class BView;
+class BWindow;
+
+/// The window's keys. Each does what a click on a tab or a button does, and nothing else.
+///
+/// Alt+1 to Alt+5 show the tabs. Ctrl+O and Ctrl+S press the buttons that load and save on the page in front; a page
+/// that has none is about the portfolio, and the portfolio's page comes to the front for it. Ctrl+N presses the button
+/// that adds in the box where the keyboard is; outside of all boxes the page's only one, if there is only one.
+class Shortcuts final : public BHandler {
+public:
+    /// Both outlive this.
+    Shortcuts(BWindow& window, BTabView& tabs);
+
+    BLooper* Looper() const override;
+    void MessageReceived(BMessage* message) override;
+
+private:
+    BView& front() const;
+    void pressFileButton(const char* ofMarkets, const char* ofPortfolio);
+    void pressAdd();
+
+    BWindow& window_;
+    BTabView& tabs_;
+};
