@@ -84,6 +84,26 @@ void ChartPainter::drawChart(const ChartLayout& layout, const std::vector<ChartS
         drawKeyEntry(entry);
 }
 
+void ChartPainter::drawFocus()
+{
+    view_.SetPenSize(1);
+    view_.SetHighColor(axis_);
+    view_.StrokeRect(view_.Bounds());
+}
+
+void ChartPainter::drawReadOut(const ChartReadOut& readOut)
+{
+    fillDisc(readOut.where, kMarkRadius + 2, text_);
+    fillDisc(readOut.where, kMarkRadius + 1, background_);
+    fillDisc(readOut.where, kMarkRadius, readOut.color);
+    view_.SetHighColor(background_);
+    view_.FillRect(readOut.box);
+    view_.SetPenSize(1);
+    view_.SetHighColor(axis_);
+    view_.StrokeRect(readOut.box);
+    drawText(readOut.text, text_);
+}
+
 void ChartPainter::drawGrid(const ChartLayout& layout)
 {
     const BRect& plot = layout.plot;

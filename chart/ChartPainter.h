@@ -1,6 +1,7 @@
 #pragma once
 
 #include "chart/ChartLayout.h"
+#include "chart/ChartReadOut.h"
 #include "platform/View.h"
 
 /// Draws what a layout has found a place for.
@@ -14,6 +15,9 @@ public:
     void drawNotice(const char* text, BPoint where, float size);
     /// From back to front: grid, polygons, axes, lines, points, lowest and highest value, texts.
     void drawChart(const ChartLayout& layout, const std::vector<ChartSeries>& series);
+    /// A frame around the chart that has the keyboard.
+    void drawFocus();
+    void drawReadOut(const ChartReadOut& readOut);
 
 private:
     void drawGrid(const ChartLayout& layout);

@@ -4,6 +4,15 @@
 #include "chart/ChartPainter.h"
 #include "chart/GraphElement.h"
 #include "chart/GraphPoint.h"
+#include "chart/GraphPolygon.h"
+#include "platform/Alert.h"
+#include "platform/Entry.h"
+#include "platform/FilePanel.h"
+#include "platform/MenuItem.h"
+#include "platform/Message.h"
+#include "platform/Path.h"
+#include "platform/PopUpMenu.h"
+#include "platform/Screenshot.h"
 
 #include <algorithm>
 #include <cmath>
@@ -11,6 +20,8 @@
 namespace {
 
 const BPoint kNoDataPlace(10, 20);
+constexpr float kPointerReach = 24; // of the read-out, in pixels
+constexpr uint32 kPictureFile = 'GSav';
 
 ChartFont fontOf(short size)
 {
@@ -25,7 +36,7 @@ ChartFont fontOf(short size)
 } // namespace
 
 GraphView::GraphView(BRect frame, const char* name)
-    : BView(frame, name, B_FOLLOW_ALL_SIDES, B_WILL_DRAW | B_FULL_UPDATE_ON_RESIZE), elements_(this)
+    : BView(frame, name, B_FOLLOW_ALL_SIDES, B_WILL_DRAW | B_FULL_UPDATE_ON_RESIZE | B_NAVIGABLE), elements_(this)
 {}
 
 GraphView::~GraphView()
@@ -60,6 +71,71 @@ void GraphView::Draw(BRect)
     painter.drawChart(layout, contents.series);
 }
 
+void GraphView::DrawOver(BRect)
+{
+    ChartPainter painter(*this, backgroundColor_);
+    if (IsFocus())
+        painter.drawFocus();
+    if (!pointer_)
+        return;
+    if (const GraphPoint* point = nearestPoint(*pointer_, kPointerReach))
+        painter.drawReadOut(layOutReadOut(*point, xDateBased_, *scale_, fontOf(legendSize_), Bounds()));
+}
+
+void GraphView::MouseMoved(BPoint where, bool inside)
+{
+    pointer_ = inside ? std::optional(where) : std::nullopt;
+    RefreshOver();
+}
+
+// --- The picture.
+
+void GraphView::MenuRequested(BPoint where)
+{
+    BPopUpMenu menu("chartMenu");
+    menu.AddItem(new BMenuItem("Save as PNG...", nullptr));
+    if (menu.Go(ConvertToScreen(where)) != nullptr)
+        askForPictureFile();
+}
+
+void GraphView::askForPictureFile()
+{
+    const BMessenger self(this);
+    if (savePanel_ == nullptr)
+        savePanel_ = std::make_unique<BFilePanel>(B_SAVE_PANEL, &self, nullptr, B_FILE_NODE, false,
+                                                  new BMessage(kPictureFile), true, true);
+    unsigned count;
+    GraphElement* const* elements = elements_.getAll(&count);
+    // The last element is the one in front, and what the chart is about.
+    std::string name(count > 0 ? elements[count - 1]->getLegend().bytes() : "");
+    std::replace(name.begin(), name.end(), '/', '-');
+    savePanel_->SetSaveText(((name.empty() ? "Chart" : name) + ".png").c_str());
+    savePanel_->Show();
+}
+
+void GraphView::MessageReceived(BMessage* message)
+{
+    if (message->what == kPictureFile)
+        savePicture(*message);
+    else
+        BView::MessageReceived(message);
+}
+
+void GraphView::savePicture(const BMessage& answer)
+{
+    entry_ref folder;
+    const char* name;
+    if (answer.FindRef("directory", &folder) != B_OK || answer.FindString("name", &name) != B_OK)
+        return;
+    BPath path;
+    BEntry(&folder).GetPath(&path);
+    path.Append(name);
+    pointer_.reset(); // it is no part of the picture
+    if (save_picture(*this, path.Path()) != B_OK)
+        (new BAlert("Save as PNG", (std::string("The picture could not be written to ") + path.Path()).c_str(), "OK"))
+            ->Go();
+}
+
 ChartContents GraphView::readContents() const
 {
     unsigned count;
@@ -81,6 +157,8 @@ GraphPoint* GraphView::nearestPoint(BPoint where, float reach) const
     unsigned count;
     GraphElement* const* elements = elements_.getAll(&count);
     for (unsigned i = 0; i < count; ++i) {
+        if (elements[i]->getType() == GraphPolygon::kType)
+            continue; // its corners are no values
         unsigned n;
         GraphPoint* single;
         GraphPoint* const* points = pointsOf(*elements[i], &n, &single);

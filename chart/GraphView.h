@@ -5,8 +5,10 @@
 #include "foundation/String.h"
 #include "platform/View.h"
 
+#include <memory>
 #include <optional>
 
+class BFilePanel;
 class GraphPoint;
 struct ChartContents;
 
@@ -14,6 +16,9 @@ struct ChartContents;
 ///
 /// Lines and polygons belong to whoever adds them; they outlive the chart or leave it when they die. Points that stand
 /// alone belong to the chart. A change of an element or of a setting shows at the next drawing.
+///
+/// The point that the pointer is near to is shown with its date and value. A menu, by the right mouse button, saves the
+/// chart as a picture.
 class GraphView : public BView {
 public:
     GraphView(BRect frame, const char* name);
@@ -48,14 +53,21 @@ public:
     void removeAllGraphPoints();
 
     void Draw(BRect updateRect) override;
+    void DrawOver(BRect updateRect) override;
+    void MouseMoved(BPoint where, bool inside) override;
+    void MenuRequested(BPoint where) override;
+    void MessageReceived(BMessage* message) override;
 
     /// Maps pixels to data as last drawn; null when there was no data.
     const ChartScale* scale() const { return scale_ ? &*scale_ : nullptr; }
-    /// The point nearest to `where`, at most `reach` pixels away, as last drawn; null when there is none.
+    /// The point of a line, or that stands alone, nearest to `where`, at most `reach` pixels away, as last drawn; null
+    /// when there is none.
     GraphPoint* nearestPoint(BPoint where, float reach) const;
 
 private:
     ChartContents readContents() const;
+    void askForPictureFile();
+    void savePicture(const BMessage& answer);
 
     GraphViewToGraphElements elements_;
     String xLegend_;
@@ -65,4 +77,6 @@ private:
     short legendSize_ = 12;
     short minMaxSize_ = 10;
     std::optional<ChartScale> scale_; // of the last drawing
+    std::optional<BPoint> pointer_;   // while it is over the chart
+    std::unique_ptr<BFilePanel> savePanel_;
 };

@@ -29,7 +29,7 @@ QFileDialog& BFilePanel::dialog()
 {
     if (dialog_ != nullptr)
         return *dialog_;
-    auto* window = dynamic_cast<BWindow*>(target_.Target());
+    auto* window = target_.IsValid() ? dynamic_cast<BWindow*>(target_.Target()->Looper()) : nullptr;
     dialog_ = std::make_unique<QFileDialog>(window != nullptr ? &window->widget() : nullptr);
     dialog_->setObjectName(mode_ == B_OPEN_PANEL ? "OpenPanel" : "SavePanel");
     dialog_->setWindowTitle(mode_ == B_OPEN_PANEL ? "Load" : "Save");
@@ -68,7 +68,12 @@ void BFilePanel::Show()
         return;
     }
     QFileDialog& shown = dialog();
-    shown.setDirectory(QString::fromStdString(directory_));
+    shown.setDirectory(directory_.empty() ? QDir::homePath() : QString::fromStdString(directory_));
+    if (!saveText_.empty()) {
+        const QString name = QString::fromStdString(saveText_);
+        shown.setDefaultSuffix(QFileInfo(name).suffix());
+        shown.selectFile(name);
+    }
     shown.show();
     shown.raise();
     shown.activateWindow();

@@ -29,8 +29,11 @@ public:
     BFilePanel(const BFilePanel&) = delete;
     BFilePanel& operator=(const BFilePanel&) = delete;
 
+    /// Without it the panel begins in the person's home folder.
     void SetPanelDirectory(const char* path);
     const std::string& PanelDirectory() const { return directory_; }
+    /// The name that a save panel comes up with. Its ending is added to a name that is typed without one.
+    void SetSaveText(const char* text) { saveText_ = text; }
     void Show();
     void Hide();
     bool IsShowing() const;
@@ -44,6 +47,7 @@ private:
     file_panel_mode mode_;
     BMessenger target_;
     std::string directory_;
+    std::string saveText_;
     bool allowMultiple_;
     std::unique_ptr<BMessage> message_;
     bool modal_;

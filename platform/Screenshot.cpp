@@ -1,10 +1,12 @@
 #include "platform/Screenshot.h"
 
+#include "platform/View.h"
 #include "platform/Window.h"
 #include "platform/WindowWidget.h"
 
 #include <QApplication>
 #include <QPixmap>
+#include <QSaveFile>
 #include <QScreen>
 
 status_t save_screenshot(const BWindow& window, BRect part, const char* path)
@@ -14,6 +16,13 @@ status_t save_screenshot(const BWindow& window, BRect part, const char* path)
     const QPixmap picture =
         shown.screen()->grabWindow(shown.winId(), place.x(), place.y(), place.width(), place.height());
     return picture.save(QString::fromUtf8(path), "PNG") ? B_OK : B_ERROR;
+}
+
+status_t save_picture(const BView& view, const char* path)
+{
+    QSaveFile file(QString::fromUtf8(path));
+    const bool isWritten = file.open(QIODevice::WriteOnly) && view.widget()->grab().save(&file, "PNG") && file.commit();
+    return isWritten ? B_OK : B_ERROR;
 }
 
 void handle_pending_messages()

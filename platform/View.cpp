@@ -122,6 +122,12 @@ void BView::placeWidget()
     widget_->setGeometry(whole(frame_.left), whole(frame_.top), whole(frame_.Width()), whole(frame_.Height()));
 }
 
+BPoint BView::ConvertToScreen(BPoint where) const
+{
+    const QPointF place = widget_->mapToGlobal(QPointF(where.x, where.y));
+    return {static_cast<float>(place.x()), static_cast<float>(place.y())};
+}
+
 void BView::MoveTo(float x, float y)
 {
     frame_ = frame_.OffsetToCopy(x, y);
@@ -199,6 +205,8 @@ void BView::SetToolTip(const char* text)
 // --- Hooks.
 
 void BView::Draw(BRect) {}
+void BView::DrawOver(BRect) {}
+void BView::MenuRequested(BPoint) {}
 void BView::FrameResized(float, float) {}
 void BView::MouseUp(BPoint) {}
 void BView::MouseMoved(BPoint, bool) {}
@@ -227,11 +235,17 @@ void BView::paintOn(QPainter& screen)
     if (fresh)
         drawAll();
     screen.drawPixmap(0, 0, canvas_->picture(&fresh));
+    canvas_->drawWith(screen, [this] { DrawOver(Bounds()); });
 }
 
 void BView::Invalidate()
 {
     canvas_->markStale();
+    widget_->update();
+}
+
+void BView::RefreshOver()
+{
     widget_->update();
 }
 

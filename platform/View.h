@@ -48,6 +48,7 @@ public:
     // Place and size.
     BRect Frame() const { return frame_; }
     BRect Bounds() const { return frame_.OffsetToCopy(0, 0); }
+    BPoint ConvertToScreen(BPoint where) const;
     void MoveTo(float x, float y);
     /// The children follow by their resizing modes.
     void ResizeTo(float width, float height);
@@ -67,6 +68,8 @@ public:
     // Hooks.
     virtual void AttachedToWindow() {}
     virtual void Draw(BRect updateRect);
+    /// Draws on the screen, over the picture and not into it: for what comes and goes. `RefreshOver` has it called.
+    virtual void DrawOver(BRect updateRect);
     virtual void FrameResized(float width, float height);
     virtual void MouseDown(BPoint where);
     virtual void MouseUp(BPoint where);
@@ -74,6 +77,8 @@ public:
     virtual void MouseMoved(BPoint where, bool inside);
     /// `bytes` is the UTF-8 text of the key, or one of the control characters of InterfaceDefs.h.
     virtual void KeyDown(const char* bytes, int32 numBytes);
+    /// The right mouse button was pressed, or the key for menus.
+    virtual void MenuRequested(BPoint where);
 
     // Drawing state.
     void SetViewColor(rgb_color color);
@@ -110,6 +115,8 @@ public:
 
     /// Has `Draw` called again, later.
     void Invalidate();
+    /// Has `DrawOver` called again, later; the picture stays as it is.
+    void RefreshOver();
     /// Puts what was drawn on the screen before it returns.
     void Sync();
 

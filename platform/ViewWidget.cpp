@@ -3,6 +3,7 @@
 #include "platform/Keys.h"
 #include "platform/View.h"
 
+#include <QContextMenuEvent>
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPainter>
@@ -45,6 +46,11 @@ void ViewWidget::mouseMoveEvent(QMouseEvent* event)
 void ViewWidget::leaveEvent(QEvent*)
 {
     view_.MouseMoved({-1, -1}, false);
+}
+
+void ViewWidget::contextMenuEvent(QContextMenuEvent* event)
+{
+    view_.MenuRequested({static_cast<float>(event->x()), static_cast<float>(event->y())});
 }
 
 void ViewWidget::keyPressEvent(QKeyEvent* event)

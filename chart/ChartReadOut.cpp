@@ -1,0 +1,59 @@
+#include "chart/ChartReadOut.h"
+
+#include "chart/ChartSeries.h"
+#include "chart/GraphPoint.h"
+#include "chart/GraphPolyElement.h"
+#include "chart/ValueFormat.h"
+#include "foundation/NumberText.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+constexpr float kPadding = 4;
+constexpr float kDistance = 10; // from the point to the box
+constexpr const char* kSpace = "   ";
+
+/// Cents where they matter, and more digits of what is small.
+std::string valueText(double value)
+{
+    constexpr double kCents = 10;
+    return std::abs(value) >= kCents ? amountText(value) : ValueFormat::forValues({value, value})(value);
+}
+
+std::string textOf(const GraphPoint& point, const GraphElement& owner, bool isDateBased)
+{
+    std::string text(owner.getLegend().bytes());
+    if (!text.empty())
+        text += kSpace;
+    const std::string_view date = point.getDateX().toString().bytes();
+    text += isDateBased ? std::string(date) : valueText(static_cast<double>(point.getX()));
+    return text + kSpace + valueText(static_cast<double>(point.getY()));
+}
+
+} // namespace
+
+ChartReadOut layOutReadOut(const GraphPoint& point, bool isDateBased, const ChartScale& scale, const ChartFont& font,
+                           const BRect& bounds)
+{
+    GraphPolyElement* line;
+    const GraphElement& owner = point.getGraphPolyElement(&line) == 0 ? *line : static_cast<const GraphElement&>(point);
+    const std::string text = fitText(textOf(point, owner, isDateBased), font, bounds.Width() - 2 * kPadding);
+    const float width = font.width(text) + 2 * kPadding;
+    const float height = std::ceil(font.height()) + 2 * kPadding;
+    const BPoint where = scale.pixel(chartPointOf(point, isDateBased));
+    // To the right above the point, unless the chart ends there.
+    float left = where.x + kDistance;
+    if (left + width > bounds.right)
+        left = where.x - kDistance - width;
+    float top = where.y - kDistance - height;
+    if (top < bounds.top)
+        top = where.y + kDistance;
+    left = std::floor(std::max(left, bounds.left));
+    top = std::floor(top);
+    return {where,
+            owner.getColor(),
+            {left, top, left + width, top + height},
+            textAt(text, font, left + kPadding, top + kPadding)};
+}
