@@ -27,8 +27,8 @@ std::string textOf(const GraphPoint& point, const GraphElement& owner, bool isDa
     std::string text(owner.getLegend().bytes());
     if (!text.empty())
         text += kSpace;
-    const std::string_view date = point.getDateX().toString().bytes();
-    text += isDateBased ? std::string(date) : valueText(static_cast<double>(point.getX()));
+    text +=
+        isDateBased ? std::string(point.getDateX().toString().bytes()) : valueText(static_cast<double>(point.getX()));
     return text + kSpace + valueText(static_cast<double>(point.getY()));
 }
 

@@ -1,5 +1,6 @@
 #include "chart/ChartLayout.h"
 #include "chart/ChartDays.h"
+#include "chart/ChartReadOut.h"
 #include "chart/ColumnReduction.h"
 #include "chart/DateTicks.h"
 #include "chart/GraphLine.h"
@@ -258,6 +259,36 @@ TEST(ChartLayoutTest, MarksTheExtremesOfTheFirstLine)
     EXPECT_LT(layout.marks[0].label.box.bottom, layout.marks[0].where.y);
     EXPECT_EQ(layout.marks[1].label.text, "20.00");
     EXPECT_GT(layout.marks[1].label.box.top, layout.marks[1].where.y);
+}
+
+TEST(ChartReadOutTest, SaysNameDateAndValueWithinTheChart)
+{
+    const BRect bounds(0, 0, 400, 200);
+    const ChartScale scale({0, 100}, {0, 50}, {20, 20, 380, 180});
+    GraphLine line;
+    line.setLegend("Trend");
+    const struct {
+        Date date;
+        float value;
+        const char* text;
+    } points[] = {
+        {{1, 1, 2000}, 0.0125F, "Trend   01/01/2000   0.0125"},
+        {{10, 4, 2000}, 9.5F, "Trend   10/04/2000   9.500"},
+        {{20, 2, 2000}, 49.99F, "Trend   20/02/2000   49.99"},
+        {{20, 2, 2000}, 127129.3F, "Trend   20/02/2000   127,129.30"},
+    };
+    for (const auto& p : points) {
+        auto* point = new GraphPoint(7, p.value);
+        point->setDateX(p.date);
+        line.addGraphPoint(point);
+        const ChartReadOut shown = layOutReadOut(*point, true, scale, kFont, bounds);
+        EXPECT_EQ(shown.text.text, p.text);
+        EXPECT_GE(shown.box.left, bounds.left);
+        EXPECT_LE(shown.box.right, bounds.right);
+        EXPECT_FALSE(shown.box.Contains(shown.where)) << "the point itself can be seen";
+    }
+    const GraphPoint alone(3, 20);
+    EXPECT_EQ(layOutReadOut(alone, false, scale, kFont, bounds).text.text, "3.000   20.00");
 }
 
 } // namespace
