@@ -36,25 +36,18 @@ int writeMuch(FILE* file)
 
 class DurableSaveTest : public testing::Test {
 protected:
-    std::string path(const std::string& name) const { return folder_.path / name; }
-    std::string content(const std::string& name) const { return contentOf(path(name)); }
-    void file(const std::string& name, int mode = 0644) const
-    {
-        std::ofstream(path(name), std::ios::binary) << "old";
-        fs::permissions(path(name), fs::perms(mode));
-    }
     /// The names in the folder, with the number of versions of `name` behind it.
     std::string names(const std::string& name) const
     {
         std::string all;
-        for (const auto& entry : fs::directory_iterator(folder_.path / "files"))
+        for (const auto& entry : fs::directory_iterator(folder_ / "files"))
             all += entry.path().filename().string() + ' ';
-        return all + std::to_string(KeptVersions(data_).versionsOf(path("files/" + name)).size());
+        return all + std::to_string(KeptVersions(data_).versionsOf(folder_ / ("files/" + name)).size());
     }
 
     TemporaryFolder folder_{"DurableSaveTest"};
     PlainUser user_{folder_.path};
-    DataFolder data_{folder_.path / "Pelorin"};
+    DataFolder data_{folder_ / "Pelorin"};
     DurableSave save_{data_};
 };
 
@@ -79,42 +72,45 @@ TEST_F(DurableSaveTest, GivesTheOldFileOrTheNewOneAndSaysWhich)
         {"a record of a new file that fails", -1, writeHalf, kWriteFailed, "", "0"},
     };
     for (const auto& c : cases) {
-        fs::create_directory(path("files"));
+        fs::create_directory(folder_ / "files");
         if (c.mode >= 0)
-            file("files/f", c.mode);
-        const DurableSave::Result result = save_.save(path("files/f"), c.write);
+            folder_.write("files/f", "old", c.mode);
+        const DurableSave::Result result = save_.save(folder_ / "files/f", c.write);
         EXPECT_EQ(result.outcome, c.outcome) << c.why << ": " << result.reason;
         EXPECT_EQ(result.reason.empty(), c.outcome == kSaved) << c.why;
         EXPECT_EQ(names("f"), c.names) << c.why;
         if (c.mode >= 0) {
-            EXPECT_EQ(fs::status(path("files/f")).permissions(), fs::perms(c.mode)) << c.why;
-            fs::permissions(path("files/f"), fs::perms(0600));
+            EXPECT_EQ(fs::status(folder_ / "files/f").permissions(), fs::perms(c.mode)) << c.why;
+            fs::permissions(folder_ / "files/f", fs::perms(0600));
         }
-        EXPECT_EQ(content("files/f"), c.content) << c.why;
-        fs::remove_all(path("files"));
+        EXPECT_EQ(folder_.content("files/f"), c.content) << c.why;
+        fs::remove_all(folder_ / "files");
         fs::remove_all(data_.path());
     }
 }
 
 TEST_F(DurableSaveTest, DealsWithWhateverThePathLeadsTo)
 {
-    fs::create_directory(path("folder"));
-    fs::create_directory(path("locked"));
-    file("locked/f");
-    fs::permissions(path("locked"), fs::perms(0555));
-    fs::create_symlink("made", path("dangling"));
-    fs::create_symlink("missing/made", path("lost"));
+    folder_.write("folder/file", "old");
+    folder_.write("locked/f", "old");
+    fs::permissions(folder_ / "locked", fs::perms(0555));
+    fs::create_symlink("ring", folder_ / "ring");
+    fs::create_symlink("made", folder_ / "dangling");
+    fs::create_symlink("missing/made", folder_ / "lost");
     const struct {
         std::string path;
         DurableSave::Outcome outcome;
     } cases[] = {
-        {path("folder"), kOpenFailed},
-        {path("folder/"), kOpenFailed},
-        {path("missing/f"), kOpenFailed},
-        {path("locked/f"), kOpenFailed},
-        {path("locked/new"), kOpenFailed},
-        {path("lost"), kOpenFailed},
-        {path("dangling"), kSaved},
+        {folder_ / "folder", kOpenFailed},
+        {folder_ / "folder/", kOpenFailed},
+        {folder_ / "missing/f", kOpenFailed},
+        {folder_ / "folder/file/f", kOpenFailed},
+        {folder_ / "ring", kOpenFailed},
+        {folder_ / std::string(300, 'x'), kOpenFailed},
+        {folder_ / "locked/f", kOpenFailed},
+        {folder_ / "locked/new", kOpenFailed},
+        {folder_ / "lost", kOpenFailed},
+        {folder_ / "dangling", kSaved},
         {"/dev/full", kWriteFailed},
         {"/dev/null", kSaved},
         {"", kOpenFailed},
@@ -129,38 +125,36 @@ TEST_F(DurableSaveTest, DealsWithWhateverThePathLeadsTo)
         EXPECT_EQ(isCalled, c.outcome != kOpenFailed) << c.path;
         EXPECT_EQ(result.reason.starts_with(c.path + ": "), c.outcome != kSaved) << result.reason;
     }
-    EXPECT_TRUE(fs::is_symlink(path("dangling")));
-    EXPECT_EQ(content("made"), "new");
-    EXPECT_EQ(content("locked/f"), "old");
-    EXPECT_EQ(save_.save(path("locked/a\nb"), writeNew).reason.find('\n'), std::string::npos) << "one line";
-    fs::permissions(path("locked"), fs::perms(0755)); // to be removed in the end
+    EXPECT_TRUE(fs::is_symlink(folder_ / "dangling"));
+    EXPECT_EQ(folder_.content("made"), "new");
+    EXPECT_EQ(folder_.content("locked/f"), "old");
+    EXPECT_EQ(save_.save(folder_ / "locked/a\nb", writeNew).reason.find('\n'), std::string::npos) << "one line";
+    fs::permissions(folder_ / "locked", fs::perms(0755)); // to be removed in the end
 }
 
 TEST_F(DurableSaveTest, AFullDiskLeavesTheOldFile)
 {
-    fs::create_directory(path("files"));
-    file("files/f");
+    folder_.write("files/f", "old");
     rlimit former;
     getrlimit(RLIMIT_FSIZE, &former);
     const rlimit little{1 << 16, former.rlim_max};
     setrlimit(RLIMIT_FSIZE, &little);
-    const DurableSave::Result result = save_.save(path("files/f"), writeMuch);
+    const DurableSave::Result result = save_.save(folder_ / "files/f", writeMuch);
     setrlimit(RLIMIT_FSIZE, &former);
     EXPECT_EQ(result.outcome, kWriteFailed);
-    EXPECT_EQ(result.reason, path("files/f") + ": cannot be written: File too large");
-    EXPECT_EQ(content("files/f"), "old");
+    EXPECT_EQ(result.reason, folder_ / "files/f" + ": cannot be written: File too large");
+    EXPECT_EQ(folder_.content("files/f"), "old");
     EXPECT_EQ(names("f"), "f 0");
 }
 
 TEST_F(DurableSaveTest, WithoutAVersionTheOldFileStays)
 {
-    file("f");
-    fs::create_directory(data_.path());
-    file("Pelorin/Backups"); // no folder can have that name now
-    const DurableSave::Result result = save_.save(path("f"), writeNew);
+    folder_.write("f", "old");
+    folder_.write("Pelorin/Backups", "old"); // no folder can have that name now
+    const DurableSave::Result result = save_.save(folder_ / "f", writeNew);
     EXPECT_EQ(result.outcome, kWriteFailed);
-    EXPECT_EQ(result.reason, path("f") + ": its former version cannot be kept: " + path("Pelorin/Backups") +
+    EXPECT_EQ(result.reason, folder_ / "f" + ": its former version cannot be kept: " + folder_ / "Pelorin/Backups" +
                                  ": cannot be made: Not a directory");
-    EXPECT_EQ(content("f"), "old");
-    EXPECT_EQ(save_.save(path("new"), writeNew).outcome, kSaved) << "there is nothing to keep";
+    EXPECT_EQ(folder_.content("f"), "old");
+    EXPECT_EQ(save_.save(folder_ / "new", writeNew).outcome, kSaved) << "there is nothing to keep";
 }

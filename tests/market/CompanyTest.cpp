@@ -27,16 +27,11 @@ TEST(CompanyTest, TheSymbolOfTheMoneyComesFromTheMarketsCurrency)
 {
     Currency euro("Euro", "EUR", nullptr);
     auto* market = new Market("NYSE");
-    auto company = std::make_unique<Company>(nullptr, "Big", "BG");
-    EXPECT_FALSE(company->getCurrencyRepresentation().hasText());
-    company->setMarket(market);
-    EXPECT_FALSE(company->getCurrencyRepresentation().hasText());
+    const Company company(market, "Big", "BG");
+    EXPECT_FALSE(company.getCurrencyRepresentation().hasText());
+    EXPECT_FALSE(Company().getCurrencyRepresentation().hasText());
     market->setCurrency(&euro);
-    EXPECT_EQ(company->getCurrencyRepresentation(), "EUR");
-    company.reset();
-    EXPECT_EQ(market->getNbrCompanies(), 0U);
-    delete market;
-    EXPECT_EQ(euro.getNbrMarkets(), 0U);
+    EXPECT_EQ(company.getCurrencyRepresentation(), "EUR");
 }
 
 TEST(CompanyTest, AnEventThatChangesItsDayStaysWithItsCompanyAndComesLast)

@@ -1,15 +1,11 @@
 #include "foundation/FieldIO.h"
-#include "market/Catalogue.h"
-#include "market/Company.h"
-#include "market/Currency.h"
-#include "market/Market.h"
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
 #include "tests/support/Bytes.h"
+#include "tests/support/SmallPortfolio.h"
 
 #include <functional>
 #include <gtest/gtest.h>
-#include <tuple>
 
 namespace {
 
@@ -54,15 +50,12 @@ std::string summary(const Catalogue& catalogue)
     for (const Currency* currency : catalogue.getCurrencies()) {
         result += currency->getRepresentation().getCharacterArray();
         result += " " + std::to_string(currency->getNbrQuotes()) + " {";
-        unsigned markets, companies;
-        Market** market = currency->getAllMarkets(&markets);
-        for (unsigned i = 0; i < markets; ++i) {
-            result += market[i]->getName().getCharacterArray() + std::string(" {");
-            Company** company = market[i]->getAllCompanies(&companies);
-            for (unsigned j = 0; j < companies; ++j)
-                result += company[j]->getAbbreviation().getCharacterArray() +
-                          (" " + std::to_string(company[j]->getNbrQuotes()) + "+") +
-                          std::to_string(company[j]->getNbrEvents()) + " ";
+        for (const Market* market : all(*currency, &Currency::getAllMarkets)) {
+            result += market->getName().getCharacterArray() + std::string(" {");
+            for (const Company* company : all(*market, &Market::getAllCompanies))
+                result += company->getAbbreviation().getCharacterArray() +
+                          (" " + std::to_string(company->getNbrQuotes()) + "+") +
+                          std::to_string(company->getNbrEvents()) + " ";
             result += "}";
         }
         result += "}";
@@ -93,8 +86,7 @@ TEST(MarketFileTest, EveryFieldComesFromAndGoesToItsPlace)
     EXPECT_EQ(company->getName(), "Big");
     EXPECT_EQ(company->getRealQuote(Date(1, 3, 1999)), 10);
     EXPECT_EQ(company->getRealQuote(Date(11, 3, 1999)), 20);
-    unsigned n;
-    CompanyEvent** events = company->getAllEvents(&n);
+    const auto events = all(*company, &Company::getAllEvents);
     const auto& split = dynamic_cast<SplitCompanyEvent&>(*events[0]);
     EXPECT_TRUE(split.getDate() == Date(3, 5, 1999) && split.getNumerator() == 2 && split.getDivider() == 1);
     const auto& note = dynamic_cast<NoteCompanyEvent&>(*events[1]);

@@ -1,6 +1,8 @@
 #include "portfolio/Account.h"
 #include "tests/support/SmallPortfolio.h"
 
+#include <gtest/gtest.h>
+
 namespace {
 
 std::string amounts(const Account& account)
@@ -53,16 +55,13 @@ TEST(AccountTest, WithoutCurrencyOrWalletLookUpsFindNothing)
     new Share(&p.wallet, p.alpha);
     auto* account = new Account("A");
     const auto* operation = new DepositAccountOperation(kStart, account, 1, false);
-    Share* share;
-    EXPECT_TRUE(account->getCurrencyName().isUndefined());
-    EXPECT_TRUE(operation->getCurrencyRepresentation().isUndefined());
-    EXPECT_EQ(account->getShare("Paris", "AC", &share), -1);
-    EXPECT_EQ(operation->getAccountByName("A"), nullptr);
-
-    account->setCurrency(p.euro);
-    account->setWallet(&p.wallet);
-    EXPECT_EQ(account->getCurrencyName(), "Euro");
-    EXPECT_EQ(operation->getCurrencyRepresentation(), "EUR");
-    EXPECT_EQ(account->getShare("Paris", "AC", &share), 0);
-    EXPECT_EQ(operation->getAccountByName("A"), account);
+    for (const bool isOwned : {false, true}) {
+        Share* share;
+        EXPECT_EQ(account->getCurrencyName().isUndefined(), !isOwned);
+        EXPECT_EQ(operation->getCurrencyRepresentation().isUndefined(), !isOwned);
+        EXPECT_EQ(account->getShare("Paris", "AC", &share), isOwned ? 0 : -1);
+        EXPECT_EQ(operation->getAccountByName("A"), isOwned ? account : nullptr);
+        account->setCurrency(p.euro);
+        account->setWallet(&p.wallet);
+    }
 }

@@ -2,6 +2,7 @@
 #include "tests/support/SmallPortfolio.h"
 
 #include <ctime>
+#include <gtest/gtest.h>
 
 TEST(ShareTest, WithoutCompanyThereAreNoNamesAndNoQuotes)
 {
@@ -25,21 +26,6 @@ TEST(ShareTest, TheRateCostIsThePresentOneOfTheWallet)
     share->setWallet(nullptr);
     EXPECT_EQ(bought->getOperationRateCost(), 0);
     EXPECT_EQ(ShareOperation().getOperationRateCost(), 0);
-}
-
-TEST(ShareTest, OnlyTheAutomaticOperationsCanBeRemovedAtOnce)
-{
-    for (const char* pattern : {"ama", "aaa", "aamm", "mmaa", ""}) {
-        Share share;
-        std::vector<ShareOperation*> manual;
-        for (int day = 0; pattern[day] != '\0'; ++day) {
-            auto* operation = new ShareOperation(daysAfterStart(day), &share, true, 1, 1, pattern[day] == 'a', 0);
-            if (!operation->isAutomatic())
-                manual.push_back(operation);
-        }
-        share.removeAutomaticShareOperations();
-        EXPECT_EQ(all(share, &Share::getAllShareOperations), manual) << pattern;
-    }
 }
 
 TEST(ShareTest, RemovingTheAutomaticOperationsTakesTimeInProportionToThem)

@@ -57,25 +57,21 @@ TEST(WalletTest, LookUpsNeedEveryNameAndGiveTheFirstMatch)
     EXPECT_EQ(p.wallet.getAccountByName("a"), nullptr);
 }
 
-TEST(WalletTest, CurrenciesAndMarketsAreCopiedAndNotOwned)
+TEST(WalletTest, CurrenciesAndMarketsAreCopied)
 {
     SmallPortfolio p;
-    {
-        Wallet other;
-        Currency* currencies[] = {p.euro};
-        Market* markets[] = {p.paris};
-        Currency* found = p.euro;
-        EXPECT_EQ(other.getCurrency("Euro", &found), -1) << "none were set";
-        EXPECT_EQ(found, nullptr);
-        other.setCurrencies(1, currencies);
-        other.setMarkets(1, markets);
-        currencies[0] = nullptr;
-        markets[0] = nullptr;
-        Company* company;
-        EXPECT_EQ(other.getCurrency("Euro", &found), 0);
-        EXPECT_EQ(other.getCompany("Paris", "AC", &company), 0);
-    }
-    EXPECT_EQ(p.alpha->getName(), "Alpha") << "it outlives the wallet";
+    Wallet other;
+    Currency* currencies[] = {p.euro};
+    Market* markets[] = {p.paris};
+    EXPECT_EQ(other.getCurrency("Euro", &currencies[0]), -1) << "none were set";
+    currencies[0] = p.euro;
+    other.setCurrencies(1, currencies);
+    other.setMarkets(1, markets);
+    currencies[0] = nullptr;
+    markets[0] = nullptr;
+    Company* company;
+    EXPECT_EQ(other.getCurrency("Euro", &currencies[0]), 0);
+    EXPECT_EQ(other.getCompany("Paris", "AC", &company), 0);
 }
 
 TEST(WalletTest, RemovingAutomaticOperationsSkipsNoNeighbour)
@@ -85,17 +81,23 @@ TEST(WalletTest, RemovingAutomaticOperationsSkipsNoNeighbour)
         Account* from = addAccount(p.wallet, "from", p.euro);
         Account* to = addAccount(p.wallet, "to", p.euro);
         auto* share = new Share(&p.wallet, p.alpha);
-        new ShareOperation(kStart, share, false, 1, 1, true, 0); // in no account's list
-        std::vector<Operation*> manual;
+        std::vector<Operation*> sent;
+        std::vector<ShareOperation*> sold, manual;
         for (int day = 0; pattern[day] != '\0'; ++day) {
-            auto* sent = transfer(from, to, day, 1, pattern[day] == 'a');
-            if (!sent->isAutomatic())
-                manual.push_back(sent);
+            const bool isAutomatic = pattern[day] == 'a';
+            auto* transferred = transfer(from, to, day, 1, isAutomatic);
+            sold.push_back(new ShareOperation(daysAfterStart(day), share, false, 1, 1, isAutomatic, 0));
+            if (!isAutomatic) {
+                sent.push_back(transferred);
+                manual.push_back(sold.back());
+            }
         }
         p.wallet.removeAutomaticOperations();
-        EXPECT_EQ(all(*from, &Account::getAllOperations), manual) << pattern;
-        EXPECT_EQ(to->getNbrTransferOperations(), manual.size()) << pattern;
-        EXPECT_EQ(share->getNbrShareOperations(), 1U) << "an automatic sale stays";
+        EXPECT_EQ(all(*from, &Account::getAllOperations), sent) << pattern;
+        EXPECT_EQ(to->getNbrTransferOperations(), sent.size()) << pattern;
+        EXPECT_EQ(all(*share, &Share::getAllShareOperations), sold) << "sales stay in: " << pattern;
+        share->removeAutomaticShareOperations();
+        EXPECT_EQ(all(*share, &Share::getAllShareOperations), manual) << pattern;
     }
 }
 

@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <functional>
+#include <gtest/gtest.h>
 #include <typeinfo>
 #include <utility>
 

@@ -11,7 +11,6 @@
 #include "portfolio/TransferAccountOperation.h"
 #include "portfolio/Wallet.h"
 
-#include <gtest/gtest.h>
 #include <ostream>
 #include <random>
 #include <vector>
@@ -35,8 +34,8 @@ inline unsigned below(std::mt19937& random, std::size_t n)
 }
 
 /// The elements of an association, as a range.
-template <class Owner, class Element>
-std::vector<Element*> all(const Owner& owner, Element** (Owner::*getAll)(unsigned*) const)
+template <class Owner, class Declarer, class Element>
+std::vector<Element*> all(const Owner& owner, Element** (Declarer::*getAll)(unsigned*) const)
 {
     unsigned n;
     Element** elements = (owner.*getAll)(&n);

@@ -25,6 +25,19 @@ struct TemporaryFolder {
     }
     ~TemporaryFolder() { std::filesystem::remove_all(path); }
 
+    /// The path of what has that name in it.
+    std::string operator/(const std::string& name) const { return path / name; }
+    std::string content(const std::string& name) const { return contentOf(path / name); }
+    /// Writes a file, with the folders that its name needs. @return its path.
+    std::string write(const std::string& name, const std::string& content, int mode = 0644) const
+    {
+        const std::filesystem::path file = path / name;
+        std::filesystem::create_directories(file.parent_path());
+        std::ofstream(file, std::ios::binary) << content;
+        std::filesystem::permissions(file, std::filesystem::perms(mode));
+        return file;
+    }
+
     const std::filesystem::path path;
 };
 

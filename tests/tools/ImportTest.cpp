@@ -1,16 +1,11 @@
-#include "market/Catalogue.h"
-#include "market/Company.h"
-#include "market/Currency.h"
-#include "market/Market.h"
+#include "tests/support/Bytes.h"
+#include "tests/support/SmallPortfolio.h"
 #include "tests/support/ToolRun.h"
 #include "tools/CsvReader.h"
 #include "tools/DateText.h"
 #include "tools/Importer.h"
 
-#include <cstdlib>
 #include <ctime>
-#include <filesystem>
-#include <fstream>
 #include <gmock/gmock.h>
 #include <sstream>
 
@@ -23,25 +18,18 @@ namespace fs = std::filesystem;
 
 class ImportTest : public testing::Test {
 protected:
-    std::string path(const std::string& name) const { return folder_.path / name; }
-    std::string file(const std::string& name, const std::string& content) const
-    {
-        std::ofstream(path(name), std::ios::binary) << content;
-        return path(name);
-    }
-    std::string content(const std::string& name) const { return contentOf(path(name)); }
     std::string zipped(const std::string& name, const std::string& content) const
     {
-        gzFile out = gzopen(path(name).c_str(), "wb");
+        gzFile out = gzopen((folder_ / name).c_str(), "wb");
         gzwrite(out, content.data(), static_cast<unsigned>(content.size()));
         gzclose(out);
-        return path(name);
+        return folder_ / name;
     }
     /// "line:field|field" of every record; "line:!" for a malformed one.
     std::vector<std::string> records(const std::string& csv) const
     {
         std::vector<std::string> result;
-        CsvReader reader(file("t.csv", csv));
+        CsvReader reader(folder_.write("t.csv", csv));
         while (reader.next()) {
             std::string text = reader.fields().empty() ? "!|" : "";
             for (const auto& field : reader.fields())
@@ -55,16 +43,13 @@ protected:
     std::vector<std::string> companies() const
     {
         std::vector<std::string> result;
-        for (const Market* market : catalogue_.getMarkets()) {
-            unsigned n;
-            Company** all = market->getAllCompanies(&n);
-            for (const Company* company : std::vector<Company*>(all, all + n)) {
+        for (const Market* market : catalogue_.getMarkets())
+            for (const Company* company : all(*market, &Market::getAllCompanies)) {
                 std::ostringstream text;
                 text << market->getName().bytes() << '/' << company->getAbbreviation().bytes() << '/'
                      << company->getName().bytes() << '/' << market->getCurrencyRepresentation().bytes();
                 result.push_back(text.str() + quotes(*company));
             }
-        }
         return result;
     }
     std::string rates(const char* symbol) const { return quotes(*catalogue_.getCurrencyByRepresentation(symbol)); }
@@ -72,8 +57,8 @@ protected:
     static std::string quotes(const Series& series)
     {
         std::ostringstream text;
-        for (unsigned i = 0; i < series.getNbrQuotes(); ++i)
-            text << ' ' << series.getQuote(i)->getDate().toString().bytes() << '=' << series.getQuote(i)->getValue();
+        for (const auto* quote : all(series, &Series::getAllQuotes))
+            text << ' ' << quote->getDate().toString().bytes() << '=' << quote->getValue();
         return text.str();
     }
     std::string log() const { return log_.str(); }
@@ -102,10 +87,10 @@ TEST_F(ImportTest, CsvRecordsFollowRfc4180WithLineNumbers)
 TEST_F(ImportTest, GzippedDataThatEndTooEarlyAreAnError)
 {
     zipped("t.gz", "2005-01-03,A,1\n2005-01-04,A,2\n");
-    fs::resize_file(path("t.gz"), fs::file_size(path("t.gz")) - 9);
+    fs::resize_file(folder_ / "t.gz", fs::file_size(folder_ / "t.gz") - 9);
     Importer importer(options_, catalogue_, log_);
-    EXPECT_THROW(importer.addQuotes(path("t.gz")), std::runtime_error);
-    EXPECT_THROW(importer.addQuotes(path("none")), std::runtime_error);
+    EXPECT_THROW(importer.addQuotes(folder_ / "t.gz"), std::runtime_error);
+    EXPECT_THROW(importer.addQuotes(folder_ / "none"), std::runtime_error);
     EXPECT_THROW(importer.addQuotes(folder_.path), std::runtime_error);
 }
 
@@ -122,8 +107,8 @@ TEST_F(ImportTest, DatesAreIsoOrDayMonthYear)
 TEST_F(ImportTest, TheFirstDecimalMarkOfAFileHoldsForAll)
 {
     Importer importer(options_, catalogue_, log_);
-    importer.addQuotes(file("a.csv", "2005-01-03;A;1234\n2005-01-04;A;1.234,5\n2005-01-05;A;12,5\n"
-                                     "2005-01-06;A;1.234\n2005-01-07;A;1e-3\n"));
+    importer.addQuotes(folder_.write("a.csv", "2005-01-03;A;1234\n2005-01-04;A;1.234,5\n2005-01-05;A;12,5\n"
+                                              "2005-01-06;A;1.234\n2005-01-07;A;1e-3\n"));
     importer.finish();
     EXPECT_THAT(companies(), ElementsAre("NYSE/A/A/USD 03/01/2005=1234 05/01/2005=12.5 07/01/2005=0.001"));
     EXPECT_THAT(log(), HasSubstr("line 2: \"1.234,5\" is no positive number with decimal '.'\n"));
@@ -133,7 +118,7 @@ TEST_F(ImportTest, TheFirstDecimalMarkOfAFileHoldsForAll)
 TEST_F(ImportTest, QuotesAreOrderedAndTheLaterLineOfADayCounts)
 {
     Importer importer(options_, catalogue_, log_);
-    importer.addQuotes(file("a.csv", "2005-01-04,A,2\n2005-01-03,A,1\n04/01/2005,A,3\n2005-01-03,B,.5\n"));
+    importer.addQuotes(folder_.write("a.csv", "2005-01-04,A,2\n2005-01-03,A,1\n04/01/2005,A,3\n2005-01-03,B,.5\n"));
     importer.addQuotes(zipped("b.csv.gz", "Adj. Close;CLOSE;Symbol;date\n9;1,5;A;2005-01-03\n;8,25;A;05/01/2005\n"));
     EXPECT_EQ(importer.finish(), Date(5, 1, 2005));
     EXPECT_THAT(companies(),
@@ -154,7 +139,7 @@ TEST_F(ImportTest, LinesThatCannotBeUsedAreCountedWithTheirNumbers)
     for (const char* line : bad)
         (csv += line) += '\n';
     Importer importer(options_, catalogue_, log_);
-    importer.addQuotes(file("a.csv", csv));
+    importer.addQuotes(folder_.write("a.csv", csv));
     for (std::size_t i = 1; i <= std::size(bad); ++i)
         EXPECT_THAT(log(), HasSubstr("a.csv, line " + std::to_string(i) + ": ")) << bad[i - 1];
     EXPECT_EQ(importer.counts().skipped, std::size(bad));
@@ -162,7 +147,7 @@ TEST_F(ImportTest, LinesThatCannotBeUsedAreCountedWithTheirNumbers)
 
     for (std::size_t i = std::size(bad); i < Table::kLinesTold + 3; ++i)
         csv += "2005-01-03,A,x\n";
-    importer.addQuotes(file("b.csv", csv));
+    importer.addQuotes(folder_.write("b.csv", csv));
     EXPECT_THAT(log(), HasSubstr("b.csv, line 20: "));
     EXPECT_THAT(log(), HasSubstr("b.csv: ... and 3 more\n"));
     EXPECT_THAT(log(), testing::Not(HasSubstr("b.csv, line 21: ")));
@@ -190,7 +175,7 @@ TEST_F(ImportTest, RatesBecomePricesInTheReference)
         options_.ratesAreUnits = c.option;
         Catalogue made;
         Importer importer(options_, made, log_);
-        const std::string table = file("r.csv", std::string(c.heading) + rows);
+        const std::string table = folder_.write("r.csv", std::string(c.heading) + rows);
         if (c.usd == nullptr) {
             EXPECT_THROW(importer.addRates(table), std::runtime_error) << c.why;
             continue;
@@ -207,8 +192,9 @@ TEST_F(ImportTest, TheRowComesBeforeTheListingAndThatBeforeTheOptions)
 {
     Importer importer(options_, catalogue_, log_);
     importer.addListing(
-        file("l.csv", "SAP,XETRA,,SAP SE\nBMW,XETRA,EUR,BMW AG\nVOW,XETRA,USD,VW\nABB,,CHF,ABB\n,X,,\nIBM\n"));
-    importer.addQuotes(file("q.csv", "date,ticker,close,market,currency,name\n3/1/2005,SAP,1,,,\n3/1/2005,BMW,2,,,BMW\n"
+        folder_.write("l.csv", "SAP,XETRA,,SAP SE\nBMW,XETRA,EUR,BMW AG\nVOW,XETRA,USD,VW\nABB,,CHF,ABB\n,X,,\nIBM\n"));
+    importer.addQuotes(folder_.write("q.csv",
+                                     "date,ticker,close,market,currency,name\n3/1/2005,SAP,1,,,\n3/1/2005,BMW,2,,,BMW\n"
                                      "3/1/2005,IBM,3,,,\n3/1/2005,BMW,4,Wien,,\n3/1/2005,ABB,5,SIX,CHF,\n"
                                      "3/1/2005,ABB,6,SIX,EUR,\n3/1/2005,VOW,7,XETRA,EUR,\n"));
     importer.finish();
@@ -226,7 +212,7 @@ TEST_F(ImportTest, AMarketOfManyCompaniesIsNotSearchedForEach)
         table += "3/1/2005,T" + std::to_string(i) + ",1\n";
     Importer importer(options_, catalogue_, log_);
     const std::clock_t start = std::clock();
-    importer.addQuotes(file("q.csv", table));
+    importer.addQuotes(folder_.write("q.csv", table));
     EXPECT_LT(std::clock() - start, 2 * CLOCKS_PER_SEC);
     importer.finish();
     EXPECT_EQ(importer.counts().companies, static_cast<std::size_t>(kMany));
@@ -234,27 +220,19 @@ TEST_F(ImportTest, AMarketOfManyCompaniesIsNotSearchedForEach)
 
 TEST_F(ImportTest, TheProgramWritesAFileThatTheCatalogueReads)
 {
-    file("IBM.csv", "Date,Close\n2005-01-03,97.75\n");
-    file("r.csv", "2005-01-03,USD,1.25\n");
+    folder_.write("IBM.csv", "Date,Close\n2005-01-03,97.75\n");
+    folder_.write("r.csv", "2005-01-03,USD,1.25\n");
     EXPECT_EQ(run("made --quotes IBM.csv --ticker-from-name --rates r.csv --market AMEX"), 0);
-    const std::string once = content("made");
-    FILE* written = std::fopen(path("made").c_str(), "rb");
-    EXPECT_EQ(catalogue_.rd(written), 0);
-    std::fclose(written);
+    const std::string once = folder_.content("made");
+    EXPECT_EQ(catalogue_.rd(BytesFile(once)), 0);
     EXPECT_THAT(companies(), ElementsAre("AMEX/IBM/IBM/USD 03/01/2005=97.75"));
     EXPECT_EQ(catalogue_.getReferenceCurrency()->getRepresentation(), "EUR");
     EXPECT_EQ(rates("USD"), " 03/01/2005=0.8");
 
     EXPECT_EQ(run("made --rates r.csv"), 1);
-    EXPECT_EQ(content("made"), once) << "nothing is overwritten unasked";
+    EXPECT_EQ(folder_.content("made"), once) << "nothing is overwritten unasked";
     EXPECT_EQ(run("made --rates r.csv --force"), 0);
-    EXPECT_NE(content("made"), once);
-    for (const char* bad : {"", "new", "new --rates r.csv --rates-are odd", "new --rates r.csv --reference ''",
-                            "new --rates r.csv --what"})
-        EXPECT_EQ(run(bad), 2) << bad;
-    for (const char* failing : {"new --rates none.csv", "none/new --rates r.csv", "new --quotes IBM.csv"})
-        EXPECT_EQ(run(failing), 1) << failing;
-    EXPECT_FALSE(fs::exists(path("new")));
+    EXPECT_NE(folder_.content("made"), once);
 }
 
 } // namespace

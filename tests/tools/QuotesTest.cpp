@@ -21,10 +21,6 @@ namespace fs = std::filesystem;
 class QuotesTest : public testing::Test {
 protected:
     ~QuotesTest() override { quoteServers() = before_; }
-    void file(const std::string& name, const std::string& content) const
-    {
-        std::ofstream(folder_.path / name, std::ios::binary) << content;
-    }
     float latest(const ServerRun& server, const char* ticker)
     {
         quoteServers() = {"localhost", "localhost", server.port(), std::chrono::seconds(20)};
@@ -77,8 +73,8 @@ TEST_F(QuotesTest, TheProgramServesWhatTheFetchesRead)
         if (day >= Date(1, 3, 2005))
             closes[day] = static_cast<float>(cents / 100.0);
     }
-    file("BRK.B.csv", table);
-    file("^X&Y.csv", "2005-01-04,8.25\r\n2005-01-03,7.75\r\n");
+    folder_.write("BRK.B.csv", table);
+    folder_.write("^X&Y.csv", "2005-01-04,8.25\r\n2005-01-03,7.75\r\n");
     ServerRun server(PELORIN_QUOTES, folder_.path);
     EXPECT_THAT(server.address(), StartsWith("127.0.0.1:"));
     EXPECT_EQ(latest(server, "^X&Y"), 8.25F) << "of the last day, not of the last line";
@@ -87,25 +83,24 @@ TEST_F(QuotesTest, TheProgramServesWhatTheFetchesRead)
     ASSERT_EQ(company_->getNbrQuotes(), closes.size());
     for (const auto& [day, close] : closes)
         EXPECT_EQ(company_->getRealQuote(day), close) << day.toString().bytes();
-    file("BRK.B.csv", "2005-06-01,9.5\n");
+    folder_.write("BRK.B.csv", "2005-06-01,9.5\n");
     EXPECT_EQ(latest(server, "BRK.B"), 9.5F) << "files are read anew";
     EXPECT_EQ(server.stop(SIGTERM), 0);
 }
 
 TEST_F(QuotesTest, OtherRequestsGetAPageWithoutAPrice)
 {
-    fs::create_directory(folder_.path / "in");
-    fs::create_directory(folder_.path / "in/FOLDER.csv");
-    mkfifo((folder_.path / "in/PIPE.csv").c_str(), 0600);
+    fs::create_directories(folder_ / "in/FOLDER.csv");
+    mkfifo((folder_ / "in/PIPE.csv").c_str(), 0600);
     for (const char* name : {"out.csv", "in/A.csv", "in/.hidden.csv", "in/.csv"})
-        file(name, "2005-01-03,97.75\n");
-    file("in/EMPTY.csv", "");
-    file("in/BAD.csv", "Date,Close\n2005-01-03,none\n");
-    file("in/COLUMNS.csv", "Date,Volume\n2005-01-03,1\n");
+        folder_.write(name, "2005-01-03,97.75\n");
+    folder_.write("in/EMPTY.csv", "");
+    folder_.write("in/BAD.csv", "Date,Close\n2005-01-03,none\n");
+    folder_.write("in/COLUMNS.csv", "Date,Volume\n2005-01-03,1\n");
     std::ostringstream log;
-    const QuoteFolder folder(folder_.path / "in", log);
+    const QuoteFolder folder(folder_ / "in", log);
     EXPECT_EQ(folder.answer("GET /quotes?symbol=A\r\n"), latestQuotePage(97.75F));
-    const std::string absolute = (folder_.path / "out").string();
+    const std::string absolute = folder_ / "out";
     for (const std::string ticker : {"B", "", "a", "../out", "../in/A", "in/../A", "./A", "/A", ".hidden", "FOLDER",
                                      "PIPE", "EMPTY", "BAD", "COLUMNS", "A.csv", "A ", "..", absolute.c_str()})
         for (const std::string& request :
@@ -119,12 +114,12 @@ TEST_F(QuotesTest, OtherRequestsGetAPageWithoutAPrice)
     EXPECT_THAT(log.str(), HasSubstr("COLUMNS.csv: the header line names no column for the price"));
     float price = 0;
     EXPECT_EQ(parseLatestQuotePage(noQuotesPage(), &price), -1);
-    EXPECT_THROW(QuoteFolder(folder_.path / "out.csv", log), std::runtime_error);
+    EXPECT_THROW(QuoteFolder(folder_ / "out.csv", log), std::runtime_error);
 }
 
 TEST_F(QuotesTest, ASilentClientHoldsTheServerForSecondsOnly)
 {
-    file("A.csv", "2005-01-03,97.75\n");
+    folder_.write("A.csv", "2005-01-03,97.75\n");
     ServerRun server(PELORIN_QUOTES, folder_.path);
     Socket silent, another;
     {
@@ -139,30 +134,6 @@ TEST_F(QuotesTest, ASilentClientHoldsTheServerForSecondsOnly)
     const auto stopping = std::chrono::steady_clock::now();
     EXPECT_EQ(server.stop(SIGINT), 0);
     EXPECT_LT(std::chrono::steady_clock::now() - stopping, std::chrono::seconds(3));
-}
-
-TEST_F(QuotesTest, WhatCannotBeServedIsTold)
-{
-    const ServerRun server(PELORIN_QUOTES, folder_.path);
-    const std::string taken = ". --port " + std::to_string(server.port());
-    const struct {
-        std::string arguments;
-        int status;
-        const char* message;
-    } cases[] = {
-        {taken, 1, ": cannot be listened on: "},
-        {". --port 0 --bind 192.0.2.1", 1, "192.0.2.1:0: cannot be listened on"},
-        {"none --port 0", 1, "none: No such"},
-        {". --port 65536", 2, "--port"},
-        {". --bind localhost", 2, "--bind"},
-        {"", 2, "FOLDER"},
-    };
-    for (const auto& c : cases) {
-        const ToolRun run(PELORIN_QUOTES, c.arguments, folder_);
-        EXPECT_EQ(run.status, c.status) << c.arguments;
-        EXPECT_THAT(run.err, HasSubstr(c.message)) << c.arguments;
-        EXPECT_EQ(run.out, "") << c.arguments;
-    }
 }
 
 } // namespace

@@ -1,9 +1,7 @@
 #include "valuation/Evolution.h"
 #include "tests/support/Links.h"
+#include "tests/support/StateText.h"
 #include "valuation/Totals.h"
-
-#include <bit>
-#include <sstream>
 
 namespace {
 
@@ -156,22 +154,6 @@ private:
     std::vector<Share*> shares_;
 };
 
-/// All that a state tells, floats as their bits.
-std::string contentOf(const State& state)
-{
-    std::ostringstream text;
-    const auto bits = [](float value) { return std::bit_cast<std::uint32_t>(value); };
-    const auto show = [](const Date& date) { return std::string(date.toString().bytes()); };
-    text << show(state.getDate()) << ' ' << show(state.getFirstOperationDate()) << ' ' << bits(state.getTotalDeposit());
-    for (const AccountState* account : all(state, &State::getAllAccountStates))
-        text << '\n' << account->listed() << ' ' << bits(account->getCash());
-    for (const ShareState* share : all(state, &State::getAllShareStates))
-        text << '\n'
-             << share->listed() << ' ' << share->getQuantity() << ' ' << bits(share->getBuyQuote()) << ' '
-             << bits(share->getQuote()) << ' ' << show(share->getEndDate());
-    return text.str();
-}
-
 } // namespace
 
 TEST(EvolutionTest, EveryDailyStateIsBitForBitTheFullReplayOfItsDay)
@@ -191,7 +173,7 @@ TEST(EvolutionTest, EveryDailyStateIsBitForBitTheFullReplayOfItsDay)
         for (int day = 1; day < 51; ++day) {
             const State& built = *states[static_cast<unsigned>(day)];
             const State replay(&p.wallet, daysAfterStart(day - 6), false);
-            ASSERT_EQ(contentOf(built), contentOf(replay)) << "seed " << seed;
+            ASSERT_EQ(textOf(built), textOf(replay)) << "seed " << seed;
         }
     }
     EXPECT_GT(evolutions, 40);

@@ -4,6 +4,7 @@
 #include "valuation/ShareState.h"
 
 #include <climits>
+#include <gtest/gtest.h>
 
 namespace {
 
@@ -23,15 +24,6 @@ struct OneHolding : SmallPortfolio {
 };
 
 } // namespace
-
-TEST(StateTest, ADepositCountsInItsCurrencyAndInTheReferenceOfItsDay)
-{
-    OneHolding p;
-    deposit(addAccount(p.wallet, "Dollars", p.dollar), 10, 1000);
-    new CurrencyQuote(p.dollar, daysAfterStart(20), 4);
-    EXPECT_EQ(p.cash(30, 1), 1000);
-    EXPECT_EQ(p.at(30).getTotalDeposit(), 2000);
-}
 
 TEST(StateTest, ATransferTakesTheLargerOfAmountAndCostAndGivesWhatIsLeft)
 {
@@ -59,6 +51,8 @@ TEST(StateTest, TradesMoveTheCashWithFixedAndProportionalCosts)
 {
     OneHolding p;
     Account* other = addAccount(p.wallet, "Other", nullptr);
+    Account foreign; // of no wallet
+    foreign.setCurrency(p.euro);
     p.wallet.setBuyRateCost(0.0017F);
     p.wallet.setSellRateCost(0.0017F);
     setTrend(p.alpha, 12);
@@ -67,12 +61,15 @@ TEST(StateTest, TradesMoveTheCashWithFixedAndProportionalCosts)
     trade(p.share, p.account, 0, 100, 10, 29.95F);
     trade(p.share, p.account, 5, -100, 20, 29.95F);
     trade(p.share, other, 5, 3, 2, 1); // ...but what trades move
+    trade(p.share, &foreign, 6, 10, 10);
+    trade(p.share, nullptr, 6, -4, 10);
     EXPECT_FLOAT_EQ(p.cash(4), 5000 - 1031.65F);
-    EXPECT_FLOAT_EQ(p.cash(5), 5000 - 1031.65F + 1966.65F) << "a sale of the state's day counts";
+    EXPECT_FLOAT_EQ(p.cash(6), 5000 - 1031.65F + 1966.65F) << "only the quantity follows trades of foreign accounts";
     EXPECT_EQ(p.cash(4, 1), 0);
-    EXPECT_FLOAT_EQ(p.cash(5, 1), -7.0102F);
+    EXPECT_FLOAT_EQ(p.cash(6, 1), -7.0102F);
     EXPECT_EQ(p.at(4).getShareState(0)->getQuote(), 12);
-    EXPECT_EQ(p.quantity(5), 3);
+    EXPECT_EQ(p.quantity(5), 3) << "a sale of the state's day counts";
+    EXPECT_EQ(p.quantity(6), 9);
     EXPECT_EQ(p.at(5).getTotalDeposit(), 5000);
 }
 
@@ -132,17 +129,6 @@ TEST(StateTest, TheFirstOperationCountsEvenWhenItIsStillToCome)
         EXPECT_EQ(p.at(day).getFirstOperationDate(), daysAfterStart(5)) << day;
     EXPECT_EQ(p.cash(4), 0);
     EXPECT_EQ(p.quantity(4), 0);
-}
-
-TEST(StateTest, TradesOnForeignAccountsOnlyChangeTheQuantity)
-{
-    OneHolding p;
-    Account foreign;
-    foreign.setCurrency(p.euro);
-    trade(p.share, &foreign, 0, 10, 10);
-    trade(p.share, nullptr, 1, -4, 10);
-    EXPECT_EQ(p.quantity(1), 6);
-    EXPECT_EQ(p.cash(1), 0);
 }
 
 TEST(StateTest, WithoutWalletOrDateAStateStaysEmpty)

@@ -2,6 +2,8 @@
 #include "tests/support/SmallPortfolio.h"
 #include "valuation/State.h"
 
+#include <gtest/gtest.h>
+
 namespace {
 
 struct Portfolio : SmallPortfolio {
@@ -49,23 +51,6 @@ TEST(TotalsTest, SumsAreRoundedAfterEveryAddition)
     p.account(p.euro, 1);
     p.account(p.euro, 1);
     EXPECT_EQ(p.at(0).totalValue, kLastWholeNumber + 2.0F) << "the single shares are lost, the cash is one sum";
-
-    std::mt19937 random(1);
-    for (int run = 0; run < 200; ++run) {
-        Portfolio q;
-        const float price = static_cast<float>(below(random, 100000)) / 300, rate = price / 7 + 1;
-        new CurrencyQuote(q.dollar, kStart, rate);
-        new CompanyQuote(q.beta, kStart, price);
-        float shares = 0, cash = 0;
-        for (int i = 0; i < 8; ++i) {
-            const int quantity = 1 + static_cast<int>(below(random, 10000));
-            q.hold(q.beta, quantity);
-            shares = static_cast<float>(shares + static_cast<double>(price) * quantity * rate);
-            q.account(q.dollar, price / 3);
-            cash = static_cast<float>(cash + static_cast<double>(price / 3) * rate);
-        }
-        ASSERT_EQ(q.at(0).totalValue, shares + cash) << run;
-    }
 }
 
 TEST(TotalsTest, WhatIsInNoKnownCurrencyDoesNotCount)

@@ -1,0 +1,68 @@
+#include "tests/support/ServerRun.h"
+#include "tests/support/ToolRun.h"
+
+#include <gmock/gmock.h>
+
+using testing::HasSubstr;
+
+TEST(ProgramsTest, FailureIsOneLineThatNamesTheReasonAndMakesNoFile)
+{
+    const TemporaryFolder folder("ProgramsTest");
+    ASSERT_EQ(ToolRun(PELORIN_SAMPLE, "data --date 20/07/2025", folder).status, 0);
+    std::filesystem::rename(folder / "data/Companies/Sample", folder / "market");
+    std::filesystem::rename(folder / "data/PortoFolios/Sample", folder / "wallet");
+    folder.write("short", folder.content("wallet").substr(0, 200));
+    folder.write("file", "x");
+    folder.write("IBM.csv", "Date,Close\n2005-01-03,97.75\n");
+    folder.write("r.csv", "2005-01-03,USD,1.25\n");
+    const ServerRun server(PELORIN_QUOTES, folder.path);
+    const std::string taken = ". --port " + std::to_string(server.port());
+    const struct {
+        const char* program;
+        std::string arguments;
+        int status;
+        const char* message;
+    } cases[] = {
+        {PELORIN_VALUE, "market wallet --date 31/02/1999", 2, "--date: is not a date DD/MM/YYYY: 31/02/1999"},
+        {PELORIN_VALUE, "market wallet --date 1999-01-11", 2, "--date: is not a date"},
+        {PELORIN_VALUE, "market", 2, "PORTFOLIO_FILE is required"},
+        {PELORIN_VALUE, "market wallet wallet", 2, "The following argument was not expected: wallet"},
+        {PELORIN_VALUE, "market none --json", 1, "pelorin-value: none: cannot be opened: No such file or directory\n"},
+        {PELORIN_VALUE, "market . --json", 1, "pelorin-value: .: is a folder\n"},
+        {PELORIN_VALUE, "wallet wallet", 1,
+         "pelorin-value: wallet: ends too early; it is cut short or not a market file\n"},
+        {PELORIN_VALUE, "market short", 1,
+         "pelorin-value: short: ends too early; it is cut short or not a portfolio file\n"},
+        {PELORIN_VALUE, "market wallet >/dev/full", 1, "pelorin-value: standard output: No space left on device\n"},
+        {PELORIN_VALUE, "--help", 0, ""},
+        {PELORIN_VALUE, "--version", 0, ""},
+        {PELORIN_QUOTES, taken, 1, ": cannot be listened on: "},
+        {PELORIN_QUOTES, ". --port 0 --bind 192.0.2.1", 1, "192.0.2.1:0: cannot be listened on"},
+        {PELORIN_QUOTES, "none --port 0", 1, "none: No such"},
+        {PELORIN_QUOTES, ". --port 65536", 2, "--port"},
+        {PELORIN_QUOTES, ". --bind localhost", 2, "--bind"},
+        {PELORIN_QUOTES, "", 2, "FOLDER"},
+        {PELORIN_SAMPLE, "file", 1, "pelorin-sample: file/Companies: cannot be made: Not a directory\n"},
+        {PELORIN_SAMPLE, "", 2, "FOLDER"},
+        {PELORIN_SAMPLE, "''", 2, "FOLDER"},
+        {PELORIN_SAMPLE, "new --date 29/02/2025", 2, "--date"},
+        {PELORIN_SAMPLE, "new --date 2025-07-20", 2, "--date"},
+        {PELORIN_SAMPLE, "new b", 2, "b"},
+        {PELORIN_IMPORT, "new", 2, "--quotes"},
+        {PELORIN_IMPORT, "new --rates r.csv --rates-are odd", 2, "--rates-are"},
+        {PELORIN_IMPORT, "new --rates r.csv --reference ''", 2, "--reference"},
+        {PELORIN_IMPORT, "new --rates r.csv --what", 2, "--what"},
+        {PELORIN_IMPORT, "new --rates none.csv", 1, "none.csv: "},
+        {PELORIN_IMPORT, "none/new --rates r.csv", 1, "none/new: "},
+        {PELORIN_IMPORT, "new --quotes IBM.csv", 1, "IBM.csv"},
+        {PELORIN_IMPORT, "market --rates r.csv", 1, "market: exists already and is left as it is\n"},
+    };
+    for (const auto& c : cases) {
+        const ToolRun run(c.program, c.arguments, folder);
+        EXPECT_EQ(run.status, c.status) << c.program << c.arguments;
+        EXPECT_THAT(run.err, HasSubstr(c.message)) << c.program << c.arguments;
+        EXPECT_EQ(run.out.empty(), c.status != 0) << c.program << c.arguments;
+        EXPECT_TRUE(c.status != 1 || std::ranges::count(run.err, '\n') == 1) << run.err;
+    }
+    EXPECT_FALSE(std::filesystem::exists(folder / "new"));
+}
