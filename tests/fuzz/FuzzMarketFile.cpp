@@ -1,13 +1,10 @@
 // Any bytes as a market data file: the reader neither crashes nor hangs, what it made answers every question, and what
 // is written of it reads back to the same bytes.
 
-#include "market/Catalogue.h"
-#include "market/Company.h"
 #include "market/CompanyEvent.h"
-#include "market/Currency.h"
-#include "market/Market.h"
 #include "tests/fuzz/Require.h"
 #include "tests/support/Bytes.h"
+#include "tests/support/SmallPortfolio.h"
 
 #include <climits>
 #include <cstdint>
@@ -25,7 +22,6 @@ void askOnDay(const Series& series, const Date& day)
 {
     (void)series.getRealQuote(day);
     (void)series.getPrevisionQuote(day);
-    (void)series.getPrevisionQuote(day.getPrevious());
 }
 
 template <class Series>
@@ -33,37 +29,33 @@ void askSeries(const Series& series)
 {
     const Date oddDays[] = {Date(),       {31, 12, 1998},  {29, 2, 2000},     {31, 2, 1999},
                             {-7, 13, -5}, {1, 1, INT_MIN}, {31, 12, INT_MAX}, {SHRT_MAX, SHRT_MAX, INT_MAX}};
+    Date former;
     for (const Date& day : oddDays)
         askOnDay(series, day);
-    unsigned n;
-    auto** quotes = series.getAllQuotes(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const Date day = quotes[i]->getDate();
-        require(i == 0 || quotes[i - 1]->getDate() < day, "quotes are in date order, one a day");
-        require(areSameBits(series.getRealQuote(day), quotes[i]->getValue()), "the value of a quoted day is its quote");
-        Date next = day;
-        askOnDay(series, next.moveBy(1));
+    const auto quotes = all(series, &Series::getAllQuotes);
+    for (const auto* quote : quotes) {
+        Date day = quote->getDate();
+        require(quote == quotes.front() || former < day, "quotes are in date order, one a day");
+        former = day;
+        require(areSameBits(series.getRealQuote(day), quote->getValue()), "the value of a quoted day is its quote");
+        askOnDay(series, day.moveBy(1));
     }
     (void)series.getPente();
     (void)series.getHighestQuote();
     (void)series.getLowestQuote();
-    require(n == 0 || series.getFirstQuote() <= series.getLastQuote(), "the first quote is not after the last");
+    require(quotes.empty() || series.getFirstQuote() <= series.getLastQuote(), "the first quote is not after the last");
 }
 
 void askMarket(const Market& market)
 {
-    unsigned n;
-    Company** companies = market.getAllCompanies(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        askSeries(*companies[i]);
+    for (const Company* company : all(market, &Market::getAllCompanies)) {
+        askSeries(*company);
+        const String ticker = company->getAbbreviation();
         Company* found = nullptr;
-        market.getCompany(companies[i]->getAbbreviation(), &found);
-        require(found == nullptr || found->getAbbreviation() == companies[i]->getAbbreviation(),
-                "a company is found by its ticker");
-        unsigned events;
-        CompanyEvent** event = companies[i]->getAllEvents(&events);
-        for (unsigned k = 0; k < events; ++k)
-            event[k]->setDate(event[k]->getDate().getNext());
+        market.getCompany(ticker, &found);
+        require(found == nullptr || found->getAbbreviation() == ticker, "a company is found by its ticker");
+        for (CompanyEvent* event : all(*company, &Company::getAllEvents))
+            event->setDate(event->getDate().getNext());
     }
 }
 
