@@ -131,6 +131,7 @@ void CurrencyView::AddCurrency(Currency* currency, bool selected)
 void CurrencyView::ModifyCurrency(Currency* currency)
 {
     currencies_->modify(currency);
+    markets_->InvalidateItems(); // they show its symbol
 }
 
 void CurrencyView::DeleteCurrency(Currency* currency)
