@@ -34,12 +34,21 @@ std::string withCurrency(const ShareState& state, double amount)
 
 } // namespace
 
-ShareStateItem::ShareStateItem(ShareState* state) : state_(state), share_(state->listed()) {}
+ShareStateItem::ShareStateItem(ShareState* state) : state_(state), share_(state->listed())
+{
+    const Company* company = companyOf(share_);
+    if (company == nullptr || company->getNbrQuotes() == 0)
+        return;
+    hasQuote_ = true;
+    hasRate_ = hasRate(*company);
+    const Date day = state->getDate();
+    const Date quoted = company->getLastQuoteUpTo(day);
+    quoteDay_ = quoted.isUndefined() ? company->getFirstQuote() : quoted;
+    isEstimate_ = company->getNbrQuotes() > 1 && (quoted.isUndefined() || day > company->getLastQuote());
+}
 
 Cell ShareStateItem::cell(int column) const
 {
-    const Company* company = companyOf(share_);
-    const bool hasQuote = company != nullptr && company->getNbrQuotes() > 0;
     switch (column) {
     case kTicker:
         return {std::string(state_->getCompanyAbbreviation().bytes()), isHeld() ? look::kText : look::kFaint};
@@ -51,13 +60,13 @@ Cell ShareStateItem::cell(int column) const
         return {isHeld() ? amountText(state_->getBuyQuote()) : ""};
     case kQuote:
         // Without a quote the holding counts as 0 in the totals.
-        return hasQuote ? Cell{amountText(state_->getQuote())} : Cell{"no quote", look::kWarning};
+        return hasQuote_ ? Cell{amountText(state_->getQuote())} : Cell{"no quote", look::kWarning};
     case kQuoteDay:
         return quoteDay();
     case kValue:
-        if (hasQuote && isHeld() && !hasRate(*company))
+        if (hasQuote_ && isHeld() && !hasRate_)
             return {"no rate", look::kWarning}; // and so it counts as 0 in the totals
-        return {hasQuote && isHeld() ? withCurrency(*state_, 1.0 * state_->getQuantity() * state_->getQuote()) : ""};
+        return {hasQuote_ && isHeld() ? withCurrency(*state_, 1.0 * state_->getQuantity() * state_->getQuote()) : ""};
     case kGain:
         return gain();
     case kEndDate:
@@ -68,25 +77,18 @@ Cell ShareStateItem::cell(int column) const
 }
 
 /// Empty where there is a quote of the day shown; otherwise the day of the one that counts, with "~" before the day
-/// that an estimate starts from: outside the series the quote is on a straight line.
+/// that an estimate starts from.
 Cell ShareStateItem::quoteDay() const
 {
-    const Company* company = companyOf(share_);
-    if (company == nullptr || company->getNbrQuotes() == 0)
-        return {};
     const Date day = state_->getDate();
-    const Date quoted = company->getLastQuoteUpTo(day);
-    if (quoted == day)
+    if (!hasQuote_ || quoteDay_ == day)
         return {};
-    const bool isEstimate = company->getNbrQuotes() > 1 && (quoted.isUndefined() || day > company->getLastQuote());
-    const std::string text = dateText(quoted.isUndefined() ? company->getFirstQuote() : quoted);
-    return {(isEstimate ? "~ " : "") + text, quoted.isUndefined() ? look::kWarning : look::kFaint};
+    return {(isEstimate_ ? "~ " : "") + dateText(quoteDay_), quoteDay_ > day ? look::kWarning : look::kFaint};
 }
 
 Cell ShareStateItem::gain() const
 {
-    const Company* company = companyOf(share_);
-    if (company == nullptr || company->getNbrQuotes() == 0 || state_->getBuyQuote() == 0 || !isHeld())
+    if (!hasQuote_ || state_->getBuyQuote() == 0 || !isHeld())
         return {};
     const double gain = static_cast<double>(state_->getQuote()) / state_->getBuyQuote() - 1;
     return {changeText(gain), gain < 0 ? look::kLoss : look::kGain};

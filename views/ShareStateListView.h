@@ -3,7 +3,8 @@
 #include "valuation/ShareState.h"
 #include "views/ObjectListView.h"
 
-/// A holding with what it is worth.
+/// A holding with what it is worth. The row keeps to its valuation: quotes and rates that come later show with the
+/// next.
 class ShareStateItem final : public ColumnItem {
 public:
     explicit ShareStateItem(ShareState* state);
@@ -20,6 +21,12 @@ private:
 
     ShareState* state_;
     const Share* share_;
+
+    // What the state's quote rests on, from when the row was made.
+    bool hasQuote_ = false;
+    bool hasRate_ = false;
+    bool isEstimate_ = false; // outside the series, where the quote is on a straight line
+    Date quoteDay_;           // of the quote that counts
 };
 
 /// The holdings of the portfolio.

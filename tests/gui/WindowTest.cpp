@@ -208,6 +208,26 @@ TEST_F(PortoFolioPageTest, RowsSayWhatIsOldOrMissing)
     EXPECT_THAT(rows("lstAccounts")[0], HasSubstr("no currency"));
 }
 
+TEST_F(PortoFolioPageTest, HoldingsKeepToTheirValuation)
+{
+    Company* quoted = nullptr;
+    Company* unquoted = nullptr;
+    unsigned n;
+    wallet().getAllShares(&n)[0]->getCompany(&quoted);
+    wallet().getAllShares(&n)[1]->getCompany(&unquoted);
+    while (unquoted->getNbrQuotes() > 0)
+        delete unquoted->getQuote(0U);
+    enter("txtDate", "24/11/2024");
+    const auto valued = rows("lstShares");
+    // As quotes that were fetched are, which wait for the next valuation.
+    new CompanyQuote(quoted, Date(23, 11, 2024), 12345);
+    new CompanyQuote(unquoted, Date(22, 11, 2024), 12345);
+    EXPECT_EQ(rows("lstShares"), valued);
+    window().UpdateState();
+    EXPECT_THAT(rows("lstShares")[0], HasSubstr("12,345.00\t23/11/2024"));
+    EXPECT_THAT(rows("lstShares")[1], HasSubstr("12,345.00\t22/11/2024"));
+}
+
 class ParameterPageTest : public WindowTest {
 protected:
     ParameterPageTest() { show(kParameterPage); }
