@@ -135,10 +135,15 @@ void PLWindow::SetCurrencyRef()
     const WindowLock lock(*this);
     if (!lock.isHeld())
         return;
-    if (Currency* currency = currencyView_->GetSelectedCurrency())
-        SetCurrencyRef(currency);
-    else
+    Currency* currency = currencyView_->GetSelectedCurrency();
+    if (currency == nullptr) {
         SetMessage("Please select a currency.");
+        return;
+    }
+    if (currency == getReferenceCurrency())
+        return;
+    SetCurrencyRef(currency);
+    UpdateState();
 }
 
 void PLWindow::SetCurrencyRef(Currency* newReference)

@@ -29,6 +29,16 @@ const Currency* currencyOf(const Account* account)
     return currency;
 }
 
+/// The fixed cost of a new operation of that type; nothing for one that is no trade.
+std::optional<float> shareCost(const Wallet& wallet, const String& type)
+{
+    if (type == "BUY")
+        return wallet.getBuyCost();
+    if (type == "SELL")
+        return wallet.getSellCost();
+    return std::nullopt;
+}
+
 } // namespace
 
 void PLWindow::ChangeOperationType(const String& type)
@@ -37,14 +47,12 @@ void PLWindow::ChangeOperationType(const String& type)
     if (!lock.isHeld())
         return;
     operationView_->SetType(type);
-    if (type == "BUY")
-        operationView_->offerShareCost(wallet_->getBuyCost());
-    else if (type == "SELL")
-        operationView_->offerShareCost(wallet_->getSellCost());
-    offerOperationQuotes();
+    if (const auto cost = shareCost(*wallet_, type))
+        operationView_->offerShareCost(*cost);
+    renewOffers();
 }
 
-void PLWindow::offerOperationQuotes()
+void PLWindow::renewOffers()
 {
     const WindowLock lock(*this);
     if (!lock.isHeld())
@@ -53,9 +61,11 @@ void PLWindow::offerOperationQuotes()
     const String type = operationView_->getType();
     if (type == "TRANSFER")
         offerTransferQuotes(date);
-    else if (type != "DEPOSIT")
+    if (const auto cost = shareCost(*wallet_, type)) {
+        operationView_->renewShareCost(*cost);
         operationView_->offerQuote(
             quoteAt(findCompany(operationView_->getMarketName(), operationView_->getCompanyAbbreviation()), date));
+    }
 }
 
 void PLWindow::offerTransferQuotes(const Date& date)

@@ -132,7 +132,7 @@ void PLWindow::makePages()
     add(currencyView_ = new CurrencyView(kPageFrame, "CurrencyView", this), "Currency");
     add(walletView_ = new WalletView(kPageFrame, "WalletView", this), "PortoFolio");
     add(operationView_ = new OperationView(kPageFrame, "OperationView", this), "Operations");
-    operationView_->SetTypingHook([this] { offerOperationQuotes(); });
+    operationView_->SetTypingHook([this] { renewOffers(); });
     add(parameterView_ = new ParameterView(kPageFrame, "ParameterView", this), "Parameters");
     messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
     AddChild(tabView_);

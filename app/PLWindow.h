@@ -140,12 +140,12 @@ public:
     void AccountSelection();
 
     // Operations (OperationCommands.cpp).
-    void ChangeOperationType(const String& type);
     void UpdateOperationTotal();
     void AddOperation();
     void UpdateOperation();
     void RemoveOperation();
     void SelectOperation();
+    void ChangeOperationType(const String& type); // OperationOffers.cpp
 
 private:
     friend class StateHold;
@@ -185,7 +185,8 @@ private:
     void showCommonFields(const Operation& operation);
 
     // OperationOffers.cpp
-    void offerOperationQuotes();
+    /// Brings what is offered on the operation page up to date with its fields, the quotes and the parameters.
+    void renewOffers();
     void offerTransferQuotes(const Date& date);
 
     Catalogue catalogue_;

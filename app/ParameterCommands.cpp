@@ -46,6 +46,8 @@ void PLWindow::ChangeParameter(uint32 code)
     showParameters(); // what was understood, in place of what was typed
     if (parameter->revalues)
         UpdateState();
+    else
+        renewOffers();
 }
 
 void PLWindow::showParameters()

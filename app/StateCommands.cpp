@@ -9,8 +9,6 @@
 #include "views/OperationView.h"
 #include "views/WalletView.h"
 
-#include <utility>
-
 void PLWindow::UpdateState()
 {
     const WindowLock lock(*this);
@@ -28,7 +26,9 @@ void PLWindow::UpdateState()
     EvolutionOutcome outcome = EvolutionOutcome::Built;
     State* state = refreshStates(*wallet_, date, operationView_->isPrevision(), isEvolutionAsked ? &outcome : nullptr);
     if (state == nullptr) {
+        walletView_->ClearEvolution();
         operationView_->DropRemovedOperations();
+        renewOffers();
         return;
     }
     if (isEvolutionAsked)
@@ -60,7 +60,9 @@ void PLWindow::SetState(State* state)
         }
     }
     operationView_->RecallSelection();
-    if (state != nullptr)
+    if (state != nullptr) {
         operationView_->offerDate(state->getDate());
+        renewOffers();
+    }
     CompanySelection();
 }

@@ -16,6 +16,8 @@ public:
 
     /// Whether a suggestion may be put in: the field is empty, or holds nothing but an earlier suggestion.
     bool isOpen() const { return isOffer_ || *Control::Text() == '\0'; }
+    /// Whether it holds a suggestion.
+    bool isOffer() const { return isOffer_; }
     /// What the field holds was just put in as a suggestion.
     void noteOffer() { isOffer_ = true; }
     /// What the field holds was not.

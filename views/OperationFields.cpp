@@ -216,6 +216,12 @@ void OperationView::offerShareCost(float cost)
     offer(*shareCost_, cost);
 }
 
+void OperationView::renewShareCost(float cost)
+{
+    if (shareCost_->isOffer())
+        offerShareCost(cost);
+}
+
 void OperationView::offerQuote(std::optional<float> quote)
 {
     offer(*quote_, quote);

@@ -102,6 +102,8 @@ public:
     void SetTypingHook(const std::function<void()>& hook);
     void offerDate(const Date& date);
     void offerShareCost(float cost);
+    /// Only where a former offer stands: a field emptied by hand says that there is no cost.
+    void renewShareCost(float cost);
     /// Without a value what was offered before is taken back.
     void offerQuote(std::optional<float> quote);
     void offerTransferQuotes(std::optional<float> from, std::optional<float> to);

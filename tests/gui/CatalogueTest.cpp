@@ -195,7 +195,10 @@ TEST_F(CatalogueTest, RemovalsAskAndTakeTheSharesAlong)
 TEST_F(CatalogueTest, FirstCurrencyIsTheReferenceAndAnotherOneRebasesTheRates)
 {
     addSmallCatalogue();
+    buy(company());
     EXPECT_EQ(window().getReferenceCurrency(), currency(0));
+    show(kPortoFolioPage);
+    const std::string value = text("txtTotalValue");
     show(kCurrencyPage);
     select("lstCurrencies", 0);
     click("btnSetReferenceCurrency");
@@ -206,6 +209,8 @@ TEST_F(CatalogueTest, FirstCurrencyIsTheReferenceAndAnotherOneRebasesTheRates)
     EXPECT_EQ(text("txtReferenceCurrencyName"), "Dollar");
     EXPECT_THAT(rows("lstQuotes"), ElementsAre("01/01/2024\t1.00"));
     EXPECT_THAT(rows("lstCurrencies"), ElementsAre("Euro\tEUR\t0.50\t01/01/2024", "Dollar\tUSD\t1.00\t01/01/2024"));
+    show(kPortoFolioPage);
+    EXPECT_NE(text("txtTotalValue"), value) << "it is in the new reference";
 }
 
 TEST_F(CatalogueTest, RemovedReferenceHandsOverToTheFirstAndTakesItsMarketsAlong)

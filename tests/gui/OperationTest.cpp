@@ -348,13 +348,26 @@ TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
     EXPECT_EQ(text("txtShareCost"), "29.95");
     choose("operationType", "Sell");
     EXPECT_EQ(text("txtShareCost"), "5.00");
+    show(kParameterPage);
+    enter("txtSellCost", "6");
+    show(kOperationPage);
+    EXPECT_EQ(text("txtShareCost"), "6.00") << "follows the parameter";
+    type("txtShareCost", "");
+    type("txtMarketName", "Paris");
+    EXPECT_EQ(text("txtShareCost"), "") << "emptied by hand: no cost";
     type("txtShareCost", "7");
     choose("operationType", "Buy");
     EXPECT_EQ(text("txtShareCost"), "7") << "typed";
 
-    type("txtMarketName", "Paris");
     type("txtCompanyAbbreviation", "BBB");
     EXPECT_EQ(text("txtQuote"), "10.00");
+    Company* beta = nullptr;
+    window().catalogue().getMarkets()[1]->getCompany("BBB", &beta);
+    new CompanyQuote(beta, Date(3, 11, 2024), 12);
+    show(kPortoFolioPage);
+    enter("txtDate", "04/11/2024");
+    show(kOperationPage);
+    EXPECT_EQ(text("txtDate") + " " + text("txtQuote"), "04/11/2024 12.00") << "the quote of the day that is offered";
     type("txtCompanyAbbreviation", "AAA");
     EXPECT_EQ(text("txtQuote"), "") << "it has no quotes, and BBB's is not its";
     type("txtQuote", "4");

@@ -176,6 +176,10 @@ TEST_F(PortoFolioPageTest, EvolutionIsBuiltAndEmptied)
     EXPECT_THAT(reason->Text(), HasSubstr("too long"));
     enter("txtDate", "20/11/2024");
     EXPECT_STREQ(reason->Text(), "");
+    EXPECT_GT(line->getNbrGraphPoints(), 0U);
+    enter("txtDate", "31/2");
+    EXPECT_EQ(line->getNbrGraphPoints(), 0U) << "no date, no evolution";
+    enter("txtDate", "20/11/2024");
     click("cbxComputeEvolution");
     EXPECT_EQ(wallet().getNbrStates(), 1U);
     EXPECT_EQ(line->getNbrGraphPoints(), 0U);
