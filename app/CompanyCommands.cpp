@@ -2,6 +2,7 @@
 
 #include "app/LatestQuoteFetch.h"
 #include "app/PLWindow.h"
+#include "app/SeriesCommands.h"
 #include "app/StateHold.h"
 #include "app/WindowLock.h"
 #include "market/Company.h"
@@ -103,10 +104,6 @@ void PLWindow::CompanySelection()
         return;
     companyView_->setCompanyName(company->getName());
     companyView_->setCompanyAbbreviation(company->getAbbreviation());
-    const Date last = company->getLastQuote();
-    const float trend = company->getPrevisionQuote(last);
-    // A trend of 0 is not guarded against: the fields then say that there is no number.
-    companyView_->setRelativeDailyChange(company->getPente() / trend);
-    companyView_->setDiffWithAverage((company->getRealQuote(last) - trend) / trend);
+    series_commands::showTrend(*companyView_, *company);
     UpdateCompanyQuotesChart();
 }

@@ -1,6 +1,7 @@
 // Currencies and their rates.
 
 #include "app/PLWindow.h"
+#include "app/SeriesCommands.h"
 #include "app/StateHold.h"
 #include "app/WindowLock.h"
 #include "market/Currency.h"
@@ -122,12 +123,9 @@ void PLWindow::CurrencySelection()
         return;
     currencyView_->setCurrencyName(currency->getName());
     currencyView_->setCurrencyRepresentation(currency->getRepresentation());
-    const Date last = currency->getLastQuote();
-    const float trend = currency->getPrevisionQuote(last);
     // On the company page, until that is refreshed. Intended, as is that the chart is not drawn here: it
     // shows the rates of the currency that is named in it until a rate is selected.
-    companyView_->setRelativeDailyChange(currency->getPente() / trend);
-    companyView_->setDiffWithAverage((currency->getRealQuote(last) - trend) / trend);
+    series_commands::showTrend(*companyView_, *currency);
 }
 
 void PLWindow::SetCurrencyRef()
@@ -158,77 +156,23 @@ void PLWindow::SetCurrencyRef(Currency* newReference)
 
 void PLWindow::AddCurrencyQuote()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
-    const Date date = currencyView_->getQuoteDate();
-    if (date.isUndefined()) {
-        SetMessage("Please specify a date.");
-        return;
-    }
-    const float value = currencyView_->getQuoteValue();
-    Currency* currency = currencyView_->GetSelectedCurrency();
-    if (currency == nullptr) {
-        SetMessage("You must first select a currency");
-        return;
-    }
-    CurrencyQuote* quote;
-    if (currency->getQuote(date, &quote) == 0) {
-        quote->setValue(value);
-        currencyView_->ModifyQuote(quote);
-    } else {
-        currencyView_->AddQuote(new CurrencyQuote(currency, date, value));
-    }
-    UpdateCurrencyQuotesChart();
-    UpdateState();
+    series_commands::addQuote(*this, *currencyView_, currencyView_->GetSelectedCurrency(),
+                              "You must first select a currency");
 }
 
 void PLWindow::UpdateCurrencyQuote()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
-    if (CurrencyQuote* quote = currencyView_->GetSelectedQuote()) {
-        const Date date = currencyView_->getQuoteDate();
-        if (date.isUndefined()) {
-            SetMessage("Please specify a date.");
-            return;
-        }
-        // Another rate may have that day; both stay.
-        quote->setDate(date);
-        quote->setValue(currencyView_->getQuoteValue());
-        currencyView_->ModifyQuote(quote);
-    } else {
-        SetMessage("You must first select a quote");
-    }
-    UpdateCurrencyQuotesChart();
-    UpdateState();
+    series_commands::updateQuote(*this, *currencyView_);
 }
 
 void PLWindow::RemoveCurrencyQuote()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
-    int n;
-    const std::unique_ptr<CurrencyQuote*[]> quotes(currencyView_->getAllSelectedQuotes(&n));
-    currencyView_->DeleteQuotes(quotes.get(), n);
-    for (int i = 0; i < n; ++i)
-        delete quotes[static_cast<std::size_t>(i)];
-    UpdateCurrencyQuotesChart();
-    UpdateState();
+    series_commands::removeQuotes(*this, *currencyView_);
 }
 
 void PLWindow::CurrencyQuoteSelection()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
-    if (const CurrencyQuote* quote = currencyView_->GetSelectedQuote()) {
-        currencyView_->setQuoteDate(quote->getDate());
-        currencyView_->setQuoteValue(quote->getValue());
-    }
-    UpdateCurrencyQuotesChart();
+    series_commands::showSelectedQuote(*this, *currencyView_);
 }
 
 void PLWindow::UpdateCurrencyQuotesChart()

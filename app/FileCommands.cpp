@@ -14,11 +14,9 @@
 #include "platform/TabView.h"
 #include "portfolio/Account.h"
 #include "portfolio/Wallet.h"
-#include "valuation/State.h"
 #include "views/CompanyView.h"
 #include "views/CurrencyView.h"
 #include "views/OperationView.h"
-#include "views/ParameterView.h"
 #include "views/WalletView.h"
 
 #include <optional>
@@ -53,13 +51,12 @@ std::unique_ptr<InputFile> openFile(const char* path)
 
 } // namespace
 
-void PLWindow::showFolder(BFilePanel& panel, std::string (DataFolder::*subfolder)(std::string*) const)
+void PLWindow::showFolder(BFilePanel& panel, bool isMarkets)
 {
     std::string error;
-    const std::string path = (folder_.*subfolder)(&error);
+    panel.SetPanelDirectory((isMarkets ? folder_.companies(&error) : folder_.portoFolios(&error)).c_str());
     if (!error.empty())
         SetMessage(error.c_str());
-    panel.SetPanelDirectory(path.c_str());
 }
 
 void PLWindow::LoadSomething()
@@ -76,7 +73,7 @@ void PLWindow::LoadSomething()
             // A portfolio is always asked for, even an empty one.
             if ((!isMarkets || catalogue_.getNbrCurrencies() > 0) && !confirm(question))
                 return;
-            showFolder(*openPanel_, isMarkets ? &DataFolder::companies : &DataFolder::portoFolios);
+            showFolder(*openPanel_, isMarkets);
         }
     }
     openPanel_->Show();
@@ -170,7 +167,7 @@ void PLWindow::SaveSomething()
         Save(path);
         return;
     }
-    showFolder(*savePanel_, isMarkets ? &DataFolder::companies : &DataFolder::portoFolios);
+    showFolder(*savePanel_, isMarkets);
     savePanel_->Show();
 }
 

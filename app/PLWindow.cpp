@@ -10,7 +10,6 @@
 #include "platform/Message.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
-#include "valuation/State.h"
 #include "views/CompanyView.h"
 #include "views/CurrencyView.h"
 #include "views/OperationView.h"

@@ -13,14 +13,12 @@ class AccountOperation;
 class BListView;
 class BTabView;
 class Company;
-class CompanyEvent;
 class CompanyView;
 class CurrencyView;
 class MessageView;
 class Operation;
 class OperationView;
 class ParameterView;
-class Share;
 class ShareOperation;
 class Shortcuts;
 class State;
@@ -163,7 +161,8 @@ private:
     void replaceWallet();
     void loadMarkets(FILE* file, const String& path);
     void loadWallet(FILE* file, const String& path);
-    void showFolder(BFilePanel& panel, std::string (DataFolder::*subfolder)(std::string*) const);
+    /// Has the panel open in the folder of market files, or in that of portfolios.
+    void showFolder(BFilePanel& panel, bool isMarkets);
 
     // AccountCommands.cpp
     /// Null, after a message, when there is none.

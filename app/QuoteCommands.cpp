@@ -2,6 +2,7 @@
 
 #include "app/LatestQuoteFetch.h"
 #include "app/PLWindow.h"
+#include "app/SeriesCommands.h"
 #include "app/WindowLock.h"
 #include "market/Company.h"
 #include "portfolio/Share.h"
@@ -12,77 +13,23 @@
 
 void PLWindow::AddCompanyQuote()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
-    const Date date = companyView_->getQuoteDate();
-    if (date.isUndefined()) {
-        SetMessage("Please specify a date.");
-        return;
-    }
-    const float value = companyView_->getQuoteValue();
-    Company* company = companyView_->GetSelectedCompany();
-    if (company == nullptr) {
-        SetMessage("You must first select a company");
-        return;
-    }
-    CompanyQuote* quote;
-    if (company->getQuote(date, &quote) == 0) {
-        quote->setValue(value);
-        companyView_->ModifyQuote(quote);
-    } else {
-        companyView_->AddQuote(new CompanyQuote(company, date, value));
-    }
-    UpdateCompanyQuotesChart();
-    UpdateState();
+    series_commands::addQuote(*this, *companyView_, companyView_->GetSelectedCompany(),
+                              "You must first select a company");
 }
 
 void PLWindow::UpdateCompanyQuote()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
-    if (CompanyQuote* quote = companyView_->GetSelectedQuote()) {
-        const Date date = companyView_->getQuoteDate();
-        if (date.isUndefined()) {
-            SetMessage("Please specify a date.");
-            return;
-        }
-        // Another quote may have that day; both stay.
-        quote->setDate(date);
-        quote->setValue(companyView_->getQuoteValue());
-        companyView_->ModifyQuote(quote);
-    } else {
-        SetMessage("You must first select a quote");
-    }
-    UpdateCompanyQuotesChart();
-    UpdateState();
+    series_commands::updateQuote(*this, *companyView_);
 }
 
 void PLWindow::RemoveCompanyQuote()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
-    int n;
-    const std::unique_ptr<CompanyQuote*[]> quotes(companyView_->getAllSelectedQuotes(&n));
-    companyView_->DeleteQuotes(quotes.get(), n);
-    for (int i = 0; i < n; ++i)
-        delete quotes[static_cast<std::size_t>(i)];
-    UpdateCompanyQuotesChart();
-    UpdateState();
+    series_commands::removeQuotes(*this, *companyView_);
 }
 
 void PLWindow::CompanyQuoteSelection()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
-    if (const CompanyQuote* quote = companyView_->GetSelectedQuote()) {
-        companyView_->setQuoteDate(quote->getDate());
-        companyView_->setQuoteValue(quote->getValue());
-    }
-    UpdateCompanyQuotesChart();
+    series_commands::showSelectedQuote(*this, *companyView_);
 }
 
 void PLWindow::SplitQuotes()
