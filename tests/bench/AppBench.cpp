@@ -12,9 +12,7 @@
 #include "tests/bench/ChildRun.h"
 #include "tests/bench/Portfolio.h"
 
-#include <benchmark/benchmark.h>
 #include <cstdlib>
-#include <memory>
 
 namespace {
 
@@ -86,44 +84,31 @@ using Step = bool (*)(Desktop&, const Files&);
 void measure(benchmark::State& state, const Files& files, Step prepare, Step work, double items)
 {
     setenv("QT_QPA_PLATFORM", "offscreen", 0);
-    for (auto _ : state) {
-        std::unique_ptr<Desktop> desktop; // made in the child
-        const ChildRun run(
-            [&] {
-                desktop = std::make_unique<Desktop>();
-                return prepare(*desktop, files);
-            },
-            [&] { return work(*desktop, files); });
-        if (!run.succeeded)
-            state.SkipWithError("the child failed");
-        state.SetIterationTime(run.seconds);
-        state.counters["items"] = items;
-        (void)desktop.release(); // the child's alone
-    }
+    Desktop* desktop = nullptr; // made in each child, and ends with it
+    const auto begin = [&] {
+        desktop = new Desktop;
+        return prepare(*desktop, files);
+    };
+    measureInChildren(state, items, begin, [&] { return work(*desktop, files); });
 }
 
 } // namespace
 
 void registerAppBenchmarks(GeneratedFiles& files, const Load& market, const Load& portfolio)
 {
+    const Step nothing = [](Desktop&, const Files&) { return true; };
+    const Step open = [](Desktop& d, const Files& f) { return d.open(f); };
+    const Step openAndLoad = [](Desktop& d, const Files& f) { return d.open(f) && d.loadBoth(f); };
     const struct {
         const char* name;
         Load load;
         Step prepare;
         Step work;
     } benchmarks[] = {
-        {"open",
-         {portfolio.size, 1},
-         [](Desktop&, const Files&) { return true; },
-         [](Desktop& d, const Files& f) { return d.open(f); }},
-        {"switch_page",
-         {portfolio.size, 1},
-         [](Desktop& d, const Files& f) { return d.open(f) && d.loadBoth(f); },
-         [](Desktop& d, const Files&) { return d.switchPages(); }},
-        {"load_market", market, [](Desktop& d, const Files& f) { return d.open(f); },
-         [](Desktop& d, const Files& f) { return d.loadMarket(f); }},
-        {"evolve_20_years", portfolio, [](Desktop& d, const Files& f) { return d.open(f) && d.loadBoth(f); },
-         [](Desktop& d, const Files&) { return d.evolve(); }},
+        {"open", {portfolio.size, 1}, nothing, open},
+        {"switch_page", {portfolio.size, 1}, openAndLoad, [](Desktop& d, const Files&) { return d.switchPages(); }},
+        {"load_market", market, open, [](Desktop& d, const Files& f) { return d.loadMarket(f); }},
+        {"evolve_20_years", portfolio, openAndLoad, [](Desktop& d, const Files&) { return d.evolve(); }},
     };
     for (const auto& b : benchmarks) {
         const auto run = [&files, load = b.load, prepare = b.prepare, work = b.work](benchmark::State& state) {

@@ -48,3 +48,16 @@ ChildRun::ChildRun(const std::function<bool()>& prepare, const std::function<boo
         bytes = report[1];
     }
 }
+
+void measureInChildren(benchmark::State& state, double items, const std::function<bool()>& prepare,
+                       const std::function<bool()>& work)
+{
+    for (auto _ : state) {
+        const ChildRun run(prepare, work);
+        if (!run.succeeded)
+            state.SkipWithError("the child failed");
+        state.SetIterationTime(run.seconds);
+        state.counters["items"] = items;
+        state.counters["bytes_per_item"] = run.bytes / items;
+    }
+}

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <benchmark/benchmark.h>
 #include <functional>
 
 /// One run of a piece of work in a child process, which ends without clean-up: memory is as fresh as in a program that
@@ -11,3 +12,7 @@ struct ChildRun {
 
     ChildRun(const std::function<bool()>& prepare, const std::function<bool()>& work);
 };
+
+/// Measures runs of `work`, each in a child of its own, for the figures of so many items.
+void measureInChildren(benchmark::State& state, double items, const std::function<bool()>& prepare,
+                       const std::function<bool()>& work);

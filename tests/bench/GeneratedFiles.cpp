@@ -1,13 +1,10 @@
 #include "tests/bench/GeneratedFiles.h"
 
-#include "market/Company.h"
-#include "portfolio/DepositAccountOperation.h"
-#include "portfolio/ShareOperation.h"
-#include "portfolio/TransferAccountOperation.h"
 #include "tests/bench/ChildRun.h"
 #include "tests/bench/Portfolio.h"
+#include "tests/support/Bytes.h"
+#include "tests/support/SmallPortfolio.h"
 
-#include <random>
 #include <stdexcept>
 #include <string>
 
@@ -60,41 +57,35 @@ private:
 
     void makeWallet()
     {
-        for (int i = 0; i < size_.accounts; ++i) {
-            accounts_.push_back(new Account(("Account " + std::to_string(i)).c_str()));
-            accounts_.back()->setWallet(&portfolio_.wallet);
-            accounts_.back()->setCurrency(
-                portfolio_.catalogue.getCurrencies()[static_cast<unsigned>(i % GeneratedFiles::kCurrencies)]);
-        }
+        const auto& currencies = portfolio_.catalogue.getCurrencies();
+        for (std::size_t i = 0; i < static_cast<std::size_t>(size_.accounts); ++i)
+            accounts_.push_back(addAccount(portfolio_.wallet, ("Account " + std::to_string(i)).c_str(),
+                                           currencies[i % GeneratedFiles::kCurrencies]));
         const std::vector<Market*> markets = portfolio_.catalogue.getMarkets();
-        for (int i = 0; i < size_.holdings; ++i) {
-            unsigned n;
-            Company** companies = markets[static_cast<unsigned>(i % GeneratedFiles::kCurrencies)]->getAllCompanies(&n);
+        for (std::size_t i = 0; i < static_cast<std::size_t>(size_.holdings); ++i) {
+            const auto companies = all(*markets[i % GeneratedFiles::kCurrencies], &Market::getAllCompanies);
             shares_.push_back(new Share(&portfolio_.wallet, companies[i / GeneratedFiles::kCurrencies]));
         }
-        const int days = Portfolio::lastDay() - first_;
-        for (int i = 0; i < size_.operations; ++i) {
-            Date day = first_;
-            makeOperation(i % 10, day.moveBy(i > 0 ? below(days) : 0)); // the first one begins the evolution
-        }
+        const int begin = first_ - kStart, days = Portfolio::lastDay() - first_;
+        for (int i = 0; i < size_.operations; ++i)
+            makeOperation(i % 10, begin + (i > 0 ? below(days) : 0)); // the first one begins the evolution
     }
 
-    void makeOperation(int kind, const Date& day)
+    void makeOperation(int kind, int day)
     {
         Account* account = accounts_[static_cast<unsigned>(below(size_.accounts))];
         if (kind == 0) {
-            new DepositAccountOperation(day, account, between(1000, 10000), false);
+            deposit(account, day, between(1000, 10000));
         } else if (kind == 1) {
             Account* recipient = accounts_[static_cast<unsigned>(below(size_.accounts))];
-            auto* transfer = new TransferAccountOperation(day, account, recipient, between(100, 1000), false);
-            transfer->setRateCost(0.001F);
-            transfer->setFromCurrencyQuote(between(0.5, 1.5));
+            TransferAccountOperation* sent = transfer(account, recipient, day, between(100, 1000));
+            sent->setRateCost(0.001F);
+            sent->setFromCurrencyQuote(between(0.5, 1.5));
         } else {
             Share* share = shares_[static_cast<unsigned>(below(size_.holdings))];
-            auto* trade = new ShareOperation(day, share, kind < 7, kind < 7 ? 50 : 70, 0, false, 29.95F);
-            share->getQuote(day, &price_);
-            trade->setQuote(price_);
-            trade->setAccount(account);
+            float price;
+            share->getQuote(daysAfterStart(day), &price);
+            trade(share, account, day, kind < 7 ? 50 : -70, price, 29.95F);
         }
     }
 
@@ -104,32 +95,9 @@ private:
     std::mt19937 random_{1};
     std::vector<Account*> accounts_;
     std::vector<Share*> shares_;
-    float price_ = 0;
 };
 
-template <class Object>
-bool save(const Object& object, const std::filesystem::path& path)
-{
-    FILE* file = std::fopen(path.c_str(), "wb");
-    const int result = file != nullptr ? object.wrt(file, Portfolio::lastDay()) : -1;
-    return file != nullptr && std::fclose(file) == 0 && result == 0;
-}
-
 } // namespace
-
-GeneratedFiles::GeneratedFiles()
-{
-    std::string folder = std::filesystem::temp_directory_path() / "pelorin-bench-XXXXXX";
-    if (mkdtemp(folder.data()) == nullptr)
-        throw std::runtime_error("cannot make a temporary folder");
-    folder_ = folder;
-}
-
-GeneratedFiles::~GeneratedFiles()
-{
-    std::error_code ignored;
-    std::filesystem::remove_all(folder_, ignored);
-}
 
 const GeneratedFiles::Files& GeneratedFiles::files(const DataSize& size)
 {
@@ -137,15 +105,18 @@ const GeneratedFiles::Files& GeneratedFiles::files(const DataSize& size)
     if (found != files_.end())
         return found->second;
     const std::string number = std::to_string(files_.size());
-    const Files files{folder_ / ("market" + number), folder_ / ("wallet" + number)};
+    const Files files{folder_.path / ("market" + number), folder_.path / ("wallet" + number)};
     // In a child, so that this process stays as small as it is when the children that are measured begin.
     const ChildRun run([] { return true; },
                        [&] {
                            Portfolio portfolio;
                            Generator(size, portfolio);
-                           return save(portfolio.catalogue, files.market) && save(portfolio.wallet, files.wallet);
+                           const Date day = Portfolio::lastDay();
+                           folder_.write(files.market, written([&](FILE* f) { portfolio.catalogue.wrt(f, day); }));
+                           folder_.write(files.wallet, written([&](FILE* f) { portfolio.wallet.wrt(f, day); }));
+                           return true;
                        });
     if (!run.succeeded)
-        throw std::runtime_error("cannot write files into " + folder_.string());
+        throw std::runtime_error("cannot write files into " + folder_.path.string());
     return files_[size] = files;
 }

@@ -1,6 +1,7 @@
 #pragma once
 
-#include <filesystem>
+#include "tests/support/ToolRun.h"
+
 #include <map>
 
 /// How much is in a pair of generated files: a market data file with a quote of each company for every weekday and a
@@ -25,15 +26,10 @@ public:
 
     static constexpr int kCurrencies = 4; // with a market each
 
-    GeneratedFiles();
-    ~GeneratedFiles();
-    GeneratedFiles(const GeneratedFiles&) = delete;
-    GeneratedFiles& operator=(const GeneratedFiles&) = delete;
-
     /// Generates the files when they are asked for the first time.
     const Files& files(const DataSize& size);
 
 private:
-    std::filesystem::path folder_;
+    const TemporaryFolder folder_{"pelorin-bench"};
     std::map<DataSize, Files> files_;
 };

@@ -120,15 +120,9 @@ using Step = bool (*)(Portfolio&, const Files&);
 void BM_Files(benchmark::State& state, const DataSize& size, double items, Step prepare, Step work)
 {
     const Files files = folder->files(size);
-    for (auto _ : state) {
-        Portfolio portfolio; // the child fills its own copy
-        const ChildRun run([&] { return prepare(portfolio, files); }, [&] { return work(portfolio, files); });
-        if (!run.succeeded)
-            state.SkipWithError("the child failed");
-        state.SetIterationTime(run.seconds);
-        state.counters["items"] = items;
-        state.counters["bytes_per_item"] = run.bytes / items;
-    }
+    Portfolio portfolio; // each child fills its own copy
+    measureInChildren(
+        state, items, [&] { return prepare(portfolio, files); }, [&] { return work(portfolio, files); });
 }
 
 #define PELORIN_BENCHMARK(name, ...)                                                                                   \
