@@ -2,21 +2,28 @@
 
 #include "tests/gui/EndToEndFixture.h"
 
-#include <algorithm>
-#include <gmock/gmock.h>
+#include <tuple>
 
 namespace {
 
 class ByHandTest : public EndToEndTest {
 protected:
-    void put(RealProgram& program, Page page, const char* field, const std::string& text)
+    using Fields = std::vector<std::pair<const char*, const char*>>;
+
+    void put(RealProgram& program, Page page, const char* field, const char* text)
     {
         program.click(place(page, field));
         program.key("ctrl+a");
         program.type(text);
     }
 
-    void press(RealProgram& program, Page page, const char* button) { program.click(place(page, button)); }
+    /// Types into fields of the page that is shown, and presses a button.
+    void fill(RealProgram& program, Page page, const Fields& fields, const char* button)
+    {
+        for (const auto& [field, text] : fields)
+            put(program, page, field, text);
+        program.click(place(page, button));
+    }
 
     /// Chooses the item of a menu that begins with `letter`.
     void pick(RealProgram& program, const char* menu, const std::string& letter)
@@ -26,20 +33,18 @@ protected:
         program.key("Return");
     }
 
-    void addOperation(RealProgram& program, const char* typeLetter, const std::string& date,
-                      const std::vector<std::pair<const char*, std::string>>& fields)
+    void addOperation(RealProgram& program, const char* typeLetter, const Fields& fields)
     {
         pick(program, "operationType", typeLetter);
         pick(program, "baseAccount", "c");
-        put(program, kOperationPage, "txtDate", date);
-        for (const auto& [field, text] : fields)
-            put(program, kOperationPage, field, text);
-        press(program, kOperationPage, "btnAddOperation");
+        if (*typeLetter == 't')
+            pick(program, "transferAccount", "r");
+        fill(program, kOperationPage, fields, "btnAddOperation");
     }
 
     void save(RealProgram& program, Page page, const char* button)
     {
-        press(program, page, button);
+        fill(program, page, {}, button);
         program.awaitWindow("Save");
         program.type("Own");
         program.key("Return");
@@ -48,25 +53,21 @@ protected:
 
     void makeCatalogue(RealProgram& program)
     {
-        program.click(tab(kCurrencyPage));
-        put(program, kCurrencyPage, "txtCurrencyName", "Euro");
-        put(program, kCurrencyPage, "txtCurrencyRepresentation", "EUR");
-        press(program, kCurrencyPage, "btnAddCurrency");
-        put(program, kCurrencyPage, "txtQuoteDate", "1/1/2024");
-        put(program, kCurrencyPage, "txtQuoteValue", "1");
-        press(program, kCurrencyPage, "btnAddQuote");
-
-        program.click(tab(kCompanyPage));
-        put(program, kCompanyPage, "txtMarketName", "Paris");
-        put(program, kCompanyPage, "txtMarketCurrencyRepresentation", "EUR");
-        press(program, kCompanyPage, "btnAddMarket");
-        put(program, kCompanyPage, "txtAbbreviation", "ACME");
-        put(program, kCompanyPage, "txtName", "Acme");
-        press(program, kCompanyPage, "btnAddCompany");
-        for (const auto& [date, value] : {std::pair("1/3/2024", "10"), {"30/6/2024", "13"}}) {
-            put(program, kCompanyPage, "txtQuoteDate", date);
-            put(program, kCompanyPage, "txtQuoteValue", value);
-            press(program, kCompanyPage, "btnAddQuote");
+        const struct {
+            Page page;
+            Fields fields;
+            const char* button;
+        } steps[] = {
+            {kCurrencyPage, {{"txtCurrencyName", "Euro"}, {"txtCurrencyRepresentation", "EUR"}}, "btnAddCurrency"},
+            {kCurrencyPage, {{"txtQuoteDate", "1/1/2024"}, {"txtQuoteValue", "1"}}, "btnAddQuote"},
+            {kCompanyPage, {{"txtMarketName", "Paris"}, {"txtMarketCurrencyRepresentation", "EUR"}}, "btnAddMarket"},
+            {kCompanyPage, {{"txtAbbreviation", "ACME"}, {"txtName", "Acme"}}, "btnAddCompany"},
+            {kCompanyPage, {{"txtQuoteDate", "1/3/2024"}, {"txtQuoteValue", "10"}}, "btnAddQuote"},
+            {kCompanyPage, {{"txtQuoteDate", "30/6/2024"}, {"txtQuoteValue", "13"}}, "btnAddQuote"},
+        };
+        for (const auto& step : steps) {
+            program.click(tab(step.page));
+            fill(program, step.page, step.fields, step.button);
         }
         save(program, kCompanyPage, "btnSaveMarket");
     }
@@ -74,23 +75,22 @@ protected:
     void makePortfolio(RealProgram& program)
     {
         program.click(tab(kPortoFolioPage));
-        for (const char* name : {"Cash", "Reserve"}) {
-            put(program, kPortoFolioPage, "txtAccountName", name);
-            put(program, kPortoFolioPage, "txtAccountCurrency", "EUR");
-            press(program, kPortoFolioPage, "btnAddAccount");
-        }
+        for (const char* name : {"Cash", "Reserve"})
+            fill(program, kPortoFolioPage, {{"txtAccountName", name}, {"txtAccountCurrency", "EUR"}}, "btnAddAccount");
         program.click(tab(kOperationPage));
-        addOperation(program, "d", "1/1/2024", {{"txtAmount", "10000"}});
-        const std::pair<const char*, std::string> company[] = {{"txtMarketName", "Paris"},
-                                                               {"txtCompanyAbbreviation", "ACME"}};
-        addOperation(program, "b", "1/3/2024",
-                     {company[0], company[1], {"txtQuantity", "100"}, {"txtQuote", "10"}, {"txtShareCost", "5"}});
-        addOperation(program, "s", "1/6/2024",
-                     {company[0], company[1], {"txtQuantity", "40"}, {"txtQuote", "12"}, {"txtShareCost", "5"}});
-        pick(program, "operationType", "t");
-        pick(program, "transferAccount", "r");
-        addOperation(program, "t", "2/6/2024",
-                     {{"txtAmount", "500"},
+        addOperation(program, "d", {{"txtDate", "1/1/2024"}, {"txtAmount", "10000"}});
+        for (const auto& [type, date, quantity, quote] :
+             {std::tuple("b", "1/3/2024", "100", "10"), {"s", "1/6/2024", "40", "12"}})
+            addOperation(program, type,
+                         {{"txtDate", date},
+                          {"txtMarketName", "Paris"},
+                          {"txtCompanyAbbreviation", "ACME"},
+                          {"txtQuantity", quantity},
+                          {"txtQuote", quote},
+                          {"txtShareCost", "5"}});
+        addOperation(program, "t",
+                     {{"txtDate", "2/6/2024"},
+                      {"txtAmount", "500"},
                       {"txtTransferCost", "0"},
                       {"txtTransferRateCost", "0"},
                       {"txtTransferFromQuote", "1"},
@@ -99,21 +99,7 @@ protected:
         save(program, kPortoFolioPage, "btnSavePortoFolio");
     }
 
-    void load(RealProgram& program, Page page, const char* button, bool isAsked)
-    {
-        program.click(tab(page));
-        press(program, page, button);
-        if (isAsked) {
-            program.awaitWindow("Warning");
-            program.key("Return");
-        }
-        program.awaitWindow("Load");
-        program.type("Own");
-        program.key("Return");
-        program.awaitNoWindow("Load");
-    }
-
-    std::string totalOn(RealProgram& program, const std::string& date, const std::string& before)
+    std::string totalOn(RealProgram& program, const char* date, const std::string& before)
     {
         put(program, kPortoFolioPage, "txtDate", date);
         program.key("Return");
@@ -136,8 +122,7 @@ TEST_F(ByHandTest, EmptyWindowToAPortfolioThatIsThereAfterARestart)
         EXPECT_EQ(program.quit(), 0);
     }
     RealProgram program(PELORIN_PROGRAM, home_.path.string());
-    load(program, kCompanyPage, "btnLoadMarket", false);
-    load(program, kPortoFolioPage, "btnLoadPortoFolio", true);
+    loadBothIn(program, "Own");
     const std::string early = totalOn(program, "1/1/2024", "");
     EXPECT_EQ(totalOn(program, "30/6/2024", early), expected);
     EXPECT_EQ(program.textAt(place(kPortoFolioPage, "txtTotalDeposit")), "10,000.00 EUR");

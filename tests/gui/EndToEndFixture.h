@@ -35,22 +35,25 @@ protected:
         ASSERT_EQ(run.status, 0) << run.err;
     }
 
-    /// Loads both files by the buttons and panels. The page of the portfolio is shown afterwards.
-    void loadSampleIn(RealProgram& program)
+    /// Loads a file by a button of the page; `isAsked` when something could be lost.
+    void loadIn(RealProgram& program, Page page, const char* button, const char* name, bool isAsked)
     {
-        program.click(place(kCompanyPage, "btnLoadMarket"));
+        program.click(tab(page));
+        program.click(place(page, button));
+        if (isAsked) {
+            program.awaitWindow("Warning");
+            program.key("Return"); // Continue
+        }
         program.awaitWindow("Load");
-        program.type("Sample");
+        program.type(name);
         program.key("Return");
         program.awaitNoWindow("Load");
-        program.click(tab(kPortoFolioPage));
-        program.click(place(kPortoFolioPage, "btnLoadPortoFolio"));
-        program.awaitWindow("Warning");
-        program.key("Return"); // Continue
-        program.awaitWindow("Load");
-        program.type("Sample");
-        program.key("Return");
-        program.awaitNoWindow("Load");
+    }
+    /// Loads both files of that name. The page of the portfolio is shown afterwards.
+    void loadBothIn(RealProgram& program, const char* name)
+    {
+        loadIn(program, kCompanyPage, "btnLoadMarket", name, false);
+        loadIn(program, kPortoFolioPage, "btnLoadPortoFolio", name, true);
     }
 
     const TemporaryFolder home_{"pelorin-home"};

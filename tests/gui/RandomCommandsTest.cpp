@@ -48,10 +48,18 @@ protected:
     /// One thing that a person may do.
     struct Action {
         const char* name;
+        std::size_t weight; // how likely it is
         void (RandomCommandsTest::*run)();
     };
     static const std::vector<Action> kActions;
 
+    const Action& anyAction()
+    {
+        std::vector<const Action*> drawn;
+        for (const Action& action : kActions)
+            drawn.insert(drawn.end(), action.weight, &action);
+        return *drawn[under(drawn.size())];
+    }
     unsigned under(std::size_t n) { return below(random_, n); }
     BListView& listOf(const char* page, const char* name)
     {
@@ -156,14 +164,12 @@ protected:
             return;
         send({'RBSr'});
     }
-    void removeCurrency() { send({'RBRe'}); }
     void addMarket()
     {
         put("CompanyView", "txtMarketName", name());
         put("CompanyView", "txtMarketCurrencyRepresentation", knownSymbol());
         send({'CBAm', 'CBAm', 'CBUm'});
     }
-    void removeMarket() { send({'CBRm'}); }
     void addCompany()
     {
         put("CompanyView", "txtAbbreviation", name());
@@ -225,7 +231,6 @@ protected:
         put("WalletView", "txtAccountCurrency", knownSymbol());
         send({isMended ? static_cast<uint32>('WBUa') : 'WBAa', 'WBAa', 'WBUa'});
     }
-    void removeAccount() { send({'WBRa'}); }
     std::string accountName()
     {
         const std::vector<Account*> accounts = all(wallet(), &Wallet::getAllAccounts);
@@ -414,37 +419,20 @@ private:
     int valuesCompared_ = 0;
 };
 
-// An action stands here as often as it is to be likely.
 const std::vector<RandomCommandsTest::Action> RandomCommandsTest::kActions = {
-    {"select", &RandomCommandsTest::pickSomething},
-    {"select", &RandomCommandsTest::pickSomething},
-    {"select", &RandomCommandsTest::pickSomething},
-    {"select", &RandomCommandsTest::pickSomething},
-    {"currency", &RandomCommandsTest::addCurrency},
-    {"reference", &RandomCommandsTest::changeReference},
-    {"market", &RandomCommandsTest::addMarket},
-    {"market", &RandomCommandsTest::addMarket},
-    {"company", &RandomCommandsTest::addCompany},
-    {"company", &RandomCommandsTest::addCompany},
-    {"company", &RandomCommandsTest::addCompany},
-    {"quote", &RandomCommandsTest::changeQuotes},
-    {"quote", &RandomCommandsTest::changeQuotes},
-    {"quote", &RandomCommandsTest::changeQuotes},
-    {"quote", &RandomCommandsTest::changeQuotes},
-    {"quotes", &RandomCommandsTest::removeOrSplitQuotes},
-    {"event", &RandomCommandsTest::changeEvent},
-    {"event", &RandomCommandsTest::changeEvent},
-    {"account", &RandomCommandsTest::changeAccount},
-    {"account", &RandomCommandsTest::changeAccount},
-    {"operation", &RandomCommandsTest::changeOperation},
-    {"operation", &RandomCommandsTest::changeOperation},
-    {"operation", &RandomCommandsTest::changeOperation},
-    {"operation", &RandomCommandsTest::changeOperation},
-    {"operation", &RandomCommandsTest::changeOperation},
-    {"operation", &RandomCommandsTest::changeOperation},
-    {"look", &RandomCommandsTest::lookAround},
-    {"revalue", &RandomCommandsTest::revalue},
-    {"remove company", &RandomCommandsTest::removeCompany},
+    {"select", 4, &RandomCommandsTest::pickSomething},
+    {"currency", 1, &RandomCommandsTest::addCurrency},
+    {"reference", 1, &RandomCommandsTest::changeReference},
+    {"market", 2, &RandomCommandsTest::addMarket},
+    {"company", 3, &RandomCommandsTest::addCompany},
+    {"quote", 4, &RandomCommandsTest::changeQuotes},
+    {"quotes", 1, &RandomCommandsTest::removeOrSplitQuotes},
+    {"event", 2, &RandomCommandsTest::changeEvent},
+    {"account", 2, &RandomCommandsTest::changeAccount},
+    {"operation", 6, &RandomCommandsTest::changeOperation},
+    {"look", 1, &RandomCommandsTest::lookAround},
+    {"revalue", 1, &RandomCommandsTest::revalue},
+    {"remove company", 1, &RandomCommandsTest::removeCompany},
 };
 
 TEST_P(RandomCommandsTest, LinksListsAndFileAgreeAfterEachCommand)
@@ -452,15 +440,12 @@ TEST_P(RandomCommandsTest, LinksListsAndFileAgreeAfterEachCommand)
     constexpr int kSteps = 1200;
     constexpr unsigned kRarely = 40; // steps between the removals of much
     for (int step = 0; step < kSteps && !HasFailure(); ++step) {
-        const Action& action = kActions[under(kActions.size())];
+        const Action& action = anyAction();
         SCOPED_TRACE("step " + std::to_string(step) + ": " + action.name);
         (this->*action.run)();
-        if (under(kRarely) == 0)
-            removeMarket();
-        if (under(kRarely) == 0)
-            removeCurrency();
-        if (under(kRarely) == 0)
-            removeAccount();
+        for (const uint32 removal : {'CBRm', 'RBRe', 'WBRa'}) // of a market, a currency, an account
+            if (under(kRarely) == 0)
+                send({removal});
         if (under(3) == 0)
             continue; // the next command comes before this one has been handled
         settle();

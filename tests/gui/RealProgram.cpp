@@ -205,31 +205,6 @@ std::string RealProgram::textOtherThan(const std::string& other, QPoint place)
     return text;
 }
 
-std::string RealProgram::picture(QRect part) const
-{
-    Display* display = XOpenDisplay(display_.c_str());
-    if (display == nullptr)
-        throw std::runtime_error("no connection to " + display_);
-    const QRect place = part.translated(kWindowPlace);
-    XImage* image =
-        XGetImage(display, DefaultRootWindow(display), place.x(), place.y(), static_cast<unsigned>(place.width()),
-                  static_cast<unsigned>(place.height()), AllPlanes, ZPixmap);
-    std::string pixels;
-    if (image != nullptr) {
-        pixels.assign(image->data, static_cast<std::size_t>(image->bytes_per_line * image->height));
-        image->f.destroy_image(image);
-    }
-    XCloseDisplay(display);
-    return pixels;
-}
-
-std::string RealProgram::pictureOtherThan(const std::string& former, QRect part) const
-{
-    std::string pixels;
-    await("another picture", [&] { return (pixels = picture(part)) != former; });
-    return pixels;
-}
-
 int RealProgram::quit()
 {
     closeWindow(display_, std::stoul(findWindow("Pelorin")));
@@ -237,9 +212,4 @@ int RealProgram::quit()
     await("the end of the program", [&] { return waitpid(program_, &status, WNOHANG) == program_; });
     program_ = -1;
     return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-}
-
-void RealProgram::screenshot(const std::string& path)
-{
-    runOnDisplay("import -window root '" + path + "'");
 }

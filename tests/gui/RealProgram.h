@@ -1,7 +1,6 @@
 #pragma once
 
 #include <QPoint>
-#include <QRect>
 #include <chrono>
 #include <string>
 #include <sys/types.h>
@@ -29,14 +28,8 @@ public:
     std::string textAt(QPoint place);
     /// Reads the field until its text is not `other`.
     std::string textOtherThan(const std::string& other, QPoint place);
-    /// The pixels of a part of the main window as the screen shows them.
-    std::string picture(QRect part) const;
-    /// Waits until that part looks other than `former`. @return how it looks.
-    std::string pictureOtherThan(const std::string& former, QRect part) const;
     /// Closes the window as a person does. @return the program's exit status.
     int quit();
-    /// Writes what the screen shows as a PNG.
-    void screenshot(const std::string& path);
 
 private:
     static std::string run(const std::string& command);

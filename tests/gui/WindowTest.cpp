@@ -237,25 +237,30 @@ protected:
     ParameterPageTest() { show(kParameterPage); }
 };
 
-TEST_F(ParameterPageTest, ShowsTheDefaults)
+TEST_F(ParameterPageTest, FieldsShowTheDefaultsAndAllButTheFixedCostsRevalue)
 {
     const struct {
         const char* field;
         const char* text;
+        bool revalues;
     } cases[] = {
-        {"txtBuyCost", "29.95"},
-        {"txtSellCost", "29.95"},
-        {"txtBuyRateCost", "0.17 %"},
-        {"txtSellRateCost", "0.17 %"},
-        {"txtInvestementPeriod", "90"},
-        {"txtBeginProfitSellRate", "200.00 %"},
-        {"txtEndProfitSellRate", "110.00 %"},
-        {"txtBeginLoseSellRate", "80.00 %"},
-        {"txtEndLoseSellRate", "80.00 %"},
-        {"txtReinvestRate", "90.00 %"},
+        {"txtBuyCost", "29.95", false},
+        {"txtSellCost", "29.95", false},
+        {"txtBuyRateCost", "0.17 %", true},
+        {"txtSellRateCost", "0.17 %", true},
+        {"txtInvestementPeriod", "90", true},
+        {"txtBeginProfitSellRate", "200.00 %", true},
+        {"txtEndProfitSellRate", "110.00 %", true},
+        {"txtBeginLoseSellRate", "80.00 %", true},
+        {"txtEndLoseSellRate", "80.00 %", true},
+        {"txtReinvestRate", "90.00 %", true},
     };
-    for (const auto& c : cases)
+    for (const auto& c : cases) {
         EXPECT_EQ(text(c.field), c.text) << c.field;
+        window().SetState(nullptr);
+        enter(c.field, "33");
+        EXPECT_EQ(window().getState() != nullptr, c.revalues) << c.field;
+    }
 }
 
 TEST_F(ParameterPageTest, CommitsStoreWhatTheFieldBeginsWith)
@@ -289,24 +294,6 @@ TEST_F(ParameterPageTest, CommitsStoreWhatTheFieldBeginsWith)
     }
     enter("txtBeginProfitSellRate", "150");
     EXPECT_EQ(wallet().getBeginProfitSellRate(), 1.5F);
-}
-
-TEST_F(ParameterPageTest, OnlyTheFixedCostsDoNotRevalue)
-{
-    const struct {
-        const char* field;
-        bool revalues;
-    } cases[] = {
-        {"txtBuyCost", false},          {"txtSellCost", false},         {"txtBuyRateCost", true},
-        {"txtSellRateCost", true},      {"txtInvestementPeriod", true}, {"txtBeginProfitSellRate", true},
-        {"txtEndProfitSellRate", true}, {"txtBeginLoseSellRate", true}, {"txtEndLoseSellRate", true},
-        {"txtReinvestRate", true},
-    };
-    for (const auto& c : cases) {
-        window().SetState(nullptr);
-        enter(c.field, "33");
-        EXPECT_EQ(window().getState() != nullptr, c.revalues) << c.field;
-    }
 }
 
 } // namespace

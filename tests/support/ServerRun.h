@@ -38,9 +38,6 @@ public:
     {
         return static_cast<unsigned short>(std::stoi("0" + address_.substr(address_.find(':') + 1)));
     }
-    /// Halts it, so that clients wait, or has it go on.
-    void halt() const { kill(pid_, SIGSTOP); }
-    void goOn() const { kill(pid_, SIGCONT); }
     /// @return the exit status; -1 when it did not exit by itself.
     int stop(int signal)
     {
