@@ -57,7 +57,10 @@ TEST(AutomaticSaleTest, TheTrendIsHeldAgainstTheLimitsOfEachDay)
                  {0, 8.1F, 0, kPeriod, false, "between the limits to the end"},
                  {0, 20.1F, 0, 0, true, "above the first day's profit limit of 20"},
                  {0, 19.95F, 0, 1, true, "above the second day's of 19.9"},
+                 {kPeriod - 1, 11.2F, 0, kPeriod - 1, true, "above the last day's of 11.1"},
+                 {kPeriod - 1, 11.05F, 0, kPeriod, false, "below the last day's"},
                  {0, 10, 0.25F, 29, true, "10 + x / 4 > 20 - x / 10 from the 29th day on"},
+                 {0, 10, -0.1875F, 11, false, "10 - 3 x / 16 < 8 from the 11th day on"},
                  {kPeriod, 50, 0, kPeriod, false, "at the end: sold whatever the trend, without a transfer"},
                  {kPeriod + 30, 50, 0, kPeriod, false, "behind it: sold in the past"}};
     for (const auto& c : cases) {
