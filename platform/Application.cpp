@@ -5,7 +5,9 @@
 #include "platform/Window.h"
 
 #include <QApplication>
+#include <QDir>
 #include <QFont>
+#include <QIcon>
 #include <QPalette>
 #include <QStyleFactory>
 
@@ -37,6 +39,16 @@ QPalette panelColors()
     return palette;
 }
 
+/// The icon of the program `name` in all sizes that were built in, without one if there are none.
+QIcon iconOf(const QString& name)
+{
+    QIcon icon;
+    const QDir icons(":/icons");
+    for (const QString& file : icons.entryList({name + "-*.png"}))
+        icon.addFile(icons.filePath(file));
+    return icon;
+}
+
 } // namespace
 
 BApplication::BApplication(const char* signature) : BLooper(signature), signature_(signature)
@@ -46,9 +58,10 @@ BApplication::BApplication(const char* signature) : BLooper(signature), signatur
         new QApplication(argumentCount, arguments); // lives as long as the process
         // It has taken over the desktop's way to write numbers. The program's own has a point, whatever the desktop's.
         std::setlocale(LC_NUMERIC, "C");
-        const std::string name = signature_.substr(signature_.find_last_of("./") + 1);
-        QApplication::setApplicationName(QString::fromStdString(name));
-        QApplication::setDesktopFileName(QString::fromStdString(name).toLower());
+        const QString name = QString::fromStdString(signature_.substr(signature_.find_last_of("./") + 1));
+        QApplication::setApplicationName(name);
+        QApplication::setDesktopFileName(name.toLower());
+        QApplication::setWindowIcon(iconOf(name.toLower()));
     }
     QApplication::setStyle(QStyleFactory::create("Fusion"));
     QApplication::setPalette(panelColors());
