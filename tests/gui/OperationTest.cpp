@@ -365,9 +365,9 @@ TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
     window().catalogue().getMarkets()[1]->getCompany("BBB", &beta);
     new CompanyQuote(beta, Date(3, 11, 2024), 12);
     show(kPortoFolioPage);
-    enter("txtDate", "04/11/2024");
+    enter("txtDate", "03/11/2024");
     show(kOperationPage);
-    EXPECT_EQ(text("txtDate") + " " + text("txtQuote"), "04/11/2024 12.00") << "the quote of the day that is offered";
+    EXPECT_EQ(text("txtDate") + " " + text("txtQuote"), "03/11/2024 12.00") << "the quote of the day that is offered";
     type("txtCompanyAbbreviation", "AAA");
     EXPECT_EQ(text("txtQuote"), "") << "it has no quotes, and BBB's is not its";
     type("txtQuote", "4");
