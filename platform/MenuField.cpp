@@ -13,8 +13,8 @@
 #include <cmath>
 
 BMenuField::BMenuField(BRect frame, const char* name, const char* label, BMenu* menu, uint32 resizingMode, uint32 flags)
-    : BView(frame, name, resizingMode, flags & ~static_cast<uint32>(B_NAVIGABLE), new QWidget), label_(label),
-      menu_(menu), field_(new QComboBox(widget())), caption_(new QLabel(labelText(label), widget())),
+    : BView(frame, name, resizingMode, (flags & ~static_cast<uint32>(B_NAVIGABLE)) | B_FRAME_EVENTS, new QWidget),
+      label_(label), menu_(menu), field_(new QComboBox(widget())), caption_(new QLabel(labelText(label), widget())),
       divider_(label_.empty() ? 0 : std::floor(frame.Width() / 2))
 {
     // The menu is what the keyboard reaches, so the menu bears the name.

@@ -45,16 +45,18 @@ Qt::Alignment toQt(alignment side)
 
 BTextControl::BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message,
                            uint32 resizingMode, uint32 flags)
-    : BControl(frame, name, label, message, resizingMode, flags & ~static_cast<uint32>(B_NAVIGABLE), new QWidget),
+    : BControl(frame, name, label, message, resizingMode, (flags & ~static_cast<uint32>(B_NAVIGABLE)) | B_FRAME_EVENTS,
+               new QWidget),
       field_(new Field(widget())), caption_(new QLabel(labelText(label), widget())),
       divider_(std::floor(frame.Width() / 2)), committed_(text != nullptr ? text : "")
 {
-    // The field is what the keyboard reaches, so the field bears the name.
+    // The field is what the keyboard reaches, so the field bears the names.
     widget()->setObjectName({});
+    widget()->setAccessibleName({});
     static_cast<Field*>(field_)->view = this;
     field_->setObjectName(QString::fromUtf8(Name()));
     field_->setAccessibleName(QString::fromUtf8(Label()));
-    field_->setText(QString::fromUtf8(text));
+    show(text);
     caption_->setBuddy(field_);
     if (*Label() == '\0')
         divider_ = 0;
@@ -98,13 +100,18 @@ void BTextControl::commit()
 
 const char* BTextControl::Text() const
 {
-    text_ = field_->text().toStdString();
-    return text_.c_str();
+    return text_.of(field_->text().toStdString());
+}
+
+void BTextControl::show(const char* text)
+{
+    field_->setText(QString::fromUtf8(text));
+    text_.set(text, field_->text().toStdString());
 }
 
 void BTextControl::SetText(const char* text)
 {
-    field_->setText(QString::fromUtf8(text));
+    show(text);
     field_->setCursorPosition(0);
     committed_ = Text();
 }

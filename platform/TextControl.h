@@ -1,6 +1,7 @@
 #pragma once
 
 #include "platform/Control.h"
+#include "platform/FieldText.h"
 
 #include <string>
 
@@ -15,7 +16,8 @@ public:
     BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message,
                  uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
 
-    /// The text belongs to the control and is valid until it changes.
+    /// The text belongs to the control and is valid until it changes. As long as nobody has changed it, it is what it
+    /// was set to, byte for byte.
     const char* Text() const;
     /// Sends no message.
     void SetText(const char* text);
@@ -35,11 +37,12 @@ public:
 
 private:
     void layOut();
+    void show(const char* text);
     void commit();
 
     QLineEdit* field_; // a part of the widget
     QLabel* caption_;  // and so is this
     float divider_;
     std::string committed_;
-    mutable std::string text_; // what `Text` has given away
+    FieldText text_;
 };

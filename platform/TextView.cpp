@@ -16,11 +16,11 @@ QPlainTextEdit& BTextView::field() const
 
 const char* BTextView::Text() const
 {
-    text_ = field().toPlainText().toStdString();
-    return text_.c_str();
+    return text_.of(field().toPlainText().toStdString());
 }
 
 void BTextView::SetText(const char* text)
 {
     field().setPlainText(QString::fromUtf8(text));
+    text_.set(text, field().toPlainText().toStdString());
 }

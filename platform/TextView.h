@@ -1,8 +1,7 @@
 #pragma once
 
+#include "platform/FieldText.h"
 #include "platform/View.h"
-
-#include <string>
 
 class QPlainTextEdit;
 
@@ -11,12 +10,13 @@ class BTextView : public BView {
 public:
     BTextView(BRect frame, const char* name, uint32 resizingMode, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
 
-    /// The text belongs to the view and is valid until the next call.
+    /// The text belongs to the view and is valid until the next call. As long as nobody has changed it, it is what it
+    /// was set to, byte for byte.
     const char* Text() const;
     void SetText(const char* text);
 
 private:
     QPlainTextEdit& field() const;
 
-    mutable std::string text_;
+    FieldText text_;
 };

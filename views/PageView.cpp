@@ -27,7 +27,7 @@ Field* makeField(BView* parent, BRect frame, const char* name, const char* label
 
 } // namespace
 
-PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_ALL, B_WILL_DRAW)
+PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_ALL, B_WILL_DRAW | B_FRAME_EVENTS)
 {
     SetViewColor(look::kPanel);
 }

@@ -1,5 +1,6 @@
 // The company and the currency page: a catalogue kept by hand. Quotes are in QuoteTest.cpp.
 
+#include "market/NoteCompanyEvent.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/ToolRun.h"
 
@@ -140,6 +141,26 @@ TEST_F(CatalogueTest, EventFieldsFollowTheKindAndAnUpdateTakesItFromTheMenu)
     click("btnRemoveCompanyEvent");
     EXPECT_THAT(rows("lstCompanyEvents"), IsEmpty());
     EXPECT_EQ(company()->getNbrEvents(), 0U);
+}
+
+TEST_F(CatalogueTest, WhatNobodyTypedComesBackByteForByte)
+{
+    addSmallCatalogue();
+    const String name("Par\xEDs\r\n");        // no UTF-8, as other programs' names may be
+    const String note("a\r\n\xC2\xA0 b\xFF"); // line ends and blanks that the field shows otherwise
+    window().catalogue().getMarkets()[0]->setName(name);
+    auto* event = new NoteCompanyEvent(company(), Date(1, 4, 2024), name, note);
+    window().CompanySelection();
+    window().MarketSelection();
+    select("lstCompanyEvents", 0);
+    click("btnUpdateMarket");
+    click("btnUpdateCompanyEvent");
+    EXPECT_EQ(window().catalogue().getMarkets()[0]->getName(), name);
+    EXPECT_EQ(event->getTitle(), name);
+    EXPECT_EQ(event->getText(), note);
+    type("txtCompanyEventTitle", "New");
+    click("btnUpdateCompanyEvent");
+    EXPECT_EQ(event->getTitle(), String("New"));
 }
 
 TEST_F(CatalogueTest, RenamingReachesBothPagesAndTheOperations)
