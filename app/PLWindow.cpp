@@ -142,8 +142,8 @@ void PLWindow::makePages()
 void PLWindow::makePanels()
 {
     const BMessenger self(this);
-    openPanel_ = std::make_unique<BFilePanel>(B_OPEN_PANEL, &self, nullptr, B_FILE_NODE, false, nullptr, false, true);
-    savePanel_ = std::make_unique<BFilePanel>(B_SAVE_PANEL, &self, nullptr, B_FILE_NODE, false, nullptr, false, true);
+    openPanel_ = std::make_unique<BFilePanel>(B_OPEN_PANEL, &self, nullptr, B_FILE_NODE);
+    savePanel_ = std::make_unique<BFilePanel>(B_SAVE_PANEL, &self, nullptr, B_FILE_NODE);
 }
 
 void PLWindow::MessageReceived(BMessage* message)

@@ -18,8 +18,7 @@ constexpr uint32 kAdd = 'KyAd';
 
 void press(BView* button)
 {
-    auto* control = dynamic_cast<BButton*>(button);
-    if (control != nullptr && control->IsEnabled())
+    if (auto* control = dynamic_cast<BButton*>(button))
         control->Invoke();
 }
 

@@ -102,8 +102,8 @@ void GraphView::askForPictureFile()
 {
     const BMessenger self(this);
     if (savePanel_ == nullptr)
-        savePanel_ = std::make_unique<BFilePanel>(B_SAVE_PANEL, &self, nullptr, B_FILE_NODE, false,
-                                                  new BMessage(kPictureFile), true, true);
+        savePanel_ =
+            std::make_unique<BFilePanel>(B_SAVE_PANEL, &self, nullptr, B_FILE_NODE, new BMessage(kPictureFile), true);
     unsigned count;
     GraphElement* const* elements = elements_.getAll(&count);
     // The last element is the one in front, and what the chart is about.

@@ -9,6 +9,8 @@
 #include <QRectF>
 
 #include <functional>
+#include <optional>
+#include <vector>
 
 class QPainter;
 class QWidget;
@@ -29,6 +31,13 @@ public:
     drawing_mode mode = B_OP_COPY;
     BFont font;
 
+    /// The stroke at the end of the lines that were added so far.
+    struct Stroke {
+        std::vector<BPoint> points;
+        rgb_color color;
+    };
+    std::optional<Stroke> lines; // while a line array is being made
+
     explicit Canvas(QWidget& widget) : widget_(widget) {}
 
     /// Runs `draw` with a painter that is set up by the state above.
@@ -41,7 +50,6 @@ public:
     /// The picture, of the view's present size. `*fresh` tells that it was just made and holds nothing yet.
     const QPixmap& picture(bool* fresh);
     void markStale() { stale_ = true; }
-    bool isStale() const { return stale_; }
 
     QColor color(pattern p) const;
     QColor color(rgb_color c) const;

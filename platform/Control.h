@@ -5,13 +5,11 @@
 
 #include <string>
 
-/// A view that a person works with: it has a label, can be disabled, and sends its message when it is used.
+/// A view that a person works with: it has a label, and sends its message when it is used.
 class BControl : public BView, public BInvoker {
 public:
     const char* Label() const { return label_.c_str(); }
     virtual void SetLabel(const char* label) { label_ = label; }
-    void SetEnabled(bool enabled);
-    bool IsEnabled() const;
     virtual void SetValue(int32 value) { value_ = value; }
     int32 Value() const { return value_; }
 

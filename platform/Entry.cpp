@@ -13,12 +13,6 @@ BEntry::BEntry(const entry_ref* ref)
 
 BEntry::BEntry(const char* path) : path_(path != nullptr ? path : "") {}
 
-bool BEntry::Exists() const
-{
-    std::error_code error;
-    return std::filesystem::exists(path_, error);
-}
-
 status_t BEntry::GetPath(BPath* path) const
 {
     return InitCheck() == B_OK ? path->SetTo(path_.c_str()) : B_NO_INIT;

@@ -21,7 +21,6 @@ public:
 
     /// `B_NO_INIT` when the entry stands for no place.
     status_t InitCheck() const { return path_.empty() ? B_NO_INIT : B_OK; }
-    bool Exists() const;
     status_t GetPath(BPath* path) const;
     status_t GetRef(entry_ref* ref) const;
 

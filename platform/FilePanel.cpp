@@ -13,10 +13,10 @@
 #include <QTreeView>
 
 BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const entry_ref* start, uint32,
-                       bool allowMultiple, BMessage* message, bool modal, bool hideWhenDone)
-    : mode_(mode), target_(target != nullptr ? *target : BMessenger()), allowMultiple_(allowMultiple),
+                       BMessage* message, bool modal)
+    : mode_(mode), target_(target != nullptr ? *target : BMessenger()),
       message_(message != nullptr ? message : new BMessage(mode == B_OPEN_PANEL ? B_REFS_RECEIVED : B_SAVE_REQUESTED)),
-      modal_(modal), hideWhenDone_(hideWhenDone)
+      modal_(modal)
 {
     BPath path;
     if (start != nullptr && BEntry(start).GetPath(&path) == B_OK)
@@ -36,8 +36,7 @@ QFileDialog& BFilePanel::dialog()
     // The desktop's own panel takes no part in this program's event loop and cannot be found by tests.
     dialog_->setOption(QFileDialog::DontUseNativeDialog);
     dialog_->setAcceptMode(mode_ == B_OPEN_PANEL ? QFileDialog::AcceptOpen : QFileDialog::AcceptSave);
-    const auto openMode = allowMultiple_ ? QFileDialog::ExistingFiles : QFileDialog::ExistingFile;
-    dialog_->setFileMode(mode_ == B_OPEN_PANEL ? openMode : QFileDialog::AnyFile);
+    dialog_->setFileMode(mode_ == B_OPEN_PANEL ? QFileDialog::ExistingFile : QFileDialog::AnyFile);
     dialog_->setModal(modal_);
     // Who types a name fast and presses Enter would leave its list of proposals open behind the panel.
     if (auto* field = dialog_->findChild<QLineEdit*>("fileNameEdit"))
@@ -79,34 +78,10 @@ void BFilePanel::Show()
     shown.activateWindow();
 }
 
-void BFilePanel::Hide()
-{
-    if (dialog_ != nullptr)
-        dialog_->hide();
-}
-
-bool BFilePanel::IsShowing() const
-{
-    return dialog_ != nullptr && dialog_->isVisible();
-}
-
 void BFilePanel::accept()
 {
     directory_ = dialog_->directory().absolutePath().toStdString();
-    if (mode_ == B_SAVE_PANEL || !allowMultiple_) {
-        send(dialog_->selectedFiles().value(0).toStdString());
-    } else {
-        BMessage answer = *message_;
-        const auto chosen = dialog_->selectedFiles();
-        for (const auto& file : chosen) {
-            entry_ref ref;
-            if (BEntry(file.toUtf8().constData()).GetRef(&ref) == B_OK)
-                answer.AddRef("refs", &ref);
-        }
-        sendAll(answer);
-    }
-    if (!hideWhenDone_)
-        dialog_->show(); // accepting has hidden it
+    send(dialog_->selectedFiles().value(0).toStdString());
 }
 
 void BFilePanel::send(const std::string& path) const

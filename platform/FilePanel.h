@@ -11,20 +11,20 @@ struct entry_ref;
 
 enum file_panel_mode { B_OPEN_PANEL, B_SAVE_PANEL };
 
-/// Which entries a panel lets a person choose.
-enum : uint32 { B_FILE_NODE = 1, B_DIRECTORY_NODE = 2 };
+/// Which entries a panel lets a person choose: files.
+enum : uint32 { B_FILE_NODE = 1 };
 
 /// The dialog in which a person chooses a file. It answers with a message to its target.
 ///
-/// An open panel sends `B_REFS_RECEIVED` with the chosen files as "refs", a save panel `B_SAVE_REQUESTED` with the
+/// An open panel sends `B_REFS_RECEIVED` with the chosen file as "refs", a save panel `B_SAVE_REQUESTED` with the
 /// folder as the reference "directory" and the file's name as the string "name"; a save panel has asked before when
 /// there is such a file already. A panel that is left without choice sends `B_CANCEL`.
 class BFilePanel {
 public:
     /// `target` is copied; `start` may be null. `message`, owned from now on, replaces the code above.
     explicit BFilePanel(file_panel_mode mode = B_OPEN_PANEL, const BMessenger* target = nullptr,
-                        const entry_ref* start = nullptr, uint32 nodeFlavors = B_FILE_NODE, bool allowMultiple = true,
-                        BMessage* message = nullptr, bool modal = false, bool hideWhenDone = true);
+                        const entry_ref* start = nullptr, uint32 nodeFlavors = B_FILE_NODE, BMessage* message = nullptr,
+                        bool modal = false);
     ~BFilePanel();
     BFilePanel(const BFilePanel&) = delete;
     BFilePanel& operator=(const BFilePanel&) = delete;
@@ -35,8 +35,6 @@ public:
     /// The name that a save panel comes up with. Its ending is added to a name that is typed without one.
     void SetSaveText(const char* text) { saveText_ = text; }
     void Show();
-    void Hide();
-    bool IsShowing() const;
 
 private:
     QFileDialog& dialog();
@@ -48,9 +46,7 @@ private:
     BMessenger target_;
     std::string directory_;
     std::string saveText_;
-    bool allowMultiple_;
     std::unique_ptr<BMessage> message_;
     bool modal_;
-    bool hideWhenDone_;
     std::unique_ptr<QFileDialog> dialog_; // made when first shown: that takes its time
 };

@@ -4,7 +4,6 @@
 
 /// How a view follows its parent when that changes its size.
 enum : uint32 {
-    B_FOLLOW_NONE = 0,
     B_FOLLOW_LEFT = 1,
     B_FOLLOW_RIGHT = 2,
     B_FOLLOW_LEFT_RIGHT = B_FOLLOW_LEFT | B_FOLLOW_RIGHT,
@@ -23,7 +22,7 @@ enum view_flags : uint32 {
     B_FULL_UPDATE_ON_RESIZE = 8,
 };
 
-enum button_width { B_WIDTH_AS_USUAL, B_WIDTH_FROM_WIDEST, B_WIDTH_FROM_LABEL };
+enum button_width { B_WIDTH_AS_USUAL };
 enum alignment { B_ALIGN_LEFT, B_ALIGN_RIGHT, B_ALIGN_CENTER };
 
 /// Keys that are held while another one is pressed.
@@ -35,8 +34,6 @@ constexpr int32 B_CONTROL_ON = 1;
 /// Keys as `KeyDown` gets them: one byte, where the key has a control character.
 constexpr char B_ENTER = 0x0a;
 constexpr char B_ESCAPE = 0x1b;
-constexpr char B_SPACE = 0x20;
-constexpr char B_TAB = 0x09;
 constexpr char B_BACKSPACE = 0x08;
 constexpr char B_DELETE = 0x7f;
 constexpr char B_LEFT_ARROW = 0x1c;

@@ -17,8 +17,6 @@ public:
     /// Takes ownership of `message`; null sends nothing from now on.
     void SetMessage(BMessage* message) { message_.reset(message); }
     BMessage* Message() const { return message_.get(); }
-    /// The code of the message, 0 without one.
-    uint32 Command() const { return message_ != nullptr ? message_->what : 0; }
     /// A view that is told no target sends to its window.
     void SetTarget(const BHandler* target) { target_ = BMessenger(target); }
     bool HasTarget() const { return target_.IsValid(); }

@@ -8,7 +8,6 @@
 #include <vector>
 
 class BListItem;
-class ListModel;
 class ListWidget;
 
 enum list_view_type { B_SINGLE_SELECTION_LIST, B_MULTIPLE_SELECTION_LIST };

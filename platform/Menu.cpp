@@ -25,17 +25,6 @@ bool BMenu::AddItem(BMenuItem* item)
     return true;
 }
 
-BMenuItem* BMenu::RemoveItem(int32 index)
-{
-    if (index < 0 || index >= CountItems())
-        return nullptr;
-    BMenuItem* item = items_[static_cast<std::size_t>(index)].release();
-    items_.erase(items_.begin() + index);
-    item->menu_ = nullptr;
-    changed();
-    return item;
-}
-
 void BMenu::ReplaceItems(const std::vector<BMenuItem*>& items)
 {
     items_.clear();

@@ -7,7 +7,6 @@
 #include <string>
 #include <vector>
 
-class BHandler;
 class BMenuItem;
 
 /// A list of choices, of which one is marked at a time. Owns its items.
@@ -21,8 +20,6 @@ public:
     const char* Name() const { return name_.c_str(); }
     /// Takes ownership of `item`. @return true
     bool AddItem(BMenuItem* item);
-    /// Gives the item back to the caller; null out of range.
-    BMenuItem* RemoveItem(int32 index);
     /// Destroys the items that are here and takes ownership of `items`.
     void ReplaceItems(const std::vector<BMenuItem*>& items);
     int32 CountItems() const { return static_cast<int32>(items_.size()); }

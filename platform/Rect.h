@@ -14,7 +14,6 @@ struct BRect {
 
     float Width() const { return right - left; }
     float Height() const { return bottom - top; }
-    bool IsValid() const { return right >= left && bottom >= top; }
     BPoint LeftTop() const { return {left, top}; }
     BPoint RightBottom() const { return {right, bottom}; }
     bool Contains(BPoint p) const { return p.x >= left && p.x <= right && p.y >= top && p.y <= bottom; }
@@ -22,6 +21,5 @@ struct BRect {
 
     /// Moves the sides inwards by `dx` and `dy`; outwards when negative.
     BRect InsetByCopy(float dx, float dy) const { return {left + dx, top + dy, right - dx, bottom - dy}; }
-    BRect OffsetByCopy(float dx, float dy) const { return {left + dx, top + dy, right + dx, bottom + dy}; }
     BRect OffsetToCopy(float x, float y) const { return {x, y, x + Width(), y + Height()}; }
 };

@@ -12,9 +12,8 @@ using status_t = int32;
 enum : status_t {
     B_OK = 0,
     B_ERROR = -1,
-    B_BAD_VALUE = -2,       ///< an argument that makes no sense here
-    B_NAME_NOT_FOUND = -3,  ///< a message holds nothing under this name
-    B_BAD_INDEX = -4,       ///< and not so many of them
-    B_ENTRY_NOT_FOUND = -5, ///< no such file or folder
-    B_NO_INIT = -6,         ///< the object was never told what it stands for
+    B_BAD_VALUE = -2,      ///< an argument that makes no sense here
+    B_NAME_NOT_FOUND = -3, ///< a message holds nothing under this name
+    B_BAD_INDEX = -4,      ///< and not so many of them
+    B_NO_INIT = -5,        ///< the object was never told what it stands for
 };

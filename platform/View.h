@@ -10,10 +10,8 @@
 #include <string>
 #include <vector>
 
-class BMessage;
 class BWindow;
 class Canvas;
-class LineArray;
 class QPainter;
 class QWidget;
 
@@ -52,12 +50,8 @@ public:
     void MoveTo(float x, float y);
     /// The children follow by their resizing modes.
     void ResizeTo(float width, float height);
-    uint32 ResizingMode() const { return resizingMode_; }
-    uint32 Flags() const { return flags_; }
     void Hide();
     void Show();
-    /// True when this view or one around it was hidden.
-    bool IsHidden() const;
 
     // Keyboard focus and what assistive tools say.
     void MakeFocus(bool focus = true);
@@ -82,13 +76,10 @@ public:
 
     // Drawing state.
     void SetViewColor(rgb_color color);
-    rgb_color ViewColor() const;
     void SetHighColor(rgb_color color);
     rgb_color HighColor() const;
     void SetLowColor(rgb_color color);
-    rgb_color LowColor() const;
     void SetPenSize(float size);
-    float PenSize() const;
     void SetDrawingMode(drawing_mode mode);
     virtual void SetFont(const BFont* font, uint32 mask = B_FONT_ALL);
     void SetFontSize(float size);
@@ -105,7 +96,6 @@ public:
     void AddLine(BPoint from, BPoint to, rgb_color color);
     void EndLineArray();
     void FillPolygon(const BPoint* points, int32 count, pattern p = B_SOLID_HIGH);
-    void StrokePolygon(const BPoint* points, int32 count, bool closed = true, pattern p = B_SOLID_HIGH);
     void FillTriangle(BPoint a, BPoint b, BPoint c, pattern p = B_SOLID_HIGH);
     /// Angles in degrees, counter-clockwise from the right.
     void FillArc(BPoint center, float xRadius, float yRadius, float startAngle, float arcAngle,
@@ -148,5 +138,4 @@ private:
     std::vector<BView*> children_; // owned
     QWidget* widget_;              // owned
     std::unique_ptr<Canvas> canvas_;
-    std::unique_ptr<LineArray> lines_; // between begin and end
 };

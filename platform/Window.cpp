@@ -9,8 +9,6 @@
 #include <QPoint>
 #include <QSize>
 
-#include <algorithm>
-#include <cmath>
 #include <vector>
 
 namespace {
@@ -88,11 +86,6 @@ void BWindow::Hide()
     widget_->hide();
 }
 
-bool BWindow::IsHidden() const
-{
-    return !widget_->isVisible();
-}
-
 void BWindow::Activate()
 {
     widget_->raise();
@@ -104,7 +97,15 @@ void BWindow::Quit()
     delete this;
 }
 
-bool BWindow::closeByHand()
+void BWindow::MessageReceived(BMessage* message)
+{
+    if (message->what == B_QUIT_REQUESTED)
+        askToClose();
+    else
+        BLooper::MessageReceived(message);
+}
+
+bool BWindow::askToClose()
 {
     if (isClosing())
         return true;

@@ -44,15 +44,16 @@ public:
 
     void Show();
     void Hide();
-    bool IsHidden() const;
     void Activate();
     /// Destroys the window.
     virtual void Quit();
+    /// `B_QUIT_REQUESTED` closes the window as by hand.
+    void MessageReceived(BMessage* message) override;
 
     /// What Qt shows the window with. For the platform's own use.
     WindowWidget& widget() const { return *widget_; }
-    /// The window is asked to close by the person. @return false to stay.
-    bool closeByHand();
+    /// The window is asked to close, by the person or by a message. @return false to stay.
+    bool askToClose();
     static void closeAll();
     /// What a dialog comes up before: the window that has the keyboard, otherwise the one opened last; null without
     /// any.

@@ -61,7 +61,7 @@ void WindowWidget::fitTo(QPoint place, QSize content, bool resizable)
 
 void WindowWidget::closeEvent(QCloseEvent* event)
 {
-    if (window_.closeByHand())
+    if (window_.askToClose())
         event->accept();
     else
         event->ignore();

@@ -7,6 +7,7 @@
 #include "market/Currency.h"
 #include "market/Market.h"
 #include "platform/ListView.h"
+#include "platform/Message.h"
 #include "platform/StringView.h"
 #include "platform/TabView.h"
 #include "platform/WindowWidget.h"
@@ -118,6 +119,15 @@ TEST_F(MainWindowTest, StatusLineReplacesClearsAndCutsItsMessage)
     line->SetMessage(nullptr);
     EXPECT_EQ(line->Message(), nullptr);
     EXPECT_EQ(line->Frame(), BRect(0, 776, 800, 800));
+}
+
+TEST_F(MainWindowTest, QuitMessageClosesTheWindow)
+{
+    auto* second = new PLWindow({50, 50, 850, 850}, DataFolder(folder()));
+    const auto token = second->token();
+    second->PostMessage(B_QUIT_REQUESTED);
+    settle();
+    EXPECT_EQ(BHandler::withToken(token), nullptr);
 }
 
 class PortoFolioPageTest : public WindowTest {
