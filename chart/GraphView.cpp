@@ -3,6 +3,7 @@
 #include "chart/ChartLayout.h"
 #include "chart/ChartPainter.h"
 #include "chart/GraphElement.h"
+#include "chart/GraphLine.h"
 #include "chart/GraphPoint.h"
 #include "chart/GraphPolygon.h"
 #include "platform/Alert.h"
@@ -106,8 +107,10 @@ void GraphView::askForPictureFile()
             std::make_unique<BFilePanel>(B_SAVE_PANEL, &self, nullptr, B_FILE_NODE, new BMessage(kPictureFile), true);
     unsigned count;
     GraphElement* const* elements = elements_.getAll(&count);
-    // The last element is the one in front, and what the chart is about.
-    std::string name(count > 0 ? elements[count - 1]->getLegend().bytes() : "");
+    // The first line is what the chart is about, as it is for the marks of the lowest and the highest value.
+    GraphElement* const* line =
+        std::find_if(elements, elements + count, [](const auto* e) { return e->getType() == GraphLine::kType; });
+    std::string name(line != elements + count ? (*line)->getLegend().bytes() : "");
     std::replace(name.begin(), name.end(), '/', '-');
     savePanel_->SetSaveText(((name.empty() ? "Chart" : name) + ".png").c_str());
     savePanel_->Show();

@@ -90,7 +90,7 @@ void FigureReporter::Finalize()
             value = value / result.items / (medianOf(lower->second.seconds) / lower->second.items);
         else
             value = unit == "B" ? result.bytesPerItem : unit == "MB" ? result.bytesPerItem / 1e6 : value * 1000;
-        std::printf("%-50s %8.3g %-2s  %s %s\n", figure.what, value, figure.unit, *figure.aim != '\0' ? "aim:" : "",
-                    figure.aim);
+        std::printf("%-50s %8.3g %-2s  %s %s\n", figure.what, value, unit == "B/B" ? "" : figure.unit,
+                    *figure.aim != '\0' ? "aim:" : "", figure.aim);
     }
 }
