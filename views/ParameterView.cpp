@@ -44,9 +44,6 @@ constexpr float kHeight = 20;
 constexpr float kDivider = 123;
 constexpr float kTextSize = 11; // the longest label must stand beside its field within that width
 
-constexpr const char* kAmount = "%.2f";
-constexpr const char* kPercent = "%.2f %%";
-
 /// The first piece of `text` between delimiters: blanks, letters, "$", the bytes of "£", and "%" where that is one,
 /// too. Empty when there is nothing but delimiters.
 std::string firstToken(const std::string& text, bool isPercent)
@@ -73,7 +70,7 @@ float number(const std::string& token, double unit)
 
 } // namespace
 
-ParameterView::ParameterView(BRect frame, const char* name, BWindow* window) : PageView(frame, name), window_(window)
+ParameterView::ParameterView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
 {
     static_assert(std::size(kPlan) == kFieldCount);
     for (std::size_t i = 0; i < fields_.size(); ++i) {
@@ -132,94 +129,4 @@ short ParameterView::getInvestementPeriod() const
     constexpr long kShortest = std::numeric_limits<short>::min();
     constexpr long kLongest = std::numeric_limits<short>::max();
     return static_cast<short>(std::clamp(std::strtol(token.c_str(), nullptr, 10), kShortest, kLongest));
-}
-
-void ParameterView::setBuyCost(float cost)
-{
-    show(kBuyCost, kAmount, cost);
-}
-
-float ParameterView::getBuyCost() const
-{
-    return amount(kBuyCost);
-}
-
-void ParameterView::setSellCost(float cost)
-{
-    show(kSellCost, kAmount, cost);
-}
-
-float ParameterView::getSellCost() const
-{
-    return amount(kSellCost);
-}
-
-void ParameterView::setBuyRateCost(float value)
-{
-    show(kBuyRateCost, kPercent, value * 100.0);
-}
-
-float ParameterView::getBuyRateCost() const
-{
-    return rate(kBuyRateCost);
-}
-
-void ParameterView::setSellRateCost(float value)
-{
-    show(kSellRateCost, kPercent, value * 100.0);
-}
-
-float ParameterView::getSellRateCost() const
-{
-    return rate(kSellRateCost);
-}
-
-void ParameterView::setBeginProfitSellRate(float value)
-{
-    show(kBeginProfitSellRate, kPercent, value * 100.0);
-}
-
-float ParameterView::getBeginProfitSellRate() const
-{
-    return rate(kBeginProfitSellRate);
-}
-
-void ParameterView::setEndProfitSellRate(float value)
-{
-    show(kEndProfitSellRate, kPercent, value * 100.0);
-}
-
-float ParameterView::getEndProfitSellRate() const
-{
-    return rate(kEndProfitSellRate);
-}
-
-void ParameterView::setBeginLoseSellRate(float value)
-{
-    show(kBeginLoseSellRate, kPercent, value * 100.0);
-}
-
-float ParameterView::getBeginLoseSellRate() const
-{
-    return rate(kBeginLoseSellRate);
-}
-
-void ParameterView::setEndLoseSellRate(float value)
-{
-    show(kEndLoseSellRate, kPercent, value * 100.0);
-}
-
-float ParameterView::getEndLoseSellRate() const
-{
-    return rate(kEndLoseSellRate);
-}
-
-void ParameterView::setReinvestRate(float value)
-{
-    show(kReinvestRate, kPercent, value * 100.0);
-}
-
-float ParameterView::getReinvestRate() const
-{
-    return rate(kReinvestRate);
 }

@@ -14,27 +14,27 @@ class ParameterView final : public PageView {
 public:
     ParameterView(BRect frame, const char* name, BWindow* window);
 
-    void setBuyCost(float cost);
-    float getBuyCost() const;
-    void setSellCost(float cost);
-    float getSellCost() const;
-    void setBuyRateCost(float rate);
-    float getBuyRateCost() const;
-    void setSellRateCost(float rate);
-    float getSellRateCost() const;
+    void setBuyCost(float cost) { showAmount(kBuyCost, cost); }
+    float getBuyCost() const { return amount(kBuyCost); }
+    void setSellCost(float cost) { showAmount(kSellCost, cost); }
+    float getSellCost() const { return amount(kSellCost); }
+    void setBuyRateCost(float rate) { showRate(kBuyRateCost, rate); }
+    float getBuyRateCost() const { return rate(kBuyRateCost); }
+    void setSellRateCost(float rate) { showRate(kSellRateCost, rate); }
+    float getSellRateCost() const { return rate(kSellRateCost); }
     /// In days.
     void setInvestementPeriod(short days);
     short getInvestementPeriod() const;
-    void setBeginProfitSellRate(float rate);
-    float getBeginProfitSellRate() const;
-    void setEndProfitSellRate(float rate);
-    float getEndProfitSellRate() const;
-    void setBeginLoseSellRate(float rate);
-    float getBeginLoseSellRate() const;
-    void setEndLoseSellRate(float rate);
-    float getEndLoseSellRate() const;
-    void setReinvestRate(float rate);
-    float getReinvestRate() const;
+    void setBeginProfitSellRate(float rate) { showRate(kBeginProfitSellRate, rate); }
+    float getBeginProfitSellRate() const { return rate(kBeginProfitSellRate); }
+    void setEndProfitSellRate(float rate) { showRate(kEndProfitSellRate, rate); }
+    float getEndProfitSellRate() const { return rate(kEndProfitSellRate); }
+    void setBeginLoseSellRate(float rate) { showRate(kBeginLoseSellRate, rate); }
+    float getBeginLoseSellRate() const { return rate(kBeginLoseSellRate); }
+    void setEndLoseSellRate(float rate) { showRate(kEndLoseSellRate, rate); }
+    float getEndLoseSellRate() const { return rate(kEndLoseSellRate); }
+    void setReinvestRate(float rate) { showRate(kReinvestRate, rate); }
+    float getReinvestRate() const { return rate(kReinvestRate); }
 
     void Draw(BRect updateRect) override;
     void FrameResized(float width, float height) override;
@@ -56,9 +56,10 @@ private:
     };
 
     void show(Field field, const char* format, double value);
+    void showAmount(Field field, float amount) { show(field, "%.2f", amount); }
+    void showRate(Field field, float rate) { show(field, "%.2f %%", rate * 100.0); }
     float amount(Field field) const;
     float rate(Field field) const;
 
-    BWindow* window_;
     std::array<BTextControl*, kFieldCount> fields_{};
 };
