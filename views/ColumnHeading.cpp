@@ -2,7 +2,6 @@
 
 #include "views/Look.h"
 
-#include <cmath>
 #include <utility>
 
 ColumnHeading::ColumnHeading(BRect frame, std::vector<ListColumn> columns)
@@ -15,19 +14,12 @@ ColumnHeading::ColumnHeading(BRect frame, std::vector<ListColumn> columns)
 
 void ColumnHeading::Draw(BRect)
 {
-    constexpr float kPadding = 4;
-    BFont font;
-    GetFont(&font);
-    font_height height;
-    font.GetHeight(&height);
     const BRect bounds = Bounds();
-    const float base = std::round((bounds.Height() + height.ascent - height.descent) / 2);
+    const float base = baseLine(*this, bounds);
     float left = 0;
     for (const auto& column : columns_) {
-        const float room = column.width - 2 * kPadding - StringWidth(column.title);
-        const float indent = column.align == B_ALIGN_RIGHT ? room : column.align == B_ALIGN_CENTER ? room / 2 : 0;
         SetHighColor(look::kText);
-        DrawString(column.title, {std::round(left + kPadding + indent), base});
+        column.drawText(*this, column.title, left, base);
         left += column.width;
         SetHighColor(look::kLine);
         if (left < bounds.right - look::kScrollBar)

@@ -5,11 +5,8 @@
 #include "views/Look.h"
 
 #include <algorithm>
-#include <cmath>
 
 namespace {
-
-constexpr float kPadding = 4; // from the sides of a column to its text
 
 /// `text`, cut at a character of UTF-8 and ended with three dots when it is wider than `width`.
 std::string fitted(const BView& view, std::string text, float width)
@@ -52,20 +49,13 @@ void ColumnItem::DrawItem(BView* owner, BRect frame, bool)
 {
     const auto& list = static_cast<const ColumnListView&>(*owner);
     const rgb_color ground = owner->HighColor(); // that of a selected row's text, where the row is selected
-    BFont font;
-    owner->GetFont(&font);
-    font_height height;
-    font.GetHeight(&height);
-    const float base = std::round(frame.top + (frame.Height() + height.ascent - height.descent) / 2);
+    const float base = baseLine(*owner, frame);
     float left = frame.left;
     for (int i = 0; i < list.CountColumns(); ++i) {
         const ListColumn& column = list.ColumnAt(i);
         const Cell shown = cell(i);
-        const std::string text = fitted(*owner, shown.text, column.width - 2 * kPadding);
-        const float room = column.width - 2 * kPadding - owner->StringWidth(text.c_str());
-        const float indent = column.align == B_ALIGN_RIGHT ? room : column.align == B_ALIGN_CENTER ? room / 2 : 0;
         owner->SetHighColor(ground == look::kText ? shown.color : ground);
-        owner->DrawString(text.c_str(), {std::round(left + kPadding + indent), base});
+        column.drawText(*owner, fitted(*owner, shown.text, column.textWidth()), left, base);
         left += column.width;
     }
 }

@@ -4,7 +4,35 @@
 #include "views/ColumnItem.h"
 #include "views/Look.h"
 
+#include <cmath>
 #include <utility>
+
+namespace {
+
+constexpr float kPadding = 4; // from the sides of a column to its text
+
+} // namespace
+
+float ListColumn::textWidth() const
+{
+    return width - 2 * kPadding;
+}
+
+void ListColumn::drawText(BView& view, const std::string& text, float left, float base) const
+{
+    const float room = textWidth() - view.StringWidth(text.c_str());
+    const float indent = align == B_ALIGN_RIGHT ? room : align == B_ALIGN_CENTER ? room / 2 : 0;
+    view.DrawString(text.c_str(), {std::round(left + kPadding + indent), base});
+}
+
+float baseLine(const BView& view, BRect line)
+{
+    BFont font;
+    view.GetFont(&font);
+    font_height height;
+    font.GetHeight(&height);
+    return std::round(line.top + (line.Height() + height.ascent - height.descent) / 2);
+}
 
 ColumnListView::ColumnListView(BRect frame, const char* name, list_view_type type, std::vector<ListColumn> columns)
     : BListView(frame, name, type), columns_(std::move(columns))

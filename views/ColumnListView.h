@@ -12,7 +12,15 @@ struct ListColumn {
     const char* title;
     float width;
     alignment align = B_ALIGN_LEFT;
+
+    /// The room for a text.
+    float textWidth() const;
+    /// Draws a text that fits on the column's side. `left` is where the column begins, `base` the text's base line.
+    void drawText(BView& view, const std::string& text, float left, float base) const;
 };
+
+/// The base line of a text, in the view's font, in the middle of `line`.
+float baseLine(const BView& view, BRect line);
 
 /// A list of rows with fields in columns. Owns its rows.
 class ColumnListView : public BListView {
