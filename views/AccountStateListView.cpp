@@ -4,6 +4,7 @@
 #include "market/Currency.h"
 #include "portfolio/Account.h"
 #include "views/Look.h"
+#include "views/ModelText.h"
 
 namespace {
 
@@ -20,7 +21,7 @@ Cell AccountStateItem::cell(int column) const
         account_->getCurrency(&currency);
     switch (column) {
     case kName:
-        return {std::string(state_->getAccountName().bytes())};
+        return {textOf(state_->getAccountName())};
     case kBalance:
         return {amountText(state_->getCash()), state_->getCash() < 0 ? look::kLoss : look::kText};
     case kCurrency:
@@ -28,8 +29,8 @@ Cell AccountStateItem::cell(int column) const
         if (currency == nullptr)
             return {"no currency", look::kWarning};
         if (currency->getNbrQuotes() == 0)
-            return {std::string(currency->getRepresentation().bytes()) + " (no rate)", look::kWarning};
-        return {std::string(currency->getRepresentation().bytes())};
+            return {textOf(currency->getRepresentation()) + " (no rate)", look::kWarning};
+        return {textOf(currency->getRepresentation())};
     case kDefault:
         return {account_ != nullptr && account_->isDefaultTransferAccount() ? "\u2713" : ""};
     default:

@@ -3,6 +3,7 @@
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
 #include "views/DateText.h"
+#include "views/ModelText.h"
 
 namespace {
 
@@ -11,7 +12,7 @@ enum Column { kDate, kKind, kContent };
 std::string contentOf(const CompanyEvent& event)
 {
     if (const auto* note = dynamic_cast<const NoteCompanyEvent*>(&event))
-        return std::string(note->getTitle().bytes());
+        return textOf(note->getTitle());
     const auto& split = static_cast<const SplitCompanyEvent&>(event);
     return std::to_string(split.getNumerator()) + " : " + std::to_string(split.getDivider());
 }

@@ -5,14 +5,13 @@
 #include "foundation/NumberText.h"
 #include "market/Company.h"
 #include "market/Market.h"
-#include "platform/Box.h"
 #include "platform/CheckBox.h"
-#include "platform/StringView.h"
 #include "platform/TextControl.h"
 #include "views/CompanyEventListView.h"
 #include "views/CompanyListView.h"
 #include "views/EventBox.h"
 #include "views/MarketListView.h"
+#include "views/ModelText.h"
 #include "views/NumberControl.h"
 #include "views/QuoteBox.h"
 #include "views/QuoteChart.h"
@@ -242,8 +241,8 @@ void CompanyView::UpdateQuotesChart()
         return;
     }
     const String unit = company->getCurrencyRepresentation();
-    chart_->showSeries(*company, std::string(company->getAbbreviation().bytes()),
-                       unit.isUndefined() ? "???" : std::string(unit.bytes()), withSafe_->Value() == B_CONTROL_ON);
+    chart_->showSeries(*company, textOf(company->getAbbreviation()), unit.isUndefined() ? "???" : textOf(unit),
+                       withSafe_->Value() == B_CONTROL_ON);
 }
 
 // --- Events.

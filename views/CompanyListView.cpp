@@ -1,8 +1,10 @@
 #include "views/CompanyListView.h"
 
+#include "views/ModelText.h"
+
 Cell CompanyItem::cell(int column) const
 {
-    return {std::string((column == 0 ? company_->getAbbreviation() : company_->getName()).bytes())};
+    return {textOf(column == 0 ? company_->getAbbreviation() : company_->getName())};
 }
 
 CompanyListView::CompanyListView(const char* name)

@@ -3,6 +3,7 @@
 #include "foundation/NumberText.h"
 #include "views/DateText.h"
 #include "views/Look.h"
+#include "views/ModelText.h"
 
 namespace {
 
@@ -15,9 +16,9 @@ Cell CurrencyItem::cell(int column) const
     const unsigned rates = currency_->getNbrQuotes();
     switch (column) {
     case kName:
-        return {std::string(currency_->getName().bytes())};
+        return {textOf(currency_->getName())};
     case kSymbol:
-        return {std::string(currency_->getRepresentation().bytes())};
+        return {textOf(currency_->getRepresentation())};
     case kRate:
         // What is held in a currency without a rate has no value.
         return rates > 0 ? Cell{exactText(currency_->getQuote(rates - 1)->getValue())}

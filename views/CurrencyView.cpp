@@ -8,6 +8,7 @@
 #include "views/CurrencyListView.h"
 #include "views/Look.h"
 #include "views/MarketListView.h"
+#include "views/ModelText.h"
 #include "views/QuoteBox.h"
 #include "views/QuoteChart.h"
 #include "views/QuoteListView.h"
@@ -255,6 +256,5 @@ void CurrencyView::UpdateQuotesChart()
         return;
     }
     const std::string reference = referenceName_->Text();
-    chart_->showSeries(*currency, std::string(currency->getRepresentation().bytes()),
-                       reference.empty() ? "???" : reference, false);
+    chart_->showSeries(*currency, textOf(currency->getRepresentation()), reference.empty() ? "???" : reference, false);
 }

@@ -11,6 +11,7 @@
 #include "views/CompanyEventListView.h"
 #include "views/DateControl.h"
 #include "views/Look.h"
+#include "views/ModelText.h"
 #include "views/NumberControl.h"
 #include "views/PageView.h"
 
@@ -129,7 +130,7 @@ String EventBox::getText() const
 
 void EventBox::setText(const String& text)
 {
-    text_->SetText(text.hasText() ? text.getCharacterArray() : "");
+    text_->SetText(textOf(text).c_str());
 }
 
 short EventBox::getNumerator() const

@@ -1,6 +1,7 @@
 #include "views/MarketListView.h"
 
 #include "foundation/NumberText.h"
+#include "views/ModelText.h"
 
 namespace {
 
@@ -12,9 +13,9 @@ Cell MarketItem::cell(int column) const
 {
     switch (column) {
     case kName:
-        return {std::string(market_->getName().bytes())};
+        return {textOf(market_->getName())};
     case kCurrency:
-        return {std::string(market_->getCurrencyRepresentation().bytes())};
+        return {textOf(market_->getCurrencyRepresentation())};
     case kCompanies:
         return {countText(static_cast<int>(market_->getNbrCompanies()))};
     default:

@@ -8,17 +8,13 @@
 #include "portfolio/TransferAccountOperation.h"
 #include "views/DateText.h"
 #include "views/Look.h"
+#include "views/ModelText.h"
 
 namespace {
 
 enum Column { kDate, kAccount, kType, kWhat, kQuantity, kPrice, kCost, kTotal, kAutomatic };
 
 constexpr const char* kTypeNames[] = {"?", "Deposit", "Transfer", "Buy", "Sell"}; // by type code
-
-std::string textOf(const String& text)
-{
-    return std::string(text.bytes());
-}
 
 bool isTrade(const Operation& operation)
 {

@@ -10,6 +10,7 @@
 #include "portfolio/ShareOperation.h"
 #include "views/DateControl.h"
 #include "views/Look.h"
+#include "views/ModelText.h"
 #include "views/NumberControl.h"
 #include "views/OfferField.h"
 #include "views/OperationListView.h"
@@ -57,8 +58,7 @@ constexpr unsigned kTrade = 4 + 8;
 class AccountMenuItem final : public BMenuItem {
 public:
     AccountMenuItem(const Account* account, const std::function<void()>& hook)
-        : BMenuItem(account->getName().hasText() ? account->getName().getCharacterArray() : "", nullptr),
-          account_(account), hook_(hook)
+        : BMenuItem(textOf(account->getName()).c_str(), nullptr), account_(account), hook_(hook)
     {}
 
     /// May be gone: only to be compared.

@@ -6,6 +6,7 @@
 #include "platform/TextControl.h"
 #include "views/DateControl.h"
 #include "views/Look.h"
+#include "views/ModelText.h"
 #include "views/NumberControl.h"
 
 #include <cmath>
@@ -110,5 +111,5 @@ BCheckBox* PageView::addCheckBox(BView* parent, BRect frame, const char* name, c
 
 void PageView::showText(BTextControl& field, const String& text)
 {
-    field.SetText(text.hasText() ? text.getCharacterArray() : "");
+    field.SetText(textOf(text).c_str());
 }

@@ -7,6 +7,7 @@
 #include "portfolio/Share.h"
 #include "views/DateText.h"
 #include "views/Look.h"
+#include "views/ModelText.h"
 
 namespace {
 
@@ -29,7 +30,7 @@ bool hasRate(const Company& company)
 
 std::string withCurrency(const ShareState& state, double amount)
 {
-    return amountText(amount) + ' ' + std::string(state.getCurrencyRepresentation().bytes());
+    return amountText(amount) + ' ' + textOf(state.getCurrencyRepresentation());
 }
 
 } // namespace
@@ -51,9 +52,9 @@ Cell ShareStateItem::cell(int column) const
 {
     switch (column) {
     case kTicker:
-        return {std::string(state_->getCompanyAbbreviation().bytes()), isHeld() ? look::kText : look::kFaint};
+        return {textOf(state_->getCompanyAbbreviation()), isHeld() ? look::kText : look::kFaint};
     case kCompany:
-        return {std::string(state_->getCompanyName().bytes()), isHeld() ? look::kText : look::kFaint};
+        return {textOf(state_->getCompanyName()), isHeld() ? look::kText : look::kFaint};
     case kQuantity:
         return {countText(state_->getQuantity()), state_->getQuantity() < 0 ? look::kLoss : look::kText};
     case kBuyQuote:

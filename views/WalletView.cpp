@@ -6,7 +6,6 @@
 #include "market/Catalogue.h"
 #include "market/Currency.h"
 #include "platform/Box.h"
-#include "platform/Button.h"
 #include "platform/CheckBox.h"
 #include "platform/StringView.h"
 #include "valuation/Evolution.h"
@@ -15,6 +14,7 @@
 #include "views/AccountStateListView.h"
 #include "views/DateControl.h"
 #include "views/Look.h"
+#include "views/ModelText.h"
 #include "views/ShareStateListView.h"
 
 namespace {
@@ -185,7 +185,7 @@ void WalletView::SetState(const State* state, const Catalogue& catalogue)
     const Totals totals(*state, catalogue);
     const Currency* reference = catalogue.getReferenceCurrency();
     if (totals.isKnown)
-        showTotals(totals, std::string(reference->getRepresentation().bytes()), reference->getNbrQuotes() > 0);
+        showTotals(totals, textOf(reference->getRepresentation()), reference->getNbrQuotes() > 0);
     else
         showNoTotals();
 }
@@ -228,7 +228,7 @@ void WalletView::UpdateEvolution(const Wallet& wallet, const Catalogue& catalogu
 {
     ClearEvolution();
     const Currency* reference = catalogue.getReferenceCurrency();
-    const std::string symbol = reference != nullptr ? std::string(reference->getRepresentation().bytes()) : "???";
+    const std::string symbol = reference != nullptr ? textOf(reference->getRepresentation()) : "???";
     evolution_->setXLegend(("Value in " + symbol).c_str());
     if (outcome != EvolutionOutcome::Built)
         noEvolution_->SetText(outcome == EvolutionOutcome::TooLong
