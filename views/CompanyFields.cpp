@@ -121,7 +121,7 @@ void CompanyView::AddCompany(Company* company, bool selected)
 void CompanyView::ModifyCompany(Company* company)
 {
     companies_->modify(company);
-    if (company != quotesOf_)
+    if (!quotes_->isOf(company))
         return;
     SetQuoteList(company);
     UpdateQuotesChart();
@@ -131,7 +131,7 @@ void CompanyView::DeleteCompany(Company* company)
 {
     companies_->remove(company);
     markets_->InvalidateItems();
-    if (company == quotesOf_)
+    if (quotes_->isOf(company))
         SetQuoteList(nullptr);
     if (company == eventsOf_)
         SetCompanyEventList(nullptr);
@@ -146,7 +146,7 @@ void CompanyView::SetCompanyList(Market* market)
     Company** companies = market != nullptr ? market->getAllCompanies(&n) : nullptr;
     companies_->setAll({companies, companies + n});
     const Company* selected = GetSelectedCompany();
-    if (selected != quotesOf_ || selected == nullptr) {
+    if (selected == nullptr || !quotes_->isOf(selected)) {
         SetQuoteList(nullptr);
         SetCompanyEventList(nullptr);
     }
@@ -198,7 +198,7 @@ CompanyQuote** CompanyView::getAllSelectedQuotes(int* n) const
 void CompanyView::AddQuote(CompanyQuote* quote)
 {
     Company* company;
-    if (quote->getCompany(&company) == 0 && company == quotesOf_)
+    if (quote->getCompany(&company) == 0 && quotes_->isOf(company))
         quotes_->list().insert(quote);
 }
 
@@ -219,16 +219,7 @@ void CompanyView::DeleteQuotes(CompanyQuote* const* quotes, int n)
 
 void CompanyView::SetQuoteList(Company* company)
 {
-    QuoteListView& list = quotes_->list();
-    const bool isOther = company != quotesOf_;
-    if (isOther)
-        list.clear();
-    quotesOf_ = company;
-    unsigned n = 0;
-    CompanyQuote** quotes = company != nullptr ? company->getAllQuotes(&n) : nullptr;
-    list.showAll({quotes, quotes + n});
-    if (isOther)
-        list.ScrollTo(list.CountItems() - 1); // the latest quote
+    quotes_->showQuotes(company);
     if (company == nullptr)
         UpdateQuotesChart();
 }

@@ -14,7 +14,6 @@ class CompanyQuote;
 class EventBox;
 class Market;
 class MarketListView;
-class Quote;
 class QuoteBox;
 class QuoteChart;
 
@@ -127,6 +126,5 @@ private:
 
     // Whose rows the lists show; never looked into when they are not selected.
     const Market* shownMarket_ = nullptr;
-    const Company* quotesOf_ = nullptr;
     const Company* eventsOf_ = nullptr;
 };

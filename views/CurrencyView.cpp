@@ -144,7 +144,7 @@ void CurrencyView::DeleteCurrency(Currency* currency)
         currencies_->move(last, place);
     if (currency == marketsOf_)
         SetMarketList(nullptr);
-    if (currency == quotesOf_)
+    if (quotes_->isOf(currency))
         SetQuoteList(nullptr);
 }
 
@@ -210,7 +210,7 @@ CurrencyQuote** CurrencyView::getAllSelectedQuotes(int* n) const
 void CurrencyView::AddQuote(CurrencyQuote* quote)
 {
     Currency* currency;
-    if (quote->getCurrency(&currency) == 0 && currency == quotesOf_)
+    if (quote->getCurrency(&currency) == 0 && quotes_->isOf(currency))
         quotes_->list().insert(quote);
     currencies_->InvalidateItems(); // they show their latest rate
 }
@@ -234,16 +234,7 @@ void CurrencyView::DeleteQuotes(CurrencyQuote* const* quotes, int n)
 
 void CurrencyView::SetQuoteList(Currency* currency)
 {
-    QuoteListView& list = quotes_->list();
-    const bool isOther = currency != quotesOf_;
-    if (isOther)
-        list.clear();
-    quotesOf_ = currency;
-    unsigned n = 0;
-    CurrencyQuote** quotes = currency != nullptr ? currency->getAllQuotes(&n) : nullptr;
-    list.showAll({quotes, quotes + n});
-    if (isOther)
-        list.ScrollTo(list.CountItems() - 1); // the latest rate
+    quotes_->showQuotes(currency);
     if (currency == nullptr)
         UpdateQuotesChart();
 }

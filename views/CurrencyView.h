@@ -4,8 +4,6 @@
 #include "foundation/String.h"
 #include "views/PageView.h"
 
-#include <vector>
-
 class Currency;
 class CurrencyListView;
 class CurrencyQuote;
@@ -74,7 +72,5 @@ private:
     QuoteBox* quotes_ = nullptr;
     QuoteChart* chart_ = nullptr;
 
-    // Whose rows the lists show; never looked into when it is not selected.
-    const Currency* marketsOf_ = nullptr;
-    const Currency* quotesOf_ = nullptr;
+    const Currency* marketsOf_ = nullptr; // whose markets are listed; never looked into
 };

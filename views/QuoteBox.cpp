@@ -4,7 +4,6 @@
 #include "views/Look.h"
 #include "views/NumberControl.h"
 #include "views/PageView.h"
-#include "views/QuoteListView.h"
 
 using namespace look;
 

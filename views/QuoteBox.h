@@ -3,13 +3,10 @@
 #include "foundation/Date.h"
 #include "platform/Box.h"
 #include "platform/SupportDefs.h"
-
-#include <vector>
+#include "views/QuoteListView.h"
 
 class DateControl;
 class NumberControl;
-class Quote;
-class QuoteListView;
 
 /// A list of quotes with the fields and buttons to add, change and remove them.
 class QuoteBox final : public BBox {
@@ -27,6 +24,23 @@ public:
     QuoteBox(BRect frame, const char* title, const Codes& codes);
 
     QuoteListView& list() const { return *list_; }
+    /// Shows the quotes of a `QuoteSeries`, which stay as they are when they are shown already; null shows none.
+    template <class Series>
+    void showQuotes(const Series* series)
+    {
+        const bool isOther = !isOf(series);
+        if (isOther)
+            list_->clear();
+        series_ = series;
+        unsigned n = 0;
+        const auto quotes = series != nullptr ? series->getAllQuotes(&n) : nullptr;
+        list_->showAll({quotes, quotes + n});
+        if (isOther)
+            list_->ScrollTo(list_->CountItems() - 1); // the latest quote
+    }
+    /// Whether it is this series whose quotes are shown.
+    bool isOf(const void* series) const { return series == series_; }
+
     /// Undefined while the text is no date.
     Date getDate() const;
     void setDate(const Date& date);
@@ -38,6 +52,7 @@ public:
 
 private:
     QuoteListView* list_;
+    const void* series_ = nullptr; // whose quotes are shown; never looked into
     DateControl* date_;
     NumberControl* value_;
     BRect freeArea_;
