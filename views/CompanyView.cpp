@@ -1,14 +1,10 @@
 #include "views/CompanyView.h"
 
-#include "foundation/NumberText.h"
-#include "market/Company.h"
-#include "market/Market.h"
 #include "platform/Box.h"
 #include "platform/CheckBox.h"
 #include "platform/Message.h"
 #include "platform/StringView.h"
 #include "platform/TextControl.h"
-#include "views/CompanyEventListView.h"
 #include "views/CompanyListView.h"
 #include "views/EventBox.h"
 #include "views/Look.h"
@@ -16,8 +12,6 @@
 #include "views/NumberControl.h"
 #include "views/QuoteBox.h"
 #include "views/QuoteChart.h"
-#include "views/QuoteListView.h"
-#include "views/Selection.h"
 
 using namespace look;
 

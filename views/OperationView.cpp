@@ -15,8 +15,6 @@
 #include "views/OfferField.h"
 #include "views/OperationListView.h"
 
-#include <cstring>
-
 namespace {
 
 using namespace look;
@@ -105,17 +103,6 @@ void OperationView::makeFields()
     makeButtons(box);
 }
 
-template <class Field>
-Field* OperationView::addOfferField(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
-                                    alignment side)
-{
-    auto* field = new Field(frame, name, label, "", new BMessage(code));
-    field->SetDivider(kDivider);
-    field->SetAlignment(B_ALIGN_RIGHT, side);
-    parent->AddChild(field);
-    return field;
-}
-
 BMenuField* OperationView::addMenu(BView* parent, BRect frame, const char* name, const char* label)
 {
     auto* field = new BMenuField(frame, name, label, new BPopUpMenu(name));
@@ -131,7 +118,7 @@ void OperationView::makeCommonFields(BBox* box)
     for (const TypePlan& plan : kTypes)
         type_->Menu()->AddItem(new BMenuItem(plan.label, new BMessage(plan.code)));
     baseAccount_ = addMenu(box, cell(1, 0), "baseAccount", "Account");
-    date_ = addOfferField<OfferField<DateControl>>(box, cell(2, 0), "txtDate", "Date", 'OTDa', B_ALIGN_LEFT);
+    date_ = addFieldOf<OfferField<DateControl>>(box, cell(2, 0), "txtDate", "Date", 'OTDa', kDivider, B_ALIGN_LEFT);
 }
 
 void OperationView::makeTypedFields(BBox* box)
@@ -144,10 +131,11 @@ void OperationView::makeTypedFields(BBox* box)
         return addTypedNumber(box, cell(column, row), name, label, code, kDivider);
     };
     const auto offered = [&](int column, int row, const char* name, const char* label, uint32 code) {
-        return addOfferField<OfferNumber>(box, cell(column, row), name, label, code, B_ALIGN_RIGHT);
+        return addFieldOf<OfferNumber>(box, cell(column, row), name, label, code, kDivider, B_ALIGN_RIGHT);
     };
     const auto word = [&](int column, int row, const char* name, const char* label) {
-        return addOfferField<OfferField<BTextControl>>(box, cell(column, row), name, label, 'OTAb', B_ALIGN_LEFT);
+        return addFieldOf<OfferField<BTextControl>>(box, cell(column, row), name, label, 'OTAb', kDivider,
+                                                    B_ALIGN_LEFT);
     };
 
     amount_ = of(kDeposit | kTransfer, number(0, 1, "txtAmount", "Amount", 'OTAm'));

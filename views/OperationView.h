@@ -118,8 +118,6 @@ private:
     void makeCommonFields(BBox* box);
     void makeTypedFields(BBox* box);
     void makeButtons(BBox* box);
-    template <class Field>
-    Field* addOfferField(BView* parent, BRect frame, const char* name, const char* label, uint32 code, alignment side);
     BMenuField* addMenu(BView* parent, BRect frame, const char* name, const char* label);
     void fillAccounts(BMenu& menu, Account** accounts, int count);
 

@@ -12,22 +12,6 @@
 #include <cmath>
 #include <cstring>
 
-namespace {
-
-/// A field of its class, in the look of all fields.
-template <class Field>
-Field* makeField(BView* parent, BRect frame, const char* name, const char* label, uint32 code, float divider,
-                 alignment text)
-{
-    auto* field = new Field(frame, name, label, "", new BMessage(code));
-    field->SetDivider(divider);
-    field->SetAlignment(B_ALIGN_RIGHT, text);
-    parent->AddChild(field);
-    return field;
-}
-
-} // namespace
-
 PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_ALL, B_WILL_DRAW | B_FRAME_EVENTS)
 {
     SetViewColor(look::kPanel);
@@ -44,25 +28,25 @@ BBox* PageView::addBox(BView* parent, BRect frame, const char* label)
 BTextControl* PageView::addField(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
                                  float divider)
 {
-    return makeField<BTextControl>(parent, frame, name, label, code, divider, B_ALIGN_LEFT);
+    return addFieldOf<BTextControl>(parent, frame, name, label, code, divider, B_ALIGN_LEFT);
 }
 
 BTextControl* PageView::addNumber(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
                                   float divider)
 {
-    return makeField<BTextControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
+    return addFieldOf<BTextControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
 }
 
 DateControl* PageView::addDate(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
                                float divider)
 {
-    return makeField<DateControl>(parent, frame, name, label, code, divider, B_ALIGN_LEFT);
+    return addFieldOf<DateControl>(parent, frame, name, label, code, divider, B_ALIGN_LEFT);
 }
 
 NumberControl* PageView::addTypedNumber(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
                                         float divider)
 {
-    return makeField<NumberControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
+    return addFieldOf<NumberControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
 }
 
 BButton* PageView::addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code)

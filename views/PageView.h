@@ -1,6 +1,7 @@
 #pragma once
 
 #include "foundation/String.h"
+#include "platform/Message.h"
 #include "platform/View.h"
 
 #include <string>
@@ -10,7 +11,6 @@ class BBox;
 class BButton;
 class BCheckBox;
 class BTextControl;
-class BWindow;
 class DateControl;
 class NumberControl;
 
@@ -52,4 +52,17 @@ public:
 
     /// Shows a text of the model; nothing for a String without text.
     static void showText(BTextControl& field, const String& text);
+
+protected:
+    /// A field of the class `Field`, in the look of all fields, with its text at the side `text`.
+    template <class Field>
+    static Field* addFieldOf(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
+                             float divider, alignment text)
+    {
+        auto* field = new Field(frame, name, label, "", new BMessage(code));
+        field->SetDivider(divider);
+        field->SetAlignment(B_ALIGN_RIGHT, text);
+        parent->AddChild(field);
+        return field;
+    }
 };

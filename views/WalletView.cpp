@@ -53,31 +53,17 @@ WalletView::~WalletView() = default;
 
 void WalletView::makeTop()
 {
-    constexpr float kDateDivider = 38;
-    date_ = new DateControl({kMargin, kMargin + 1, kMargin + 132, kMargin + 1 + kFieldHeight}, "txtDate", "Date", "",
-                            new BMessage('WTDa'));
+    date_ =
+        addDate(this, {kMargin, kMargin + 1, kMargin + 132, kMargin + 1 + kFieldHeight}, "txtDate", "Date", 'WTDa', 38);
     date_->SetToolTip("The day to value at.  Up and Down: a day on and back; Page Up and Page Down: a month");
-    date_->SetDivider(kDateDivider);
-    date_->SetAlignment(B_ALIGN_RIGHT, B_ALIGN_LEFT);
-    AddChild(date_);
     computeEvolution_ = addCheckBox(this, {kMargin + 148, kMargin + 1, kMargin + 300, kMargin + 1 + kFieldHeight},
                                     "cbxComputeEvolution", "Compute Evolution", 'WCCe');
-    constexpr float kWidth = 110;
-    const struct {
-        const char* name;
-        const char* label;
-        uint32 code;
-    } buttons[] = {
-        {"btnLoadPortoFolio", "Load from File", 'WBLd'},
-        {"btnSavePortoFolio", "Save to File", 'WBSv'},
-        {"btnReinitPortoFolio", "Reinit", 'WBRe'},
-        {"btnUpdateAllQuotes", "Update Quotes", 'WBUp'},
-    };
-    float left = kRight - 4 * kWidth - 3 * kGap;
-    for (const auto& b : buttons) {
-        addButton(this, {left, kMargin, left + kWidth, kTopEnd}, b.name, b.label, b.code);
-        left += kWidth + kGap;
-    }
+    constexpr float kButtonWidth = 110;
+    addButtons(this, {kRight - 4 * kButtonWidth - 3 * kGap, kMargin, kRight, kTopEnd},
+               {{"btnLoadPortoFolio", "Load from File", 'WBLd'},
+                {"btnSavePortoFolio", "Save to File", 'WBSv'},
+                {"btnReinitPortoFolio", "Reinit", 'WBRe'},
+                {"btnUpdateAllQuotes", "Update Quotes", 'WBUp'}});
     explainLoadAndSave(this, "btnLoadPortoFolio", "btnSavePortoFolio", "the portfolio");
 }
 
@@ -120,13 +106,10 @@ void WalletView::makeAccounts()
     top += kRow;
     defaultTransferAccount_ = addCheckBox(box, {kLeft, top, right, top + kFieldHeight}, "cbxDefaultTransferAccount",
                                           "Default Transfer Account for this currency", 'WCDt');
-    const float width = (right - kLeft - 2 * kGap) / 3;
-    const float buttonTop = bottom - kButtonHeight;
     // The last two bear the names of the quote buttons of other pages. Intended: controls are found by these names.
-    addButton(box, {kLeft, buttonTop, kLeft + width, bottom}, "btnAddAccount", "Add", 'WBAa');
-    addButton(box, {kLeft + width + kGap, buttonTop, kLeft + 2 * width + kGap, bottom}, "btnUpdateQuote", "Update",
-              'WBUa');
-    addButton(box, {right - width, buttonTop, right, bottom}, "btnRemoveQuote", "Remove", 'WBRa');
+    addButtons(
+        box, {kLeft, bottom - kButtonHeight, right, bottom},
+        {{"btnAddAccount", "Add", 'WBAa'}, {"btnUpdateQuote", "Update", 'WBUa'}, {"btnRemoveQuote", "Remove", 'WBRa'}});
 }
 
 void WalletView::makeHoldings()
@@ -276,7 +259,7 @@ String WalletView::getAccountName() const
 
 void WalletView::setAccountName(const String& name)
 {
-    accountName_->SetText(name.hasText() ? name.getCharacterArray() : "");
+    showText(*accountName_, name);
 }
 
 String WalletView::getAccountCurrency() const
@@ -286,7 +269,7 @@ String WalletView::getAccountCurrency() const
 
 void WalletView::setAccountCurrency(const String& representation)
 {
-    accountCurrency_->SetText(representation.hasText() ? representation.getCharacterArray() : "");
+    showText(*accountCurrency_, representation);
 }
 
 bool WalletView::isDefaultTransferAccount() const
