@@ -95,6 +95,11 @@ void CompanyView::makeCompanies(BRect frame)
                 {"btnUpdateCompany", "Update", 'CBUc'},
                 {"btnRemoveCompany", "Remove", 'CBRc'}});
     addButton(box, {kLeft, fetchTop, right, bottom}, "btnSetLastThreeMonths", "Set Last Three Months", 'CB3M');
+    explain(*box,
+            {{"txtRelativeDailyChange", "Slope of the trend per day, in proportion to its value on the last day"},
+             {"txtDiffWithAverage", "How far the last quote is from the trend, in proportion to it"},
+             {"btnUpdateCompany", "Takes over ticker and name, and fetches the latest quote"},
+             {"btnSetLastThreeMonths", "Fetches the quotes of three months, on the markets NASDAQ, NYSE and AMEX"}});
 }
 
 void CompanyView::makeQuotes(BRect frame)
@@ -117,4 +122,6 @@ void CompanyView::makeQuotes(BRect frame)
               "Split", 'CBSq');
     withSafe_ = addCheckBox(quotes_, {area.left, area.bottom - kFieldHeight, area.right, area.bottom}, "cbWithSafe",
                             "With Safe", 'CCWs');
+    explain(*quotes_, {{"btnSplitQuotes", "Multiplies the selected quotes; operations stay as they are"},
+                       {"cbWithSafe", "Shades a band of one standard deviation of the quotes about the trend"}});
 }

@@ -78,6 +78,7 @@ void CurrencyView::makeCurrencies(BRect frame)
                 {"btnUpdateCurrency", "Update", 'RBUp'},
                 {"btnRemoveCurrency", "Remove", 'RBRe'}});
     addButton(box, {kLeft, referenceTop, right, bottom}, "btnSetReferenceCurrency", "Set Reference Currency", 'RBSr');
+    explain(*box, {{"btnSetReferenceCurrency", "Has all rates and totals given in the selected currency"}});
 }
 
 void CurrencyView::makeMarkets(BRect frame)

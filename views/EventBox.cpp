@@ -48,6 +48,7 @@ EventBox::EventBox(BRect frame) : BBox(frame, "")
                          {{"btnAddCompanyEvent", "Add", 'CBEa'},
                           {"btnUpdateCompanyEvent", "Update", 'CBEu'},
                           {"btnRemoveCompanyEvent", "Remove", 'CBEr'}});
+    PageView::explain(*this, {{"companyEventType", "Events are notes: they change neither quotes nor holdings"}});
     setNumerator(1);
     setDivider(2);
     setType(SplitCompanyEvent::kType);

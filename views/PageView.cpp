@@ -77,13 +77,14 @@ void PageView::addLoadAndSave(BView* page)
     constexpr float kRight = look::kPageWidth - look::kMargin;
     addButtons(page, {kRight - 2 * kWidth - look::kGap, look::kMargin, kRight, look::kMargin + look::kButtonHeight},
                {{"btnLoadMarket", "Load", 'CBLd'}, {"btnSaveMarket", "Save", 'CBSv'}});
-    explainLoadAndSave(page, "btnLoadMarket", "btnSaveMarket", "the currencies, markets and companies");
+    explain(*page, {{"btnLoadMarket", "Loads currencies, markets and companies from a file.  Ctrl+O"},
+                    {"btnSaveMarket", "Saves all currencies, markets and companies to a file.  Ctrl+S"}});
 }
 
-void PageView::explainLoadAndSave(BView* page, const char* load, const char* save, const std::string& contents)
+void PageView::explain(BView& page, std::initializer_list<Tip> tips)
 {
-    page->FindView(load)->SetToolTip(("Loads " + contents + " from a file.  Ctrl+O").c_str());
-    page->FindView(save)->SetToolTip(("Saves " + contents + " to a file.  Ctrl+S").c_str());
+    for (const Tip& tip : tips)
+        page.FindView(tip.control)->SetToolTip(tip.text);
 }
 
 BCheckBox* PageView::addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code)

@@ -4,7 +4,7 @@
 #include "platform/Message.h"
 #include "platform/View.h"
 
-#include <string>
+#include <initializer_list>
 #include <vector>
 
 class BBox;
@@ -46,8 +46,12 @@ public:
     static void addButtons(BView* parent, BRect area, const std::vector<ButtonPlan>& buttons);
     /// The buttons for the market data file, at the right of the page's upper edge.
     static void addLoadAndSave(BView* page);
-    /// Gives the page's buttons of those names tool tips with their keys.
-    static void explainLoadAndSave(BView* page, const char* load, const char* save, const std::string& contents);
+    struct Tip {
+        const char* control; // its name
+        const char* text;
+    };
+    /// Gives controls of the page their tool tips.
+    static void explain(BView& page, std::initializer_list<Tip> tips);
     static BCheckBox* addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code);
 
     /// Shows a text of the model; nothing for a String without text.

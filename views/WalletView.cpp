@@ -55,7 +55,6 @@ void WalletView::makeTop()
 {
     date_ =
         addDate(this, {kMargin, kMargin + 1, kMargin + 132, kMargin + 1 + kFieldHeight}, "txtDate", "Date", 'WTDa', 38);
-    date_->SetToolTip("The day to value at.  Up and Down: a day on and back; Page Up and Page Down: a month");
     computeEvolution_ = addCheckBox(this, {kMargin + 148, kMargin + 1, kMargin + 300, kMargin + 1 + kFieldHeight},
                                     "cbxComputeEvolution", "Compute Evolution", 'WCCe');
     constexpr float kButtonWidth = 110;
@@ -64,7 +63,12 @@ void WalletView::makeTop()
                 {"btnSavePortoFolio", "Save to File", 'WBSv'},
                 {"btnReinitPortoFolio", "Reinit", 'WBRe'},
                 {"btnUpdateAllQuotes", "Update Quotes", 'WBUp'}});
-    explainLoadAndSave(this, "btnLoadPortoFolio", "btnSavePortoFolio", "the portfolio");
+    explain(*this, {{"txtDate", "The day to value at.  Up and Down: a day on and back; Page Up and Page Down: a month"},
+                    {"cbxComputeEvolution", "Draws the value of every day since the first operation"},
+                    {"btnLoadPortoFolio", "Loads the portfolio from a file.  Ctrl+O"},
+                    {"btnSavePortoFolio", "Saves the portfolio to a file.  Ctrl+S"},
+                    {"btnReinitPortoFolio", "Begins an empty portfolio. Asks nothing: save before"},
+                    {"btnUpdateAllQuotes", "Fetches the latest quote of every company that is or was held"}});
 }
 
 void WalletView::makeTotals()
@@ -106,6 +110,7 @@ void WalletView::makeAccounts()
     top += kRow;
     defaultTransferAccount_ = addCheckBox(box, {kLeft, top, right, top + kFieldHeight}, "cbxDefaultTransferAccount",
                                           "Default Transfer Account for this currency", 'WCDt');
+    defaultTransferAccount_->SetToolTip("Gets a part of the gain of simulated sales in its currency");
     // The last two bear the names of the quote buttons of other pages. Intended: controls are found by these names.
     addButtons(
         box, {kLeft, bottom - kButtonHeight, right, bottom},
