@@ -1,10 +1,7 @@
 #include "app/KeptVersions.h"
-#include "tests/support/PlainUser.h"
 #include "tests/support/ToolRun.h"
 
 #include <gtest/gtest.h>
-#include <set>
-#include <stdexcept>
 
 namespace {
 
@@ -107,36 +104,4 @@ TEST_F(KeptVersionsTest, AClockSetBackDoesNotCostTheNewVersions)
     for (int i = 0; i < 17; ++i)
         expected += "a ";
     EXPECT_EQ(contents("Sample"), expected);
-}
-
-TEST_F(KeptVersionsTest, AFileInUseUnderAnotherNameIsCopied)
-{
-    folder_.write("Sample", "old", 0640);
-    const auto written = fs::last_write_time(path("Sample"));
-    fs::create_hard_link(path("Sample"), path("other"));
-    const std::string version = versions_.keep(path("Sample"), kNow);
-    folder_.write("other", "written in place");
-    EXPECT_EQ(contentOf(version), "old");
-    EXPECT_EQ(fs::status(version).permissions(), fs::perms(0640));
-    EXPECT_EQ(fs::last_write_time(version), written);
-}
-
-TEST_F(KeptVersionsTest, WhatCannotBeKeptIsAnError)
-{
-    const PlainUser user(folder_.path);
-    const auto reason = [this](const std::string& name) -> std::string {
-        try {
-            versions_.keep(path(name), kNow);
-            return "";
-        } catch (const std::runtime_error& error) {
-            return error.what();
-        }
-    };
-    fs::create_hard_link(folder_.write("unreadable", "old", 0200), path("other"));
-    EXPECT_EQ(reason("unreadable"), path("unreadable") + ": its former version cannot be kept: Permission denied");
-    EXPECT_EQ(contents("unreadable"), "") << "not even a part";
-    fs::permissions(path("Pelorin/Backups"), fs::perms(0500));
-    folder_.write("Pelorin/Companies/Sample", "old");
-    EXPECT_TRUE(reason("Pelorin/Companies/Sample").ends_with("/Backups/Companies: cannot be made: Permission denied"));
-    fs::permissions(path("Pelorin/Backups"), fs::perms(0700));
 }

@@ -1,8 +1,14 @@
 // What loading and valuing cost, for believable amounts of data. Whatever works on files is measured in a child process
 // of its own.
 
-#include "market/Company.h"
-#include "tests/bench/AppBench.h"
+#include "app/PLWindow.h"
+#include "foundation/Today.h"
+#include "platform/Application.h"
+#include "platform/CheckBox.h"
+#include "platform/Entry.h"
+#include "platform/Message.h"
+#include "platform/Screenshot.h"
+#include "platform/TabView.h"
 #include "tests/bench/ChildRun.h"
 #include "tests/bench/FigureReporter.h"
 #include "tests/bench/GeneratedFiles.h"
@@ -10,6 +16,7 @@
 #include "valuation/Evolution.h"
 #include "valuation/State.h"
 
+#include <cstdlib>
 #include <cstring>
 #include <memory>
 
@@ -43,7 +50,8 @@ double shareStatesOf(const DataSize& size)
 
 // The steps that are measured, and those that lead up to them. All return true on success.
 
-bool doNothing(Portfolio&, const Files&)
+template <class Subject>
+bool doNothing(Subject&, const Files&)
 {
     return true;
 }
@@ -115,51 +123,101 @@ bool replay(Portfolio& portfolio, const Files&)
     return true;
 }
 
-using Step = bool (*)(Portfolio&, const Files&);
+/// The window, with what is needed around it.
+struct Desktop {
+    BApplication application{"application/x-vnd.Pelorin-bench"};
+    PLWindow* window = nullptr;
+    BTabView* tabs = nullptr;
+};
 
-void BM_Files(benchmark::State& state, const DataSize& size, double items, Step prepare, Step work)
+bool openWindow(Desktop& desktop, const Files& files)
 {
-    const Files files = folder->files(size);
-    Portfolio portfolio; // each child fills its own copy
-    measureInChildren(
-        state, items, [&] { return prepare(portfolio, files); }, [&] { return work(portfolio, files); });
+    setToday(Portfolio::lastDay());
+    desktop.window = new PLWindow({50, 50, 850, 850}, DataFolder(files.market.parent_path().string()));
+    desktop.window->Show();
+    handle_pending_messages();
+    desktop.tabs = dynamic_cast<BTabView*>(desktop.window->FindView("TabView"));
+    return desktop.tabs != nullptr;
 }
 
-#define PELORIN_BENCHMARK(name, ...)                                                                                   \
-    BENCHMARK_CAPTURE(BM_Files, name, __VA_ARGS__)->UseManualTime()->Unit(benchmark::kMillisecond)
-
-PELORIN_BENCHMARK(walk_market, kLarge, quotesOf(kLarge), doNothing, walkMarket);
-PELORIN_BENCHMARK(load_market, kLarge, quotesOf(kLarge), doNothing, loadMarket);
-PELORIN_BENCHMARK(evolve_10_years, small(10), shareStatesOf(small(10)), load, evolve);
-PELORIN_BENCHMARK(evolve_20_years, small(20), shareStatesOf(small(20)), load, evolve);
-PELORIN_BENCHMARK(evolve_40_years, small(40), shareStatesOf(small(40)), load, evolve);
-PELORIN_BENCHMARK(replay, small(20), kReplays* small(20).holdings, load, replay);
-PELORIN_BENCHMARK(remove_10_years, small(10), shareStatesOf(small(10)), loadAndEvolve, removeStates);
-PELORIN_BENCHMARK(remove_20_years, small(20), shareStatesOf(small(20)), loadAndEvolve, removeStates);
-PELORIN_BENCHMARK(remove_40_years, small(40), shareStatesOf(small(40)), loadAndEvolve, removeStates);
-PELORIN_BENCHMARK(chart_small, small(20), 1, doNothing, makeChart);
-PELORIN_BENCHMARK(chart_large, kLarge, 1, doNothing, makeChart);
-
-/// From the front, so that every removal leaves a gap in the list.
-void BM_RemoveQuotes(benchmark::State& state)
+/// What an open panel's answer does.
+void answerWith(const std::filesystem::path& path, Desktop& desktop, int32 tab)
 {
-    for (auto _ : state) {
-        state.PauseTiming();
-        Company company;
-        std::vector<std::unique_ptr<CompanyQuote>> quotes;
-        Date day(1, 1, 1900);
-        for (std::int64_t i = 0; i < state.range(); ++i, day + 1)
-            quotes.push_back(std::make_unique<CompanyQuote>(&company, day, 1));
-        state.ResumeTiming();
-        for (const auto& quote : quotes)
-            company.removeQuote(quote.get());
-        state.PauseTiming();
-        quotes.clear();
-        state.ResumeTiming();
+    desktop.tabs->Select(tab);
+    const entry_ref ref{path.parent_path().string(), path.filename().string()};
+    BMessage answer(B_REFS_RECEIVED);
+    answer.AddRef("refs", &ref);
+    desktop.window->PostMessage(&answer);
+    handle_pending_messages();
+}
+
+bool loadMarket(Desktop& desktop, const Files& files)
+{
+    answerWith(files.market, desktop, 0);
+    return desktop.window->catalogue().getNbrCurrencies() > 0;
+}
+
+bool load(Desktop& desktop, const Files& files)
+{
+    if (!openWindow(desktop, files) || !loadMarket(desktop, files))
+        return false;
+    answerWith(files.wallet, desktop, 2);
+    return desktop.window->getWallet()->getNbrAccounts() > 0;
+}
+
+bool evolve(Desktop& desktop, const Files&)
+{
+    dynamic_cast<BCheckBox*>(desktop.window->FindView("cbxComputeEvolution"))->SetValue(B_CONTROL_ON);
+    desktop.window->PostMessage('WCCe');
+    handle_pending_messages();
+    return desktop.window->getWallet()->getNbrStates() > 1;
+}
+
+bool switchPages(Desktop& desktop, const Files&)
+{
+    constexpr int kPages = 5, kSwitches = 20 * kPages;
+    for (int i = 0; i < kSwitches; ++i) {
+        desktop.tabs->Select(i % kPages);
+        handle_pending_messages();
     }
-    state.counters["items"] = static_cast<double>(state.range());
+    return true;
 }
-BENCHMARK(BM_RemoveQuotes)->Arg(10000)->Arg(40000);
+
+template <class Subject>
+void measure(benchmark::State& state, const DataSize& size, double items, bool (*prepare)(Subject&, const Files&),
+             bool (*work)(Subject&, const Files&))
+{
+    setenv("QT_QPA_PLATFORM", "offscreen", 0);
+    const Files files = folder->files(size);
+    Subject* subject = nullptr; // made in each child, and ends with it
+    const auto begin = [&] {
+        subject = new Subject;
+        return prepare(*subject, files);
+    };
+    measureInChildren(state, items, begin, [&] { return work(*subject, files); });
+}
+
+constexpr auto BM_Files = measure<Portfolio>;
+constexpr auto BM_Window = measure<Desktop>;
+
+#define PELORIN_BENCHMARK(subject, name, ...)                                                                          \
+    BENCHMARK_CAPTURE(subject, name, __VA_ARGS__)->UseManualTime()->Unit(benchmark::kMillisecond)
+
+PELORIN_BENCHMARK(BM_Files, walk_market, kLarge, quotesOf(kLarge), doNothing, walkMarket);
+PELORIN_BENCHMARK(BM_Files, load_market, kLarge, quotesOf(kLarge), doNothing, loadMarket);
+PELORIN_BENCHMARK(BM_Files, evolve_10_years, small(10), shareStatesOf(small(10)), load, evolve);
+PELORIN_BENCHMARK(BM_Files, evolve_20_years, small(20), shareStatesOf(small(20)), load, evolve);
+PELORIN_BENCHMARK(BM_Files, evolve_40_years, small(40), shareStatesOf(small(40)), load, evolve);
+PELORIN_BENCHMARK(BM_Files, replay, small(20), kReplays* small(20).holdings, load, replay);
+PELORIN_BENCHMARK(BM_Files, remove_10_years, small(10), shareStatesOf(small(10)), loadAndEvolve, removeStates);
+PELORIN_BENCHMARK(BM_Files, remove_20_years, small(20), shareStatesOf(small(20)), loadAndEvolve, removeStates);
+PELORIN_BENCHMARK(BM_Files, remove_40_years, small(40), shareStatesOf(small(40)), loadAndEvolve, removeStates);
+PELORIN_BENCHMARK(BM_Files, chart_small, small(20), 1, doNothing, makeChart);
+PELORIN_BENCHMARK(BM_Files, chart_large, kLarge, 1, doNothing, makeChart);
+PELORIN_BENCHMARK(BM_Window, open, small(20), 1, doNothing, openWindow);
+PELORIN_BENCHMARK(BM_Window, switch_page, small(20), 1, load, switchPages);
+PELORIN_BENCHMARK(BM_Window, load_market, kLarge, quotesOf(kLarge), openWindow, loadMarket);
+PELORIN_BENCHMARK(BM_Window, evolve_20_years, small(20), shareStatesOf(small(20)), load, evolve);
 
 } // namespace
 
@@ -169,7 +227,6 @@ int main(int argc, char** argv)
     if (benchmark::ReportUnrecognizedArguments(argc, argv))
         return 2;
     folder = std::make_unique<GeneratedFiles>();
-    registerAppBenchmarks(*folder, {kLarge, quotesOf(kLarge)}, {small(20), shareStatesOf(small(20))});
     FigureReporter reporter;
     benchmark::RunSpecifiedBenchmarks(&reporter);
     folder.reset();

@@ -1,4 +1,4 @@
-// What a start and drawing cost. It needs no screen, only the platform's offscreen mode.
+// What drawing costs. It needs no screen, only the platform's offscreen mode.
 
 #include "chart/GraphLine.h"
 #include "chart/GraphPoint.h"
@@ -10,9 +10,7 @@
 #include <benchmark/benchmark.h>
 
 #include <cmath>
-#include <cstdio>
 #include <cstdlib>
-#include <string>
 
 namespace {
 
@@ -64,22 +62,5 @@ void BM_FillLine(benchmark::State& state)
     state.counters["items"] = static_cast<double>(state.range());
 }
 BENCHMARK(BM_FillLine)->Arg(20000)->Arg(80000)->Unit(benchmark::kMillisecond);
-
-/// A start from nothing, libraries and all, until the window is painted.
-void BM_Start(benchmark::State& state, const char* window)
-{
-    setenv("QT_QPA_PLATFORM", "offscreen", 0);
-    for (auto _ : state) {
-        double seconds = 0;
-        double bytes = 0;
-        FILE* probe = popen((std::string(PELORIN_START_PROBE " ") + window).c_str(), "r");
-        if (probe == nullptr || std::fscanf(probe, "%lf %lf", &seconds, &bytes) != 2 || pclose(probe) != 0)
-            state.SkipWithError("no window came up");
-        state.SetIterationTime(seconds);
-        state.counters["bytes_per_item"] = bytes;
-    }
-}
-BENCHMARK_CAPTURE(BM_Start, pelorin, "pelorin")->UseManualTime()->Unit(benchmark::kMillisecond)->Iterations(20);
-BENCHMARK_CAPTURE(BM_Start, bare, "bare")->UseManualTime()->Unit(benchmark::kMillisecond)->Iterations(20);
 
 } // namespace

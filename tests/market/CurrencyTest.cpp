@@ -1,4 +1,3 @@
-#include "tests/support/Bytes.h"
 #include "tests/support/SmallPortfolio.h"
 
 #include <cmath>
@@ -28,16 +27,6 @@ Currency* addCurrency(Catalogue& catalogue, const char* symbol, const std::vecto
 }
 
 } // namespace
-
-TEST(CurrencyTest, WithoutAStoredReferenceACurrencyIsItsOwn)
-{
-    Currency euro, dollar("Dollar", "USD", &euro);
-    Currency *ofEuro, *ofDollar;
-    EXPECT_EQ(euro.getReferenceCurrency(&ofEuro) + dollar.getReferenceCurrency(&ofDollar), 0);
-    EXPECT_TRUE(ofEuro == &euro && ofDollar == &euro);
-    EXPECT_EQ(euro.rd(BytesFile(std::string(40, '\0'))), -1) << "undated records do not exist";
-    EXPECT_EQ(written([&euro](FILE* out) { EXPECT_EQ(euro.wrt(out), -1); }), "");
-}
 
 TEST(CurrencyTest, ANewReferenceDividesTheOtherRatesByItsOwnOfTheDay)
 {
@@ -82,23 +71,10 @@ TEST(CurrencyTest, ARemovedCurrencyLeavesItsPlaceToTheLastAndNoPointerBehind)
     EXPECT_EQ(catalogue.getCurrencies(), (std::vector<Currency*>{c, d}));
     EXPECT_EQ(catalogue.getReferenceCurrency(), c);
     EXPECT_EQ(rates(*d), Rates{2}) << "in the new reference";
-    Currency* stored;
-    d->getReferenceCurrency(&stored);
-    EXPECT_EQ(stored, c);
+    Currency *ofC, *ofD;
+    EXPECT_EQ(c->getReferenceCurrency(&ofC) + d->getReferenceCurrency(&ofD), 0);
+    EXPECT_TRUE(ofC == c && ofD == c) << "without a stored one a currency is its own";
     removed(d);
     removed(c);
     EXPECT_EQ(catalogue.getReferenceCurrency(), nullptr);
-}
-
-TEST(CurrencyTest, ADestroyedCurrencyTakesItsMarketsAlongAndLeavesItsAccounts)
-{
-    SmallPortfolio p;
-    Account* account = addAccount(p.wallet, "cash", p.euro);
-    new Share(&p.wallet, p.alpha);
-    p.catalogue.removeCurrency(p.euro);
-    delete p.euro;
-    Currency* currency;
-    EXPECT_EQ(account->getCurrency(&currency), -1);
-    EXPECT_EQ(p.wallet.getNbrAccounts(), 1U);
-    EXPECT_EQ(p.wallet.getNbrShares(), 0U) << "the holding has gone with its company, and that with its market";
 }

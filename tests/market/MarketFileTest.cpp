@@ -4,7 +4,6 @@
 #include "tests/support/Bytes.h"
 #include "tests/support/SmallPortfolio.h"
 
-#include <functional>
 #include <gtest/gtest.h>
 
 namespace {
@@ -63,13 +62,6 @@ std::string summary(const Catalogue& catalogue)
     return result;
 }
 
-template <class Record>
-int readOne(FILE* file)
-{
-    Record record;
-    return record.rd(file);
-}
-
 } // namespace
 
 TEST(MarketFileTest, EveryFieldComesFromAndGoesToItsPlace)
@@ -114,16 +106,6 @@ TEST(MarketFileTest, AFileCutAnywhereKeepsWhatIsWhole)
         EXPECT_EQ(catalogue.rd(BytesFile(bytes.substr(0, size))), -1) << "cut after " << size;
         EXPECT_EQ(summary(catalogue), holds) << "cut after " << size;
     }
-    const std::pair<std::string, std::function<int(FILE*)>> records[] = {
-        {pieces(4, 5), readOne<CompanyQuote>},
-        {pieces(7, 8).substr(2), readOne<SplitCompanyEvent>},
-        {pieces(8, 9).substr(2), readOne<NoteCompanyEvent>},
-        {pieces(3, 9), readOne<Company>},
-        {pieces(2, 10), readOne<Market>},
-        {pieces(1, 13), [](FILE* file) { return Currency().rd(file, nullptr); }}};
-    for (const auto& [record, rd] : records)
-        for (std::size_t size = 0; size <= record.size(); ++size)
-            EXPECT_EQ(rd(BytesFile(record.substr(0, size))), size < record.size() ? -1 : 0) << record << " to " << size;
 }
 
 TEST(MarketFileTest, ACountThatTheFileDoesNotBearOutEndsWithTheFile)

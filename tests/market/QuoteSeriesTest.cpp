@@ -116,12 +116,6 @@ TEST(QuoteSeriesTest, AnAddedQuoteReplacesTheFirstOneOfItsDay)
     EXPECT_EQ(dump(company), "1:3 1:4 ") << "a changed date replaces nothing";
     for (const auto& [day, value] : {std::pair(0, 3), {1, 3}, {2, 4}})
         EXPECT_EQ(company.getRealQuote(march(day)), static_cast<float>(value)) << "no line in one day: " << day;
-    auto* e = new CompanyQuote(&other, march(1), 5);
-    EXPECT_EQ(e->setCompany(&company), 0);
-    EXPECT_EQ(dump(company) + "| " + dump(other), "1:4 1:5 | ");
-    EXPECT_EQ(company.removeQuote(d), 0);
-    EXPECT_EQ(dump(company), "1:5 ");
-    delete d;
 }
 
 TEST(QuoteSeriesTest, ChangesLeaveNoTrace)

@@ -31,21 +31,15 @@ TEST(LatestPageTest, ThePriceIsCutOutOfTheFirstMarkedCell)
         const char* why;
     } cases[] = {
         {"<td nowrap><b>45</b></td>", 45, "a whole number"},
-        {"<td nowrap><b>112<sup>3</sup>/<sub>8</sub></b></td>", 112.375F, "a fraction"},
-        {"<td nowrap><b>0<sup>1</sup>/<sub>3</sub>", 1.0F / 3, "in single precision"},
         {"<td nowrap><b>16777216<sup>1</sup>/<sub>2</sub>", 16777216, "the sum, too"},
-        {"<td nowrap><b>45.25</b></td>", 45.25F, "a decimal price"},
         {"<td nowrap><b>7</b></td><td nowrap><b>8</b></td>", 7, "the first cell counts"},
         {"<<td nowrap><b>7</b></td>", -1, "a match that breaks is not begun anew"},
         {"<<td nowrap><b>7</b></td> <td nowrap><b>8</b></td>", 8, "but a later one is found"},
-        {"<td nowrap><b", -1, "no whole marker"},
         {"", -1, "nothing"},
         {{"\0<td nowrap><b>7", 16}, -1, "the page ends at a zero"},
         {"<td nowrap><b>", -1, "the page ends before the price"},
-        {"<td nowrap><b>45", 45, "behind the whole part"},
         {"<td nowrap><b>45 <sup>3", 45, "behind the numerator"},
         {"<td nowrap><b>45 <sup>3</sup>/<sub>0</sub>", 45, "a denominator of 0"},
-        {"<td nowrap><b>N/A</b></td>", 0, "no number is 0"},
     };
     for (const auto& c : cases) {
         float price = -1;
@@ -63,27 +57,19 @@ TEST(HistoryPageTest, RowsAreReadInPageOrder)
         const char* why;
     } cases[] = {
         {"\n5/3/1999 45.5 46 44\n05/04/1999\t46\t47\t9\n</pre>", "0: 03/05/1999=45.5 04/05/1999=46 ", "blanks or tabs"},
-        {"</table>", "0: ", "an empty table"},
         {" \r\n\t/5/3/1999 45 - - -\r\n  5/4/1999 46 - - -\n<", "0: 03/05/1999=45 04/05/1999=46 ", "blanks in front"},
         {"5/3/99 45 - - -\n<", "0: 03/05/99=45 ", "no century is added"},
         {"5/3/1999 45 - - -\n</pre>\n5/4/1999 46 - - -\n", "0: 03/05/1999=45 ", "the table ends at the first '<'"},
-        {"5/3/1999 45 - - -\n5<4/1999 46 - - -\n", "0: 03/05/1999=45 ", "in the month, too"},
         // The filter.
         {"5/3/1999 10 - - -\n5/4/1999 25 - - -\n5/5/1999 12 - - -\n5/6/1999 3 - - -\n5/7/1999 11 - - -\n<",
          "0: 03/05/1999=10 05/05/1999=12 07/05/1999=11 ", "only plausible prices"},
-        {"5/3/1999 0 - - -\n5/4/1999 900 - - -\n5/5/1999 2 - - -\n<", "0: 03/05/1999=0 04/05/1999=900 ",
-         "a 0 lets any pass"},
         {"5/3/1999 12 - - -\n5/4/1999 24 - - -\n5/5/1999 4 - - -\n5/6/1999 23.5 - - -\n<",
          "0: 03/05/1999=12 06/05/1999=23.5 ", "the limits do not belong to it"},
         // The end of the text.
         {"5/3/1999 45 - - -\n", "-1: 03/05/1999=45 ", "behind a row that was read"},
-        {"5/3/1999 45 - - -", "-1: 03/05/1999=45 ", "before its line feed"},
         {"5/3/1999 45 - - -\n5/4/1999 46", "-1: 03/05/1999=45 ", "in a price"},
         {"5/3/1999 ", "-1: ", "before the price"},
-        {"5/3/1999", "-1: ", "in a year"},
-        {"5/3", "-1: ", "in a day"},
         {"5", "-1: ", "in a month"},
-        {"5/3/1999 45 - - -\nno row\n", "0: 03/05/1999=45 ", "behind a skipped row"},
         // Skipped rows.
         {"x\n5\n5/3\n5/3/\n5/3/1999\n5/4/1999 46 - - -\n<", "0: 04/05/1999=46 ", "a line feed in each field"},
         {"5/3/1999 45.51\n5/4/1999 46 - - -\n<", "0: 04/05/1999=46 ", "and right where the price may end"},

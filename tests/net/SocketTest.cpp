@@ -1,12 +1,9 @@
 #include "net/Socket.h"
 #include "tests/support/Bytes.h"
 #include "tests/support/Peer.h"
-#include "tests/support/ToolRun.h"
 
 #include <cstring>
-#include <fcntl.h>
 #include <gmock/gmock.h>
-#include <list>
 #include <memory>
 #include <optional>
 #include <vector>
@@ -139,13 +136,6 @@ TEST(SocketTest, NumbersTravelInTheOrderOfThisMachine)
     expectTravels(&Socket::writeUInt, &Socket::readUInt, 0x89ABCDEF, "EFCDAB89");
     expectTravels(&Socket::writeShort, &Socket::readShort, short{-2}, "FEFF");
     expectTravels<unsigned short>(&Socket::writeUShort, &Socket::readUShort, 0x1234, "3412");
-
-    Connected by;
-    by.socket->writeInt(0x01020304);
-    Peer::send(by.peer, "\xFF");
-    int number;
-    EXPECT_EQ(by.socket->readInt(&number), 0);
-    EXPECT_EQ(number, 0x010203FF) << "a short read is filled up from the shared buffer";
 }
 
 TEST(SocketTest, APeerThatHasGoneIsAFailureWithoutASignal)
@@ -158,13 +148,6 @@ TEST(SocketTest, APeerThatHasGoneIsAFailureWithoutASignal)
     EXPECT_EQ(by.socket->writeLine(bytes), -1);
     EXPECT_EQ(by.socket->putCharacterArray(bytes, 4), -1);
     EXPECT_EQ(by.socket->putChar('c'), -1);
-    EXPECT_EQ(by.socket->writeDouble(1), -1);
-
-    Socket none;
-    String line;
-    for (const int result : {none.readLine(&line), none.readLine(bytes, 4), none.writeLine(bytes), none.getChar(bytes)})
-        EXPECT_EQ(result, -1) << "it has no descriptor";
-    EXPECT_EQ(none.closeConnection(), 0);
 }
 
 TEST(SocketTest, AServerTalksToItsClient)
@@ -186,64 +169,12 @@ TEST(SocketTest, AServerTalksToItsClient)
     EXPECT_EQ(server.acceptConnection(&accepted), -1) << "and ends the listening";
 }
 
-TEST(SocketTest, AServerLeavesDescriptorZeroOpen)
-{
-    while (fcntl(0, F_GETFD) < 0)
-        ASSERT_EQ(open("/dev/null", O_RDONLY), 0);
-    Socket server(0, sockaddr_in{});
-    EXPECT_EQ(server.serverOn(0), 0);
-    EXPECT_GE(fcntl(0, F_GETFD), 0);
-}
-
-TEST(SocketTest, ClosingAlsoRemovesTheFileThatTheAddressNames)
-{
-    const TemporaryFolder folder("pelorin-socket-test");
-    const std::filesystem::path before = std::filesystem::current_path();
-    std::filesystem::current_path(folder.path);
-    folder.write("named", "x");
-    sockaddr_in address{};
-    std::memcpy(&address, "named", sizeof "named");
-    int ends[2];
-    ASSERT_EQ(pipe(ends), 0);
-    Socket socket(ends[0], address);
-    EXPECT_EQ(socket.closeConnection(), 0);
-    EXPECT_FALSE(std::filesystem::exists("named"));
-    EXPECT_EQ(socket.closeConnection(), -1) << "it is closed already, but keeps its number";
-    EXPECT_EQ(Socket(ends[1], sockaddr_in{}).closeConnection(), -1) << "there is no file";
-    std::filesystem::current_path(before);
-}
-
 TEST(SocketDeathTest, AnObjectIsConnectedOnce)
 {
-    const auto connectAgain = [](bool byName, bool closeFirst) {
-        Connected by;
-        if (closeFirst)
-            by.socket->closeConnection();
-        byName ? by.socket->connectToName("localhost", 9) : by.socket->connectTo("127.0.0.1", 9);
-    };
-    for (const bool byName : {false, true})
-        for (const bool closeFirst : {false, true})
-            EXPECT_EXIT(connectAgain(byName, closeFirst), testing::ExitedWithCode(255),
-                        "^Error closing previous connection\\.\n$");
-}
-
-TEST(SocketTest, NoWaitIsLongerThanTheTimeLimit)
-{
-    Socket server;
-    unsigned short port = 0;
-    ASSERT_EQ(server.serverOn(0, in_addr{htonl(INADDR_LOOPBACK)}) + server.getLocalPort(&port), 0);
-    std::list<Socket> clients;
-    const auto start = std::chrono::steady_clock::now();
-    // Those that nobody accepts fill the queue; the next one gets no answer.
-    for (int result = 0; result == 0 && clients.size() < 20U;) {
-        clients.emplace_back().setTimeLimit(100ms);
-        result = clients.back().connectTo("127.0.0.1", port);
-    }
-    EXPECT_LT(clients.size(), 20U);
-    char c;
-    EXPECT_EQ(clients.front().getChar(&c), -1) << "connected, but silent";
-    EXPECT_GE(std::chrono::steady_clock::now() - start, 200ms);
-    EXPECT_LT(std::chrono::steady_clock::now() - start, 5s);
+    Connected by;
+    by.socket->closeConnection(); // it keeps its number
+    EXPECT_EXIT(by.socket->connectTo("127.0.0.1", 9), testing::ExitedWithCode(255),
+                "^Error closing previous connection\\.\n$");
 }
 
 } // namespace

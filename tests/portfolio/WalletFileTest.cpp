@@ -96,13 +96,16 @@ TEST(WalletFileTest, EveryFieldStandsInItsPlace)
     EXPECT_EQ(again.wallet.rd(BytesFile(bytesOfPieces()), nullptr), 0);
     EXPECT_EQ(again.wallet.getNbrStates(), 0U);
     EXPECT_EQ(bytesWritten(again.wallet), bytesOfPieces());
-    Account* side = again.wallet.getAccountByName("Side");
+    const Account* side = again.wallet.getAccountByName("Side");
+    ASSERT_NE(side, nullptr);
     ASSERT_EQ(side->getNbrTransferOperations(), 1U) << "though it comes later in the file than the transfer";
     EXPECT_EQ(side->getTransferOperation(0), again.wallet.getAccount(0)->getOperation(1));
     Links({again.euro, again.dollar}, {&again.wallet}).expectConsistent();
 
     const std::string others = replaced(replaced(bytesOfPieces(), "'B' 'Y'", "'?' 'N'"), "'Main' 'Y'", "'Main' 'y'");
     ASSERT_EQ(again.wallet.rd(BytesFile(others), nullptr), 0) << "only the flags tell purchase and default account";
+    ASSERT_EQ(again.wallet.getNbrAccounts(), 2U);
+    ASSERT_GT(again.wallet.getAccount(0)->getNbrOperations(), 0U);
     EXPECT_EQ(again.wallet.getAccount(0)->getOperation(0)->getType(), Operation::kSell);
     EXPECT_FALSE(again.wallet.getAccount(0)->isDefaultTransferAccount());
 }
@@ -126,20 +129,6 @@ TEST(WalletFileTest, WhatIsWholeStaysWhereverTheFileIsCut)
     }
 }
 
-TEST(WalletFileTest, ANameMeansTheFirstThatBearsIt)
-{
-    SmallPortfolio p;
-    new Share(&p.wallet, p.alpha);
-    auto* second = new Share(&p.wallet, p.alpha);
-    addAccount(p.wallet, "A", p.euro);
-    Account* sender = addAccount(p.wallet, "A", p.dollar);
-    transfer(sender, sender, 0, 1);
-    trade(second, sender, 0, 1, 1);
-    ASSERT_EQ(p.wallet.rd(BytesFile(bytesWritten(p.wallet)), nullptr), 0);
-    EXPECT_EQ(p.wallet.getAccount(0)->getNbrTransferOperations(), 1U);
-    EXPECT_EQ(all(p.wallet, &Wallet::getAllShares).front()->getNbrShareOperations(), 1U);
-}
-
 TEST(WalletFileTest, AutomaticTransfersAreWrittenLikeManualOnesAndAutomaticSalesNotAtAll)
 {
     SmallPortfolio p;
@@ -147,6 +136,8 @@ TEST(WalletFileTest, AutomaticTransfersAreWrittenLikeManualOnesAndAutomaticSales
     transfer(account, account, 1, 2, true);
     new ShareOperation(kStart, new Share(&p.wallet, p.alpha), false, 1, 1, true, 0);
     ASSERT_EQ(p.wallet.rd(BytesFile(bytesWritten(p.wallet)), nullptr), 0);
+    ASSERT_EQ(p.wallet.getNbrAccounts() + p.wallet.getNbrShares(), 2U);
+    ASSERT_EQ(p.wallet.getAccount(0)->getNbrOperations(), 1U);
     EXPECT_FALSE(p.wallet.getAccount(0)->getOperation(0)->isAutomatic());
     EXPECT_EQ(all(p.wallet, &Wallet::getAllShares).front()->getNbrShareOperations(), 0U);
     p.wallet.getAccount(0)->setCurrency(nullptr);
@@ -195,9 +186,10 @@ TEST(WalletFileTest, ATransferToNobodyStaysAndWhatFollowsIsReadOutOfPlace)
                               bytesOf(kDefaults);
     SmallPortfolio p;
     EXPECT_EQ(p.wallet.rd(BytesFile(bytes), nullptr), 0);
-    const Account* account = p.wallet.getAccount(0);
-    ASSERT_EQ(account->getNbrOperations(), 2U);
-    const auto* failed = static_cast<TransferAccountOperation*>(account->getOperation(0));
+    ASSERT_EQ(p.wallet.getNbrAccounts(), 1U);
+    ASSERT_EQ(p.wallet.getAccount(0)->getNbrOperations(), 2U);
+    const auto* failed = dynamic_cast<TransferAccountOperation*>(p.wallet.getAccount(0)->getOperation(0));
+    ASSERT_NE(failed, nullptr);
     Account* recipient;
     EXPECT_EQ(failed->getRecepientAccount(&recipient), -1);
     EXPECT_TRUE(failed->getDate().isUndefined());

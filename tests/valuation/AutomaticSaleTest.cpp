@@ -180,14 +180,3 @@ TEST(AutomaticSaleTest, TheNextStateRemovesTheTransferAndReplaysTheSaleWithoutCa
         EXPECT_EQ(p.share->getNbrShareOperations(), 2U) << "neither removed nor made again, day " << day;
     }
 }
-
-TEST(AutomaticSaleTest, AnEndDateFarAheadIsNotWalkedTo)
-{
-    HundredShares p(10);
-    p.wallet.setEndProfitSellRate(2); // no limit is ever passed
-    trade(p.share, p.main, 1, -1000000100, 10);
-    trade(p.share, p.main, 10, 1000000001, 10); // 1000000001 / 1 ways of ten days
-    const Date end = daysAfterStart(kPeriod + 10 * 1000000001LL);
-    EXPECT_EQ(p.at(20)->getShareState(0)->getEndDate(), end);
-    EXPECT_EQ(p.share->getShareOperation(3)->getDate(), end);
-}

@@ -38,30 +38,6 @@ TEST(EvolutionTest, TheCurrentStateComesFirstThenEveryDayBeforeIt)
     EXPECT_EQ(p.wallet.getNbrStates(), 0U) << "the old states go all the same";
 }
 
-TEST(EvolutionTest, TheDailyStatesRemoveTheAutomaticTransfersOfTheCurrentOne)
-{
-    const struct {
-        int day;
-        bool withEvolution;
-        unsigned states, operations;
-    } cases[] = {{3, false, 1, 2}, {3, true, 4, 1}, {0, true, 1, 2}}; // the last one has no daily states
-    for (const auto& c : cases) {
-        SmallPortfolio p;
-        Account* main = addAccount(p.wallet, "Main", p.euro);
-        addAccount(p.wallet, "Profits", p.euro)->setDefaultTransferAccount(true);
-        auto* share = new Share(&p.wallet, p.alpha);
-        trade(share, main, 0, 100, 10);
-        setTrend(p.alpha, 30);
-        EvolutionOutcome outcome;
-        const State* current =
-            refreshStates(p.wallet, daysAfterStart(c.day), true, c.withEvolution ? &outcome : nullptr);
-        EXPECT_EQ(p.wallet.getNbrStates(), c.states);
-        EXPECT_EQ(main->getNbrOperations(), c.operations);
-        EXPECT_EQ(share->getNbrShareOperations(), 2U) << "the sale stays";
-        EXPECT_GT(current->getAccountState(1)->getCash(), 0) << "what the current state has counted stays counted";
-    }
-}
-
 TEST(EvolutionTest, WithoutARealFirstDayOrWithTooManyThereAreNoDailyStates)
 {
     constexpr auto Built = EvolutionOutcome::Built, BadFirstDay = EvolutionOutcome::BadFirstDay,

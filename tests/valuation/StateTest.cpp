@@ -130,22 +130,3 @@ TEST(StateTest, TheFirstOperationCountsEvenWhenItIsStillToCome)
     EXPECT_EQ(p.cash(4), 0);
     EXPECT_EQ(p.quantity(4), 0);
 }
-
-TEST(StateTest, WithoutWalletOrDateAStateStaysEmpty)
-{
-    OneHolding p;
-    transfer(p.account, p.account, 0, 1, true);
-    trade(p.share, nullptr, 0, 10, 10);
-    State unowned(nullptr, kStart, true);
-    const State undated(&p.wallet, Date(), true);
-    for (const State* state : {&std::as_const(unowned), &undated}) {
-        EXPECT_EQ(state->getNbrAccountStates() + state->getNbrShareStates(), 0U);
-        EXPECT_TRUE(state->getFirstOperationDate().isUndefined());
-    }
-    EXPECT_EQ(p.account->getNbrOperations(), 1U) << "no automatic operation was removed";
-    const AccountState lost(p.account, nullptr, kStart, false);
-    const ShareState held(p.share, &unowned, kStart, true);
-    EXPECT_TRUE(lost.getDate().isUndefined());
-    EXPECT_EQ(held.getDate(), kStart);
-    EXPECT_EQ(held.getQuantity(), 0);
-}
