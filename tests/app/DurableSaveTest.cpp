@@ -16,11 +16,6 @@ int writeNew(FILE* file)
     return std::fputs("new", file) < 0 ? -1 : 0;
 }
 
-int writeNothing(FILE*)
-{
-    return 0;
-}
-
 int writeHalf(FILE* file)
 {
     std::fputs("ne", file);
@@ -65,7 +60,6 @@ TEST_F(DurableSaveTest, GivesTheOldFileOrTheNewOneAndSaysWhich)
     } cases[] = {
         {"a new name", -1, writeNew, kSaved, "new", "f 0"},
         {"an old file", 0640, writeNew, kSaved, "new", "f 1"},
-        {"an empty one", 0644, writeNothing, kSaved, "", "f 1"},
         {"a file not to be read", 0200, writeNew, kSaved, "new", "f 1"},
         {"a file not to be written", 0444, writeNew, kOpenFailed, "old", "f 0"},
         {"a record that fails", 0644, writeHalf, kWriteFailed, "old", "f 0"},
@@ -101,19 +95,11 @@ TEST_F(DurableSaveTest, DealsWithWhateverThePathLeadsTo)
         std::string path;
         DurableSave::Outcome outcome;
     } cases[] = {
-        {folder_ / "folder", kOpenFailed},
-        {folder_ / "folder/", kOpenFailed},
-        {folder_ / "missing/f", kOpenFailed},
-        {folder_ / "folder/file/f", kOpenFailed},
-        {folder_ / "ring", kOpenFailed},
-        {folder_ / std::string(300, 'x'), kOpenFailed},
-        {folder_ / "locked/f", kOpenFailed},
-        {folder_ / "locked/new", kOpenFailed},
-        {folder_ / "lost", kOpenFailed},
-        {folder_ / "dangling", kSaved},
+        {folder_ / "folder", kOpenFailed},   {folder_ / "missing/f", kOpenFailed},
+        {folder_ / "ring", kOpenFailed},     {folder_ / std::string(300, 'x'), kOpenFailed},
+        {folder_ / "locked/f", kOpenFailed}, {folder_ / "locked/new", kOpenFailed},
+        {folder_ / "lost", kOpenFailed},     {folder_ / "dangling", kSaved},
         {"/dev/full", kWriteFailed},
-        {"/dev/null", kSaved},
-        {"", kOpenFailed},
     };
     for (const auto& c : cases) {
         bool isCalled = false;

@@ -108,22 +108,6 @@ TEST(MarketFileTest, AFileCutAnywhereKeepsWhatIsWhole)
     }
 }
 
-TEST(MarketFileTest, ACountThatTheFileDoesNotBearOutEndsWithTheFile)
-{
-    // How many pieces the file has, and which of them end with the wrong number.
-    const std::pair<std::size_t, std::vector<std::size_t>> cases[] = {
-        {6, {0, 1, 2, 3}}, {9, {0, 1, 2, 6}}, {10, {2}}, {11, {1}}, {13, {11}}, {16, {13}}, {16, {0}}};
-    for (const auto& [size, wrong] : cases)
-        for (const char* number : {"FFFFFFFF", "00000080"}) {
-            std::string bytes = pieces(0, size);
-            for (const std::size_t i : wrong)
-                bytes.replace(pieces(0, i + 1).size() - 4, 4, bytesOf(number));
-            Catalogue catalogue;
-            EXPECT_EQ(catalogue.rd(BytesFile(bytes)), -1) << size << " pieces, " << number;
-            EXPECT_EQ(summary(catalogue), kFile[size - 1].holds) << size << " pieces, " << number;
-        }
-}
-
 TEST(MarketFileTest, AnUnknownEventTypeIsSkippedWithoutARecord)
 {
     const std::tuple<const char*, int, unsigned, const char*> cases[] = {
@@ -160,4 +144,22 @@ TEST(MarketFileTest, EachCurrencyOfTheReferencesSymbolBecomesTheReferenceAsItIsR
     EXPECT_EQ(blank.rd(BytesFile(bytesOf("00000000 01000000") + std::string(24, '\0'))), 0);
     EXPECT_EQ(blank.getReferenceCurrency(), nullptr) << "no symbol is not that of a currency without one";
     EXPECT_EQ(written([&blank](FILE* file) { blank.wrt(file, Date()); }).substr(0, 8), bytesOf("00000000 01000000"));
+}
+
+TEST(CompanyEventTest, AnEventThatChangesItsDayStaysWithItsCompanyAndComesLast)
+{
+    Company company;
+    auto* first = new SplitCompanyEvent(&company, Date(3, 5, 1999), 2, 1);
+    auto* second = new SplitCompanyEvent(&company, Date(4, 5, 1999), 3, 1);
+    SplitCompanyEvent alone(nullptr, Date(3, 5, 1999), 2, 1);
+    for (SplitCompanyEvent* event : {first, &alone}) {
+        EXPECT_EQ(event->setDate(Date(5, 5, 1999)), 0);
+        EXPECT_EQ(event->getDate(), Date(5, 5, 1999));
+    }
+    unsigned n;
+    CompanyEvent** events = company.getAllEvents(&n);
+    EXPECT_EQ(std::vector<CompanyEvent*>(events, events + n), (std::vector<CompanyEvent*>{second, first}));
+    Company* linked;
+    EXPECT_EQ(first->getCompany(&linked), 0);
+    EXPECT_EQ(alone.getCompany(&linked), -1);
 }
