@@ -1,7 +1,6 @@
 #include "tests/bench/GeneratedFiles.h"
 
 #include "tests/bench/ChildRun.h"
-#include "tests/bench/Portfolio.h"
 #include "tests/support/Bytes.h"
 #include "tests/support/SmallPortfolio.h"
 

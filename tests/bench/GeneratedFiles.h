@@ -1,5 +1,7 @@
 #pragma once
 
+#include "market/Catalogue.h"
+#include "portfolio/Wallet.h"
 #include "tests/support/ToolRun.h"
 
 #include <map>
@@ -14,6 +16,15 @@ struct DataSize {
     int operations; // a tenth deposits, a tenth transfers, half of them purchases, the rest sales
 
     auto operator<=>(const DataSize&) const = default;
+};
+
+/// A wallet on its market data.
+struct Portfolio {
+    Catalogue catalogue;
+    Wallet wallet; // destroyed first
+
+    /// The last day with quotes, on which the portfolio is valued.
+    static Date lastDay() { return {20, 11, 2026}; }
 };
 
 /// A temporary folder with generated files, which are the same in every run. It is removed in the end.

@@ -1,8 +1,12 @@
-// What loading and valuing cost, for believable amounts of data. Whatever works on files is measured in a child process
-// of its own.
+// What loading, valuing and drawing cost, for believable amounts of data. Whatever works on files is measured in a
+// child process of its own. It needs no screen, only the platform's offscreen mode.
 
 #include "app/PLWindow.h"
+#include "chart/GraphLine.h"
+#include "chart/GraphPoint.h"
+#include "chart/GraphView.h"
 #include "foundation/Today.h"
+#include "market/Quote.h"
 #include "platform/Application.h"
 #include "platform/CheckBox.h"
 #include "platform/Entry.h"
@@ -12,10 +16,10 @@
 #include "tests/bench/ChildRun.h"
 #include "tests/bench/FigureReporter.h"
 #include "tests/bench/GeneratedFiles.h"
-#include "tests/bench/Portfolio.h"
 #include "valuation/Evolution.h"
 #include "valuation/State.h"
 
+#include <cmath>
 #include <cstdlib>
 #include <cstring>
 #include <memory>
@@ -75,14 +79,26 @@ bool walkMarket(Portfolio&, const Files& files)
     return isRead;
 }
 
+template <class Read>
+bool isRead(const std::filesystem::path& path, Read read)
+{
+    FILE* file = std::fopen(path.c_str(), "rb");
+    const int result = read(file);
+    std::fclose(file);
+    return result == 0;
+}
+
 bool loadMarket(Portfolio& portfolio, const Files& files)
 {
-    return portfolio.loadMarket(files.market);
+    return isRead(files.market, [&](FILE* file) { return portfolio.catalogue.rd(file); });
 }
 
 bool load(Portfolio& portfolio, const Files& files)
 {
-    return portfolio.loadMarket(files.market) && portfolio.loadWallet(files.wallet);
+    if (!loadMarket(portfolio, files))
+        return false;
+    portfolio.wallet.setCatalogue(portfolio.catalogue);
+    return isRead(files.wallet, [&](FILE* file) { return portfolio.wallet.rd(file, nullptr); });
 }
 
 bool evolve(Portfolio& portfolio, const Files&)
@@ -187,7 +203,6 @@ template <class Subject>
 void measure(benchmark::State& state, const DataSize& size, double items, bool (*prepare)(Subject&, const Files&),
              bool (*work)(Subject&, const Files&))
 {
-    setenv("QT_QPA_PLATFORM", "offscreen", 0);
     const Files files = folder->files(size);
     Subject* subject = nullptr; // made in each child, and ends with it
     const auto begin = [&] {
@@ -219,6 +234,54 @@ PELORIN_BENCHMARK(BM_Window, switch_page, small(20), 1, load, switchPages);
 PELORIN_BENCHMARK(BM_Window, load_market, kLarge, quotesOf(kLarge), openWindow, loadMarket);
 PELORIN_BENCHMARK(BM_Window, evolve_20_years, small(20), shareStatesOf(small(20)), load, evolve);
 
+/// A price a day that wanders up and down.
+void fill(GraphLine& line, std::int64_t count)
+{
+    Date day(1, 1, 1700);
+    for (std::int64_t i = 0; i < count; ++i, day + 1) {
+        const auto t = static_cast<double>(i);
+        auto* point = new GraphPoint(0, static_cast<float>(std::sin(t * 1e-3) + 0.1 * std::sin(t * 0.7)));
+        point->setDateBased(true);
+        point->setDateX(day);
+        line.addGraphPoint(point);
+    }
+}
+
+void BM_DrawLine(benchmark::State& state)
+{
+    BApplication application("application/x-vnd.Pelorin-bench");
+    auto* window = new BWindow(BRect(0, 0, 780, 360), "chart", B_TITLED_WINDOW, 0); // belongs to itself
+    auto* chart = new GraphView(window->Bounds(), "chart");
+    window->AddChild(chart);
+    GraphLine line;
+    line.setDateBased(true);
+    fill(line, state.range());
+    chart->setXDateBased(true);
+    chart->addGraphElement(&line);
+    window->Show();
+    handle_pending_messages();
+    for (auto _ : state) {
+        chart->Invalidate();
+        chart->Sync();
+    }
+    if (chart->scale() == nullptr)
+        state.SkipWithError("nothing was drawn");
+    window->Quit();
+}
+BENCHMARK(BM_DrawLine)->Arg(5000)->Arg(100000)->Unit(benchmark::kMillisecond);
+
+void BM_FillLine(benchmark::State& state)
+{
+    for (auto _ : state) {
+        GraphLine line;
+        fill(line, state.range());
+        benchmark::DoNotOptimize(line.getMaxDateX());
+        line.clearAll();
+    }
+    state.counters["items"] = static_cast<double>(state.range());
+}
+BENCHMARK(BM_FillLine)->Arg(20000)->Arg(80000)->Unit(benchmark::kMillisecond);
+
 } // namespace
 
 int main(int argc, char** argv)
@@ -226,6 +289,7 @@ int main(int argc, char** argv)
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv))
         return 2;
+    setenv("QT_QPA_PLATFORM", "offscreen", 0);
     folder = std::make_unique<GeneratedFiles>();
     FigureReporter reporter;
     benchmark::RunSpecifiedBenchmarks(&reporter);

@@ -115,18 +115,3 @@ TEST(DateTest, ShiftsChangeTheDateItselfHoweverFarTheyGo)
     EXPECT_EQ(Date(1, 1, 2000) - Date(1, 1, 6'000'000), INT_MIN);
     EXPECT_EQ(Date(31, 12, INT_MIN) - Date(1, 1, INT_MIN), 365);
 }
-
-TEST(DateTest, ABadMonthIsNamedWhereItsLengthCounts)
-{
-    const std::string says = "Bad month...";
-    const std::pair<Date, std::string> cases[] = {{{27, 13, 1999}, "28/13/1999"},
-                                                  {{28, 13, 1999}, says + "29/13/1999"},
-                                                  {{31, 13, 1999}, says + "01/14/1999"},
-                                                  {{31, 0, 1999}, says + "01/01/1999"},
-                                                  {{31, 4, 1999}, "32/04/1999"}};
-    for (const auto& [date, expected] : cases) {
-        testing::internal::CaptureStderr();
-        const std::string next = text(date.getNext());
-        EXPECT_EQ(testing::internal::GetCapturedStderr() + next, expected) << text(date);
-    }
-}

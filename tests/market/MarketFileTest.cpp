@@ -140,10 +140,6 @@ TEST(MarketFileTest, EachCurrencyOfTheReferencesSymbolBecomesTheReferenceAsItIsR
         for (std::size_t i = 0; i < 3; ++i)
             EXPECT_EQ(catalogue.getCurrencies()[i]->getRealQuote(Date(1, 3, 1999)), rates[i]) << reference << i;
     }
-    Catalogue blank;
-    EXPECT_EQ(blank.rd(BytesFile(bytesOf("00000000 01000000") + std::string(24, '\0'))), 0);
-    EXPECT_EQ(blank.getReferenceCurrency(), nullptr) << "no symbol is not that of a currency without one";
-    EXPECT_EQ(written([&blank](FILE* file) { blank.wrt(file, Date()); }).substr(0, 8), bytesOf("00000000 01000000"));
 }
 
 TEST(CompanyEventTest, AnEventThatChangesItsDayStaysWithItsCompanyAndComesLast)

@@ -1,7 +1,5 @@
-#include "net/QuoteHistory.h"
 #include "tests/support/SmallPortfolio.h"
 #include "tests/support/ToolRun.h"
-#include "tools/QuoteFolder.h"
 #include "tools/SampleMarket.h"
 #include "tools/SamplePortfolio.h"
 #include "tools/Valuation.h"
@@ -51,32 +49,6 @@ TEST_F(SampleTest, FilesThatAreThereAreLeftAlone)
     EXPECT_THAT(make("a").out, HasSubstr("a/Companies/Sample: is there and left as it is\n"));
     EXPECT_EQ(folder_.content("a/Companies/Sample"), "mine");
     EXPECT_GT(fs::file_size(folder_ / "a/PortoFolios/Sample"), 1000U);
-}
-
-TEST_F(SampleTest, TablesOfQuotesGoOnWhereTheMarketFileEnds)
-{
-    make("a --date 16/07/2025 --quotes q");
-    EXPECT_THAT(make("a --date 20/07/2025 --quotes q").out, HasSubstr("q: quotes up to 20/07/2025 written\n"));
-    std::ostringstream log;
-    const QuoteFolder served(folder_ / "q", log);
-    const Valuation valuation(folder_ / "a/Companies/Sample", folder_ / "a/PortoFolios/Sample");
-    for (const Market* market : valuation.catalogue().getMarkets())
-        for (const Company* company : all(*market, &Market::getAllCompanies)) {
-            const std::string ticker(company->getAbbreviation().bytes());
-            const std::string page = served.answer("GET /idc/nasdgraph.idc?usymbol=" + ticker + "&umos=03&site=nasdaq");
-            std::vector<DatedPrice> rows;
-            ASSERT_EQ(parseHistoryPage(page, &rows), 0) << ticker << log.str();
-            for (const auto& [day, price] : rows)
-                EXPECT_TRUE(day > Date(16, 7, 2025) || price == company->getRealQuote(day)) << ticker;
-            // Thursday and Friday, and the Sunday itself.
-            ASSERT_GT(rows.size(), 60U);
-            EXPECT_EQ(rows.end()[-4].date, Date(16, 7, 2025));
-            EXPECT_EQ(rows.end()[-2].date, kFriday);
-            EXPECT_EQ(rows.end()[-1].date, kLast);
-            EXPECT_NEAR(rows.end()[-1].price / rows.end()[-4].price, 1, 0.25) << ticker;
-        }
-    folder_.write("a/Companies/Sample", "mine");
-    EXPECT_EQ(make("a --quotes q").err, "pelorin-sample: a/Companies/Sample: cannot be read as a market file\n");
 }
 
 TEST(SampleDataTest, NothingIsEverOverdrawnOrSoldShort)
