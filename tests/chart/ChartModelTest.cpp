@@ -5,9 +5,8 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <initializer_list>
+#include <cmath>
 #include <limits>
-#include <memory>
 #include <vector>
 
 namespace {
@@ -30,13 +29,19 @@ void addAll(Poly& poly, const std::vector<float>& xs)
 }
 
 template <class Poly>
-std::vector<float> xsOf(const Poly& poly)
+std::vector<GraphPoint*> pointsOf(const Poly& poly)
 {
     unsigned count;
     GraphPoint* const* points = poly.getAllGraphPoints(&count);
+    return {points, points + count};
+}
+
+template <class Poly>
+std::vector<float> xsOf(const Poly& poly)
+{
     std::vector<float> xs;
-    for (unsigned i = 0; i < count; ++i)
-        xs.push_back(points[i]->getX());
+    for (const GraphPoint* point : pointsOf(poly))
+        xs.push_back(point->getX());
     return xs;
 }
 
@@ -50,36 +55,34 @@ TEST(GraphElementTest, IsUndefinedUntilThereIsEnoughToDraw)
         addAll(line, {1});
         addAll(polygon, {1});
     }
-    EXPECT_FALSE(GraphPoint().isUndefined());
 }
 
-TEST(GraphLineTest, KeepsItsPointsByX)
+TEST(GraphPolyElementTest, LineKeepsItsPointsByXAndPolygonAsTheyWereAdded)
 {
     GraphLine line;
+    GraphPolygon polygon;
     addAll(line, {3, 1, 2});
+    addAll(polygon, {3, 1, 2});
     EXPECT_EQ(xsOf(line), (std::vector<float>{1, 2, 3}));
-    unsigned count;
-    line.getAllGraphPoints(&count)[0]->setX(2.5F);
+    pointsOf(line)[0]->setX(2.5F);
+    pointsOf(polygon)[1]->setX(9);
     EXPECT_EQ(xsOf(line), (std::vector<float>{2, 2.5F, 3}));
+    EXPECT_EQ(xsOf(polygon), (std::vector<float>{3, 9, 2}));
 }
 
 TEST(GraphLineTest, SortsByDatesThatCountOnlyAfterTheAddition)
 {
     GraphLine line;
     std::vector<GraphPoint*> added;
-    for (const short day : std::initializer_list<short>{30, 10, 20}) {
+    for (const short day : {short{30}, short{10}, short{20}}) {
         added.push_back(new GraphPoint(0, day));
         added.back()->setDateX(Date(day, 6, 2001));
         line.addGraphPoint(added.back());
     }
     for (GraphPoint* point : added)
         point->setDateBased(true);
-    unsigned count;
-    GraphPoint* const* points = line.getAllGraphPoints(&count);
-    EXPECT_EQ(points[0]->getY(), 10);
-    EXPECT_EQ(points[1]->getY(), 20);
-    EXPECT_EQ(line.getMinDateX(), Date(10, 6, 2001));
-    EXPECT_EQ(line.getMaxDateX(), Date(30, 6, 2001));
+    EXPECT_EQ(pointsOf(line)[0]->getY(), 10);
+    EXPECT_EQ(pointsOf(line)[1]->getY(), 20);
 }
 
 TEST(GraphLineTest, PutsPointsThatHaveNoOrderInOne)
@@ -91,41 +94,33 @@ TEST(GraphLineTest, PutsPointsThatHaveNoOrderInOne)
         else
             line.addGraphPoint(new GraphPoint(i % 7 == 0 ? kNaN : static_cast<float>(-i), 0));
     }
-    unsigned count;
-    GraphPoint* const* points = line.getAllGraphPoints(&count);
-    ASSERT_EQ(count, 500U);
-    EXPECT_TRUE(
-        std::is_sorted(points, points + count, [](GraphPoint* a, GraphPoint* b) { return sortPointsByX(&a, &b) < 0; }));
-    const auto isDated = [](const GraphPoint* point) { return point->isDateBased(); };
-    EXPECT_TRUE(std::none_of(points, points + 333, isDated)) << "numbers come first";
-}
-
-TEST(GraphPolygonTest, KeepsTheOrderOfAddition)
-{
-    GraphPolygon polygon;
-    addAll(polygon, {3, 1, 2});
-    unsigned count;
-    polygon.getAllGraphPoints(&count)[1]->setX(9);
-    EXPECT_EQ(xsOf(polygon), (std::vector<float>{3, 9, 2}));
+    const std::vector<GraphPoint*> points = pointsOf(line);
+    const auto dated = std::ranges::find_if(points, &GraphPoint::isDateBased);
+    EXPECT_EQ(dated - points.begin(), 333) << "numbers come first";
+    const auto unordered = std::find_if(points.begin(), dated, [](auto* point) { return std::isnan(point->getX()); });
+    EXPECT_EQ(dated - unordered, 48) << "what is no number is last of them";
+    const auto isBefore = [](GraphPoint* a, GraphPoint* b) { return a->getX() < b->getX(); };
+    EXPECT_TRUE(std::is_sorted(points.begin(), unordered, isBefore));
+    const auto isEarlier = [](GraphPoint* a, GraphPoint* b) { return a->getDateX() < b->getDateX(); };
+    EXPECT_TRUE(std::is_sorted(dated, points.end(), isEarlier));
 }
 
 TEST(GraphPolyElementTest, FindsTheExtremesOfAllPoints)
 {
     const auto check = [](auto&& poly, const char* what) {
-        EXPECT_EQ(poly.getMaxY(), 0) << what << " without points";
-        EXPECT_EQ(poly.getMinY(), 0) << what << " without points";
-        EXPECT_EQ(poly.getMinDateX(), Date()) << what << " without points";
-        EXPECT_EQ(poly.getMaxDateX(), Date()) << what << " without points";
-        for (const short day : std::initializer_list<short>{14, 3, 25, 9})
-            poly.addGraphPoint(datedPoint(Date(day, 1, 2002), static_cast<float>(-day)));
-        EXPECT_EQ(poly.getMinDateX(), Date(3, 1, 2002)) << what;
-        EXPECT_EQ(poly.getMaxDateX(), Date(25, 1, 2002)) << what;
-        EXPECT_EQ(poly.getMinY(), -25) << what;
-        EXPECT_EQ(poly.getMaxY(), -3) << what;
+        SCOPED_TRACE(what);
+        EXPECT_EQ(poly.getMaxY(), 0) << "without points";
+        EXPECT_EQ(poly.getMinDateX(), Date()) << "without points";
+        for (const int day : {14, 3, 25, 9})
+            poly.addGraphPoint(datedPoint(Date(static_cast<short>(day), 1, 2002), static_cast<float>(-day)));
+        EXPECT_EQ(poly.getMinDateX(), Date(3, 1, 2002));
+        EXPECT_EQ(poly.getMaxDateX(), Date(25, 1, 2002));
+        EXPECT_EQ(poly.getMinY(), -25);
+        EXPECT_EQ(poly.getMaxY(), -3);
         poly.clearAll();
         addAll(poly, {4, -2, 8, 1});
-        EXPECT_EQ(poly.getMinX(), -2) << what;
-        EXPECT_EQ(poly.getMaxX(), 8) << what;
+        EXPECT_EQ(poly.getMinX(), -2);
+        EXPECT_EQ(poly.getMaxX(), 8);
     };
     check(GraphLine(), "line");
     check(GraphPolygon(), "polygon");
@@ -134,49 +129,18 @@ TEST(GraphPolyElementTest, FindsTheExtremesOfAllPoints)
 TEST(GraphPointTest, BelongsToOneElementWhichOwnsIt)
 {
     auto* point = new GraphPoint(1, 1);
+    GraphLine line;
+    GraphPolygon polygon;
     GraphPolyElement* owner;
-    {
-        GraphLine line;
-        GraphPolygon polygon;
-        line.addGraphPoint(point);
-        point->setGraphPolyElement(&polygon);
-        EXPECT_EQ(line.getNbrGraphPoints(), 0U) << "left for the polygon";
-        ASSERT_EQ(polygon.getNbrGraphPoints(), 1U);
-        EXPECT_EQ(polygon.removeGraphPoint(point), 0);
-        EXPECT_EQ(point->getGraphPolyElement(&owner), -1);
-        line.addGraphPoint(point);
-        EXPECT_EQ(point->getGraphPolyElement(&owner), 0);
-        EXPECT_EQ(owner, &line);
-        EXPECT_EQ(line.addGraphPoint(nullptr), -1);
-        line.clearAll();
-        EXPECT_EQ(line.getNbrGraphPoints(), 0U);
-    } // a leak or a second destruction shows under AddressSanitizer
-}
-
-TEST(GraphPointTest, ComparesDatesWithDatesAndNumbersWithNumbers)
-{
-    const std::unique_ptr<GraphPoint> early(datedPoint(Date(31, 12, 1999), 0));
-    const std::unique_ptr<GraphPoint> late(datedPoint(Date(1, 1, 2000), 0));
-    const auto low = std::make_unique<GraphPoint>(-1.0F, 0.0F);
-    const auto high = std::make_unique<GraphPoint>(1.0F, 0.0F);
-    const auto none = std::make_unique<GraphPoint>(kNaN, 0.0F);
-    const struct {
-        GraphPoint* a;
-        GraphPoint* b;
-        int order;
-        const char* why;
-    } cases[] = {
-        {early.get(), late.get(), -1, "earlier day"},
-        {late.get(), early.get(), 1, "later day"},
-        {late.get(), late.get(), 0, "same day"},
-        {low.get(), high.get(), -1, "smaller number"},
-        {high.get(), low.get(), 1, "greater number"},
-        {early.get(), high.get(), 0, "date and number"},
-        {high.get(), none.get(), -1, "not a number is last"},
-        {none.get(), low.get(), 1, "not a number is last"},
-    };
-    for (const auto& c : cases)
-        EXPECT_EQ(sortPointsByX(&c.a, &c.b), c.order) << c.why;
+    line.addGraphPoint(point);
+    point->setGraphPolyElement(&polygon);
+    EXPECT_EQ(line.getNbrGraphPoints(), 0U) << "left for the polygon";
+    ASSERT_EQ(polygon.getNbrGraphPoints(), 1U);
+    EXPECT_EQ(polygon.removeGraphPoint(point), 0);
+    EXPECT_EQ(point->getGraphPolyElement(&owner), -1);
+    line.addGraphPoint(point); // a leak or a second destruction shows under AddressSanitizer
+    EXPECT_EQ(point->getGraphPolyElement(&owner), 0);
+    EXPECT_EQ(owner, &line);
 }
 
 } // namespace

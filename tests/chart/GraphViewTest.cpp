@@ -11,6 +11,7 @@
 #include <QWidget>
 
 #include <limits>
+#include <vector>
 
 namespace {
 
@@ -48,37 +49,27 @@ protected:
     GraphView view_{BRect(0, 0, 300, 200), "chart"};
 };
 
-TEST_F(GraphViewTest, RemovesThePointsThatStandAlone)
+TEST_F(GraphViewTest, OwnsAndRemovesOnlyPointsThatStandAlone)
 {
     for (int i = 0; i < 3; ++i)
-        view_.addGraphElement(new GraphPoint(1, 1));
-    GraphLine behind;
-    view_.addGraphElement(&behind);
-    EXPECT_EQ(view_.getNbrGraphElements(), 6U);
-    view_.removeAllGraphPoints();
-    unsigned count;
-    GraphElement* const* elements = view_.getAllGraphElements(&count);
-    ASSERT_EQ(count, 3U);
-    EXPECT_EQ(elements[0], &band_);
-    EXPECT_EQ(elements[1], &line_);
-    EXPECT_EQ(elements[2], &behind);
-}
-
-TEST_F(GraphViewTest, OwnsOnlyPointsThatStandAlone)
-{
+        view_.addGraphElement(new GraphPoint(1, 1)); // a leak shows under AddressSanitizer
+    {
+        GraphLine behind;
+        view_.addGraphElement(&behind);
+        view_.removeAllGraphPoints();
+        unsigned count;
+        GraphElement* const* elements = view_.getAllGraphElements(&count);
+        EXPECT_EQ(std::vector(elements, elements + count), (std::vector<GraphElement*>{&band_, &line_, &behind}));
+    }
+    EXPECT_EQ(view_.getNbrGraphElements(), 2U);
     GraphView* shownBy;
     {
         GraphView other(BRect(0, 0, 10, 10), "other");
         line_.setGraphView(&other);
         EXPECT_EQ(view_.getNbrGraphElements(), 1U) << "left for the other chart";
         other.addGraphElement(new GraphPoint(1, 1));
-    } // a leak shows under AddressSanitizer
-    EXPECT_EQ(line_.getGraphView(&shownBy), -1);
-    {
-        GraphLine line;
-        view_.addGraphElement(&line);
     }
-    EXPECT_EQ(view_.getNbrGraphElements(), 1U);
+    EXPECT_EQ(line_.getGraphView(&shownBy), -1);
 }
 
 TEST_F(GraphViewTest, SaysThatThereIsNoDataAndNothingElse)
@@ -96,14 +87,15 @@ TEST_F(GraphViewTest, SaysThatThereIsNoDataAndNothingElse)
         const QImage drawn = image();
         const QRect text(10, 5, 70, 20);
         const QColor background(kBackground.red, kBackground.green, kBackground.blue);
-        bool hasText = false;
+        int drawnPixels = 0;
         for (int y = 0; y < drawn.height(); ++y)
             for (int x = 0; x < drawn.width(); ++x) {
-                const bool isBackground = drawn.pixelColor(x, y) == background;
-                hasText = hasText || !isBackground;
-                ASSERT_TRUE(isBackground || text.contains(x, y)) << c.why << ": " << x << ", " << y;
+                if (drawn.pixelColor(x, y) == background)
+                    continue;
+                ++drawnPixels;
+                ASSERT_TRUE(text.contains(x, y)) << c.why << ": " << x << ", " << y;
             }
-        EXPECT_TRUE(hasText) << c.why;
+        EXPECT_GT(drawnPixels, 0) << c.why;
         EXPECT_EQ(view_.scale(), nullptr) << c.why;
     }
 }
@@ -128,8 +120,6 @@ TEST_F(GraphViewTest, FindsThePointUnderThePointer)
     EXPECT_EQ(view_.nearestPoint({0, 0}, 1e6), nullptr) << "nothing drawn yet";
     image();
     const BPoint middle = view_.scale()->pixel({5, 2});
-    EXPECT_NEAR(view_.scale()->x(middle.x), 5, 0.01);
-    EXPECT_NEAR(view_.scale()->y(middle.y), 2, 0.01);
     const GraphPoint* found = view_.nearestPoint(middle + BPoint(3, 2), 5);
     ASSERT_NE(found, nullptr);
     EXPECT_EQ(found->getX(), 5);

@@ -13,26 +13,9 @@
 #include <QLineEdit>
 #include <QTest>
 
-/// A window in which a catalogue is kept by hand.
+/// Tests of the commands, with their market data.
 class CatalogueTest : public WindowTest {
 protected:
-    /// A click on a button, with what is typed before it and what the status line says then.
-    struct Step {
-        std::vector<std::pair<const char*, const char*>> fields;
-        const char* button;
-        const char* message;
-    };
-    void follow(const std::vector<Step>& steps)
-    {
-        for (const auto& step : steps) {
-            for (const auto& [field, typed] : step.fields)
-                type(field, typed);
-            clearMessage();
-            click(step.button);
-            EXPECT_EQ(message(), step.message) << step.button;
-        }
-    }
-
     void addCurrency(const char* name, const char* symbol)
     {
         show(kCurrencyPage);
@@ -51,7 +34,7 @@ protected:
     {
         follow({{{{"txtQuoteDate", date}, {"txtQuoteValue", value}}, "btnAddQuote", ""}});
     }
-    /// Two currencies, a market in the first one, and a company with three quotes, which is selected.
+    /// By hand: two currencies, a market in the first one, and a company with three quotes, which is selected.
     void addSmallCatalogue()
     {
         addCurrency("Euro", "EUR");
@@ -63,6 +46,24 @@ protected:
         addQuote("1/3/2024", "10");
         addQuote("11/3/2024", "20");
         addQuote("6/3/2024", "12.5");
+    }
+    /// Not by hand: the euro, which is the reference, and the dollar at half of it; two markets of the name Paris, the
+    /// first with AAA, in dollars, the second with BBB, in euros, at 10 on 01/11/2024.
+    void addTwoMarkets()
+    {
+        auto* euro = new Currency("Euro", "EUR", nullptr);
+        auto* dollar = new Currency("Dollar", "USD", euro);
+        new CurrencyQuote(euro, Date(1, 1, 2020), 1);
+        new CurrencyQuote(dollar, Date(1, 1, 2020), 0.5F);
+        for (Currency* added : {dollar, euro}) {
+            window().catalogue().addCurrency(added);
+            (new Market("Paris"))->setCurrency(added);
+        }
+        window().setReferenceCurrency(euro);
+        const auto markets = window().catalogue().getMarkets();
+        new Company(markets[0], "Alpha", "AAA");
+        new CompanyQuote(new Company(markets[1], "Beta", "BBB"), Date(1, 11, 2024), 10);
+        window().UpdateState();
     }
     /// A purchase of ten shares of the company, on the operation page's list.
     Share* buy(Company* company)
@@ -88,6 +89,4 @@ protected:
         QTest::keyClick(list(name).widget(), Qt::Key_A, Qt::ControlModifier);
         settle();
     }
-    /// Whether the field tells that it does not understand its text.
-    bool isMarked(const char* field) { return !find<QLineEdit>(field).toolTip().isEmpty(); }
 };

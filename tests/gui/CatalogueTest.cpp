@@ -1,4 +1,5 @@
-// The company and the currency page: a catalogue kept by hand. Quotes are in QuoteTest.cpp.
+// The company and the currency page: a catalogue kept by hand. Quotes are in QuoteTest.cpp, refusals in
+// RefusalTest.cpp.
 
 #include "market/NoteCompanyEvent.h"
 #include "tests/gui/CatalogueFixture.h"
@@ -12,71 +13,6 @@ namespace {
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::SizeIs;
-
-TEST_F(CatalogueTest, CompanyPageChecksInOrder)
-{
-    show(kCompanyPage);
-    follow({
-        {{}, "btnAddMarket", "Please specify a market name."},
-        {{{"txtMarketName", "Paris"}}, "btnAddMarket", "Please specify a currency representation."},
-        {{{"txtMarketCurrencyRepresentation", "EUR"}}, "btnAddMarket", "Unknown currency..."},
-        {{}, "btnUpdateMarket", ""},
-        {{}, "btnAddCompany", "Please first create a market."},
-        {{}, "btnUpdateCompany", ""},
-        {{}, "btnSetLastThreeMonths", ""},
-        {{}, "btnAddQuote", "Please specify a date."},
-        {{{"txtQuoteDate", "1/1/2024"}}, "btnAddQuote", "You must first select a company"},
-        {{{"txtQuoteDate", ""}}, "btnUpdateQuote", "You must first select a quote"},
-        {{}, "btnRemoveQuote", ""},
-        {{}, "btnSplitQuotes", "Please specify a factor (ex: 1:2)"},
-        {{{"txtSplitRangeNum", "1"}, {"txtSplitRangeDenum", "0"}},
-         "btnSplitQuotes",
-         "Please specify a factor (ex: 1:2)"},
-        {{{"txtSplitRangeDenum", "2"}}, "btnSplitQuotes", ""},
-        {{}, "btnAddCompanyEvent", "You must first select a company"},
-        {{}, "btnUpdateCompanyEvent", "Please specify a date."},
-        {{{"txtCompanyEventDate", "1/1/2024"}},
-         "btnUpdateCompanyEvent",
-         "Please select a company event if you want to update."},
-        {{}, "btnRemoveCompanyEvent", ""},
-    });
-    EXPECT_THAT(alerts(), IsEmpty());
-    addSmallCatalogue();
-    follow({
-        {{{"txtAbbreviation", ""}}, "btnAddCompany", "Please specify an abbreviation for your company"},
-        {{{"txtCompanyEventDate", "31/2/2024"}}, "btnAddCompanyEvent", "Please specify a date."},
-    });
-    select("lstQuotes", 0);
-    follow({{{{"txtQuoteDate", "99"}}, "btnUpdateQuote", "Please specify a date."}});
-    EXPECT_THAT(rows("lstQuotes"), ElementsAre("01/03/2024\t10.00", "06/03/2024\t12.50", "11/03/2024\t20.00"));
-    EXPECT_THAT(rows("lstCompanies"), SizeIs(1));
-    EXPECT_THAT(rows("lstCompanyEvents"), IsEmpty());
-}
-
-TEST_F(CatalogueTest, CurrencyPageChecksInOrder)
-{
-    const char* incomplete = "Please specify a currency name and representation.";
-    show(kCurrencyPage);
-    follow({
-        {{}, "btnAddCurrency", incomplete},
-        {{{"txtCurrencyName", "Euro"}}, "btnAddCurrency", incomplete},
-        {{{"txtCurrencyName", ""}, {"txtCurrencyRepresentation", "EUR"}}, "btnAddCurrency", incomplete},
-        {{}, "btnUpdateCurrency", ""},
-        {{}, "btnSetReferenceCurrency", "Please select a currency."},
-        {{}, "btnAddQuote", "Please specify a date."},
-        {{{"txtQuoteDate", "1.1.2024"}}, "btnAddQuote", "You must first select a currency"},
-        {{}, "btnUpdateQuote", "You must first select a quote"},
-        {{}, "btnRemoveQuote", ""},
-    });
-    EXPECT_THAT(rows("lstCurrencies"), IsEmpty());
-    addCurrency("Euro", "EUR");
-    follow({{{}, "btnRemoveCurrency", "You may not remove the last currency..."}});
-    addQuote("1/1/2024", "1");
-    select("lstQuotes", 0);
-    follow({{{{"txtQuoteDate", ""}}, "btnUpdateQuote", "Please specify a date."}});
-    EXPECT_THAT(rows("lstQuotes"), ElementsAre("01/01/2024\t1.00"));
-    EXPECT_THAT(alerts(), IsEmpty());
-}
 
 TEST_F(CatalogueTest, CatalogueByHandIsSavedAndComesBackTheSame)
 {
@@ -112,19 +48,23 @@ TEST_F(CatalogueTest, CatalogueByHandIsSavedAndComesBackTheSame)
     EXPECT_EQ(text("txtReferenceCurrencyName"), "Euro");
     select("lstCurrencies", 0);
     EXPECT_THAT(rows("lstMarkets"), ElementsAre("Paris\tEUR\t1"));
+    EXPECT_EQ(text("txtCurrencyName") + ' ' + text("txtCurrencyRepresentation"), "Euro EUR");
     click("btnSaveMarket");
     EXPECT_EQ(contentOf(folder() + "/Companies/ByHand"), saved);
+    select("lstCurrencies", 1);
+    addQuote("11/1/2024", "3");
+    select("lstCurrencies", 0);
+    select("lstCurrencies", 1);
+    show(kCompanyPage);
+    EXPECT_EQ(text("txtRelativeDailyChange"), "3.3333 %") << "of the currency that was selected last";
 }
 
 TEST_F(CatalogueTest, EventFieldsFollowTheKindAndAnUpdateTakesItFromTheMenu)
 {
     addSmallCatalogue();
     EXPECT_TRUE(isVisible("txtEventSplitRangeNum") && !isVisible("txtCompanyEventTitle"));
-    EXPECT_EQ(text("txtEventSplitRangeNum") + ":" + text("txtEventSplitRangeDenum"), "1:2");
     follow({{{{"txtCompanyEventDate", "1/4/2024"}, {"txtEventSplitRangeNum", "99999"}}, "btnAddCompanyEvent", ""}});
     EXPECT_THAT(rows("lstCompanyEvents"), ElementsAre("01/04/2024\tSplit\t32767 : 2"));
-    EXPECT_EQ(list("lstCompanyEvents").CurrentSelection(), 0);
-
     choose("companyEventType", "Note");
     EXPECT_TRUE(!isVisible("txtEventSplitRangeNum") && isVisible("txtCompanyEventText"));
     follow({{{{"txtCompanyEventDate", "9/9/2024"}, {"txtCompanyEventTitle", "New"}}, "btnUpdateCompanyEvent", ""}});
@@ -132,14 +72,11 @@ TEST_F(CatalogueTest, EventFieldsFollowTheKindAndAnUpdateTakesItFromTheMenu)
     follow({{{{"txtCompanyEventTitle", "Newer"}}, "btnUpdateCompanyEvent", ""},
             {{{"txtCompanyEventDate", "1/1/2024"}, {"txtCompanyEventTitle", "Old"}}, "btnAddCompanyEvent", ""}});
     EXPECT_THAT(rows("lstCompanyEvents"), ElementsAre("01/01/2024\tNote\tOld", "01/04/2024\tNote\tNewer"));
-    EXPECT_EQ(text("txtCompanyEventTitle"), "Old") << "the new one is selected";
 
-    select("lstCompanyEvents", 0, true); // now none is
-    EXPECT_EQ(text("txtCompanyEventDate"), "");
-    EXPECT_EQ(text("txtCompanyEventTitle"), " ");
+    select("lstCompanyEvents", 0, true); // the new one was, and now none is
+    EXPECT_EQ(text("txtCompanyEventDate") + text("txtCompanyEventTitle"), " ");
     selectAll("lstCompanyEvents");
     click("btnRemoveCompanyEvent");
-    EXPECT_THAT(rows("lstCompanyEvents"), IsEmpty());
     EXPECT_EQ(company()->getNbrEvents(), 0U);
 }
 
@@ -183,10 +120,10 @@ TEST_F(CatalogueTest, RemovalsAskAndTakeTheSharesAlong)
     const struct {
         const char* button;
         const char* question;
-        std::size_t markets, companies;
+        std::size_t markets;
     } cases[] = {
-        {"btnRemoveCompany", "This will delete all attached share operations...", 1, 0},
-        {"btnRemoveMarket", "This will delete all attached companies and share operations...", 0, 0},
+        {"btnRemoveCompany", "This will delete all attached share operations...", 1},
+        {"btnRemoveMarket", "This will delete all attached companies and share operations...", 0},
     };
     for (const auto& c : cases) {
         restart();
@@ -199,86 +136,52 @@ TEST_F(CatalogueTest, RemovalsAskAndTakeTheSharesAlong)
         click(c.button);
         EXPECT_THAT(alerts(), ElementsAre(c.question, c.question));
         EXPECT_EQ(wallet().getNbrShares(), 0U);
-        EXPECT_EQ(wallet().getAccount(0)->getNbrOperations(), 0U);
         EXPECT_THAT(rows("lstMarkets"), SizeIs(c.markets));
-        EXPECT_THAT(rows("lstCompanies"), SizeIs(c.companies));
-        EXPECT_THAT(rows("lstQuotes"), IsEmpty());
-        show(kOperationPage);
-        EXPECT_THAT(rows("lstOperations"), IsEmpty());
-        show(kCompanyPage);
+        EXPECT_THAT(rows("lstCompanies"), IsEmpty());
         answerNextAlert("Continue"); // nothing is selected now
         click("btnRemoveCompany");
-        EXPECT_EQ(message(), "");
         EXPECT_THAT(alerts(), SizeIs(1));
+        show(kOperationPage);
+        EXPECT_THAT(rows("lstOperations"), IsEmpty());
     }
 }
 
-TEST_F(CatalogueTest, FirstCurrencyIsTheReferenceAndAnotherOneRebasesTheRates)
-{
-    addSmallCatalogue();
-    buy(company());
-    EXPECT_EQ(window().getReferenceCurrency(), currency(0));
-    show(kPortoFolioPage);
-    const std::string value = text("txtTotalValue");
-    show(kCurrencyPage);
-    select("lstCurrencies", 0);
-    click("btnSetReferenceCurrency");
-    EXPECT_EQ(currency(1)->getRealQuote(Date(1, 1, 2024)), 2) << "it was the reference";
-    select("lstCurrencies", 1);
-    EXPECT_THAT(rows("lstQuotes"), ElementsAre("01/01/2024\t2.00"));
-    click("btnSetReferenceCurrency");
-    EXPECT_EQ(text("txtReferenceCurrencyName"), "Dollar");
-    EXPECT_THAT(rows("lstQuotes"), ElementsAre("01/01/2024\t1.00"));
-    EXPECT_THAT(rows("lstCurrencies"), ElementsAre("Euro\tEUR\t0.50\t01/01/2024", "Dollar\tUSD\t1.00\t01/01/2024"));
-    show(kPortoFolioPage);
-    EXPECT_NE(text("txtTotalValue"), value) << "it is in the new reference";
-}
-
-TEST_F(CatalogueTest, RemovedReferenceHandsOverToTheFirstAndTakesItsMarketsAlong)
+TEST_F(CatalogueTest, AnotherReferenceRebasesTheRatesAndARemovedOneHandsOver)
 {
     addSmallCatalogue();
     addCurrency("Pound", "GBP");
     addQuote("1/1/2024", "4");
     buy(company());
+    show(kPortoFolioPage);
+    const std::string value = text("txtTotalValue");
+    show(kCurrencyPage);
+    select("lstCurrencies", 1);
+    click("btnSetReferenceCurrency");
+    EXPECT_EQ(text("txtReferenceCurrencyName"), "Dollar");
+    EXPECT_THAT(rows("lstQuotes"), ElementsAre("01/01/2024\t1.00"));
+    show(kPortoFolioPage);
+    EXPECT_NE(text("txtTotalValue"), value) << "it is in the new reference";
+
+    show(kCurrencyPage);
+    select("lstCurrencies", 0);
+    click("btnSetReferenceCurrency");
     answerNextAlert("Cancel");
     click("btnRemoveCurrency");
-    EXPECT_EQ(window().catalogue().getNbrCurrencies(), 3U);
-    select("lstCurrencies", 0);
+    EXPECT_THAT(rows("lstCurrencies"), SizeIs(3));
     answerNextAlert("Continue");
     click("btnRemoveCurrency");
     EXPECT_THAT(alerts(), testing::Each("This will delete all attached markets, companies and accounts..."));
     EXPECT_THAT(rows("lstCurrencies"), ElementsAre("Pound\tGBP\t1.00\t01/01/2024", "Dollar\tUSD\t0.50\t01/01/2024"))
         << "the last one comes first now, and the rates are in it";
     EXPECT_EQ(text("txtReferenceCurrencyName"), "Pound");
-    EXPECT_THAT(rows("lstMarkets"), IsEmpty());
     EXPECT_EQ(wallet().getNbrShares(), 0U);
-    ASSERT_EQ(wallet().getNbrAccounts(), 1U) << "the account stays, without a currency";
     Currency* stored;
-    EXPECT_EQ(wallet().getAccount(0)->getCurrency(&stored), -1);
-    currency(1)->getReferenceCurrency(&stored);
-    EXPECT_EQ(stored, currency(0)) << "nobody stores the one that is gone";
-    show(kCompanyPage);
-    EXPECT_THAT(rows("lstMarkets"), IsEmpty());
+    EXPECT_EQ(wallet().getAccount(0)->getCurrency(&stored), -1) << "the account stays, without a currency";
 
     window().RemoveAllCurrencies();
-    EXPECT_EQ(window().catalogue().getNbrCurrencies(), 0U);
     EXPECT_EQ(window().getReferenceCurrency(), nullptr);
     addCurrency("Euro", "EUR");
     EXPECT_EQ(text("txtReferenceCurrencyName"), "Euro");
-}
-
-TEST_F(CatalogueTest, FiguresOfASelectedCurrencyShowOnTheCompanyPage)
-{
-    addSmallCatalogue();
-    show(kCurrencyPage);
-    select("lstCurrencies", 1);
-    addQuote("11/1/2024", "3");
-    select("lstCurrencies", 0);
-    select("lstCurrencies", 1);
-    EXPECT_EQ(text("txtRelativeDailyChange"), "");
-    show(kCompanyPage);
-    EXPECT_EQ(text("txtRelativeDailyChange"), "3.3333 %");
-    EXPECT_EQ(text("txtDiffWithAverage"), "0.00 %");
 }
 
 } // namespace

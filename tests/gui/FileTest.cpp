@@ -19,26 +19,24 @@ using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::SizeIs;
 
-constexpr const char* kMarketsQuestion = "This will delete all unsaved changes to the wallet and the markets...";
-constexpr const char* kWalletQuestion = "This will delete all unsaved changes to the wallet...";
-
 class FileTest : public WindowTest {
 protected:
-    void loadMarkets(const std::string& path)
+    void loadMarkets(const std::string& path) { load(kCompanyPage, "btnLoadMarket", path); }
+    void loadWallet(const std::string& path) { load(kPortoFolioPage, "btnLoadPortoFolio", path); }
+    void load(Page page, const char* button, const std::string& path)
     {
-        show(kCompanyPage);
-        if (window().catalogue().getNbrCurrencies() > 0)
+        show(page);
+        if (page == kPortoFolioPage || window().catalogue().getNbrCurrencies() > 0)
             answerNextAlert("Continue");
-        click("btnLoadMarket");
+        click(button);
         answerPanel("OpenPanel", path);
     }
-
-    void loadWallet(const std::string& path)
+    void receive(const BMessage& refs, const std::string& expected)
     {
-        show(kPortoFolioPage);
-        answerNextAlert("Continue");
-        click("btnLoadPortoFolio");
-        answerPanel("OpenPanel", path);
+        clearMessage();
+        window().PostMessage(&refs);
+        settle();
+        EXPECT_EQ(message(), expected);
     }
 
     static void write(const std::string& path, const std::string& content)
@@ -52,21 +50,16 @@ TEST_F(FileTest, SampleComesInThroughTheButtonsAndIsSavedUnchanged)
     loadSample();
     const ToolRun valued(PELORIN_VALUE, "'" + marketFile() + "' '" + walletFile() + "' --date 21/11/2024",
                          TemporaryFolder("pelorin-gui-value"));
-    const std::string shown = text("txtTotalValue");
-    EXPECT_THAT(valued.out, testing::HasSubstr(shown.substr(0, shown.find(' '))));
-    const std::string market = contentOf(marketFile());
-    const std::string portfolio = contentOf(walletFile());
-
-    click("btnSavePortoFolio");
-    EXPECT_EQ(message(), "Wallet successfully saved...");
-    show(kCurrencyPage);
-    click("btnSaveMarket");
-    EXPECT_EQ(message(), "Currencies successfully saved...");
-    // The stamps of the day are all that differs: the records are as long as before, and load to the same again.
-    EXPECT_EQ(contentOf(marketFile()).size(), market.size());
-    EXPECT_EQ(contentOf(walletFile()).size(), portfolio.size());
-    show(kPortoFolioPage);
     const std::string total = text("txtTotalValue");
+    EXPECT_THAT(valued.out, testing::HasSubstr(total.substr(0, total.find(' '))));
+    const auto market = std::filesystem::file_size(marketFile());
+    const auto portfolio = std::filesystem::file_size(walletFile());
+    follow({{{}, "btnSavePortoFolio", "Wallet successfully saved..."}});
+    show(kCurrencyPage);
+    follow({{{}, "btnSaveMarket", "Currencies successfully saved..."}});
+    // The stamps of the day are all that differs: the records are as long as before, and load to the same again.
+    EXPECT_EQ(std::filesystem::file_size(marketFile()), market);
+    EXPECT_EQ(std::filesystem::file_size(walletFile()), portfolio);
     restart();
     loadMarkets(marketFile());
     loadWallet(walletFile());
@@ -83,45 +76,36 @@ TEST_F(FileTest, LoadingAsksWhereSomethingCouldBeLost)
     answerPanel("OpenPanel", "");
     EXPECT_EQ(window().catalogue().getNbrCurrencies(), 0U);
 
+    const std::pair<Page, const char*> buttons[] = {{kCurrencyPage, "btnLoadMarket"},
+                                                    {kPortoFolioPage, "btnLoadPortoFolio"}};
     loadMarkets(marketFile());
-    show(kCurrencyPage);
-    answerNextAlert("Cancel");
-    click("btnLoadMarket");
-    EXPECT_THAT(alerts(), ElementsAre(kMarketsQuestion));
-    EXPECT_FALSE(isPanelOpen("OpenPanel"));
-
-    show(kPortoFolioPage);
-    answerNextAlert("Cancel");
-    click("btnLoadPortoFolio");
-    EXPECT_THAT(alerts(), ElementsAre(kWalletQuestion)) << "also of an empty portfolio";
-    EXPECT_FALSE(isPanelOpen("OpenPanel"));
+    for (const auto& [page, button] : buttons) {
+        show(page);
+        answerNextAlert("Cancel");
+        click(button);
+        EXPECT_EQ(panelFolder("OpenPanel"), "");
+    }
+    EXPECT_THAT(alerts(), ElementsAre("This will delete all unsaved changes to the wallet and the markets...",
+                                      "This will delete all unsaved changes to the wallet..."))
+        << "also of an empty portfolio";
     answerNextAlert("Continue");
     click("btnLoadPortoFolio");
     EXPECT_EQ(panelFolder("OpenPanel"), folder() + "/PortoFolios");
     answerPanel("OpenPanel", "");
 }
 
-TEST_F(FileTest, MarketsLoadedTwiceHaveEveryCurrencyTwiceAndEveryMarketOnce)
+TEST_F(FileTest, MarketLoadThrowsThePortfolioAwayAndHasEveryCurrencyTwiceAndEveryMarketOnce)
 {
-    makeSample();
-    loadMarkets(marketFile());
+    loadSample();
     const unsigned currencies = window().catalogue().getNbrCurrencies();
     const auto markets = window().catalogue().getMarkets().size();
     ASSERT_GT(currencies, 1U);
-    loadMarkets(marketFile());
-    EXPECT_THAT(alerts(), ElementsAre(kMarketsQuestion));
-    EXPECT_EQ(window().catalogue().getNbrCurrencies(), 2 * currencies);
-    EXPECT_EQ(window().catalogue().getMarkets().size(), markets);
-    EXPECT_EQ(message(), "Markets successfully loaded...");
-}
-
-TEST_F(FileTest, MarketLoadThrowsThePortfolioAwayAndPutsItsParametersBack)
-{
-    loadSample();
     show(kParameterPage);
     enter("txtBuyCost", "12.5");
-    show(kCompanyPage);
     loadMarkets(marketFile());
+    EXPECT_EQ(message(), "Markets successfully loaded...");
+    EXPECT_EQ(window().catalogue().getNbrCurrencies(), 2 * currencies);
+    EXPECT_EQ(window().catalogue().getMarkets().size(), markets);
     EXPECT_EQ(wallet().getNbrAccounts(), 0U);
     show(kParameterPage);
     EXPECT_EQ(text("txtBuyCost"), "29.95");
@@ -134,24 +118,20 @@ TEST_F(FileTest, FileThatCannotBeOpenedLeavesEverything)
     loadSample();
     const auto currencies = window().catalogue().getNbrCurrencies();
     BMessage refs(B_REFS_RECEIVED);
-    window().PostMessage(&refs);
-    settle();
-    EXPECT_EQ(message(), "ERROR GETTING REF");
-
+    receive(refs, "ERROR GETTING REF");
     const entry_ref missing{folder(), "missing"};
     refs.AddRef("refs", &missing);
     for (const Page page : {kCompanyPage, kPortoFolioPage}) {
         show(page);
-        clearMessage();
-        window().PostMessage(&refs);
-        settle();
-        EXPECT_EQ(message(), "OPEN FAILED: " + folder() + "/missing");
+        receive(refs, "OPEN FAILED: " + folder() + "/missing");
     }
-    show(kParameterPage);
-    clearMessage();
-    window().PostMessage(&refs);
-    settle();
-    EXPECT_EQ(message(), "") << "this page has no files";
+    for (const Page page : {kOperationPage, kParameterPage}) { // which have no files
+        show(page);
+        receive(refs, "");
+        for (const uint32 code : {'CBLd', 'WBLd', 'CBSv', 'WBSv'})
+            post(code);
+        EXPECT_EQ(panelFolder("OpenPanel") + panelFolder("SavePanel") + message(), "");
+    }
     EXPECT_EQ(window().catalogue().getNbrCurrencies(), currencies);
     EXPECT_GT(wallet().getNbrAccounts(), 0U);
 }
@@ -166,8 +146,7 @@ TEST_F(FileTest, DamagedMarketFileKeepsWhatWasReadAndIsNotSavedOver)
     EXPECT_EQ(message(), "Failed to load the markets");
     EXPECT_GT(window().catalogue().getNbrCurrencies(), 0U);
     click("btnSaveMarket");
-    EXPECT_TRUE(isPanelOpen("SavePanel")) << "no path is known to save to";
-    EXPECT_EQ(panelFolder("SavePanel"), folder() + "/Companies");
+    EXPECT_EQ(panelFolder("SavePanel"), folder() + "/Companies") << "no path is known to save to";
     answerPanel("SavePanel", "");
     EXPECT_EQ(contentOf(damaged).size(), whole.size() / 2);
 
@@ -179,7 +158,7 @@ TEST_F(FileTest, DamagedMarketFileKeepsWhatWasReadAndIsNotSavedOver)
     EXPECT_EQ(message(), "Currencies successfully saved...");
     EXPECT_EQ(contentOf(marketFile()), whole);
     click("btnSaveMarket");
-    EXPECT_FALSE(isPanelOpen("SavePanel"));
+    EXPECT_EQ(panelFolder("SavePanel"), "");
 }
 
 TEST_F(FileTest, DamagedPortfolioGivesAnEmptyOneAndTheVersionSavedOverIsKept)
@@ -204,42 +183,17 @@ TEST_F(FileTest, DamagedPortfolioGivesAnEmptyOneAndTheVersionSavedOverIsKept)
 TEST_F(FileTest, ReinitForgetsThePathAndAsksForAName)
 {
     loadSample();
-    clearMessage();
-    click("btnReinitPortoFolio");
-    EXPECT_EQ(message(), "");
-    EXPECT_THAT(alerts(), IsEmpty());
+    follow({{{}, "btnReinitPortoFolio", ""}});
     EXPECT_EQ(wallet().getNbrAccounts(), 0U);
     EXPECT_EQ(text("txtTotalDeposit"), "0.00 EUR");
     click("btnSavePortoFolio");
     EXPECT_EQ(panelFolder("SavePanel"), folder() + "/PortoFolios");
     answerPanel("SavePanel", "New");
     EXPECT_EQ(message(), "Wallet successfully saved...");
-    EXPECT_TRUE(std::filesystem::exists(folder() + "/PortoFolios/New"));
-    click("btnSavePortoFolio"); // its path is known now
-    EXPECT_FALSE(isPanelOpen("SavePanel"));
-}
-
-TEST_F(FileTest, SaveThatCannotOpenItsFileSaysSo)
-{
-    loadSample();
-    std::filesystem::remove(walletFile());
-    std::filesystem::create_directory(walletFile());
-    click("btnSavePortoFolio");
-    EXPECT_EQ(message(), "Failed to open the file.");
-}
-
-TEST_F(FileTest, PagesWithoutFilesDoNothing)
-{
-    loadSample();
-    for (const Page page : {kOperationPage, kParameterPage}) {
-        show(page);
-        clearMessage();
-        for (const uint32 code : {'CBLd', 'WBLd', 'CBSv', 'WBSv'})
-            post(code);
-        EXPECT_FALSE(isPanelOpen("OpenPanel"));
-        EXPECT_FALSE(isPanelOpen("SavePanel"));
-        EXPECT_EQ(message(), "");
-    }
+    const std::string file = folder() + "/PortoFolios/New";
+    EXPECT_TRUE(std::filesystem::remove(file));
+    std::filesystem::create_directory(file);
+    follow({{{}, "btnSavePortoFolio", "Failed to open the file."}}); // its path is known now
 }
 
 } // namespace

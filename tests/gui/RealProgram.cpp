@@ -1,151 +1,89 @@
 #include "tests/gui/RealProgram.h"
 
-#include <cerrno>
+#include <chrono>
 #include <csignal>
-#include <cstdio>
-#include <cstdlib>
-#include <fcntl.h>
 #include <stdexcept>
 #include <sys/prctl.h>
-#include <sys/wait.h>
 #include <thread>
 #include <unistd.h>
 
-// Last, because it names everyday words as macros.
-#include <X11/Xlib.h>
-
 namespace {
 
-using std::chrono::milliseconds;
-
 constexpr QPoint kWindowPlace(50, 50); // where the program puts its window; without a desktop it has no border
-constexpr milliseconds kPause(20);
-constexpr int kPatience = 1500; // pauses until something that does not come is given up: 30 s, for a busy machine
-
-void breathe()
-{
-    std::this_thread::sleep_for(kPause);
-}
+constexpr std::chrono::milliseconds kPause(20);
+constexpr std::chrono::milliseconds kPatience(60000); // for a busy machine
 
 template <class Condition>
 void await(const std::string& what, Condition isMet)
 {
-    for (int i = 0; i < kPatience; ++i) {
-        if (isMet())
-            return;
-        breathe();
+    const auto end = std::chrono::steady_clock::now() + kPatience;
+    while (!isMet()) {
+        if (std::chrono::steady_clock::now() > end)
+            throw std::runtime_error("waited in vain for " + what);
+        std::this_thread::sleep_for(kPause);
     }
-    throw std::runtime_error("waited in vain for " + what);
-}
-
-/// Asks a window to close, as a desktop's close button does.
-void closeWindow(const std::string& displayName, unsigned long window)
-{
-    Display* display = XOpenDisplay(displayName.c_str());
-    if (display == nullptr)
-        throw std::runtime_error("no connection to " + displayName);
-    XEvent event = {};
-    event.xclient.type = ClientMessage;
-    event.xclient.window = window;
-    event.xclient.message_type = XInternAtom(display, "WM_PROTOCOLS", False);
-    event.xclient.format = 32;
-    event.xclient.data.l[0] = static_cast<long>(XInternAtom(display, "WM_DELETE_WINDOW", False));
-    XSendEvent(display, window, False, NoEventMask, &event);
-    XCloseDisplay(display);
-}
-
-/// Has this child process end when the test does, however that comes about.
-void endWithTest()
-{
-    prctl(PR_SET_PDEATHSIG, SIGKILL);
-}
-
-void stop(pid_t process, int signal)
-{
-    if (process <= 0)
-        return;
-    kill(process, signal);
-    waitpid(process, nullptr, 0);
 }
 
 } // namespace
 
-RealProgram::RealProgram(const std::string& program, const std::string& home)
+RealProgram::Child::Child()
 {
-    startServer();
-    startProgram(program, home);
+    setProcessChannelMode(ForwardedErrorChannel);
+    setChildProcessModifier([] { prctl(PR_SET_PDEATHSIG, SIGKILL); });
+}
+
+RealProgram::Child::~Child()
+{
+    terminate(); // an X server that is killed leaves its lock behind
+    if (!waitForFinished())
+        kill();
+}
+
+void RealProgram::Child::startIt(const std::string& program, const QStringList& arguments)
+{
+    start(QString::fromStdString(program), arguments);
+    if (!waitForStarted(kPatience.count()))
+        throw std::runtime_error(program + " does not start");
+}
+
+RealProgram::RealProgram(const std::string& program, const std::string& home) : display_(startServer())
+{
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    // The X keyboard library copies parts of texts that have no end, which a strict check takes for a mistake.
+    environment.insert("ASAN_OPTIONS", environment.value("ASAN_OPTIONS") + ":strict_string_checks=0");
+    environment.insert("DISPLAY", QString::fromStdString(display_));
+    environment.insert("QT_QPA_PLATFORM", "xcb");
+    environment.insert("HOME", QString::fromStdString(home));
+    environment.remove("XDG_CONFIG_HOME");
+    program_.setProcessEnvironment(environment);
+    program_.startIt(program, {});
     awaitWindow("Pelorin");
 }
 
-RealProgram::~RealProgram()
+/// @return the name of its display.
+std::string RealProgram::startServer()
 {
-    stop(program_, SIGKILL);
-    stop(server_, SIGTERM);
-}
-
-void RealProgram::startServer()
-{
-    int ends[2];
-    if (pipe(ends) != 0)
-        throw std::runtime_error("no pipe");
     // Servers that look for a free number at the same time take each other's socket away.
-    const std::string own = ":" + std::to_string(100 + getpid() % 50000);
-    server_ = fork();
-    if (server_ == 0) {
-        endWithTest();
-        const std::string end = std::to_string(ends[1]);
-        execlp("Xvfb", "Xvfb", own.c_str(), "-displayfd", end.c_str(), "-screen", "0", "1000x900x24", "-nolisten",
-               "tcp", static_cast<char*>(nullptr));
-        _exit(127);
-    }
-    close(ends[1]);
-    // It tells its number when it is ready.
-    char number[16] = {};
-    const auto length = read(ends[0], number, sizeof number - 1);
-    close(ends[0]);
-    if (length <= 0)
+    const QString own = QString(":%1").arg(100 + getpid() % 50000);
+    server_.startIt("Xvfb", {own, "-displayfd", "1", "-screen", "0", "1000x900x24", "-nolisten", "tcp"});
+    if (!server_.waitForReadyRead(kPatience.count())) // it tells its number when it is ready
         throw std::runtime_error("Xvfb does not start");
-    display_ = ":" + std::to_string(std::atoi(number));
+    return own.toStdString();
 }
 
-void RealProgram::startProgram(const std::string& program, const std::string& home)
+std::string RealProgram::run(const std::string& command) const
 {
-    program_ = fork();
-    if (program_ != 0)
-        return;
-    endWithTest();
-    // The X keyboard library copies parts of texts that have no end, which a strict check takes for a mistake.
-    const char* options = getenv("ASAN_OPTIONS");
-    setenv("ASAN_OPTIONS", ((options != nullptr ? options : "") + std::string(":strict_string_checks=0")).c_str(), 1);
-    setenv("DISPLAY", display_.c_str(), 1);
-    setenv("QT_QPA_PLATFORM", "xcb", 1);
-    setenv("HOME", home.c_str(), 1);
-    unsetenv("XDG_CONFIG_HOME");
-    execl(program.c_str(), program.c_str(), static_cast<char*>(nullptr));
-    _exit(127);
-}
-
-std::string RealProgram::run(const std::string& command)
-{
-    FILE* pipe = popen((command + " 2>/dev/null").c_str(), "r");
-    if (pipe == nullptr)
-        throw std::runtime_error("cannot run " + command);
-    std::string output;
-    char block[256];
-    while (const auto n = fread(block, 1, sizeof block, pipe))
-        output.append(block, n);
-    pclose(pipe);
-    return output;
-}
-
-std::string RealProgram::runOnDisplay(const std::string& command) const
-{
-    return run("DISPLAY=" + display_ + " " + command);
+    QProcess shell;
+    shell.start("sh", {"-c", QString::fromStdString("export DISPLAY=" + display_ + "; " + command)});
+    if (!shell.waitForFinished(kPatience.count()))
+        throw std::runtime_error("waited in vain for " + command);
+    std::this_thread::sleep_for(kPause);
+    return shell.readAllStandardOutput().toStdString();
 }
 
 std::string RealProgram::findWindow(const std::string& title) const
 {
-    const std::string found = runOnDisplay("xdotool search --onlyvisible --name '^" + title + "$'");
+    const std::string found = run("xdotool search --onlyvisible --name '^" + title + "$'");
     return found.substr(0, found.find('\n'));
 }
 
@@ -153,14 +91,10 @@ void RealProgram::awaitWindow(const std::string& title)
 {
     std::string window;
     await("the window " + title, [&] { return !(window = findWindow(title)).empty(); });
-    runOnDisplay("xdotool windowraise " + window);
+    run("xdotool windowraise " + window);
     // The server refuses the keyboard to a window that is not quite there yet.
-    await("the keyboard of " + title, [&] {
-        runOnDisplay("xdotool windowfocus " + window);
-        const std::string holder = runOnDisplay("xdotool getwindowfocus");
-        return holder.substr(0, holder.find('\n')) == window;
-    });
-    breathe();
+    await("the keyboard of " + title,
+          [&] { return run("xdotool windowfocus " + window + " getwindowfocus").starts_with(window + '\n'); });
 }
 
 void RealProgram::awaitNoWindow(const std::string& title)
@@ -172,30 +106,16 @@ void RealProgram::awaitNoWindow(const std::string& title)
 void RealProgram::click(QPoint place)
 {
     const QPoint p = place + kWindowPlace;
-    runOnDisplay("xdotool mousemove " + std::to_string(p.x()) + ' ' + std::to_string(p.y()) + " click 1");
-    breathe();
-}
-
-void RealProgram::key(const std::string& keys)
-{
-    runOnDisplay("xdotool key " + keys);
-    breathe();
-}
-
-void RealProgram::type(const std::string& text)
-{
-    runOnDisplay("xdotool type --delay 5 '" + text + "'");
-    breathe();
+    run("xdotool mousemove " + std::to_string(p.x()) + ' ' + std::to_string(p.y()) + " click 1");
 }
 
 std::string RealProgram::textAt(QPoint place)
 {
     // Stays behind to hand the emptiness out, so it must not hold on to this call's output.
-    runOnDisplay("xclip -selection clipboard -in </dev/null >/dev/null 2>&1");
+    run("xclip -selection clipboard -in </dev/null >/dev/null 2>&1");
     click(place);
-    key("ctrl+a");
-    key("ctrl+c");
-    return runOnDisplay("xclip -selection clipboard -out");
+    key("ctrl+a ctrl+c");
+    return run("xclip -selection clipboard -out");
 }
 
 std::string RealProgram::textOtherThan(const std::string& other, QPoint place)
@@ -207,9 +127,8 @@ std::string RealProgram::textOtherThan(const std::string& other, QPoint place)
 
 int RealProgram::quit()
 {
-    closeWindow(display_, std::stoul(findWindow("Pelorin")));
-    int status = -1;
-    await("the end of the program", [&] { return waitpid(program_, &status, WNOHANG) == program_; });
-    program_ = -1;
-    return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+    key("ctrl+q");
+    if (!program_.waitForFinished(kPatience.count()))
+        throw std::runtime_error("waited in vain for the end of the program");
+    return program_.exitStatus() == QProcess::NormalExit ? program_.exitCode() : -1;
 }

@@ -1,10 +1,8 @@
 #pragma once
 
 #include <QPoint>
-#include <chrono>
+#include <QProcess>
 #include <string>
-#include <sys/types.h>
-#include <vector>
 
 /// The built program in a real window: on an X server of its own without a screen, driven by real mouse and key events.
 ///
@@ -13,14 +11,11 @@ class RealProgram {
 public:
     /// Starts an X server, and `program` on it with `home` as home folder.
     RealProgram(const std::string& program, const std::string& home);
-    ~RealProgram();
-    RealProgram(const RealProgram&) = delete;
-    RealProgram& operator=(const RealProgram&) = delete;
 
     /// Clicks at a place of the main window.
     void click(QPoint place);
-    void key(const std::string& keys);
-    void type(const std::string& text);
+    void key(const std::string& keys) { run("xdotool key " + keys); }
+    void type(const std::string& text) { run("xdotool type --delay 5 '" + text + "'"); }
     /// Waits for a window of that title, and gives it the keyboard, which is a desktop's task otherwise.
     void awaitWindow(const std::string& title);
     void awaitNoWindow(const std::string& title);
@@ -28,17 +23,24 @@ public:
     std::string textAt(QPoint place);
     /// Reads the field until its text is not `other`.
     std::string textOtherThan(const std::string& other, QPoint place);
-    /// Closes the window as a person does. @return the program's exit status.
+    /// Closes the window by its key. @return the program's exit status.
     int quit();
+    /// Runs a shell command on the program's display, and pauses. @return what it writes.
+    std::string run(const std::string& command) const;
 
 private:
-    static std::string run(const std::string& command);
-    std::string runOnDisplay(const std::string& command) const;
-    void startServer();
-    void startProgram(const std::string& program, const std::string& home);
+    /// A process that ends with this object, or with the test, however that comes about.
+    class Child : public QProcess {
+    public:
+        Child();
+        ~Child() override;
+        void startIt(const std::string& program, const QStringList& arguments);
+    };
+
+    std::string startServer();
     std::string findWindow(const std::string& title) const;
 
-    std::string display_;
-    pid_t server_ = -1;
-    pid_t program_ = -1;
+    Child server_;
+    const std::string display_;
+    Child program_;
 };

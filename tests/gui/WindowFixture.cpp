@@ -88,28 +88,27 @@ void WindowTest::settle()
     }
 }
 
-QWidget& WindowTest::desktopWindow() const
+BView& WindowTest::pageView()
 {
-    return window_->widget();
+    auto* tabs = static_cast<BTabView*>(window_->FindView("TabView"));
+    return *tabs->TabAt(tabs->Selection())->View();
 }
 
 QWidget& WindowTest::page()
 {
-    auto* tabs = static_cast<BTabView*>(window_->FindView("TabView"));
-    return *tabs->TabAt(tabs->Selection())->View()->widget();
+    return *pageView().widget();
 }
 
 void WindowTest::show(Page page)
 {
-    auto* bar = desktopWindow().findChild<QTabBar*>();
+    auto* bar = window_->widget().findChild<QTabBar*>();
     QTest::mouseClick(bar, Qt::LeftButton, {}, bar->tabRect(page).center());
     settle();
 }
 
 BListView& WindowTest::list(const char* name)
 {
-    auto* tabs = static_cast<BTabView*>(window_->FindView("TabView"));
-    auto* found = dynamic_cast<BListView*>(tabs->TabAt(tabs->Selection())->View()->FindView(name));
+    auto* found = dynamic_cast<BListView*>(pageView().FindView(name));
     if (found == nullptr)
         throw std::runtime_error(std::string("no such list: ") + name);
     return *found;
@@ -146,6 +145,26 @@ void WindowTest::enter(const char* name, const std::string& text)
 std::string WindowTest::text(const char* name)
 {
     return find<QLineEdit>(name).text().toStdString();
+}
+
+void WindowTest::fill(const Fields& fields)
+{
+    for (const auto& [field, entered] : fields) {
+        if (std::string_view(field).starts_with("txt"))
+            type(field, entered);
+        else
+            choose(field, entered);
+    }
+}
+
+void WindowTest::follow(const std::vector<Step>& steps)
+{
+    for (const Step& step : steps) {
+        fill(step.fields);
+        clearMessage();
+        click(step.button);
+        EXPECT_EQ(message(), step.message) << step.button;
+    }
 }
 
 void WindowTest::choose(const char* name, const std::string& item)
@@ -215,11 +234,6 @@ void WindowTest::watchForAlert()
     watcher_ = std::move(timer);
 }
 
-bool WindowTest::isPanelOpen(const char* panel) const
-{
-    return findPanel(panel) != nullptr;
-}
-
 std::string WindowTest::panelFolder(const char* panel) const
 {
     const QFileDialog* shown = findPanel(panel);
@@ -239,7 +253,7 @@ void WindowTest::answerPanel(const char* panel, const std::string& path)
         QTest::keyClick(field, Qt::Key_Return);
     }
     settle();
-    EXPECT_FALSE(isPanelOpen(panel));
+    EXPECT_EQ(findPanel(panel), nullptr);
     activate();
 }
 

@@ -53,6 +53,16 @@ protected:
     /// The same, with Enter.
     void enter(const char* name, const std::string& text);
     std::string text(const char* name);
+    /// Names of fields and menus, with what is typed into them or chosen.
+    using Fields = std::vector<std::pair<const char*, const char*>>;
+    void fill(const Fields& fields);
+    /// A click on a button, with what is filled in before it and what the status line says then.
+    struct Step {
+        Fields fields;
+        const char* button;
+        const char* message;
+    };
+    void follow(const std::vector<Step>& steps);
     /// Chooses the item of a menu by keys.
     void choose(const char* name, const std::string& item);
     /// Clicks on a row; with `more` the ones selected before stay so.
@@ -75,8 +85,7 @@ protected:
     std::vector<std::string> alerts() { return std::exchange(alerts_, {}); }
     /// Chooses a file in the panel that is open, by keys; an empty path leaves the panel by Escape.
     void answerPanel(const char* panel, const std::string& path);
-    bool isPanelOpen(const char* panel) const;
-    /// The folder that an open panel shows.
+    /// The folder that a panel shows; empty while it is not open.
     std::string panelFolder(const char* panel) const;
 
     /// Both files through the buttons and panels.
@@ -85,9 +94,8 @@ protected:
 private:
     void open();
     void activate();
+    BView& pageView();
     QWidget& page();
-    QWidget& desktopWindow() const;
-    int32 onAlert();
     void watchForAlert();
 
     std::unique_ptr<QTemporaryDir> temporary_;
