@@ -13,16 +13,22 @@ const BRect kQuotesAndChart(0, 262, 800, 776);
 const BRect kFirstOperations(0, 0, 800, 200);
 const BRect kOperationFields(0, 616, 800, 776);
 
-void addCurrency(TourHand& hand, const char* name, const char* symbol,
-                 const std::vector<std::pair<const char*, const char*>>& rates)
+using DatedValues = std::vector<std::pair<const char*, const char*>>;
+
+void addQuotes(TourHand& hand, const DatedValues& quotes)
+{
+    for (const auto& [date, value] : quotes) {
+        hand.type({{"txtQuoteDate", date}, {"txtQuoteValue", value}});
+        hand.press("btnAddQuote");
+    }
+}
+
+void addCurrency(TourHand& hand, const char* name, const char* symbol, const DatedValues& rates)
 {
     hand.turnTo(kCurrency);
     hand.type({{"txtCurrencyName", name}, {"txtCurrencyRepresentation", symbol}});
     hand.press("btnAddCurrency");
-    for (const auto& [date, rate] : rates) {
-        hand.type({{"txtQuoteDate", date}, {"txtQuoteValue", rate}});
-        hand.press("btnAddQuote");
-    }
+    addQuotes(hand, rates);
 }
 
 void addMarket(TourHand& hand, const char* name, const char* currency)
@@ -33,15 +39,11 @@ void addMarket(TourHand& hand, const char* name, const char* currency)
 }
 
 /// On the company page, in the market that was added last.
-void addCompany(TourHand& hand, const char* ticker, const char* name,
-                const std::vector<std::pair<const char*, const char*>>& quotes)
+void addCompany(TourHand& hand, const char* ticker, const char* name, const DatedValues& quotes)
 {
     hand.type({{"txtAbbreviation", ticker}, {"txtName", name}});
     hand.press("btnAddCompany");
-    for (const auto& [date, value] : quotes) {
-        hand.type({{"txtQuoteDate", date}, {"txtQuoteValue", value}});
-        hand.press("btnAddQuote");
-    }
+    addQuotes(hand, quotes);
 }
 
 void addAccount(TourHand& hand, const char* name, const char* currency, bool isDefault)

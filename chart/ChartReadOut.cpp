@@ -51,7 +51,7 @@ ChartReadOut layOutReadOut(const GraphPoint& point, bool isDateBased, const Char
     if (top < bounds.top)
         top = where.y + kDistance;
     left = std::floor(std::max(left, bounds.left));
-    top = std::floor(top);
+    top = std::floor(std::min(top, bounds.bottom - height));
     return {where,
             owner.getColor(),
             {left, top, left + width, top + height},

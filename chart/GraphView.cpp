@@ -133,7 +133,6 @@ void GraphView::savePicture(const BMessage& answer)
     BPath path;
     BEntry(&folder).GetPath(&path);
     path.Append(name);
-    pointer_.reset(); // it is no part of the picture
     if (save_picture(*this, path.Path()) != B_OK)
         (new BAlert("Save as PNG", (std::string("The picture could not be written to ") + path.Path()).c_str(), "OK"))
             ->Go();

@@ -5,13 +5,17 @@
 #include "platform/Window.h"
 
 #include <QMenu>
+#include <QPointer>
 
 BMenuItem* BPopUpMenu::Go(BPoint where) const
 {
-    QMenu shown(BWindow::front());
-    shown.setObjectName(QString::fromUtf8(Name()));
+    // The window owns it, and may be closed while the menu is up; otherwise it goes here.
+    const QPointer<QMenu> shown = new QMenu(BWindow::front());
+    shown->setObjectName(QString::fromUtf8(Name()));
     for (int32 i = 0; i < CountItems(); ++i)
-        shown.addAction(labelText(ItemAt(i)->Label()))->setData(i);
-    const QAction* chosen = shown.exec(QPoint(static_cast<int>(where.x), static_cast<int>(where.y)));
-    return chosen != nullptr ? ItemAt(chosen->data().toInt()) : nullptr;
+        shown->addAction(labelText(ItemAt(i)->Label()))->setData(i);
+    const QAction* chosen = shown->exec(QPoint(static_cast<int>(where.x), static_cast<int>(where.y)));
+    BMenuItem* item = chosen != nullptr ? ItemAt(chosen->data().toInt()) : nullptr;
+    delete shown;
+    return item;
 }

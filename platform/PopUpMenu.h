@@ -3,11 +3,13 @@
 #include "platform/Menu.h"
 #include "platform/Point.h"
 
-/// A menu that comes up in place and marks what was chosen last.
+/// A menu that comes up in place: in a menu field, which marks what was chosen last, or by `Go`.
 class BPopUpMenu : public BMenu {
 public:
     using BMenu::BMenu;
 
-    /// Comes up at `where` on the screen and waits for a choice. @return the item that was chosen; null without one.
+    /// Comes up at `where` on the screen and waits for a choice; marks nothing and sends no message.
+    /// @return the item that was chosen; null without one, also when the window was closed meanwhile with all its
+    /// views.
     BMenuItem* Go(BPoint where) const;
 };

@@ -18,10 +18,10 @@ status_t save_screenshot(const BWindow& window, BRect part, const char* path)
     return picture.save(QString::fromUtf8(path), "PNG") ? B_OK : B_ERROR;
 }
 
-status_t save_picture(const BView& view, const char* path)
+status_t save_picture(BView& view, const char* path)
 {
     QSaveFile file(QString::fromUtf8(path));
-    const bool isWritten = file.open(QIODevice::WriteOnly) && view.widget()->grab().save(&file, "PNG") && file.commit();
+    const bool isWritten = file.open(QIODevice::WriteOnly) && view.picture().save(&file, "PNG") && file.commit();
     return isWritten ? B_OK : B_ERROR;
 }
 

@@ -9,7 +9,7 @@ class BWindow;
 /// Writes what the window shows within `part`, which is in its own coordinates, as a PNG at the resolution of its
 /// screen.
 status_t save_screenshot(const BWindow& window, BRect part, const char* path);
-/// Writes what `view` shows as a PNG: all of it or, when that fails, nothing.
-status_t save_picture(const BView& view, const char* path);
+/// Writes what `view` has drawn as a PNG, without what it draws over that: all of it or, when that fails, nothing.
+status_t save_picture(BView& view, const char* path);
 /// Handles what waits in the queues, until nothing does.
 void handle_pending_messages();

@@ -22,6 +22,8 @@ public:
 protected:
     void keyPressEvent(QKeyEvent* event) override
     {
+        if ((event->modifiers() & ~Qt::KeypadModifier) != Qt::NoModifier)
+            return QLineEdit::keyPressEvent(event);
         // Enter is the field's: it sends the message, and must not reach a default button.
         if (event->key() == Qt::Key_Up || event->key() == Qt::Key_Down || event->key() == Qt::Key_PageUp ||
             event->key() == Qt::Key_PageDown) {

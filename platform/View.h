@@ -13,6 +13,7 @@
 class BWindow;
 class Canvas;
 class QPainter;
+class QPixmap;
 class QWidget;
 
 /// A rectangular part of a window that draws itself and answers to mouse and keyboard.
@@ -118,6 +119,8 @@ public:
     /// The innermost view, this one or within it, that `inner` is a part of; null when there is none.
     BView* viewAround(const QWidget& inner);
     void paintOn(QPainter& screen);
+    /// What the view has drawn, up to date.
+    const QPixmap& picture();
 
 protected:
     /// A view that is shown by `widget`, which it owns.

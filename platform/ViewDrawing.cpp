@@ -53,13 +53,18 @@ void BView::drawAll()
     });
 }
 
-void BView::paintOn(QPainter& screen)
+const QPixmap& BView::picture()
 {
     bool fresh = false;
     canvas_->picture(&fresh);
     if (fresh)
         drawAll();
-    screen.drawPixmap(0, 0, canvas_->picture(&fresh));
+    return canvas_->picture(&fresh);
+}
+
+void BView::paintOn(QPainter& screen)
+{
+    screen.drawPixmap(0, 0, picture());
     canvas_->drawWith(screen, [this] { DrawOver(Bounds()); });
 }
 

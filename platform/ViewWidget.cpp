@@ -64,12 +64,12 @@ void ViewWidget::keyPressEvent(QKeyEvent* event)
 
 void ViewWidget::focusInEvent(QFocusEvent* event)
 {
-    view_.Invalidate();
+    view_.RefreshOver();
     QWidget::focusInEvent(event);
 }
 
 void ViewWidget::focusOutEvent(QFocusEvent* event)
 {
-    view_.Invalidate();
+    view_.RefreshOver();
     QWidget::focusOutEvent(event);
 }

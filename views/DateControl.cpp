@@ -44,15 +44,19 @@ void DateControl::KeyDown(const char* bytes, int32)
     }
     switch (*bytes) {
     case B_UP_ARROW:
-        return enter(date.moveBy(1));
+        enter(date.moveBy(1));
+        break;
     case B_DOWN_ARROW:
-        return enter(date.moveBy(-1));
+        enter(date.moveBy(-1));
+        break;
     case B_PAGE_UP:
-        return enter(monthsFrom(date, 1));
+        enter(monthsFrom(date, 1));
+        break;
     case B_PAGE_DOWN:
-        return enter(monthsFrom(date, -1));
+        enter(monthsFrom(date, -1));
+        break;
     default:
-        return;
+        break;
     }
 }
 

@@ -174,6 +174,7 @@ TEST_F(HabitsTest, ChartShowsThePointAndSavesItsPicture)
     QTest::mouseMove(&widget, place);
 
     const std::string file = folder() + "/evolution";
+    widget.setFocus(); // as the click for the menu does
     QTimer::singleShot(100, [] {
         auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
         ASSERT_NE(menu, nullptr);
