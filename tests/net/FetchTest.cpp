@@ -150,18 +150,8 @@ TEST_F(FetchTest, ADayHasOneQuoteHoweverOftenItIsFetched)
     EXPECT_EQ(history(sending(kHistoryPage)), 0);
     EXPECT_EQ(quotes(), "3=45 4=47 ");
     EXPECT_EQ(company_->getQuote(1), quote) << "it was changed, not replaced";
-}
-
-TEST_F(FetchTest, OnlyThreeMarketsHaveAHistory)
-{
-    const std::pair<const char*, bool> cases[] = {{"NASDAQ", true}, {"NYSE", true}, {"AMEX", true}, {"Nasdaq", false}};
-    for (const auto& [name, served] : cases) {
-        market_.setName(name);
-        request_.clear();
-        EXPECT_EQ(history(sending(kHistoryPage)), served ? 0 : -1) << name;
-        EXPECT_EQ(request_.empty(), !served) << name;
-    }
-    EXPECT_EQ(Company().setInternetLastThreeMonthsQuote(), -1) << "no market";
+    market_.setName("Nasdaq");
+    EXPECT_EQ(history(sending(kHistoryPage)), -1) << "only NASDAQ, NYSE and AMEX have a history";
 }
 
 } // namespace

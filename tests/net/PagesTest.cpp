@@ -1,4 +1,3 @@
-#include "net/LatestQuote.h"
 #include "net/QuoteHistory.h"
 
 #include <gtest/gtest.h>
@@ -21,30 +20,6 @@ std::string parsed(std::string_view page)
     std::vector<DatedPrice> rows;
     const int result = parseHistoryPage(page, &rows);
     return std::to_string(result) + ": " + shownRows(rows);
-}
-
-TEST(LatestPageTest, ThePriceIsCutOutOfTheFirstMarkedCell)
-{
-    const struct {
-        std::string_view page;
-        float price; // -1 for none
-        const char* why;
-    } cases[] = {
-        {"<td nowrap><b>7</b></td><td nowrap><b>8</b></td>", 7, "the first cell counts"},
-        {"<<td nowrap><b>7</b></td>", -1, "a match that breaks is not begun anew"},
-        {"<<td nowrap><b>7</b></td> <td nowrap><b>8</b></td>", 8, "but a later one is found"},
-        {"", -1, "nothing"},
-        {{"\0<td nowrap><b>7", 16}, -1, "the page ends at a zero"},
-        {"<td nowrap><b>", -1, "the page ends before the price"},
-        {"<td nowrap><b>45 <sup>3", 45, "behind the numerator"},
-        {"<td nowrap><b>45 <sup>3</sup>/<sub>0</sub>", 45, "a denominator of 0"},
-    };
-    for (const auto& c : cases) {
-        float price = -1;
-        const std::string exact(c.page); // for the address sanitizer
-        EXPECT_EQ(parseLatestQuotePage(exact, &price), c.price == -1 ? -1 : 0) << c.why;
-        EXPECT_EQ(price, c.price) << c.why;
-    }
 }
 
 TEST(HistoryPageTest, RowsAreReadInPageOrder)

@@ -87,11 +87,6 @@ TEST(SocketTest, ALineEndsWithItsLineFeedOrBeforeAZero)
         EXPECT_EQ(by.socket->getChar(&next), 0) << c.bytes;
         EXPECT_EQ(next, c.next) << c.bytes << ": what follows stays";
     }
-    Connected by;
-    char buffer[3];
-    Peer::send(by.peer, "GET\n");
-    EXPECT_EQ(by.socket->readLine(buffer, 3), 0);
-    EXPECT_STREQ(buffer, "\n") << "intended: every byte goes to the same place";
 }
 
 TEST(SocketTest, ALineThatDoesNotEndInTimeGivesEight)
