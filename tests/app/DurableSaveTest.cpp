@@ -99,7 +99,7 @@ TEST_F(DurableSaveTest, DealsWithWhateverThePathLeadsTo)
         {folder_ / "ring", kOpenFailed},     {folder_ / std::string(300, 'x'), kOpenFailed},
         {folder_ / "locked/f", kOpenFailed}, {folder_ / "locked/new", kOpenFailed},
         {folder_ / "lost", kOpenFailed},     {folder_ / "dangling", kSaved},
-        {"/dev/full", kWriteFailed},
+        {"/dev/full", kWriteFailed},         {"/dev/null", kSaved},
     };
     for (const auto& c : cases) {
         bool isCalled = false;

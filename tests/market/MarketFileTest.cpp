@@ -1,4 +1,3 @@
-#include "foundation/FieldIO.h"
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
 #include "tests/support/Bytes.h"

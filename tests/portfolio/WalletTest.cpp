@@ -57,6 +57,19 @@ TEST(WalletTest, LookUpsNeedEveryNameAndGiveTheFirstMatch)
     EXPECT_EQ(p.wallet.getAccountByName("a"), nullptr);
 }
 
+TEST(WalletTest, TheRateCostOfATradeIsThePresentOne)
+{
+    SmallPortfolio p;
+    auto* share = new Share(&p.wallet, p.alpha);
+    const ShareOperation* bought = trade(share, nullptr, 0, 1, 10);
+    EXPECT_EQ(bought->getOperationRateCost(), 0.0017F);
+    p.wallet.setSellRateCost(0.25F);
+    EXPECT_EQ(trade(share, nullptr, 0, -1, 10)->getOperationRateCost(), 0.25F);
+    share->setWallet(nullptr);
+    EXPECT_EQ(bought->getOperationRateCost(), 0);
+    EXPECT_EQ(ShareOperation().getOperationRateCost(), 0);
+}
+
 TEST(WalletTest, RemovingAutomaticOperationsSkipsNoNeighbour)
 {
     for (const char* pattern : {"aaaa", "amaam", "maama"}) {

@@ -54,7 +54,6 @@ public:
     BytesFile& operator=(const BytesFile&) = delete;
 
     operator FILE*() const { return file_; }
-    long position() const { return std::ftell(file_); }
 
 private:
     std::string bytes_;
