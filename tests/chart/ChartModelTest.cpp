@@ -45,18 +45,6 @@ std::vector<float> xsOf(const Poly& poly)
     return xs;
 }
 
-TEST(GraphElementTest, IsUndefinedUntilThereIsEnoughToDraw)
-{
-    GraphLine line;
-    GraphPolygon polygon;
-    for (unsigned count = 0; count < 4; ++count) {
-        EXPECT_EQ(line.isUndefined(), count < 2) << count;
-        EXPECT_EQ(polygon.isUndefined(), count < 3) << count;
-        addAll(line, {1});
-        addAll(polygon, {1});
-    }
-}
-
 TEST(GraphPolyElementTest, LineKeepsItsPointsByXAndPolygonAsTheyWereAdded)
 {
     GraphLine line;

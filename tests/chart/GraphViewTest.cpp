@@ -114,16 +114,4 @@ TEST_F(GraphViewTest, CoversWithAlpha0AndLetsShineThroughBetween)
     EXPECT_EQ(colorAt(image(), 6.5, 2.2), QColor(kColor.red, kColor.green, kColor.blue));
 }
 
-TEST_F(GraphViewTest, FindsThePointUnderThePointer)
-{
-    fill(line_, {{0, 1}, {5, 2}, {10, 1}});
-    EXPECT_EQ(view_.nearestPoint({0, 0}, 1e6), nullptr) << "nothing drawn yet";
-    image();
-    const BPoint middle = view_.scale()->pixel({5, 2});
-    const GraphPoint* found = view_.nearestPoint(middle + BPoint(3, 2), 5);
-    ASSERT_NE(found, nullptr);
-    EXPECT_EQ(found->getX(), 5);
-    EXPECT_EQ(view_.nearestPoint(middle + BPoint(3, 2), 2), nullptr);
-}
-
 } // namespace

@@ -66,7 +66,7 @@ protected:
         window().UpdateState();
     }
     /// A purchase of ten shares of the company, on the operation page's list.
-    Share* buy(Company* company)
+    void buy(Company* company)
     {
         auto* account = new Account("Cash");
         account->setWallet(&wallet());
@@ -74,9 +74,7 @@ protected:
         auto* share = new Share(&wallet(), company);
         (new ShareOperation(Date(2, 3, 2024), share, true, 10, 11, false, 0))->setAccount(account);
         window().UpdateState();
-        return share;
     }
-    Currency* currency(unsigned i) { return window().catalogue().getCurrencies()[i]; }
     Company* company()
     {
         Company* found = nullptr;

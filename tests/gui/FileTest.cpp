@@ -1,7 +1,5 @@
 // Loading, saving and starting anew, by buttons and panels.
 
-#include "foundation/Today.h"
-#include "market/Currency.h"
 #include "platform/Entry.h"
 #include "platform/Message.h"
 #include "portfolio/Account.h"

@@ -80,14 +80,12 @@ TEST_F(HabitsTest, LoadAndSaveAreThoseOfThePageInFront)
 TEST_F(HabitsTest, AddGoesByTheBoxThatHasTheKeyboard)
 {
     show(kCurrencyPage);
-    type("txtCurrencyRepresentation", "EUR");
-    type("txtCurrencyName", "Euro");
+    fill({{"txtCurrencyRepresentation", "EUR"}, {"txtCurrencyName", "Euro"}});
     press(Qt::Key_N);
     ASSERT_EQ(list("lstCurrencies").CountItems(), 1);
     EXPECT_EQ(focus(), "txtCurrencyName") << "ready for the next one";
     select("lstCurrencies", 0);
-    type("txtQuoteDate", "05/03/2024");
-    type("txtQuoteValue", "1.5");
+    fill({{"txtQuoteDate", "05/03/2024"}, {"txtQuoteValue", "1.5"}});
     press(Qt::Key_N);
     EXPECT_EQ(list("lstCurrencies").CountItems(), 1);
     EXPECT_EQ(list("lstQuotes").CountItems(), 1);
