@@ -1,5 +1,6 @@
 #include "platform/WindowWidget.h"
 
+#include "platform/HeldKey.h"
 #include "platform/InterfaceDefs.h"
 #include "platform/Window.h"
 
@@ -26,8 +27,10 @@ void WindowWidget::addShortcut(int key, uint32 modifiers, const std::function<vo
     for (const auto& m : kModifiers)
         combination |= (modifiers & m.modifier) != 0 ? static_cast<int>(m.ours) : 0;
     auto* shortcut = new QShortcut(QKeySequence(combination), this); // this owns it
-    shortcut->setAutoRepeat(false);
+    HeldKey::watch();
     QObject::connect(shortcut, &QShortcut::activated, [this, action] {
+        if (HeldKey::isRepeating())
+            return;
         if (QWidget* field = focusWidget()) {
             field->clearFocus();
             field->setFocus(Qt::OtherFocusReason);
