@@ -7,7 +7,8 @@
 
 namespace {
 
-/// With `lower`, the cost of an item of `upper` in terms of that of an item of `lower`; otherwise as the unit says.
+/// With `lower`, the cost of an item of `upper` in terms of that of an item of `lower`, in memory where the unit is
+/// that of two memories; otherwise as the unit says.
 struct Figure {
     const char* what;
     const char* upper;
@@ -30,6 +31,10 @@ constexpr Figure kFigures[] = {
      "about 1"},
     {"Files to chart, small portfolio", "BM_Files/chart_small", nullptr, "ms", "< 80"},
     {"Files to chart, large portfolio", "BM_Files/chart_large", nullptr, "ms", "< 640"},
+    {"Start until the window is painted", "BM_Start/pelorin", nullptr, "ms", ""},
+    {"The same / that of a bare window of its size", "BM_Start/pelorin", "BM_Start/bare", "", ""},
+    {"Memory at rest", "BM_Start/pelorin", nullptr, "MB", ""},
+    {"Memory at rest / that of the bare window", "BM_Start/pelorin", "BM_Start/bare", "B/B", ""},
     {"The window opens, until it is painted", "BM_Window/open", nullptr, "ms", ""},
     {"100 pages come up", "BM_Window/switch_page", nullptr, "ms", ""},
     {"Load of a market file in the window / without", "BM_Window/load_market", "BM_Files/load_market", "", "about 1"},
@@ -76,11 +81,14 @@ void FigureReporter::Finalize()
             continue; // filtered out
         const Result& result = upper->second;
         double value = medianOf(result.seconds);
-        if (figure.lower != nullptr)
+        const std::string_view unit = figure.unit;
+        if (unit == "B/B")
+            value = result.bytesPerItem / lower->second.bytesPerItem;
+        else if (figure.lower != nullptr)
             value = value / result.items / (medianOf(lower->second.seconds) / lower->second.items);
         else
-            value = figure.unit == std::string_view("B") ? result.bytesPerItem : value * 1000;
-        std::printf("%-50s %8.3g %-2s  %s %s\n", figure.what, value, figure.unit, *figure.aim != '\0' ? "aim:" : "",
-                    figure.aim);
+            value = unit == "B" ? result.bytesPerItem : unit == "MB" ? result.bytesPerItem / 1e6 : value * 1000;
+        std::printf("%-50s %8.3g %-2s  %s %s\n", figure.what, value, unit == "B/B" ? "" : figure.unit,
+                    *figure.aim != '\0' ? "aim:" : "", figure.aim);
     }
 }

@@ -1,5 +1,5 @@
-// What loading, valuing and drawing cost, for believable amounts of data. Whatever works on files is measured in a
-// child process of its own. It needs no screen, only the platform's offscreen mode.
+// What starting, loading, valuing and drawing cost, for believable amounts of data. Whatever works on files is measured
+// in a child process of its own. It needs no screen, only the platform's offscreen mode.
 
 #include "app/PLWindow.h"
 #include "chart/GraphLine.h"
@@ -23,6 +23,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <memory>
+#include <string>
 
 namespace {
 
@@ -281,6 +282,22 @@ void BM_FillLine(benchmark::State& state)
     state.counters["items"] = static_cast<double>(state.range());
 }
 BENCHMARK(BM_FillLine)->Arg(20000)->Arg(80000)->Unit(benchmark::kMillisecond);
+
+/// A start from nothing, libraries and all, until the window is painted.
+void BM_Start(benchmark::State& state, const char* window)
+{
+    for (auto _ : state) {
+        double seconds = 0;
+        double bytes = 0;
+        FILE* probe = popen((std::string(PELORIN_START_PROBE " ") + window).c_str(), "r");
+        if (probe == nullptr || std::fscanf(probe, "%lf %lf", &seconds, &bytes) != 2 || pclose(probe) != 0)
+            state.SkipWithError("no window came up");
+        state.SetIterationTime(seconds);
+        state.counters["bytes_per_item"] = bytes;
+    }
+}
+BENCHMARK_CAPTURE(BM_Start, pelorin, "pelorin")->UseManualTime()->Unit(benchmark::kMillisecond)->Iterations(20);
+BENCHMARK_CAPTURE(BM_Start, bare, "bare")->UseManualTime()->Unit(benchmark::kMillisecond)->Iterations(20);
 
 } // namespace
 

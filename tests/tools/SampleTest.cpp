@@ -63,7 +63,8 @@ TEST(SampleDataTest, NothingIsEverOverdrawnOrSoldShort)
     const State* last = refreshStates(wallet, kLast, false, &outcome);
     EXPECT_EQ(wallet.getNbrStates(), 1827U);
     int losers = 0;
-    for (const State* state : all(wallet, &Wallet::getAllStates)) {
+    const std::vector<State*> states = all(wallet, &Wallet::getAllStates);
+    for (const State* state : states) {
         const std::string day = testing::PrintToString(state->getDate());
         for (const AccountState* account : all(*state, &State::getAllAccountStates))
             EXPECT_GE(account->getCash(), 0) << account->getAccountName().bytes() << ' ' << day;
