@@ -65,7 +65,8 @@ std::string RealProgram::startServer()
 {
     // Servers that look for a free number at the same time take each other's socket away.
     const QString own = QString(":%1").arg(100 + getpid() % 50000);
-    server_.startIt("Xvfb", {own, "-displayfd", "1", "-screen", "0", "1000x900x24", "-nolisten", "tcp"});
+    // Without -noreset it would begin anew, and refuse the program, whenever a tool was its only client and leaves.
+    server_.startIt("Xvfb", {own, "-displayfd", "1", "-screen", "0", "1000x900x24", "-nolisten", "tcp", "-noreset"});
     if (!server_.waitForReadyRead(kPatience.count())) // it tells its number when it is ready
         throw std::runtime_error("Xvfb does not start");
     return own.toStdString();
