@@ -428,6 +428,7 @@ TEST_P(RandomCommandsTest, LinksListsAndFileAgreeAfterEachCommand)
 {
     constexpr int kSteps = 1200;
     constexpr unsigned kRarely = 40; // steps between the removals of much
+    std::size_t mostMarkets = 0;
     for (int step = 0; step < kSteps && !HasFailure(); ++step) {
         const Action& action = anyAction();
         SCOPED_TRACE("step " + std::to_string(step) + ": " + action.name);
@@ -438,13 +439,13 @@ TEST_P(RandomCommandsTest, LinksListsAndFileAgreeAfterEachCommand)
         if (under(3) == 0)
             continue; // the next command comes before this one has been handled
         settle();
+        mostMarkets = std::max(mostMarkets, window().catalogue().getMarkets().size());
         expectLinks();
         expectListsShowTheModel();
         expectOperationsShow();
         expectTheSameAfterSaveAndLoad();
     }
-    const auto markets = window().catalogue().getMarkets();
-    EXPECT_GT(markets.size(), 0U) << "else there was little to go wrong";
+    EXPECT_GT(mostMarkets, 4U) << "else there was little to go wrong";
     if (areNamesUnique()) {
         EXPECT_GT(valuesCompared(), 4);
     }
