@@ -27,6 +27,13 @@ struct Command {
     void (*run)(PLWindow& window, BMessage* message);
 };
 
+/// While a key is held in the date field, each day would be valued long after it has gone by: only the last one is.
+void valueAtDate(PLWindow& window)
+{
+    if (!window.IsNextMessage('WTDa'))
+        window.UpdateState();
+}
+
 constexpr Command kCommands[] = {
     // The company page.
     {'CBAm', [](PLWindow& w, BMessage*) { w.AddMarket(); }},
@@ -63,7 +70,7 @@ constexpr Command kCommands[] = {
     {'RBRq', [](PLWindow& w, BMessage*) { w.RemoveCurrencyQuote(); }},
     {'RQSe', [](PLWindow& w, BMessage*) { w.CurrencyQuoteSelection(); }},
     // The portfolio page.
-    {'WTDa', [](PLWindow& w, BMessage*) { w.UpdateStateUnlessAgain('WTDa'); }},
+    {'WTDa', [](PLWindow& w, BMessage*) { valueAtDate(w); }},
     {'WCCe', [](PLWindow& w, BMessage*) { w.UpdateState(); }},
     {'WBLd', [](PLWindow& w, BMessage*) { w.LoadSomething(); }},
     {'WBSv', [](PLWindow& w, BMessage*) { w.SaveSomething(); }},

@@ -64,9 +64,6 @@ public:
     // The valuation (StateCommands.cpp).
     /// Values the portfolio anew at its page's date and shows it. Within a `StateHold` that waits for its end.
     void UpdateState();
-    /// The same, unless the next message is another one of `code`: while a key is held in the date field, each day
-    /// would be valued long after it has gone by.
-    void UpdateStateUnlessAgain(uint32 code);
     /// Makes `state` the one that is shown; null shows none. The former one is not destroyed here.
     void SetState(State* state);
 

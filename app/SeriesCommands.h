@@ -18,6 +18,7 @@ namespace series_commands {
 template <class Page>
 using QuoteOf = std::remove_pointer_t<decltype(std::declval<const Page&>().GetSelectedQuote())>;
 
+/// What the commands that change quotes end with.
 template <class Page>
 void showChange(PLWindow& window, Page& page)
 {
@@ -52,6 +53,7 @@ void addQuote(PLWindow& window, Page& page, Series* series, const char* unselect
     showChange(window, page);
 }
 
+/// Gives the selected quote the day and the value of the page's fields.
 template <class Page>
 void updateQuote(PLWindow& window, Page& page)
 {
@@ -74,6 +76,7 @@ void updateQuote(PLWindow& window, Page& page)
     showChange(window, page);
 }
 
+/// Destroys all selected quotes.
 template <class Page>
 void removeQuotes(PLWindow& window, Page& page)
 {
@@ -88,6 +91,7 @@ void removeQuotes(PLWindow& window, Page& page)
     showChange(window, page);
 }
 
+/// Puts the selected quote into the page's fields.
 template <class Page>
 void showSelectedQuote(PLWindow& window, Page& page)
 {

@@ -38,12 +38,6 @@ void PLWindow::UpdateState()
     SetState(state);
 }
 
-void PLWindow::UpdateStateUnlessAgain(uint32 code)
-{
-    if (!IsNextMessage(code))
-        UpdateState();
-}
-
 void PLWindow::SetState(State* state)
 {
     const WindowLock lock(*this);
