@@ -149,11 +149,16 @@ public:
             setCapacity(count);
     }
 
-    /// Destroys every element; each unlinks itself. Goes from the end, so that nothing moves or needs sorting.
+    /// Destroys every element, always the first of the list as it then stands; each unlinks itself.
+    ///
+    /// In an unsorted list the last element takes the place of each one that goes. Intended: it settles in which order
+    /// an element's other owners, who lose it, too, are left with the rest of theirs.
     void deleteAll()
     {
+        if (isSorted())
+            turnRound();
         while (count_ > 0)
-            delete elements_[count_ - 1];
+            delete elements_[isSorted() ? count_ - 1 : 0];
     }
     /// Unlinks every element and leaves it alone otherwise; stops at one that will not be unlinked.
     void unlinkAll()
@@ -210,6 +215,17 @@ private:
             return;
         dirty_ = false;
         sort();
+    }
+
+    /// Puts a sorted list in order from the last to the first, so that the first one can leave without moving others.
+    /// The list counts as dirty from here on: whoever reads it finds it in order.
+    void turnRound()
+    {
+        sortWhenDirty();
+        std::reverse(elements_, elements_ + count_);
+        for (std::uint32_t i = 0; i < count_; ++i)
+            backLink(*elements_[i]).place_ = i;
+        dirty_ = true;
     }
 
     void shrink()

@@ -32,7 +32,13 @@ private:
 
 struct Item {
     explicit Item(char n, int k = 0) : name(n), key(k) {}
-    ~Item() { box.set(nullptr); }
+    ~Item()
+    {
+        if (obituary != nullptr)
+            *obituary += name;
+        box.set(nullptr);
+    }
+    std::string* obituary = nullptr; // gets the name in the end
     char name;
     int key;
     ItemsToBox box{this};
@@ -149,5 +155,26 @@ TEST(AssociationTest, RandomChangesFromBothEndsAgreeWithPlainLists)
                 want += listed->name;
             ASSERT_EQ(names(boxes[i]), want) << "after change " << turn;
         }
+    }
+}
+
+TEST(AssociationTest, DestroyingAllGoesFromTheFront)
+{
+    const struct {
+        bool sorted;
+        const char* order;
+        const char* why;
+    } cases[] = {{true, "bdac", "by key"}, {false, "adcb", "the last one takes the place of the first"}};
+    for (const auto& c : cases) {
+        Box box(c.sorted);
+        std::string order;
+        for (const auto& [name, key] : {std::pair('a', 3), {'b', 1}, {'c', 9}, {'d', 2}}) {
+            auto* item = new Item(name, key); // destroyed by `deleteAll`
+            item->obituary = &order;
+            box.items.add(item);
+        }
+        box.items.deleteAll();
+        EXPECT_EQ(order, c.order) << c.why;
+        EXPECT_EQ(box.items.getNbr(), 0U);
     }
 }

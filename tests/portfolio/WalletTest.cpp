@@ -70,6 +70,17 @@ TEST(WalletTest, TheRateCostOfATradeIsThePresentOne)
     EXPECT_EQ(ShareOperation().getOperationRateCost(), 0);
 }
 
+TEST(WalletTest, ACompanysHoldingsGoFromTheFrontAndLeaveTheOthersInOneOrder)
+{
+    SmallPortfolio p;
+    auto* gamma = new Company(p.york, "Gamma", "GA");
+    for (Company* company : {p.alpha, p.alpha, p.beta, gamma})
+        new Share(&p.wallet, company);
+    const std::vector<Share*> former = all(p.wallet, &Wallet::getAllShares);
+    delete p.alpha;
+    EXPECT_EQ(all(p.wallet, &Wallet::getAllShares), (std::vector{former[3], former[2]}));
+}
+
 TEST(WalletTest, RemovingAutomaticOperationsSkipsNoNeighbour)
 {
     for (const char* pattern : {"aaaa", "amaam", "maama"}) {
