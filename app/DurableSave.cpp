@@ -57,10 +57,11 @@ bool isDevice(const std::string& path)
     return stat(path.c_str(), &status) == 0 && S_ISCHR(status.st_mode);
 }
 
-/// A device has no contents that could be lost, and must not be replaced by a file.
+/// A device has no contents that could be lost, and must not be replaced by a file. One that takes nothing for the
+/// time being, such as a stopped terminal, fails the save instead of holding it up.
 void writeDevice(const std::string& path, const DurableSave::Writer& write)
 {
-    const int descriptor = open(path.c_str(), O_WRONLY | O_NOCTTY | O_CLOEXEC);
+    const int descriptor = open(path.c_str(), O_WRONLY | O_NOCTTY | O_NONBLOCK | O_CLOEXEC);
     FILE* const opened = descriptor >= 0 ? fdopen(descriptor, "wb") : nullptr;
     if (opened == nullptr) {
         const int reason = errno;

@@ -2,6 +2,7 @@
 #include "tests/support/PlainUser.h"
 #include "tests/support/ToolRun.h"
 
+#include <fcntl.h>
 #include <gtest/gtest.h>
 #include <ostream>
 #include <sys/resource.h>
@@ -143,4 +144,14 @@ TEST_F(DurableSaveTest, WithoutAVersionTheOldFileStays)
                                  ": cannot be made: Not a directory");
     EXPECT_EQ(folder_.content("f"), "old");
     EXPECT_EQ(save_.save(folder_ / "new", writeNew).outcome, kSaved) << "there is nothing to keep";
+}
+
+TEST_F(DurableSaveTest, ATerminalThatIsStoppedFailsTheSaveInsteadOfHoldingItUp)
+{
+    const int controller = posix_openpt(O_RDWR | O_NOCTTY);
+    ASSERT_EQ(unlockpt(controller), 0);
+    alarm(20); // ends a save that waits until the terminal is read
+    EXPECT_EQ(save_.save(ptsname(controller), writeMuch).outcome, kWriteFailed);
+    alarm(0);
+    close(controller);
 }
