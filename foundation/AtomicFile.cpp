@@ -73,6 +73,22 @@ int createIn(const std::string& folder, mode_t mode, std::string* name)
     return -1;
 }
 
+bool isNumber(std::string_view text)
+{
+    return !text.empty() && text.find_first_not_of("0123456789") == std::string_view::npos;
+}
+
+/// Whether `createIn` gives such a name: a file of another one may be a user's.
+bool isTemporary(std::string_view name)
+{
+    if (!name.starts_with(kPrefix) || !name.ends_with(kSuffix))
+        return false;
+    const std::string_view numbers = name.substr(kPrefix.size(), name.size() - kPrefix.size() - kSuffix.size());
+    const std::size_t hyphen = numbers.find('-');
+    return hyphen != std::string_view::npos && isNumber(numbers.substr(0, hyphen)) &&
+           isNumber(numbers.substr(hyphen + 1));
+}
+
 /// Removes a temporary file unless somebody has it locked: he is still writing it.
 void removeUnlessLocked(const std::string& path)
 {
@@ -118,8 +134,7 @@ void AtomicFile::removeLeftOvers(const std::string& folder)
     std::error_code error;
     for (fs::directory_iterator entry(folder, error); !error && entry != fs::directory_iterator();
          entry.increment(error)) {
-        const std::string name = entry->path().filename();
-        if (name.starts_with(kPrefix) && name.ends_with(kSuffix))
+        if (isTemporary(entry->path().filename().string()))
             removeUnlessLocked(entry->path());
     }
 }

@@ -8,8 +8,9 @@
 /// which then takes the name.
 ///
 /// A crash, a full disk or a pulled plug leaves the former file or the new one, never a part. What a killed program
-/// leaves behind is a temporary file, ".pelorin-...tmp"; the next AtomicFile in that folder removes it. One that a
-/// living program still writes is locked and stays.
+/// leaves behind is a temporary file, ".pelorin-4711-0.tmp" with the program's number and one of its own; the next
+/// AtomicFile in that folder removes it. One that a living program still writes is locked and stays, and so does a file
+/// of any other name.
 ///
 /// Whatever fails throws an OpenError or a WriteError, with one line for the user that names the file and the reason.
 class AtomicFile {

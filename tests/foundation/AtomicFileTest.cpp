@@ -53,10 +53,15 @@ TEST_F(AtomicFileTest, ReplacesWhatALinkLeadsToAndKeepsItsPermissions)
 TEST_F(AtomicFileTest, RemovesWhatAKilledProgramLeftButNotWhatALivingOneWrites)
 {
     folder_.write(".pelorin-4194999-0.tmp", "half", 0200);
-    folder_.write("pelorin.tmp", "the user's");
+    const char* const others[] = {"pelorin.tmp",        ".pelorin-.tmp",    ".pelorin-notes.tmp",
+                                  ".pelorin-12-0x.tmp", ".pelorin-12-.tmp", ".pelorin-12-0.tmp.tmp"};
+    for (const char* name : others)
+        folder_.write(name, "the user's");
     AtomicFile slow(folder_ / "slow", kReplace);
     AtomicFile(folder_ / "quick", kReplace).commit();
     slow.commit();
-    EXPECT_TRUE(fs::exists(folder_ / "slow") && fs::exists(folder_ / "quick") && fs::exists(folder_ / "pelorin.tmp"));
-    EXPECT_EQ(files(), 3);
+    EXPECT_TRUE(fs::exists(folder_ / "slow") && fs::exists(folder_ / "quick"));
+    for (const char* name : others)
+        EXPECT_TRUE(fs::exists(folder_ / name)) << name;
+    EXPECT_EQ(files(), 2 + std::ssize(others));
 }
