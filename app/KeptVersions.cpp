@@ -4,6 +4,7 @@
 #include "foundation/Folders.h"
 
 #include <algorithm>
+#include <array>
 #include <cerrno>
 #include <cstdint>
 #include <cstdio>
@@ -14,6 +15,7 @@
 #include <string_view>
 #include <sys/stat.h>
 #include <unistd.h>
+#include <utility>
 
 namespace {
 
@@ -61,89 +63,102 @@ std::string stampOf(std::time_t now)
     return text;
 }
 
-/// The place of a version in time: its stamp, and its number within that second.
-struct Moment {
-    std::string stamp;
-    unsigned number = 1;
+/// A version of a file, and what settles its place in the order of the saves: its serial number, which is 0 in names of
+/// release 0.1.0; then year to second of its stamp; then the number that 0.1.0 put behind the later ones of a second.
+struct Version {
+    std::array<std::int64_t, 8> place{};
+    std::string name;
 
-    auto operator<=>(const Moment&) const = default;
-
-    std::string text() const
-    {
-        char suffix[16] = "";
-        if (number > 1)
-            std::snprintf(suffix, sizeof suffix, "-%03u", number);
-        return stamp + suffix;
-    }
-    /// @return false when `text` is no moment.
-    bool read(std::string_view text)
-    {
-        constexpr std::string_view kPattern = "0000-00-00 00.00.00";
-        const auto isLike = [](char c, char pattern) { return pattern == '0' ? c >= '0' && c <= '9' : c == pattern; };
-        if (text.size() < kPattern.size() ||
-            !std::equal(kPattern.begin(), kPattern.end(), text.begin(), [&](char p, char c) { return isLike(c, p); }))
-            return false;
-        stamp = text.substr(0, kPattern.size());
-        const std::string_view suffix = text.substr(kPattern.size());
-        if (suffix.empty())
-            return true;
-        constexpr std::size_t kDigits = 9;
-        if (suffix.size() < 2 || suffix.size() > 1 + kDigits || suffix[0] != '-' ||
-            suffix.find_first_not_of("0123456789", 1) != std::string_view::npos)
-            return false;
-        number = static_cast<unsigned>(std::stoul(std::string(suffix.substr(1))));
-        return true;
-    }
+    auto operator<=>(const Version&) const = default;
 };
 
-/// The moments of the versions of one file that lie in `folder`, in order of time.
-std::vector<Moment> momentsIn(const std::string& folder, const std::string& stem)
+bool take(char c, std::string_view* text)
 {
-    std::vector<Moment> moments;
-    std::error_code error;
-    for (fs::directory_iterator entry(folder, error); !error && entry != fs::directory_iterator();
-         entry.increment(error)) {
-        const std::string name = entry->path().filename();
-        Moment moment;
-        if (name.starts_with(stem + ' ') && moment.read(std::string_view(name).substr(stem.size() + 1)))
-            moments.push_back(moment);
-    }
-    std::sort(moments.begin(), moments.end());
-    return moments;
+    if (!text->starts_with(c))
+        return false;
+    text->remove_prefix(1);
+    return true;
 }
 
-/// Where the versions of one file go: `folder/stem moment`.
+/// Takes a number of so many digits off the front of `*text`. @return false when it is not there.
+bool takeNumber(std::size_t fewest, std::size_t most, std::string_view* text, std::int64_t* number)
+{
+    const std::size_t digits = std::min(text->find_first_not_of("0123456789"), text->size());
+    if (digits < fewest || digits > most)
+        return false;
+    *number = std::stoll(std::string(text->substr(0, digits)));
+    text->remove_prefix(digits);
+    return true;
+}
+
+/// @return false when `text` is not what stands behind the name of a version's file.
+bool readPlace(std::string_view text, Version* version)
+{
+    auto& [serial, year, month, day, hour, minute, second, number] = version->place;
+    const bool isNegative = take('-', &text); // whatever a clock may say
+    if (!takeNumber(1, 10, &text, &year))
+        return false;
+    if (isNegative)
+        year = -year;
+    const std::pair<char, std::int64_t*> parts[] = {
+        {'-', &month}, {'-', &day}, {' ', &hour}, {'.', &minute}, {'.', &second}};
+    for (const auto& [before, part] : parts)
+        if (!take(before, &text) || !takeNumber(2, 2, &text, part))
+            return false;
+    if (text.empty())
+        return true;
+    if (take('-', &text))
+        return takeNumber(1, 9, &text, &number) && text.empty();
+    return take(' ', &text) && take('(', &text) && takeNumber(1, 15, &text, &serial) && text == ")";
+}
+
+/// Where the versions of one file go: `folder/stem stamp (serial number)`.
 struct Shelf {
     Shelf(const std::string& aFolder, const std::string& path)
         : folder(aFolder), stem(stemFor(fs::path(path).filename()))
     {}
-    std::string pathOf(const Moment& moment) const { return folder + '/' + stem + ' ' + moment.text(); }
-    std::vector<Moment> moments() const { return momentsIn(folder, stem); }
+    std::string pathOf(const Version& version) const { return folder + '/' + version.name; }
+    std::string newPath(std::int64_t serial, std::time_t now) const
+    {
+        return folder + '/' + stem + ' ' + stampOf(now) + " (" + std::to_string(serial) + ')';
+    }
+    /// In the order of the saves. Where `*error` is set, some may be missing.
+    std::vector<Version> versions(std::error_code* error) const
+    {
+        std::vector<Version> versions;
+        for (fs::directory_iterator entry(folder, *error); !*error && entry != fs::directory_iterator();
+             entry.increment(*error)) {
+            Version version;
+            version.name = entry->path().filename();
+            if (version.name.starts_with(stem + ' ') &&
+                readPlace(std::string_view(version.name).substr(stem.size() + 1), &version))
+                versions.push_back(version);
+        }
+        std::sort(versions.begin(), versions.end());
+        return versions;
+    }
 
     const std::string folder;
     const std::string stem;
 };
 
 /// Removes a version that a killed save has linked but not replaced: it still is the file itself.
-void removeLinkTo(const struct stat& file, const Shelf& shelf, const std::vector<Moment>& moments)
+void removeLinkTo(const struct stat& file, const Shelf& shelf, std::vector<Version>* versions)
 {
     if (file.st_nlink == 1)
         return;
-    struct stat version;
-    for (const Moment& moment : moments) {
-        const std::string path = shelf.pathOf(moment);
-        if (lstat(path.c_str(), &version) == 0 && version.st_ino == file.st_ino && version.st_dev == file.st_dev)
-            unlink(path.c_str());
-    }
+    std::erase_if(*versions, [&](const Version& version) {
+        struct stat status;
+        const std::string path = shelf.pathOf(version);
+        return lstat(path.c_str(), &status) == 0 && status.st_ino == file.st_ino && status.st_dev == file.st_dev &&
+               unlink(path.c_str()) == 0;
+    });
 }
 
-/// Removes the oldest of the versions. Those after `present` come from a time when the clock was ahead, and count as
-/// older than all others.
-void removeOldest(const Shelf& shelf, std::vector<Moment> moments, const Moment& present)
+void removeOldest(const Shelf& shelf, const std::vector<Version>& versions)
 {
-    std::rotate(moments.begin(), std::upper_bound(moments.begin(), moments.end(), present), moments.end());
-    for (std::size_t i = 0; i + KeptVersions::kVersions < moments.size(); ++i)
-        unlink(shelf.pathOf(moments[i]).c_str());
+    for (std::size_t i = 0; i + KeptVersions::kVersions < versions.size(); ++i)
+        unlink(shelf.pathOf(versions[i]).c_str());
 }
 
 /// Links the file to `version` unless it has other names. @return false when it has to be copied.
@@ -225,26 +240,25 @@ std::string KeptVersions::keep(const std::string& path, std::time_t now) const
     if (!error.empty())
         failFor(path, error);
     const Shelf shelf(folderFor(path), path);
-    if (const std::error_code reason = makeFolders(shelf.folder, kPrivate))
-        failFor(path, shelf.folder + ": cannot be made: " + reason.message());
+    if (const std::error_code failure = makeFolders(shelf.folder, kPrivate))
+        failFor(path, shelf.folder + ": cannot be made: " + failure.message());
     AtomicFile::removeLeftOvers(shelf.folder); // of copies
     struct stat file;
     if (lstat(path.c_str(), &file) != 0)
         failFor(path, std::strerror(errno));
-    const std::vector<Moment> moments = shelf.moments();
-    removeLinkTo(file, shelf, moments);
-
-    Moment moment{stampOf(now)};
-    for (const Moment& former : moments) // a number is not used again, even if its version is gone
-        if (former.stamp == moment.stamp)
-            moment.number = former.number + 1;
-    removeOldest(shelf, moments, moment); // of saves that were killed before they could prune
-    const std::string version = shelf.pathOf(moment);
+    std::error_code reason;
+    std::vector<Version> versions = shelf.versions(&reason);
+    if (reason)
+        failFor(path, shelf.folder + ": cannot be read: " + reason.message());
+    const std::int64_t serial = versions.empty() ? 1 : versions.back().place.front() + 1;
+    removeLinkTo(file, shelf, &versions);
+    removeOldest(shelf, versions); // of saves that were killed before they could prune
+    const std::string version = shelf.newPath(serial, now);
     if (!linkVersion(path, version)) {
         try {
             copyVersion(path, version);
-        } catch (const std::runtime_error& reason) {
-            failFor(path, reason.what());
+        } catch (const std::runtime_error& failure) {
+            failFor(path, failure.what());
         }
     }
     syncFolder(shelf.folder);
@@ -258,19 +272,17 @@ void KeptVersions::forget(const std::string& version) const
 
 void KeptVersions::prune(const std::string& path, const std::string& newest) const
 {
-    const Shelf shelf(folderFor(path), path);
-    const std::vector<Moment> moments = shelf.moments();
-    const auto present =
-        std::find_if(moments.begin(), moments.end(), [&](const Moment& m) { return shelf.pathOf(m) == newest; });
-    if (present != moments.end())
-        removeOldest(shelf, moments, *present);
+    const Shelf shelf(folderOf(newest), path);
+    std::error_code error; // The next save prunes what this one does not see.
+    removeOldest(shelf, shelf.versions(&error));
 }
 
 std::vector<std::string> KeptVersions::versionsOf(const std::string& path) const
 {
     const Shelf shelf(folderFor(path), path);
-    std::vector<std::string> versions;
-    for (const Moment& moment : shelf.moments())
-        versions.push_back(shelf.pathOf(moment));
-    return versions;
+    std::error_code error;
+    std::vector<std::string> paths;
+    for (const Version& version : shelf.versions(&error))
+        paths.push_back(shelf.pathOf(version));
+    return paths;
 }

@@ -25,7 +25,7 @@ protected:
         versions_.prune(path(name), version);
         return version;
     }
-    /// The contents of the versions, by time.
+    /// The contents of the versions, in the order of the saves.
     std::string contents(const std::string& name) const
     {
         std::string all;
@@ -40,19 +40,20 @@ protected:
 
 } // namespace
 
-TEST_F(KeptVersionsTest, AVersionIsNamedAfterFileAndTime)
+TEST_F(KeptVersionsTest, AVersionIsNamedAfterFileTimeAndNumber)
 {
     const std::string outside = "/Elsewhere" + folder_.path.string();
     const struct {
         std::string file, version;
     } cases[] = {
-        {"Pelorin/Companies/Sample", "/Companies/Sample 2026-11-21 10.53.04"},
-        {"Pelorin/PortoFolios/Sample", "/PortoFolios/Sample 2026-11-21 10.53.04"},
-        {"Pelorin/PortoFolios/a/Sample", "/PortoFolios/a/Sample 2026-11-21 10.53.04"},
-        {"Pelorin/Sample", outside + "/Pelorin/Sample 2026-11-21 10.53.04"},
-        {"Companies/Sample", outside + "/Companies/Sample 2026-11-21 10.53.04"},
-        {"odd/%s \n*\xFF", outside + "/odd/%s \n*\xFF 2026-11-21 10.53.04"},
-        {"Pelorin/Companies/Sample 2026-11-21 10.53.04", "/Companies/Sample 2026-11-21 10.53.04 2026-11-21 10.53.04"},
+        {"Pelorin/Companies/Sample", "/Companies/Sample 2026-11-21 10.53.04 (1)"},
+        {"Pelorin/PortoFolios/Sample", "/PortoFolios/Sample 2026-11-21 10.53.04 (1)"},
+        {"Pelorin/PortoFolios/a/Sample", "/PortoFolios/a/Sample 2026-11-21 10.53.04 (1)"},
+        {"Pelorin/Sample", outside + "/Pelorin/Sample 2026-11-21 10.53.04 (1)"},
+        {"Companies/Sample", outside + "/Companies/Sample 2026-11-21 10.53.04 (1)"},
+        {"odd/%s \n*\xFF", outside + "/odd/%s \n*\xFF 2026-11-21 10.53.04 (1)"},
+        {"Pelorin/Companies/Sample 2026-11-21 10.53.04 (1)",
+         "/Companies/Sample 2026-11-21 10.53.04 (1) 2026-11-21 10.53.04 (1)"},
     };
     for (const auto& c : cases)
         EXPECT_EQ(versions_.keep(folder_.write(c.file, c.file), kNow), path("Pelorin/Backups") + c.version);
@@ -78,8 +79,8 @@ TEST_F(KeptVersionsTest, TheLongestNamesHaveVersionsOfTheirOwn)
 TEST_F(KeptVersionsTest, TheLastTwentyStayHoweverQuicklyTheyCome)
 {
     folder_.write("Sample", "0");
-    folder_.write("Sample 2026-11-21 10.53.04", "other");
-    const std::string other = versions_.keep(path("Sample 2026-11-21 10.53.04"), kNow);
+    folder_.write("Sample 2026-11-21 10.53.04 (1)", "other");
+    const std::string other = versions_.keep(path("Sample 2026-11-21 10.53.04 (1)"), kNow);
     const std::string note = fs::path(other).parent_path() / "Sample 2026-11-21 note";
     std::ofstream(note) << "the user's";
     std::string expected;
@@ -92,16 +93,43 @@ TEST_F(KeptVersionsTest, TheLastTwentyStayHoweverQuicklyTheyCome)
     EXPECT_TRUE(fs::exists(other) && fs::exists(note));
 }
 
-TEST_F(KeptVersionsTest, AClockSetBackDoesNotCostTheNewVersions)
+TEST_F(KeptVersionsTest, TheLastTwentyStayWhateverTheClockDoes)
 {
-    folder_.write("Sample", "a");
-    constexpr int kHour = 3600; // as every autumn
-    for (int i = 0; i < 20; ++i)
-        save("Sample", i < 19 ? "a" : "b", kNow + kHour + i);
-    for (int i = 0; i < 3; ++i)
-        save("Sample", "b", kNow + i);
-    std::string expected = "b b b ";
-    for (int i = 0; i < 17; ++i)
-        expected += "a ";
-    EXPECT_EQ(contents("Sample"), expected);
+    constexpr std::time_t kHour = 3600, kYear = 31557600;
+    const std::time_t clocks[] = {kNow,
+                                  kNow - kHour,
+                                  kNow + 9 * kYear,
+                                  kNow - 30 * kYear,
+                                  kNow + 9000 * kYear,
+                                  kNow + kHour,
+                                  kNow - 3000 * kYear,
+                                  kNow,
+                                  kNow - 1500 * kYear};
+    folder_.write("Sample", "0");
+    std::string expected;
+    for (int i = 0; i < 100; ++i) {
+        save("Sample", std::to_string(i + 1), clocks[i % std::size(clocks)]);
+        expected += std::to_string(i) + ' ';
+        if (i >= 20)
+            expected.erase(0, expected.find(' ') + 1);
+        EXPECT_EQ(contents("Sample"), expected) << i;
+    }
+}
+
+TEST_F(KeptVersionsTest, NamesOfTheFirstReleaseGoFirstAndByTheirTime)
+{
+    folder_.write("Pelorin/Companies/Sample", "now");
+    const char* const names[] = {"-5-01-01 00.00.00",       "905-01-01 00.00.00",      "2026-11-21 10.53.04",
+                                 "2026-11-21 10.53.04-002", "2026-11-21 10.53.04-011", "2026-11-21 10.53.04-1000",
+                                 "12026-01-01 00.00.00"};
+    for (const char* name : names)
+        folder_.write(std::string("Pelorin/Backups/Companies/Sample ") + name, name);
+    std::string expected;
+    for (int i = 0; i < 18; ++i) {
+        save("Pelorin/Companies/Sample", "now", kNow);
+        expected += "now ";
+    }
+    EXPECT_EQ(contents("Pelorin/Companies/Sample"), names[5] + (' ' + (names[6] + (' ' + expected))));
+    save("Pelorin/Companies/Sample", "now", kNow);
+    EXPECT_EQ(contents("Pelorin/Companies/Sample"), names[6] + (' ' + expected) + "now ");
 }

@@ -58,7 +58,7 @@ struct Saves {
         };
         return DurableSave(data).save(path, write).outcome == DurableSave::Outcome::kSaved;
     }
-    /// The saves that have written the versions, by time.
+    /// The saves that have written the versions, in their order.
     std::vector<int> versions() const
     {
         std::vector<int> numbers;
