@@ -107,16 +107,18 @@ void DurableSave::replace(const std::string& path, const Writer& write) const
     fill(file.stream(), path, write);
     // The old file is kept only when it is sure to be replaced, and as late as possible.
     file.flush();
+    const SaveLock lock(file.target(), folder_, patience_);
     if (!exists(file.target())) {
         file.commit();
         return;
     }
-    const std::string version = versions_.keep(file.target());
+    const KeptVersions versions(folder_);
+    const std::string version = versions.keep(file.target());
     try {
         file.commit();
     } catch (const AtomicFile::WriteError&) {
-        versions_.forget(version);
+        versions.forget(version);
         throw;
     }
-    versions_.prune(file.target(), version);
+    versions.prune(file.target(), version);
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "app/KeptVersions.h"
+#include "app/SaveLock.h"
 
 #include <cstdio>
 #include <functional>
@@ -9,9 +10,11 @@
 /// Saves a file so that a crash, a full disk or a pulled plug at any moment leaves the old file or the new one, whole,
 /// and keeps the old one among the kept versions.
 ///
-/// The new contents go to a temporary file and to the disk; then the old file is kept, then replaced. Whatever fails
-/// leaves the old file as it was. A link at the path stays, and so do the file's permissions. A file that the user may
-/// not write to is not replaced, nor one in a folder where he may not make files.
+/// The new contents go to a temporary file and to the disk; then the old file is kept, then replaced, under a lock, so
+/// that of several programs which save one file each finds in its place what the one before it has saved. Whatever
+/// fails leaves the old file as it was. A link at the path stays, and so do the
+/// file's permissions. A file that the user may not write to is not replaced, nor one in a folder where he may not make
+/// files.
 class DurableSave {
 public:
     enum class Outcome { kSaved, kOpenFailed, kWriteFailed };
@@ -22,14 +25,20 @@ public:
     /// Writes the contents, perhaps none. @return 0, or -1 when that failed.
     using Writer = std::function<int(FILE*)>;
 
-    explicit DurableSave(const DataFolder& folder) : versions_(folder) {}
+    /// @param patience how long a save waits for another program that saves in the same folder.
+    explicit DurableSave(const DataFolder& folder, SaveLock::Patience patience = kPatience)
+        : folder_(folder), patience_(patience)
+    {}
 
     /// Saves what `write` writes to `path`. It is called at most once, and only when the file could be opened.
-    /// @return kWriteFailed also when the old file could not be kept.
+    /// @return kWriteFailed also when the old file could not be kept, or another program did not end its save.
     Result save(const std::string& path, const Writer& write) const;
 
 private:
+    static constexpr SaveLock::Patience kPatience{10000}; // longer than a slow disk takes to copy a large file
+
     void replace(const std::string& path, const Writer& write) const;
 
-    KeptVersions versions_;
+    DataFolder folder_;
+    SaveLock::Patience patience_;
 };

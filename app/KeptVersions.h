@@ -27,7 +27,9 @@ public:
 
     explicit KeptVersions(const DataFolder& folder) : folder_(folder) {}
 
-    /// Keeps the file at `path` (absolute, no links) as it is now; the version is on the disk on return.
+    /// Keeps the file at `path` (absolute, no links) as it is now; the version is on the disk on return. From here to
+    /// the end of `prune` the caller holds a SaveLock: the link of another save that is under way would be taken for
+    /// one that a killed save has left.
     /// Throws std::runtime_error with one line for the user when it cannot be kept.
     /// @return the version's path.
     std::string keep(const std::string& path, std::time_t now = std::time(nullptr)) const;

@@ -5,6 +5,8 @@
 #include <fcntl.h>
 #include <gtest/gtest.h>
 #include <ostream>
+#include <set>
+#include <sys/file.h>
 #include <sys/resource.h>
 
 namespace {
@@ -30,6 +32,19 @@ int writeMuch(FILE* file)
     return std::fwrite(much.data(), 1, much.size(), file) == much.size() ? 0 : -1;
 }
 
+/// Starts a program that saves `content` as soon as `start` is closed. @return its number; it exits with the outcome.
+pid_t startSave(const DataFolder& data, const std::string& path, const std::string& content, const int (&start)[2])
+{
+    const pid_t child = fork();
+    if (child != 0)
+        return child;
+    close(start[1]);
+    char none;
+    (void)!read(start[0], &none, 1);
+    const auto write = [&content](FILE* file) { return std::fputs(content.c_str(), file) < 0 ? -1 : 0; };
+    _exit(static_cast<int>(DurableSave(data).save(path, write).outcome));
+}
+
 class DurableSaveTest : public testing::Test {
 protected:
     /// The names in the folder, with the number of versions of `name` behind it.
@@ -39,6 +54,17 @@ protected:
         for (const auto& entry : fs::directory_iterator(folder_ / "files"))
             all += entry.path().filename().string() + ' ';
         return all + std::to_string(KeptVersions(data_).versionsOf(folder_ / ("files/" + name)).size());
+    }
+
+    /// What is in `path` and among the versions of either data folder.
+    std::set<std::string> contents(const std::string& path) const
+    {
+        std::set<std::string> all{contentOf(path)};
+        for (const char* data : {"Pelorin", "Other"})
+            for (const auto& entry : fs::recursive_directory_iterator(folder_ / data))
+                if (entry.is_regular_file())
+                    all.insert(contentOf(entry.path()));
+        return all;
     }
 
     TemporaryFolder folder_{"DurableSaveTest"};
@@ -144,6 +170,76 @@ TEST_F(DurableSaveTest, WithoutAVersionTheOldFileStays)
                                  ": cannot be made: Not a directory");
     EXPECT_EQ(folder_.content("f"), "old");
     EXPECT_EQ(save_.save(folder_ / "new", writeNew).outcome, kSaved) << "there is nothing to keep";
+}
+
+TEST_F(DurableSaveTest, OfProgramsThatSaveAtOnceNoneLosesWhatAnotherHasSaved)
+{
+    const char* const text = std::getenv("PELORIN_SAVE_ROUNDS");
+    const int rounds = text != nullptr ? std::atoi(text) : 20;
+    const struct {
+        const char* why;
+        const char* secondData;
+        int mode; // of the folder
+    } cases[] = {
+        {"a user with three windows", "Pelorin", 0755},
+        {"users who share a folder", "Other", 0755},
+        {"a folder that cannot be read, so cannot be locked", "Pelorin", 0333},
+    };
+    for (const auto& c : cases) {
+        int lost = 0, refused = 0;
+        for (int round = 0; round < rounds; ++round) {
+            const std::string file = folder_ / "files/f", link = folder_ / "link";
+            for (const char* data : {"Pelorin", "Other"})
+                fs::create_directory(folder_ / data);
+            fs::create_directory(folder_ / "files");
+            fs::create_symlink("files/f", link);
+            if (round % 2 == 0)
+                folder_.write("files/f", "old");
+            fs::permissions(folder_ / "files", fs::perms(c.mode));
+
+            int start[2];
+            ASSERT_EQ(pipe(start), 0);
+            const pid_t programs[] = {startSave(data_, file, "0", start),
+                                      startSave(DataFolder(folder_ / c.secondData), file, "1", start),
+                                      startSave(data_, link, "2", start)};
+            close(start[0]);
+            close(start[1]);
+            std::set<std::string> told;
+            if (round % 2 == 0)
+                told.insert("old");
+            for (std::size_t i = 0; i < std::size(programs); ++i) {
+                int status = -1;
+                waitpid(programs[i], &status, 0);
+                if (status == 0)
+                    told.insert(std::to_string(i));
+                else
+                    ++refused;
+            }
+            const std::set<std::string> found = contents(file);
+            for (const std::string& content : told)
+                lost += found.count(content) == 0;
+            fs::permissions(folder_ / "files", fs::perms(0755));
+            for (const char* name : {"files", "link", "Pelorin", "Other"})
+                fs::remove_all(folder_ / name);
+        }
+        EXPECT_EQ(lost, 0) << c.why;
+        EXPECT_EQ(refused, 0) << c.why;
+    }
+}
+
+TEST_F(DurableSaveTest, AProgramThatStopsWithinItsSaveHoldsUpOthersOnlyForATime)
+{
+    folder_.write("files/f", "old");
+    const int folder = open((folder_ / "files").c_str(), O_RDONLY | O_DIRECTORY);
+    ASSERT_EQ(flock(folder, LOCK_EX), 0);
+    const DurableSave::Result result =
+        DurableSave(data_, std::chrono::milliseconds(50)).save(folder_ / "files/f", writeNew);
+    EXPECT_EQ(result.outcome, kWriteFailed);
+    EXPECT_EQ(result.reason, folder_ / "files/f" + ": cannot be written: another program is saving in its folder and "
+                                                   "does not come to an end");
+    EXPECT_EQ(folder_.content("files/f") + ' ' + names("f"), "old f 0");
+    close(folder);
+    EXPECT_EQ(save_.save(folder_ / "files/f", writeNew).outcome, kSaved);
 }
 
 TEST_F(DurableSaveTest, ATerminalThatIsStoppedFailsTheSaveInsteadOfHoldingItUp)

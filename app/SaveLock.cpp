@@ -1,0 +1,70 @@
+#include "app/SaveLock.h"
+
+#include "foundation/AtomicFile.h"
+#include "foundation/Folders.h"
+
+#include <cerrno>
+#include <cstring>
+#include <fcntl.h>
+#include <sys/file.h>
+#include <thread>
+#include <unistd.h>
+
+namespace {
+
+using Clock = std::chrono::steady_clock;
+
+[[noreturn]] void failFor(const std::string& path, const std::string& reason)
+{
+    throw AtomicFile::WriteError(path + ": cannot be written: " + reason);
+}
+
+/// Locks what was opened as `descriptor`, or closes it. @return `descriptor`; -1 with errno set, ETIMEDOUT when
+/// somebody else had it locked all the time.
+int lockOpened(int descriptor, Clock::time_point end)
+{
+    constexpr std::chrono::milliseconds kPause(2);
+    if (descriptor < 0)
+        return -1;
+    while (flock(descriptor, LOCK_EX | LOCK_NB) != 0) {
+        const int reason = errno;
+        if (reason == EINTR || (reason == EWOULDBLOCK && Clock::now() < end)) {
+            std::this_thread::sleep_for(kPause);
+            continue;
+        }
+        close(descriptor);
+        errno = reason == EWOULDBLOCK ? ETIMEDOUT : reason;
+        return -1;
+    }
+    return descriptor;
+}
+
+/// Whether `reason` says that a folder is of the kind that cannot be locked. All who save there find it so.
+bool isWithoutLocks(int reason)
+{
+    return reason == EACCES || reason == EBADF || reason == EINVAL || reason == ENOLCK || reason == ENOSYS ||
+           reason == EOPNOTSUPP;
+}
+
+} // namespace
+
+SaveLock::SaveLock(const std::string& path, const DataFolder& folder, Patience patience)
+{
+    const Clock::time_point end = Clock::now() + patience;
+    descriptor_ = lockOpened(open(folderOf(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC), end);
+    if (descriptor_ < 0 && isWithoutLocks(errno)) {
+        std::string error;
+        const std::string file = folder.backups(&error) + "/.lock";
+        if (!error.empty())
+            failFor(path, error);
+        descriptor_ = lockOpened(open(file.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600), end);
+    }
+    if (descriptor_ < 0)
+        failFor(path, errno == ETIMEDOUT ? "another program is saving in its folder and does not come to an end"
+                                         : std::string("its folder cannot be locked: ") + std::strerror(errno));
+}
+
+SaveLock::~SaveLock()
+{
+    close(descriptor_);
+}
