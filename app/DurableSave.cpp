@@ -45,16 +45,14 @@ void fill(FILE* stream, const std::string& path, const DurableSave::Writer& writ
         failWriting(path);
 }
 
-bool exists(const std::string& path)
-{
-    struct stat status;
-    return lstat(path.c_str(), &status) == 0;
-}
-
 bool isDevice(const std::string& path)
 {
     struct stat status;
-    return stat(path.c_str(), &status) == 0 && S_ISCHR(status.st_mode);
+    if (stat(path.c_str(), &status) == 0)
+        return S_ISCHR(status.st_mode);
+    if (errno != ENOENT)
+        throw AtomicFile::OpenError(path + ": cannot be opened: " + std::strerror(errno));
+    return false;
 }
 
 /// A device has no contents that could be lost, and must not be replaced by a file. One that takes nothing for the
@@ -108,7 +106,7 @@ void DurableSave::replace(const std::string& path, const Writer& write) const
     // The old file is kept only when it is sure to be replaced, and as late as possible.
     file.flush();
     const SaveLock lock(file.target(), folder_, patience_);
-    if (!exists(file.target())) {
+    if (!file.replaces()) {
         file.commit();
         return;
     }

@@ -161,17 +161,20 @@ void removeOldest(const Shelf& shelf, const std::vector<Version>& versions)
         unlink(shelf.pathOf(versions[i]).c_str());
 }
 
-/// Links the file to `version` unless it has other names. @return false when it has to be copied.
+/// Links the file to `version` unless it has other names. Throws a WriteError when it cannot be brought to the disk.
+/// @return false when it has to be copied.
 bool linkVersion(const std::string& path, const std::string& version)
 {
     struct stat file;
     if (lstat(path.c_str(), &file) != 0 || file.st_nlink != 1 || link(path.c_str(), version.c_str()) != 0)
         return false;
-    // Whoever wrote the file may not have brought it to the disk. It cannot always be opened; it is kept even so.
+    // Whoever wrote the file may not have brought it to the disk. One that may not be read is kept even so.
     const Descriptor written(version);
-    if (written.number >= 0)
-        (void)fsync(written.number);
-    return true;
+    if (written.number >= 0 ? fsync(written.number) == 0 || errno == EINVAL : errno == EACCES)
+        return true;
+    const int reason = errno;
+    unlink(version.c_str());
+    throw AtomicFile::WriteError(std::strerror(reason));
 }
 
 /// Copies what is left of `from` to `to`. @return false with errno set.
@@ -224,6 +227,8 @@ std::string KeptVersions::folderFor(const std::string& path) const
     for (const char* kind : {DataFolder::kCompanies, DataFolder::kPortoFolios}) {
         std::error_code error;
         const fs::path base = fs::weakly_canonical(folder_.path() + kind, error);
+        if (error)
+            failFor(path, folder_.path() + kind + ": " + error.message());
         const fs::path within = folder.lexically_relative(base);
         if (within == ".")
             return backups + kind;
@@ -254,12 +259,11 @@ std::string KeptVersions::keep(const std::string& path, std::time_t now) const
     removeLinkTo(file, shelf, &versions);
     removeOldest(shelf, versions); // of saves that were killed before they could prune
     const std::string version = shelf.newPath(serial, now);
-    if (!linkVersion(path, version)) {
-        try {
+    try {
+        if (!linkVersion(path, version))
             copyVersion(path, version);
-        } catch (const std::runtime_error& failure) {
-            failFor(path, failure.what());
-        }
+    } catch (const std::runtime_error& failure) {
+        failFor(path, failure.what());
     }
     syncFolder(shelf.folder);
     return version;

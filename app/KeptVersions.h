@@ -40,7 +40,7 @@ public:
     /// so that there is never more than one too many.
     void prune(const std::string& path, const std::string& newest) const;
 
-    /// The paths of the versions of the file at `path`, in the order of the saves.
+    /// The paths of the versions of the file at `path`, in the order of the saves. Throws as `keep` does.
     std::vector<std::string> versionsOf(const std::string& path) const;
 
 private:

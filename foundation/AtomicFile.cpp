@@ -17,6 +17,8 @@ namespace fs = std::filesystem;
 
 constexpr std::string_view kPrefix = ".pelorin-";
 constexpr std::string_view kSuffix = ".tmp";
+constexpr const char* kCannotOpen = "cannot be opened";
+constexpr const char* kCannotWrite = "cannot be written";
 
 template <class Error>
 [[noreturn]] void failFor(const std::string& path, const char* what)
@@ -30,16 +32,45 @@ template <class Error>
     throw Error(path + ": exists already and is left as it is");
 }
 
-/// What `path` leads to, which need not exist. The caller has seen that its links end somewhere.
+/// Whether there is something at `path`. When that cannot be told, throws an Error for `shown` that says `what`: taken
+/// for nothing, it would be replaced unseen.
+/// @param flags AT_SYMLINK_NOFOLLOW to look at a link itself.
+template <class Error>
+bool isThere(const std::string& path, int flags, const std::string& shown, const char* what, struct stat* status)
+{
+    if (fstatat(AT_FDCWD, path.c_str(), status, flags) == 0)
+        return true;
+    if (errno != ENOENT)
+        failFor<Error>(shown, what);
+    return false;
+}
+
+bool isLink(const std::string& path, const std::string& shown)
+{
+    struct stat status;
+    return isThere<AtomicFile::OpenError>(path, AT_SYMLINK_NOFOLLOW, shown, kCannotOpen, &status) &&
+           S_ISLNK(status.st_mode);
+}
+
+/// What `path` leads to, which need not exist. Throws an OpenError when that cannot be told.
 std::string withoutLinks(const std::string& path)
 {
-    constexpr int kMaxLinks = 40; // those of a ring that has come up since
+    constexpr int kMaxLinks = 40; // those of a ring that has come up since the check
     std::error_code error;
     fs::path target = path;
-    for (int i = 0; i < kMaxLinks && fs::is_symlink(target, error); ++i)
+    for (int links = 0; !error && isLink(target, path); ++links) {
         target = target.parent_path() / fs::read_symlink(target, error);
-    const fs::path folder = fs::canonical(folderOf(target), error);
-    return error ? target : folder / target.filename();
+        if (links == kMaxLinks)
+            error = std::make_error_code(std::errc::too_many_symbolic_link_levels);
+    }
+    fs::path folder;
+    if (!error)
+        folder = fs::canonical(folderOf(target), error);
+    if (error) {
+        errno = error.value();
+        failFor<AtomicFile::OpenError>(path, kCannotOpen);
+    }
+    return folder / target.filename();
 }
 
 /// Locks a temporary file that was just created. @return false when it was taken for a left-over before it was locked.
@@ -108,25 +139,22 @@ void removeUnlessLocked(const std::string& path)
 void AtomicFile::check(const std::string& path, Existing existing)
 {
     struct stat status;
-    if (lstat(path.c_str(), &status) != 0) {
+    if (!isThere<OpenError>(path, AT_SYMLINK_NOFOLLOW, path, kCannotOpen, &status)) {
         // An empty name is refused here: it would be found to be no name only after the writing.
-        if (errno != ENOENT || path.empty())
-            failFor<OpenError>(path, "cannot be opened");
+        if (path.empty())
+            failFor<OpenError>(path, kCannotOpen);
         return;
     }
     if (existing == Existing::kKeep)
         failForExisting<OpenError>(path);
-    if (stat(path.c_str(), &status) != 0) {
-        if (errno != ENOENT)
-            failFor<OpenError>(path, "cannot be opened");
+    if (!isThere<OpenError>(path, 0, path, kCannotOpen, &status))
         return; // a link to a file that is yet to be made
-    }
     // Renaming would put a file in the place of a device or a pipe.
     if (!S_ISREG(status.st_mode))
         throw OpenError(path + ": is not an ordinary file");
     // It would also replace a file that its owner has protected.
     if (faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) != 0)
-        failFor<OpenError>(path, "cannot be opened");
+        failFor<OpenError>(path, kCannotOpen);
 }
 
 void AtomicFile::removeLeftOvers(const std::string& folder)
@@ -160,7 +188,8 @@ void AtomicFile::create()
     removeLeftOvers(folder);
     // Until it has the permissions of the file that it replaces, its contents are for nobody else.
     struct stat status;
-    const mode_t mode = lstat(target_.c_str(), &status) == 0 ? 0600 : 0666;
+    const bool isOld = isThere<OpenError>(target_, AT_SYMLINK_NOFOLLOW, path_, kCannotOpen, &status);
+    const mode_t mode = isOld ? 0600 : 0666;
     const int descriptor = createIn(folder, mode, &temporary_);
     if (descriptor < 0) {
         temporary_.clear();
@@ -168,8 +197,10 @@ void AtomicFile::create()
     }
     stream_ = fdopen(descriptor, "wb");
     if (stream_ == nullptr) {
+        const int reason = errno;
         close(descriptor);
         unlink(temporary_.c_str());
+        errno = reason;
         failFor<OpenError>(path_, "cannot be created");
     }
 }
@@ -181,8 +212,14 @@ void AtomicFile::flush()
         errno = EIO;
     keepPermissions();
     if (std::ferror(stream_) != 0 || std::fflush(stream_) != 0 || fsync(fileno(stream_)) != 0)
-        fail("cannot be written");
+        fail(kCannotWrite);
     flushed_ = true;
+}
+
+bool AtomicFile::replaces() const
+{
+    struct stat status;
+    return isThere<WriteError>(target_, AT_SYMLINK_NOFOLLOW, path_, kCannotWrite, &status);
 }
 
 void AtomicFile::commit()
@@ -200,7 +237,7 @@ void AtomicFile::commit()
 void AtomicFile::keepPermissions() const
 {
     struct stat former;
-    if (existing_ != Existing::kReplace || stat(target_.c_str(), &former) != 0)
+    if (existing_ != Existing::kReplace || !isThere<WriteError>(target_, 0, path_, kCannotWrite, &former))
         return;
     constexpr auto kSameOwner = static_cast<uid_t>(-1);
     const int file = fileno(stream_);

@@ -27,8 +27,8 @@ public:
     };
 
     /// Throws an OpenError when a file of this name could not be written in the end: it is there already and to be
-    /// kept, it may not be written to, or it is no ordinary file. A check ahead of long work; the constructor makes it
-    /// again.
+    /// kept, it may not be written to or looked at, or it is no ordinary file. A check ahead of long work; the
+    /// constructor makes it again.
     static void check(const std::string& path, Existing existing);
 
     /// Removes the temporary files in `folder` that killed programs have left. The constructor does so, too.
@@ -50,6 +50,8 @@ public:
     /// may set them. Nothing may be written afterwards. For work that must wait until the contents are safe, and come
     /// before the commit.
     void flush();
+    /// Whether there is a file now that the commit would replace. Throws a WriteError when that cannot be told.
+    bool replaces() const;
     /// Flushes unless that is done, and gives the contents their name.
     void commit();
     /// Throws a WriteError with the file's name, `what` and the reason in errno.
