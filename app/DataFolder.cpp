@@ -1,10 +1,12 @@
 #include "app/DataFolder.h"
 
 #include "foundation/Folders.h"
+#include "foundation/InputFile.h"
 
 #include <cstdlib>
-#include <fstream>
 #include <pwd.h>
+#include <sstream>
+#include <stdexcept>
 #include <string_view>
 #include <unistd.h>
 
@@ -61,10 +63,25 @@ bool readDocumentsLine(std::string_view line, std::string* value)
     return true;
 }
 
+/// What the file holds; nothing when it cannot be opened.
+std::string contentOf(const std::string& path)
+{
+    std::string content;
+    try {
+        const InputFile file(path);
+        char piece[4096];
+        while (const std::size_t got = std::fread(piece, 1, sizeof piece, file.stream()))
+            content.append(piece, got);
+    } catch (const std::runtime_error&) {
+        // As a rule it is not there: the desktop does without it.
+    }
+    return content;
+}
+
 /// The folder that the desktop's configuration names; empty when it names none. The last line counts.
 std::string configuredDocuments(const std::string& home)
 {
-    std::ifstream file(configurationFolder(home) + "/user-dirs.dirs");
+    std::istringstream file(contentOf(configurationFolder(home) + "/user-dirs.dirs"));
     std::string value;
     for (std::string line; std::getline(file, line);)
         readDocumentsLine(line, &value);

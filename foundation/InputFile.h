@@ -3,7 +3,12 @@
 #include <cstdio>
 #include <string>
 
-/// A data file open for reading. What cannot be opened throws std::runtime_error with one line for the user.
+/// Opens a file that a person has named. Only ordinary files, and links to them, are opened: reading anything else, a
+/// pipe or a device, could take for ever. What is not opened throws std::runtime_error with one line for the user.
+/// @return the descriptor, which the caller closes.
+int openForReading(const std::string& path);
+
+/// A data file open for reading, by `openForReading`.
 class InputFile {
 public:
     explicit InputFile(const std::string& path);

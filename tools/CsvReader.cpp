@@ -1,14 +1,17 @@
 #include "tools/CsvReader.h"
 
+#include "foundation/InputFile.h"
+
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
+#include <new>
 #include <stdexcept>
 
-CsvReader::CsvReader(const std::string& path) : path_(path), file_(gzopen(path.c_str(), "rb"))
+CsvReader::CsvReader(const std::string& path) : path_(path), file_(gzdopen(openForReading(path), "rb"))
 {
     if (file_ == nullptr)
-        throw std::runtime_error(path + ": cannot be opened: " + std::strerror(errno));
+        throw std::bad_alloc();
     constexpr unsigned kBuffer = 1U << 17; // bytes; the library's own 8 KiB make it slower
     gzbuffer(file_, kBuffer);
 }

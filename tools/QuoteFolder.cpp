@@ -51,8 +51,7 @@ Closes QuoteFolder::closesOf(std::string_view ticker) const
     Closes closes;
     const std::filesystem::path file = folder_ / (std::string(ticker) + ".csv");
     std::error_code error;
-    // Opening anything else, a pipe for one, could take for ever.
-    if (!isFileName(ticker) || !std::filesystem::is_regular_file(file, error))
+    if (!isFileName(ticker) || !std::filesystem::exists(file, error))
         return closes;
     try {
         Table table(file, quotesOfOneTicker());

@@ -20,7 +20,8 @@ const char* const kTables = R"(The tables are CSV files, plain or gzipped, with 
            name, in any order; usual headings are known (Date, Symbol, Close, Price, Exchange, ...)
   rates    date,currency,rate, likewise
   listing  ticker,market,currency,name, likewise; cells may be empty
-Dates are YYYY-MM-DD or DD/MM/YYYY. Numbers may have a decimal comma where commas do not separate the fields.
+Only ordinary files are read, no pipes. Dates are YYYY-MM-DD or DD/MM/YYYY. Numbers may have a decimal comma where
+commas do not separate the fields.
 What a row of the quotes says comes before the listing, the listing before the options. Of two values for the same
 day the later line counts. A line that cannot be used is reported with its number and skipped.
 

@@ -3,6 +3,7 @@
 #include "tests/support/ToolRun.h"
 
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 
 namespace {
 
@@ -50,6 +51,9 @@ TEST_F(DataFolderTest, IsWhereTheDesktopKeepsDocuments)
             EXPECT_EQ(DataFolder().path(), c.path) << c.why;
             fs::remove_all(configuration);
         }
+    fs::create_directory(folder_.path / "config");
+    ASSERT_EQ(mkfifo((folder_.path / "config/user-dirs.dirs").c_str(), 0600), 0);
+    EXPECT_EQ(DataFolder().path(), home + "/Documents/Pelorin") << "a pipe is not waited for";
     unsetenv("HOME");
     EXPECT_EQ(DataFolder().path().front(), '/') << "the user's entry has a home folder, too";
 }

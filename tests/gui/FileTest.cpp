@@ -10,6 +10,7 @@
 #include <filesystem>
 #include <fstream>
 #include <gmock/gmock.h>
+#include <sys/stat.h>
 
 namespace {
 
@@ -117,11 +118,18 @@ TEST_F(FileTest, FileThatCannotBeOpenedLeavesEverything)
     const auto currencies = window().catalogue().getNbrCurrencies();
     BMessage refs(B_REFS_RECEIVED);
     receive(refs, "ERROR GETTING REF");
-    const entry_ref missing{folder(), "missing"};
-    refs.AddRef("refs", &missing);
+    const std::string pipe = folder() + "/pipe"; // which nobody writes into: opening it would wait for ever
+    ASSERT_EQ(mkfifo(pipe.c_str(), 0600), 0);
     for (const Page page : {kCompanyPage, kPortoFolioPage}) {
-        show(page);
-        receive(refs, "OPEN FAILED: " + folder() + "/missing");
+        for (const entry_ref& odd : {entry_ref{folder(), "missing"}, entry_ref{folder(), "pipe"},
+                                     entry_ref{folder(), "Companies"}, entry_ref{"/dev", "zero"}}) {
+            show(page);
+            refs = BMessage(B_REFS_RECEIVED);
+            refs.AddRef("refs", &odd);
+            receive(refs, "OPEN FAILED: " + odd.directory + '/' + odd.name);
+        }
+        load(page, page == kCompanyPage ? "btnLoadMarket" : "btnLoadPortoFolio", pipe);
+        EXPECT_EQ(message(), "OPEN FAILED: " + pipe);
     }
     for (const Page page : {kOperationPage, kParameterPage}) { // which have no files
         show(page);

@@ -2,6 +2,9 @@
 #include "tests/support/ToolRun.h"
 
 #include <gmock/gmock.h>
+#include <sys/socket.h>
+#include <sys/stat.h>
+#include <sys/un.h>
 
 using testing::HasSubstr;
 
@@ -54,4 +57,34 @@ TEST(ProgramsTest, FailureIsOneLineThatNamesTheReasonAndMakesNoFile)
         EXPECT_TRUE(c.status != 1 || std::ranges::count(run.err, '\n') == 1) << run.err;
     }
     EXPECT_FALSE(std::filesystem::exists(folder / "new"));
+}
+
+TEST(ProgramsTest, WhatIsNoOrdinaryFileIsRefusedAtOnce)
+{
+    const TemporaryFolder folder("ProgramsTest");
+    ASSERT_EQ(ToolRun(PELORIN_SAMPLE, "data --date 20/07/2025", folder).status, 0);
+    ASSERT_EQ(mkfifo((folder / "pipe").c_str(), 0600), 0); // which nobody writes into
+    sockaddr_un address{AF_UNIX, {}};
+    (folder / "socket").copy(address.sun_path, sizeof address.sun_path - 1);
+    const int socket = ::socket(AF_UNIX, SOCK_STREAM, 0);
+    ASSERT_EQ(bind(socket, reinterpret_cast<const sockaddr*>(&address), sizeof address), 0);
+    std::filesystem::create_symlink("data/Companies/Sample", folder.path / "link");
+    const std::pair<const char*, const char*> uses[] = {
+        {PELORIN_VALUE, "% data/PortoFolios/Sample"},
+        {PELORIN_VALUE, "link % --json"},
+        {PELORIN_IMPORT, "new --quotes %"},
+        {PELORIN_IMPORT, "new --rates %"},
+        {PELORIN_IMPORT, "new --rates % --listing %"},
+    };
+    for (const auto& [program, use] : uses)
+        for (const std::string odd : {"pipe", "socket", "/dev/zero"}) {
+            std::string arguments(use);
+            for (std::size_t at; (at = arguments.find('%')) != arguments.npos;)
+                arguments.replace(at, 1, odd);
+            const ToolRun run(program, arguments, folder);
+            EXPECT_EQ(run.status, 1) << program << arguments;
+            EXPECT_THAT(run.err, testing::EndsWith(": " + odd + ": is not an ordinary file\n")) << arguments;
+        }
+    EXPECT_EQ(ToolRun(PELORIN_VALUE, "link data/PortoFolios/Sample", folder).status, 0) << "of a file, it is one";
+    close(socket);
 }

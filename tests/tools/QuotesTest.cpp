@@ -101,6 +101,7 @@ TEST_F(QuotesTest, OtherRequestsGetAPageWithoutAPrice)
     for (const char* request : {"", "GET", "get /quotes?symbol=A", "GET /idc/nasdgraph.idc?usymbol=A"})
         EXPECT_EQ(folder.answer(request), noQuotesPage()) << request;
     EXPECT_THAT(log.str(), HasSubstr("BAD.csv, line 2: "));
+    EXPECT_THAT(log.str(), HasSubstr("PIPE.csv: is not an ordinary file\n"));
     float price = 0;
     EXPECT_EQ(parseLatestQuotePage(noQuotesPage(), &price), -1);
     EXPECT_THROW(QuoteFolder(folder_ / "out.csv", log), std::runtime_error);
