@@ -22,6 +22,12 @@ char* reallocate(char* text, std::size_t size)
 
 const char* const String::NULLSTRING = "null";
 
+const String& String::none()
+{
+    static const String none;
+    return none;
+}
+
 String::String(const char* s)
 {
     if (s != nullptr)

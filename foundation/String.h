@@ -13,6 +13,9 @@ public:
     /// Stands in for a String without text where characters are asked for: "null".
     static const char* const NULLSTRING;
 
+    /// One without text, for what gives a reference.
+    static const String& none();
+
     String() = default;
     /// Copies `s` up to its terminating zero; null gives a String without text.
     String(const char* s);

@@ -78,10 +78,10 @@ int Company::readEvents(FILE* file)
     return reachedEnd(file) ? -1 : 0;
 }
 
-String Company::getCurrencyRepresentation() const
+const String& Company::getCurrencyRepresentation() const
 {
     const Market* market = market_.partner();
-    return market != nullptr ? market->getCurrencyRepresentation() : String();
+    return market != nullptr ? market->getCurrencyRepresentation() : String::none();
 }
 
 ManyToOneAssociation<Company, Market>& MarketToCompanies::backLink(Company& e) const

@@ -30,7 +30,7 @@ public:
     int getMarket(Market** out) const { return market_.get(out); }
     int setMarket(Market* market) { return market_.set(market); }
     /// The short symbol of the market's currency; a String without text when market or currency is missing.
-    String getCurrencyRepresentation() const;
+    const String& getCurrencyRepresentation() const;
 
     int addShare(Share* share) { return shares_.add(share); }
     int removeShare(Share* share) { return shares_.remove(share); }

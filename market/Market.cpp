@@ -48,10 +48,10 @@ int Market::rd(FILE* file)
     return reachedEnd(file) ? -1 : 0;
 }
 
-String Market::getCurrencyRepresentation() const
+const String& Market::getCurrencyRepresentation() const
 {
     const Currency* currency = currency_.partner();
-    return currency != nullptr ? currency->getRepresentation() : String();
+    return currency != nullptr ? currency->getRepresentation() : String::none();
 }
 
 int Market::getCompany(const String& abbreviation, Company** out) const

@@ -22,7 +22,7 @@ public:
     int getCurrency(Currency** out) const { return currency_.get(out); }
     int setCurrency(Currency* currency) { return currency_.set(currency); }
     /// The currency's short symbol; a String without text when the market has no currency.
-    String getCurrencyRepresentation() const;
+    const String& getCurrencyRepresentation() const;
 
     int addCompany(Company* company) { return companies_.add(company); }
     int removeCompany(Company* company) { return companies_.remove(company); }

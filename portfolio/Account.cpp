@@ -114,14 +114,14 @@ int Account::readTransferOperations(FILE* file)
     return reachedEnd(file) ? -1 : 0;
 }
 
-String Account::getCurrencyName() const
+const String& Account::getCurrencyName() const
 {
-    return currency_.partner() != nullptr ? currency_.partner()->getName() : String();
+    return currency_.partner() != nullptr ? currency_.partner()->getName() : String::none();
 }
 
-String Account::getCurrencyRepresentation() const
+const String& Account::getCurrencyRepresentation() const
 {
-    return currency_.partner() != nullptr ? currency_.partner()->getRepresentation() : String();
+    return currency_.partner() != nullptr ? currency_.partner()->getRepresentation() : String::none();
 }
 
 int Account::getShare(const String& market, const String& abbreviation, Share** out) const

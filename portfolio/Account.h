@@ -44,8 +44,8 @@ public:
     int getCurrency(Currency** out) const { return currency_.get(out); }
     int setCurrency(Currency* currency) { return currency_.set(currency); }
     /// Of its currency; Strings without text when it has none.
-    String getCurrencyName() const;
-    String getCurrencyRepresentation() const;
+    const String& getCurrencyName() const;
+    const String& getCurrencyRepresentation() const;
 
     int addOperation(Operation* operation) { return operations_.add(operation); }
     int removeOperation(Operation* operation) { return operations_.remove(operation); }

@@ -21,9 +21,9 @@ void Operation::notifyChange()
         account()->operationChanged();
 }
 
-String Operation::getCurrencyRepresentation() const
+const String& Operation::getCurrencyRepresentation() const
 {
-    return account() != nullptr ? account()->getCurrencyRepresentation() : String();
+    return account() != nullptr ? account()->getCurrencyRepresentation() : String::none();
 }
 
 Account* Operation::getAccountByName(const String& name) const

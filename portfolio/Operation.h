@@ -32,7 +32,7 @@ public:
     int setAccount(Account* account) { return account_.set(account); }
 
     /// The account's currency symbol; a String without text when account or currency is missing.
-    String getCurrencyRepresentation() const;
+    const String& getCurrencyRepresentation() const;
     /// The first account of that name in the account's wallet, null when there is none.
     Account* getAccountByName(const String& name) const;
 

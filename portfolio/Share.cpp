@@ -35,23 +35,23 @@ int Share::rd(FILE*)
     return 0;
 }
 
-String Share::getMarketName() const
+const String& Share::getMarketName() const
 {
     Market* market = nullptr;
     const Company* company = company_.partner();
-    return company != nullptr && company->getMarket(&market) == 0 ? market->getName() : String();
+    return company != nullptr && company->getMarket(&market) == 0 ? market->getName() : String::none();
 }
 
-String Share::getCompanyAbbreviation() const
+const String& Share::getCompanyAbbreviation() const
 {
     const Company* company = company_.partner();
-    return company != nullptr ? company->getAbbreviation() : String();
+    return company != nullptr ? company->getAbbreviation() : String::none();
 }
 
-String Share::getCompanyName() const
+const String& Share::getCompanyName() const
 {
     const Company* company = company_.partner();
-    return company != nullptr ? company->getName() : String();
+    return company != nullptr ? company->getName() : String::none();
 }
 
 int Share::getQuote(const Date& date, float* out) const

@@ -45,9 +45,9 @@ public:
     void reserveShareStates(unsigned n) { states_.reserve(n); }
 
     /// Names of the company and its market; Strings without text where the link is missing.
-    String getMarketName() const;
-    String getCompanyAbbreviation() const;
-    String getCompanyName() const;
+    const String& getMarketName() const;
+    const String& getCompanyAbbreviation() const;
+    const String& getCompanyName() const;
 
     /// The company's price for any day, 0 without a company. @return 0; -1 without a company.
     int getQuote(const Date& date, float* out) const;

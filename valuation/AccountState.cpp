@@ -67,14 +67,14 @@ Date AccountState::getDate() const
     return state_.partner() != nullptr ? state_.partner()->getDate() : Date();
 }
 
-String AccountState::getAccountName() const
+const String& AccountState::getAccountName() const
 {
-    return account_.partner() != nullptr ? account_.partner()->getName() : String();
+    return account_.partner() != nullptr ? account_.partner()->getName() : String::none();
 }
 
-String AccountState::getCurrencyRepresentation() const
+const String& AccountState::getCurrencyRepresentation() const
 {
-    return account_.partner() != nullptr ? account_.partner()->getCurrencyRepresentation() : String();
+    return account_.partner() != nullptr ? account_.partner()->getCurrencyRepresentation() : String::none();
 }
 
 ManyToOneAssociation<AccountState, Account>& AccountToAccountStates::backLink(AccountState& e) const

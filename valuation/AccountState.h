@@ -23,8 +23,8 @@ public:
     void setCash(float cash) { cash_ = cash; }
     /// The state's day, undefined without a state.
     Date getDate() const;
-    String getAccountName() const;
-    String getCurrencyRepresentation() const;
+    const String& getAccountName() const;
+    const String& getCurrencyRepresentation() const;
 
     int getAccount(Account** out) const { return account_.get(out); }
     /// The linked account, null without one.

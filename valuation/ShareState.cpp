@@ -66,21 +66,21 @@ Date ShareState::getDate() const
     return state_.partner() != nullptr ? state_.partner()->getDate() : Date();
 }
 
-String ShareState::getCompanyAbbreviation() const
+const String& ShareState::getCompanyAbbreviation() const
 {
-    return share_.partner() != nullptr ? share_.partner()->getCompanyAbbreviation() : String();
+    return share_.partner() != nullptr ? share_.partner()->getCompanyAbbreviation() : String::none();
 }
 
-String ShareState::getCompanyName() const
+const String& ShareState::getCompanyName() const
 {
-    return share_.partner() != nullptr ? share_.partner()->getCompanyName() : String();
+    return share_.partner() != nullptr ? share_.partner()->getCompanyName() : String::none();
 }
 
-String ShareState::getCurrencyRepresentation() const
+const String& ShareState::getCurrencyRepresentation() const
 {
     Company* company = nullptr;
     if (share_.partner() == nullptr || share_.partner()->getCompany(&company) != 0)
-        return String();
+        return String::none();
     return company->getCurrencyRepresentation();
 }
 

@@ -29,9 +29,9 @@ public:
     const Date& getEndDate() const { return holding_.endDate; }
     /// The state's day, undefined without a state.
     Date getDate() const;
-    String getCompanyAbbreviation() const;
-    String getCompanyName() const;
-    String getCurrencyRepresentation() const;
+    const String& getCompanyAbbreviation() const;
+    const String& getCompanyName() const;
+    const String& getCurrencyRepresentation() const;
 
     int getShare(Share** out) const { return share_.get(out); }
     /// The linked share, null without one.
