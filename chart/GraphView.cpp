@@ -14,6 +14,7 @@
 #include "platform/Path.h"
 #include "platform/PopUpMenu.h"
 #include "platform/Screenshot.h"
+#include "platform/ShortText.h"
 
 #include <algorithm>
 #include <cmath>
@@ -111,6 +112,8 @@ void GraphView::askForPictureFile()
     GraphElement* const* line =
         std::find_if(elements, elements + count, [](const auto* e) { return e->getType() == GraphLine::kType; });
     std::string name(line != elements + count ? (*line)->getLegend().bytes() : "");
+    constexpr std::size_t kLongest = 200; // bytes; the name of a file has 255
+    name.resize(wholeCharacters(name, kLongest));
     std::replace(name.begin(), name.end(), '/', '-');
     savePanel_->SetSaveText(((name.empty() ? "Chart" : name) + ".png").c_str());
     savePanel_->Show();

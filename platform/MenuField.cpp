@@ -3,6 +3,7 @@
 #include "platform/Labels.h"
 #include "platform/Menu.h"
 #include "platform/MenuItem.h"
+#include "platform/ShortText.h"
 #include "platform/Window.h"
 
 #include <QComboBox>
@@ -47,10 +48,11 @@ void BMenuField::FrameResized(float, float)
 
 void BMenuField::fill()
 {
+    constexpr std::size_t kLongestShown = 256; // bytes; the items keep their whole labels
     const QSignalBlocker silence(field_);
     QStringList labels;
     for (int32 i = 0; i < menu_->CountItems(); ++i)
-        labels.append(QString::fromUtf8(menu_->ItemAt(i)->Label()));
+        labels.append(QString::fromStdString(shortened(menu_->ItemAt(i)->Label(), kLongestShown)));
     bool same = field_->count() == labels.size();
     for (int i = 0; same && i < field_->count(); ++i)
         same = field_->itemText(i) == labels[i];

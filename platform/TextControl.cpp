@@ -12,6 +12,8 @@
 
 namespace {
 
+constexpr std::size_t kLongestShown = 4096; // bytes; no name is as long
+
 /// Gives the control's `KeyDown` what the field itself has no use for.
 class Field final : public QLineEdit {
 public:
@@ -50,7 +52,7 @@ BTextControl::BTextControl(BRect frame, const char* name, const char* label, con
     : BControl(frame, name, label, message, resizingMode, (flags & ~static_cast<uint32>(B_NAVIGABLE)) | B_FRAME_EVENTS,
                new QWidget),
       field_(new Field(widget())), caption_(new QLabel(labelText(label), widget())),
-      divider_(std::floor(frame.Width() / 2)), committed_(text != nullptr ? text : "")
+      divider_(std::floor(frame.Width() / 2)), text_(kLongestShown)
 {
     // The field is what the keyboard reaches, so the field bears the names.
     widget()->setObjectName({});
@@ -64,7 +66,7 @@ BTextControl::BTextControl(BRect frame, const char* name, const char* label, con
         divider_ = 0;
     layOut();
     QObject::connect(field_, &QLineEdit::returnPressed, [this] {
-        committed_ = Text();
+        committed_ = shown();
         Invoke();
     });
     QObject::connect(field_, &QLineEdit::editingFinished, [this] { commit(); });
@@ -94,28 +96,33 @@ void BTextControl::FrameResized(float, float)
 
 void BTextControl::commit()
 {
-    if (committed_ == Text())
+    if (committed_ == shown())
         return;
-    committed_ = Text();
+    committed_ = shown();
     Invoke();
 }
 
 const char* BTextControl::Text() const
 {
-    return text_.of(field_->text().toStdString());
+    return text_.of(shown());
+}
+
+std::string BTextControl::shown() const
+{
+    return field_->text().toStdString();
 }
 
 void BTextControl::show(const char* text)
 {
-    field_->setText(QString::fromUtf8(text));
-    text_.set(text, field_->text().toStdString());
+    field_->setText(QString::fromStdString(text_.take(text)));
+    committed_ = shown();
+    text_.noteShown(committed_);
 }
 
 void BTextControl::SetText(const char* text)
 {
     show(text);
     field_->setCursorPosition(0);
-    committed_ = Text();
 }
 
 void BTextControl::SetDivider(float x)

@@ -17,7 +17,8 @@ public:
                  uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
 
     /// The text belongs to the control and is valid until it changes. As long as nobody has changed it, it is what it
-    /// was set to, byte for byte.
+    /// was set to, byte for byte. Of a text of more than 4096 bytes the field shows the beginning, with a mark for the
+    /// rest; see `FieldText`.
     const char* Text() const;
     /// Sends no message.
     void SetText(const char* text);
@@ -38,11 +39,12 @@ public:
 private:
     void layOut();
     void show(const char* text);
+    std::string shown() const;
     void commit();
 
     QLineEdit* field_; // a part of the widget
     QLabel* caption_;  // and so is this
     float divider_;
-    std::string committed_;
+    std::string committed_; // what the field showed when its text was set or sent
     FieldText text_;
 };

@@ -2,8 +2,14 @@
 
 #include <QPlainTextEdit>
 
+namespace {
+
+constexpr std::size_t kLongestShown = 65536; // bytes: some twenty pages
+
+} // namespace
+
 BTextView::BTextView(BRect frame, const char* name, uint32 resizingMode, uint32 flags)
-    : BView(frame, name, resizingMode, flags, new QPlainTextEdit)
+    : BView(frame, name, resizingMode, flags, new QPlainTextEdit), text_(kLongestShown)
 {
     field().setTabChangesFocus(true);
     SetAccessibleName(name);
@@ -21,6 +27,6 @@ const char* BTextView::Text() const
 
 void BTextView::SetText(const char* text)
 {
-    field().setPlainText(QString::fromUtf8(text));
-    text_.set(text, field().toPlainText().toStdString());
+    field().setPlainText(QString::fromStdString(text_.take(text)));
+    text_.noteShown(field().toPlainText().toStdString());
 }

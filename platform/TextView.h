@@ -11,7 +11,8 @@ public:
     BTextView(BRect frame, const char* name, uint32 resizingMode, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
 
     /// The text belongs to the view and is valid until the next call. As long as nobody has changed it, it is what it
-    /// was set to, byte for byte.
+    /// was set to, byte for byte. Of a text of more than 65,536 bytes the field shows the beginning, with a mark for
+    /// the rest; see `FieldText`.
     const char* Text() const;
     void SetText(const char* text);
 

@@ -1,5 +1,6 @@
 #include "views/ColumnItem.h"
 
+#include "platform/ShortText.h"
 #include "platform/View.h"
 #include "views/ColumnListView.h"
 #include "views/Look.h"
@@ -13,21 +14,17 @@ std::string fitted(const BView& view, std::string text, float width)
 {
     if (view.StringWidth(text.c_str()) <= width)
         return text;
-    constexpr const char* kDots = "\u2026";
-    const auto isInside = [&](std::size_t i) { return (static_cast<unsigned char>(text[i]) & 0xC0) == 0x80; };
     std::size_t end = text.size();
     std::size_t shortest = 0;
     // The width grows with the length, so halving finds the cut.
     while (end - shortest > 1) {
         std::size_t middle = (end + shortest) / 2;
-        if (view.StringWidth((text.substr(0, middle) + kDots).c_str()) <= width)
+        if (view.StringWidth((text.substr(0, middle) + kEllipsis).c_str()) <= width)
             shortest = middle;
         else
             end = middle;
     }
-    while (shortest > 0 && isInside(shortest))
-        --shortest;
-    return text.substr(0, shortest) + kDots;
+    return text.substr(0, wholeCharacters(text, shortest)) + kEllipsis;
 }
 
 } // namespace

@@ -247,6 +247,6 @@ void CurrencyView::UpdateQuotesChart()
         chart_->showNothing();
         return;
     }
-    const std::string reference = referenceName_->Text();
+    const std::string reference = textOf(referenceName_->Text());
     chart_->showSeries(*currency, textOf(currency->getRepresentation()), reference.empty() ? "???" : reference, false);
 }

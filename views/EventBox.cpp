@@ -131,7 +131,7 @@ String EventBox::getText() const
 
 void EventBox::setText(const String& text)
 {
-    text_->SetText(textOf(text).c_str());
+    text_->SetText(wholeTextOf(text));
 }
 
 short EventBox::getNumerator() const

@@ -1,11 +1,20 @@
 #pragma once
 
 #include "foundation/String.h"
+#include "platform/ShortText.h"
 
 #include <string>
 
-/// A text of the model, to be shown; empty for a String without text.
+/// A text of the model, to be shown in a list, a chart or a line; empty for a String without text. Of a longer one, as
+/// a damaged file can hold of megabytes, some hundred characters are shown.
 inline std::string textOf(const String& text)
 {
-    return std::string(text.bytes());
+    constexpr std::size_t kLongestShown = 512; // bytes
+    return shortened(text.bytes(), kLongestShown);
+}
+
+/// The same, whole, for what gives it back: fields and menus, which show as much of it as they can.
+inline const char* wholeTextOf(const String& text)
+{
+    return text.hasText() ? text.getCharacterArray() : "";
 }

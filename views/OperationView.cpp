@@ -56,7 +56,7 @@ constexpr unsigned kTrade = 4 + 8;
 class AccountMenuItem final : public BMenuItem {
 public:
     AccountMenuItem(const Account* account, const std::function<void()>& hook)
-        : BMenuItem(textOf(account->getName()).c_str(), nullptr), account_(account), hook_(hook)
+        : BMenuItem(wholeTextOf(account->getName()), nullptr), account_(account), hook_(hook)
     {}
 
     /// May be gone: only to be compared.

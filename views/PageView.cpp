@@ -96,5 +96,5 @@ BCheckBox* PageView::addCheckBox(BView* parent, BRect frame, const char* name, c
 
 void PageView::showText(BTextControl& field, const String& text)
 {
-    field.SetText(textOf(text).c_str());
+    field.SetText(wholeTextOf(text));
 }

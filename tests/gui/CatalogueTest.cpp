@@ -2,9 +2,11 @@
 // RefusalTest.cpp.
 
 #include "market/NoteCompanyEvent.h"
+#include "net/QuoteServers.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/ToolRun.h"
 
+#include <QComboBox>
 #include <QPlainTextEdit>
 #include <gmock/gmock.h>
 
@@ -98,6 +100,64 @@ TEST_F(CatalogueTest, WhatNobodyTypedComesBackByteForByte)
     type("txtCompanyEventTitle", "New");
     click("btnUpdateCompanyEvent");
     EXPECT_EQ(event->getTitle(), String("New"));
+}
+
+TEST_F(CatalogueTest, OfALongTextTheBeginningShowsAndNothingIsLost)
+{
+    addSmallCatalogue();
+    const auto longText = [](const char* name) {
+        std::string text = name;
+        while (text.size() < 200'000)
+            text += "\u20AC"; // which no cut may tear apart
+        return text;
+    };
+    const std::string name = longText("Name");
+    const std::string note = longText("Note");
+    Market* market = window().catalogue().getMarkets()[0];
+    Company* alpha = company();
+    market->setName(name.c_str());
+    alpha->setName(name.c_str());
+    alpha->setAbbreviation(name.c_str());
+    auto* event = new NoteCompanyEvent(alpha, Date(1, 4, 2024), name.c_str(), note.c_str());
+    window().CompanySelection();
+    window().MarketSelection();
+    select("lstCompanyEvents", 0);
+    auto& field = find<QPlainTextEdit>("txtCompanyEventText");
+    EXPECT_LT(field.toPlainText().size(), 30'000);
+    for (const std::string& shown : {rows("lstMarkets")[0], rows("lstCompanies")[0], rows("lstCompanyEvents")[0],
+                                     text("txtMarketName"), text("txtName"), text("txtCompanyEventTitle")}) {
+        EXPECT_LT(shown.size(), 5000U);
+        EXPECT_THAT(shown, testing::HasSubstr("\u20AC\u2026"));
+    }
+
+    const QuoteServers servers = std::exchange(quoteServers(), {"localhost", "localhost", 1, std::chrono::seconds(1)});
+    for (const char* button : {"btnUpdateMarket", "btnUpdateCompany", "btnUpdateCompanyEvent"})
+        click(button);
+    quoteServers() = servers;
+    EXPECT_TRUE(market->getName() == name.c_str() && alpha->getName() == name.c_str() &&
+                alpha->getAbbreviation() == name.c_str());
+    EXPECT_TRUE(event->getTitle() == name.c_str() && event->getText() == note.c_str());
+    // What is typed before and behind the mark leaves what it stands for.
+    QTest::keyClicks(&field, "My ");
+    QTest::keyClick(&field, Qt::Key_End, Qt::ControlModifier);
+    QTest::keyClicks(&field, "!");
+    type("txtCompanyEventTitle", "New");
+    click("btnUpdateCompanyEvent");
+    EXPECT_TRUE(event->getText() == ("My " + note + '!').c_str());
+    EXPECT_EQ(event->getTitle(), String("New"));
+
+    buy(alpha);
+    wallet().getAccount(0)->setName(name.c_str());
+    show(kPortoFolioPage);
+    select("lstAccounts", 0);
+    follow({{{}, "btnUpdateQuote", ""}}); // fills the menus of the accounts, too
+    show(kOperationPage);
+    select("lstOperations", 0);
+    EXPECT_LT(find<QComboBox>("baseAccount").currentText().size(), 1000);
+    follow({{{{"txtQuantity", "12"}}, "btnUpdateOperation", ""}});
+    EXPECT_EQ(wallet().getAccount(0)->getName(), name.c_str());
+    ASSERT_EQ(wallet().getAccount(0)->getNbrOperations(), 1U);
+    EXPECT_EQ(static_cast<ShareOperation*>(wallet().getAccount(0)->getOperation(0))->getQuantity(), 12);
 }
 
 TEST_F(CatalogueTest, RenamingReachesBothPagesAndTheOperations)
