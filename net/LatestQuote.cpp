@@ -28,25 +28,56 @@ float singleOf(std::string_view token)
     return static_cast<float>(leadingNumber(token));
 }
 
-} // namespace
+enum class Cut {
+    kNone,   // no number has come that has its end
+    kLikely, // unless a fraction follows behind the closing tag
+    kCertain
+};
 
-int parseLatestQuotePage(std::string_view page, float* price)
+bool beginsWithClosingTag(std::string_view text)
+{
+    text.remove_prefix(std::min(text.find_first_not_of(' '), text.size()));
+    return text.starts_with("</");
+}
+
+/// A token has its end when something stands behind it.
+Cut cutPrice(std::string_view page, float* price)
 {
     const std::string_view text = page.substr(0, page.find('\0'));
     const std::size_t cell = endOfMarker(text, "<td nowrap><b>");
     if (cell == text.npos)
-        return -1;
+        return Cut::kNone;
     std::string_view rest = text.substr(cell);
-    const std::string_view whole = takeToken(&rest);
-    if (whole.empty())
-        return -1;
+    *price = singleOf(takeToken(&rest));
+    if (rest.empty())
+        return Cut::kNone;
+    const bool isClosed = beginsWithClosingTag(rest);
     const std::string_view numerator = takeToken(&rest);
+    if (numerator.starts_with('t')) // "</td>"
+        return Cut::kCertain;
     const float denominator = singleOf(takeToken(&rest));
-    *price = singleOf(whole);
-    const bool closesCell = numerator.starts_with('t'); // "</td>"
-    if (!closesCell && denominator != 0)
+    if (rest.empty())
+        return isClosed && singleOf(numerator) == 0 ? Cut::kLikely : Cut::kNone;
+    if (denominator != 0)
         *price += singleOf(numerator) / denominator;
+    return Cut::kCertain;
+}
+
+} // namespace
+
+int parseLatestQuotePage(std::string_view page, float* price)
+{
+    float found = 0;
+    if (cutPrice(page, &found) == Cut::kNone || !isPrice(found))
+        return -1;
+    *price = found;
     return 0;
+}
+
+bool isLatestQuoteCertain(std::string_view beginning)
+{
+    float price = 0;
+    return cutPrice(beginning, &price) == Cut::kCertain;
 }
 
 int Company::getInternetLastQuote(const String& host, const String& path, float* value, Date* date) const
@@ -60,8 +91,8 @@ int Company::getInternetLastQuote(const String& host, const String& path, float*
     *value = 0;
     String request(path);
     request += getAbbreviation();
-    std::string page;
-    if (requestPage(&socket, request, kPageLimit, &page) != 0)
+    ReceivedPage page(kPageLimit);
+    if (requestPage(&socket, request, isLatestQuoteCertain, &page) != 0)
         return -1;
-    return parseLatestQuotePage(page, value);
+    return parseLatestQuotePage(page.received(), value);
 }

@@ -1,6 +1,7 @@
 #include "net/PageText.h"
 
 #include <clocale>
+#include <cmath>
 #include <cstdlib>
 #include <string>
 
@@ -25,4 +26,9 @@ long leadingInteger(std::string_view text)
 {
     constexpr int kDecimal = 10;
     return std::strtol(std::string(text).c_str(), nullptr, kDecimal);
+}
+
+bool isPrice(float number)
+{
+    return std::isfinite(number) && number >= 0;
 }

@@ -15,3 +15,6 @@ std::size_t endOfMarker(std::string_view page, std::string_view marker);
 /// '.' whatever the user's language.
 double leadingNumber(std::string_view text);
 long leadingInteger(std::string_view text);
+
+/// Prices are finite and not negative.
+bool isPrice(float number);

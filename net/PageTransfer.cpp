@@ -2,35 +2,43 @@
 
 #include "net/QuoteServers.h"
 
-#include <chrono>
+#include <algorithm>
 
 int connectToQuotes(Socket* socket, const String& host)
 {
     socket->setTimeLimit(quoteServers().limit);
-    // A short chunk keeps the end of the one before. Waiting for whole ones leaves that to the end of the page, however
-    // the network cuts it into packets.
-    socket->setWholeReceives(true);
     return socket->connectToName(host, quoteServers().port);
 }
 
-int requestPage(Socket* socket, const String& path, std::size_t limit, std::string* page)
+int requestPage(Socket* socket, const String& path, const IsEnough& isEnough, ReceivedPage* page)
 {
     String request("GET ");
     request += path;
     if (socket->writeLine(request) != 0)
         return -1;
-    constexpr int kChunk = 256;
-    char chunk[kChunk + 1] = {};
-    // A server that has closed without a word, or that sends zeros, adds nothing for ever; one that trickles would take
-    // a day for a page.
-    std::size_t useless = 0;
-    constexpr int kLongestTransfer = 10; // time limits
-    const auto end = std::chrono::steady_clock::now() + kLongestTransfer * quoteServers().limit;
-    while (page->size() <= limit && useless <= limit && std::chrono::steady_clock::now() < end &&
-           socket->getCharacterArray(chunk, kChunk) == 0) {
-        chunk[kChunk] = '\0';
-        page->append(chunk);
-        useless += chunk[0] == '\0' ? 1 : 0;
+    constexpr int kLongestTransfer = 10; // time limits: a server that trickles would take a day for a page
+    const auto end = Socket::Clock::now() + kLongestTransfer * quoteServers().limit;
+    char bytes[256];
+    std::size_t known = 0; // characters that were not enough
+    while (const std::size_t room = std::min(page->room(), sizeof bytes)) {
+        const auto deadline = std::min(end, Socket::Clock::now() + quoteServers().limit);
+        std::size_t count = 0;
+        const int result = socket->receive(bytes, room, deadline, &count);
+        // What has come until now is a page cut anywhere, not one that the server has ended.
+        if (result == Socket::kTimedOut)
+            return -1;
+        if (result != 0) {
+            page->endWithBreak();
+            return 0;
+        }
+        if (count == 0) {
+            page->endWithClose();
+            return 0;
+        }
+        page->add({bytes, count});
+        if (page->text().size() > known && isEnough(page->text()))
+            return 0;
+        known = page->text().size();
     }
     return 0;
 }

@@ -1,18 +1,20 @@
 #pragma once
 
+#include "net/ReceivedPage.h"
 #include "net/Socket.h"
 
-#include <cstddef>
-#include <string>
+#include <functional>
+#include <string_view>
 
 /// Connects to a quote server, at the port and with the time limit of `quoteServers()`. @return 0, or -1.
 int connectToQuotes(Socket* socket, const String& host);
 
-/// Asks a connected server for `path` and appends its answer to `*page`, as text, until that is longer than `limit`
-/// characters, which it then exceeds by 256 at most, a receive fails, or ten time limits have passed.
-///
-/// The answer comes in chunks of 256 bytes of which a zero byte hides the rest. When the server has closed the
-/// connection, the last chunk is appended again and again. Intended: a page always fills up, and what the parsers look
-/// for stands in front.
-/// @return 0; -1 when the request cannot be sent.
-int requestPage(Socket* socket, const String& path, std::size_t limit, std::string* page);
+/// Tells of the text that has come so far whether what follows makes no difference any more. It is asked after each
+/// receive: once a byte at worst, of a text that is as long as a page at most.
+using IsEnough = std::function<bool(std::string_view text)>;
+
+/// Asks a connected server for `path` and receives its answer into `*page`, until that is enough or full, or the
+/// connection ends.
+/// @return 0; -1 when the request cannot be sent, and when a receive has waited for the time limit, or all for ten of
+/// them, before the page was enough.
+int requestPage(Socket* socket, const String& path, const IsEnough& isEnough, ReceivedPage* page);

@@ -19,7 +19,7 @@ public:
     /// `text` begins behind the table's header.
     explicit RowReader(std::string_view text) : text_(text) { skipBlanks(); }
 
-    enum class Outcome { kTaken, kSkipped, kTableEnds, kError };
+    enum class Outcome { kTaken, kSkipped, kTableEnds, kTextEnds, kError };
     Outcome readRow(DatedPrice* row);
     /// Goes to the row after the one that was read. @return false when there is none.
     bool goToNextRow();
@@ -48,7 +48,7 @@ private:
 RowReader::Outcome RowReader::readRow(DatedPrice* row)
 {
     if (place_ == text_.size())
-        return Outcome::kTableEnds;
+        return Outcome::kTextEnds;
     int month = 0, day = 0, year = 0;
     Outcome outcome = readMonth(&month);
     if (outcome == Outcome::kTaken)
@@ -150,29 +150,39 @@ private:
     float previous_ = 0; // the last one accepted
 };
 
-} // namespace
-
-int parseHistoryPage(std::string_view page, std::vector<DatedPrice>* rows)
+/// Appends the rows that count. @return what the last one read gave.
+RowReader::Outcome readTable(std::string_view page, std::vector<DatedPrice>* rows)
 {
     const std::string_view text = page.substr(0, page.find('\0'));
     const std::size_t table = endOfMarker(text, "(00s)</b>");
     if (table == text.npos)
-        return -1;
+        return RowReader::Outcome::kError;
     RowReader reader(text.substr(table));
     GlitchFilter filter;
     for (DatedPrice row{};;) {
         const RowReader::Outcome outcome = reader.readRow(&row);
-        if (outcome == RowReader::Outcome::kTableEnds)
-            return 0;
-        if (outcome == RowReader::Outcome::kError)
-            return -1;
         if (outcome == RowReader::Outcome::kSkipped)
             continue;
-        if (row.date.getMonth() != 0 && filter.accepts(row.price))
+        if (outcome != RowReader::Outcome::kTaken)
+            return outcome;
+        if (row.date.getMonth() != 0 && isPrice(row.price) && filter.accepts(row.price))
             rows->push_back(row);
         if (!reader.goToNextRow())
-            return -1;
+            return RowReader::Outcome::kError;
     }
+}
+
+} // namespace
+
+int parseHistoryPage(std::string_view page, std::vector<DatedPrice>* rows)
+{
+    return readTable(page, rows) == RowReader::Outcome::kError ? -1 : 0;
+}
+
+bool isHistoryCertain(std::string_view beginning)
+{
+    std::vector<DatedPrice> rows;
+    return readTable(beginning, &rows) == RowReader::Outcome::kTableEnds;
 }
 
 int Market::setInternetLastThreeMonthsQuote(Company* company) const
@@ -185,11 +195,14 @@ int Market::setInternetLastThreeMonthsQuote(Company* company) const
     String path(QuoteServers::kHistoryPath);
     path += company->getAbbreviation();
     path += QuoteServers::kHistoryPathEnd;
-    std::string page;
-    if (requestPage(&socket, path, kPageLimit, &page) != 0)
+    ReceivedPage page(kPageLimit);
+    if (requestPage(&socket, path, isHistoryCertain, &page) != 0)
         return -1;
-    std::vector<DatedPrice> rows;
-    const int result = parseHistoryPage(page, &rows);
+    // The result is that of the whole text, as ever; but a price in a repetition, or one that runs into it, has not
+    // been sent.
+    std::vector<DatedPrice> rows, repeated;
+    const int result = parseHistoryPage(page.text(), &repeated);
+    parseHistoryPage(page.received(), &rows);
     CompanyQuote* quote;
     for (const auto& [date, price] : rows)
         storeQuote(company, date, price, &quote);

@@ -13,6 +13,27 @@
 #include <sys/socket.h>
 #include <unistd.h>
 
+namespace {
+
+/// 0 when it has passed.
+std::chrono::milliseconds millisecondsUntil(Socket::Clock::time_point deadline)
+{
+    return std::max(std::chrono::ceil<std::chrono::milliseconds>(deadline - Socket::Clock::now()),
+                    std::chrono::milliseconds(0));
+}
+
+/// What `poll` gives; 0 at once when the deadline has passed.
+int waitToReceive(int descriptor, Socket::Clock::time_point deadline)
+{
+    const auto left = millisecondsUntil(deadline);
+    if (left.count() == 0)
+        return 0;
+    pollfd waiting{descriptor, POLLIN, 0};
+    return poll(&waiting, 1, static_cast<int>(left.count()));
+}
+
+} // namespace
+
 char Socket::SOCKETString[8];
 short Socket::SOCKETCounter;
 
@@ -162,8 +183,23 @@ int Socket::putCharacterArray(const char* bytes, int count)
 
 int Socket::getCharacterArray(char* bytes, int count)
 {
-    const int flags = wholeReceives_ ? MSG_WAITALL : 0;
-    return recv(descriptor_, bytes, static_cast<std::size_t>(count), flags) < 0 ? -1 : 0;
+    return recv(descriptor_, bytes, static_cast<std::size_t>(count), 0) < 0 ? -1 : 0;
+}
+
+int Socket::receive(char* bytes, std::size_t count, Clock::time_point deadline, std::size_t* received)
+{
+    for (;;) {
+        const int ready = waitToReceive(descriptor_, deadline);
+        if (ready == 0)
+            return kTimedOut;
+        const ssize_t n = ready > 0 ? recv(descriptor_, bytes, count, MSG_DONTWAIT) : ready;
+        if (n >= 0) {
+            *received = static_cast<std::size_t>(n);
+            return 0;
+        }
+        if (errno != EINTR && errno != EAGAIN)
+            return -1;
+    }
 }
 
 int Socket::putChar(char c)
@@ -233,11 +269,7 @@ void Socket::applyTimeLimit() const
 /// @return 0; `kTimedOut`, or -1 at the end of the connection and on an error.
 int Socket::readBefore(Clock::time_point deadline, char* c) const
 {
-    const auto left = std::chrono::ceil<std::chrono::milliseconds>(deadline - Clock::now());
-    if (left.count() <= 0)
-        return kTimedOut;
-    pollfd waiting{descriptor_, POLLIN, 0};
-    const int ready = poll(&waiting, 1, static_cast<int>(left.count()));
+    const int ready = waitToReceive(descriptor_, deadline);
     if (ready == 0)
         return kTimedOut;
     const int received = ready > 0 ? sgetc(c, descriptor_) : ready;

@@ -11,7 +11,9 @@
 /// other, without a signal. An object serves one connection only; see `closeConnection`.
 class Socket {
 public:
-    /// The result of reading a line that did not end in time.
+    using Clock = std::chrono::steady_clock;
+
+    /// The result of reading a line that did not end in time, and of a `receive` to which nothing came.
     static constexpr int kTimedOut = 8;
     static constexpr std::chrono::milliseconds kLineLimit{5000};
 
@@ -27,9 +29,6 @@ public:
     void setTimeLimit(std::chrono::milliseconds limit);
     /// The longest wait for a whole line, from the call on; at first `kLineLimit`.
     void setLineLimit(std::chrono::milliseconds limit) { lineLimit_ = limit; }
-    /// Makes `getCharacterArray` wait for all bytes that were asked for; fewer then tell of the end of the connection,
-    /// or of the time limit.
-    void setWholeReceives(bool whole) { wholeReceives_ = whole; }
 
     /// Connects to a dotted address, or to a host's first IPv4 address. On an object that was connected before, the
     /// program ends with "Error closing previous connection.", since `closeConnection` fails.
@@ -61,6 +60,10 @@ public:
     /// `bytes`; nobody learns how many came.
     int putCharacterArray(const char* bytes, int count);
     int getCharacterArray(char* bytes, int count);
+    /// Receives what comes first, up to `count` bytes; `*received` is their number, and 0 at the end of the connection.
+    /// A signal does not end the wait.
+    /// @return 0; `kTimedOut` when nothing has come until the deadline, and -1.
+    int receive(char* bytes, std::size_t count, Clock::time_point deadline, std::size_t* received);
     int putChar(char c);
     int getChar(char* c);
 
@@ -85,8 +88,6 @@ public:
     int getLocalPort(unsigned short* port) const;
 
 private:
-    using Clock = std::chrono::steady_clock;
-
     void closePrevious();
     int open();
     int connectToAddress(unsigned short port);
@@ -103,7 +104,6 @@ private:
     int descriptor_ = -1;
     bool isServer_ = false;
     sockaddr_in address_{}; // of the peer; of this end for a server
-    bool wholeReceives_ = false;
     std::chrono::milliseconds timeLimit_{0};
     std::chrono::milliseconds lineLimit_ = kLineLimit;
 };

@@ -84,6 +84,57 @@ TEST_F(FetchTest, ThePageIsTheSameHoweverItArrives)
     }
 }
 
+TEST_F(FetchTest, APageCutAnywhereGivesTheTruePriceOrNone)
+{
+    const std::string before(256, '7'); // what the next chunk does not cover of this one would go on with a number
+    const std::string table = "(00s)</b>\n5/3/1999 12.50 1 2 3\n5/4/1999 13.25 1 2 3\n</pre>";
+    const std::pair<std::string, float> pages[] = {
+        {kLatestPage, 112.375F}, {"<td nowrap><b>12.50</b></td>\n", 12.5F}, {table, 0}};
+    const struct {
+        std::chrono::milliseconds limit, pause; // behind the cut, and behind the next character
+        bool goesOn;
+        std::size_t step;
+    } cases[] = {{10ms, 0ms, false, 1}, {100ms, 60ms, true, 9}, {20s, 0ms, false, 1}};
+    for (const auto& [limit, pause, goesOn, step] : cases)
+        for (const auto& [page, price] : pages)
+            for (std::size_t size = page.size() % step; size <= page.size(); size += step) {
+                SCOPED_TRACE(page.substr(0, size) + " with pauses of " + std::to_string(pause.count()));
+                const auto talk = [&, limited = limit < 1s](int client) {
+                    Peer::receiveLine(client);
+                    for (const std::string& part : {before + page.substr(0, size), page.substr(size, 1),
+                                                    page.substr(std::min(size + 1, page.size()))}) {
+                        Peer::send(client, part);
+                        if (!goesOn)
+                            break;
+                        std::this_thread::sleep_for(pause);
+                    }
+                    if (limited)
+                        Peer::waitForEnd(client);
+                };
+                limit_ = limit;
+                value_ = 0;
+                const int result = price == 0 ? history(talk) : latest(talk);
+                EXPECT_TRUE(result == 0 || size < page.size() || limit < 1s);
+                EXPECT_EQ(value_, result == 0 ? price : 0);
+                for (const CompanyQuote* quote : all(*company_, &Company::getAllQuotes))
+                    EXPECT_EQ(quote->getValue(), quote->getDate() == Date(3, 5, 1999) ? 12.5F : 13.25F);
+            }
+    EXPECT_EQ(quotes(), "3=12 4=13 ");
+}
+
+TEST_F(FetchTest, AWholePageNeedsNoEndOfItsConnection)
+{
+    const auto start = std::chrono::steady_clock::now();
+    const auto stayOpen = [this](const std::string& page) {
+        return [=, this](int client) { sending(page)(client), Peer::waitForEnd(client); };
+    };
+    EXPECT_EQ(latest(stayOpen(kLatestPage)), 0);
+    EXPECT_EQ(value_, 112.375F);
+    EXPECT_EQ(history(stayOpen(kHistoryPage)), 0);
+    EXPECT_EQ(quotes(), "3=45 4=47 ");
+    EXPECT_LT(std::chrono::steady_clock::now() - start, limit_ / 2);
+}
+
 TEST_F(FetchTest, PeersThatGiveNoPageFailInTime)
 {
     limit_ = 100ms;
@@ -123,7 +174,7 @@ TEST_F(FetchTest, PeersThatGiveNoPageFailInTime)
 TEST_F(FetchTest, APageEndsAtItsLimit)
 {
     // The first multiple of 256 beyond 5000 is 5120.
-    const std::pair<int, float> cases[] = {{57, 112.375F}, {29, 112}, {19, -1}}; // the fraction, the price, the marker
+    const std::pair<int, float> cases[] = {{57, 112.375F}, {29, -1}, {19, -1}}; // the fraction, the price, the marker
     for (const auto& [left, price] : cases) {
         value_ = -1;
         const std::string page = std::string(static_cast<std::size_t>(5120 - left), '-') + kLatestPage;

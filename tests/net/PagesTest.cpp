@@ -1,3 +1,4 @@
+#include "net/LatestQuote.h"
 #include "net/QuoteHistory.h"
 
 #include <gtest/gtest.h>
@@ -38,6 +39,8 @@ TEST(HistoryPageTest, RowsAreReadInPageOrder)
          "0: 03/05/1999=10 05/05/1999=12 07/05/1999=11 ", "only plausible prices"},
         {"5/3/1999 12 - - -\n5/4/1999 24 - - -\n5/5/1999 4 - - -\n5/6/1999 23.5 - - -\n<",
          "0: 03/05/1999=12 06/05/1999=23.5 ", "the limits do not belong to it"},
+        {"5/3/1999 nan - - -\n5/4/1999 -7 - - -\n5/5/1999 1e99 - - -\n5/6/1999 none - - -\n5/7/1999 0x10 - - -\n<",
+         "0: 06/05/1999=0 07/05/1999=16 ", "only finite ones from 0 on, and no number is 0"},
         // The end of the text.
         {"5/3/1999 45 - - -\n", "-1: 03/05/1999=45 ", "behind a row that was read"},
         {"5/3/1999 45 - - -\n5/4/1999 46", "-1: 03/05/1999=45 ", "in a price"},
@@ -60,6 +63,40 @@ TEST(HistoryPageTest, RowsAreReadInPageOrder)
     EXPECT_EQ(parsed("5/3/1999 45 - - -\n<"), "-1: ") << "no header";
     EXPECT_EQ(parsed("((00s)</b>5/3/1999 45 - - -\n<"), "-1: ") << "a match that breaks is not begun anew";
     EXPECT_EQ(parsed({"(00s)</b>5/3/1999 45 - - -\n\0<", 29}), "-1: 03/05/1999=45 ") << "the page ends at a zero";
+}
+
+TEST(LatestPageTest, APriceIsFiniteNotNegativeAndNotCut)
+{
+    const struct {
+        const char* cell;
+        float price; // -1 for none
+        bool certain;
+    } cases[] = {
+        {"45</b></td>", 45, true},
+        {"45</b></t", 45, true},
+        {"45</b>", 45, false},
+        {"45</b>\n", 45, false},
+        {"45</b>7/8", -1, false},
+        {"45</b>7/8<", 45.875F, true},
+        {"45 </", 45, false},
+        {"45 <", -1, false},
+        {"45", -1, false},
+        {"112 <sup>3</sup>/<sub>8", -1, false},
+        {"112 <sup>3</sup>/<sub>8<", 112.375F, true},
+        {"nan</b></td>", -1, true},
+        {"-7</b></td>", -1, true},
+        {"1e99</b></td>", -1, true},
+        {"1 <sup>inf</sup>/<sub>8</sub>", -1, true},
+        {"none</b></td>", 0, true},
+        {"", -1, false},
+    };
+    for (const auto& [cell, price, certain] : cases) {
+        const std::string page = std::string("<td nowrap><b>") + cell;
+        float cut = -1;
+        EXPECT_EQ(parseLatestQuotePage(page, &cut), price < 0 ? -1 : 0) << cell;
+        EXPECT_EQ(cut, price) << cell;
+        EXPECT_EQ(isLatestQuoteCertain(page), certain) << cell;
+    }
 }
 
 } // namespace
