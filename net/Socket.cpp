@@ -2,12 +2,12 @@
 
 #include "foundation/Error.h"
 #include "foundation/FieldIO.h"
+#include "net/HostLookup.h"
 
 #include <algorithm>
 #include <arpa/inet.h>
 #include <cerrno>
 #include <cstring>
-#include <netdb.h>
 #include <poll.h>
 #include <string>
 #include <sys/socket.h>
@@ -47,7 +47,7 @@ void Socket::setTimeLimit(std::chrono::milliseconds limit)
 {
     timeLimit_ = limit;
     if (descriptor_ >= 0)
-        applyTimeLimit();
+        applyTimeLimit(timeLimit_);
 }
 
 int Socket::connectTo(const String& address, unsigned short port)
@@ -55,19 +55,16 @@ int Socket::connectTo(const String& address, unsigned short port)
     closePrevious();
     address_ = {};
     address_.sin_addr.s_addr = inet_addr(address.getCharacterArray());
-    return connectToAddress(port);
+    return connectToAddress(port, connectDeadline());
 }
 
 int Socket::connectToName(const String& host, unsigned short port)
 {
     closePrevious();
-    const hostent* found = gethostbyname(host.getCharacterArray());
-    if (found == nullptr || found->h_length < 1)
+    const auto deadline = connectDeadline();
+    if (lookUpHost(host.getCharacterArray(), deadline, &address_.sin_addr) != 0)
         return -1;
-    if (const char* first = found->h_addr_list[0])
-        std::memcpy(&address_.sin_addr, first,
-                    std::min(sizeof address_.sin_addr, static_cast<std::size_t>(found->h_length)));
-    return connectToAddress(port);
+    return connectToAddress(port, deadline);
 }
 
 int Socket::serverOn(unsigned short port)
@@ -242,25 +239,35 @@ int Socket::open()
     descriptor_ = socket(AF_INET, SOCK_STREAM, 0);
     if (descriptor_ < 0)
         return -1;
-    applyTimeLimit();
+    applyTimeLimit(timeLimit_);
     return 0;
 }
 
+/// None when there is no limit.
+std::optional<Socket::Clock::time_point> Socket::connectDeadline() const
+{
+    return timeLimit_.count() > 0 ? std::optional(Clock::now() + timeLimit_) : std::nullopt;
+}
+
 /// A failed attempt leaves the descriptor open.
-int Socket::connectToAddress(unsigned short port)
+int Socket::connectToAddress(unsigned short port, std::optional<Clock::time_point> deadline)
 {
     address_.sin_family = AF_INET;
     address_.sin_port = htons(port);
     if (open() != 0)
         return -1;
-    return connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_) == 0 ? 0 : -1;
+    // The search for the host has used up a part of the time. At least a millisecond is left: 0 would stand for ever.
+    if (deadline)
+        applyTimeLimit(std::max(millisecondsUntil(*deadline), std::chrono::milliseconds(1)));
+    const int result = connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_);
+    applyTimeLimit(timeLimit_);
+    return result == 0 ? 0 : -1;
 }
 
-void Socket::applyTimeLimit() const
+void Socket::applyTimeLimit(std::chrono::milliseconds limit) const
 {
     constexpr int kThousand = 1000; // milliseconds a second, microseconds a millisecond
-    const auto limit = timeLimit_.count();
-    const timeval value{limit / kThousand, limit % kThousand * kThousand};
+    const timeval value{limit.count() / kThousand, limit.count() % kThousand * kThousand};
     setsockopt(descriptor_, SOL_SOCKET, SO_RCVTIMEO, &value, sizeof value);
     setsockopt(descriptor_, SOL_SOCKET, SO_SNDTIMEO, &value, sizeof value); // a connect, too
 }

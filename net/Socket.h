@@ -4,6 +4,7 @@
 
 #include <chrono>
 #include <netinet/in.h>
+#include <optional>
 
 /// A TCP socket over IPv4: a client, a server, or a server's end of a connection.
 ///
@@ -24,8 +25,8 @@ public:
     Socket(const Socket&) = delete;
     Socket& operator=(const Socket&) = delete;
 
-    /// The longest wait of each connect, receive and send from now on; what exceeds it fails. 0, as it is at first,
-    /// stands for ever.
+    /// The longest wait of each connect, the search for the host included, of each receive and each send from now on;
+    /// what exceeds it fails. 0, as it is at first, stands for ever.
     void setTimeLimit(std::chrono::milliseconds limit);
     /// The longest wait for a whole line, from the call on; at first `kLineLimit`.
     void setLineLimit(std::chrono::milliseconds limit) { lineLimit_ = limit; }
@@ -90,8 +91,9 @@ public:
 private:
     void closePrevious();
     int open();
-    int connectToAddress(unsigned short port);
-    void applyTimeLimit() const;
+    std::optional<Clock::time_point> connectDeadline() const;
+    int connectToAddress(unsigned short port, std::optional<Clock::time_point> deadline);
+    void applyTimeLimit(std::chrono::milliseconds limit) const;
     bool canTransferLines() const { return descriptor_ >= 0 && !isServer_; }
     int readBefore(Clock::time_point deadline, char* c) const;
     int send(const char* bytes, std::size_t count) const;

@@ -4,7 +4,12 @@
 #include <cstring>
 #include <gmock/gmock.h>
 #include <memory>
+#include <net/if.h>
 #include <optional>
+#include <sched.h>
+#include <sys/ioctl.h>
+#include <sys/mount.h>
+#include <sys/wait.h>
 #include <vector>
 
 using namespace std::chrono_literals;
@@ -139,6 +144,49 @@ TEST(SocketTest, AServerTalksToItsClient)
     EXPECT_EQ(server.writeLine("x"), -1);
     EXPECT_EQ(server.serverOn(0), -1) << "closing it fails, as ever";
     EXPECT_EQ(server.acceptConnection(&accepted), -1) << "and ends the listening";
+}
+
+/// Gives this process a network of its own with a name server that never answers. @return false when that is refused.
+bool enterSilentNetwork()
+{
+    char servers[] = "/tmp/pelorin-servers-XXXXXX";
+    const int file = mkstemp(servers);
+    const bool isWritten = write(file, "nameserver 127.0.0.1\n", 21) == 21;
+    const bool isAlone = isWritten && unshare(CLONE_NEWUSER | CLONE_NEWNS | CLONE_NEWNET) == 0 &&
+                         mount(servers, "/etc/resolv.conf", nullptr, MS_BIND, nullptr) == 0;
+    unlink(servers);
+    ifreq loopback{};
+    std::strcpy(loopback.ifr_name, "lo");
+    loopback.ifr_flags = IFF_UP;
+    const int silent = socket(AF_INET, SOCK_DGRAM, 0);
+    sockaddr_in address{};
+    address.sin_family = AF_INET;
+    address.sin_port = htons(53);
+    return isAlone && ioctl(silent, SIOCSIFFLAGS, &loopback) == 0 &&
+           bind(silent, reinterpret_cast<const sockaddr*>(&address), sizeof address) == 0;
+}
+
+TEST(SocketDeathTest, ASilentNameServerHoldsAConnectNoLongerThanTheLimit)
+{
+    const auto connect = [] {
+        if (!enterSilentNetwork())
+            std::exit(2);
+        Socket socket;
+        socket.setTimeLimit(200ms);
+        const auto start = std::chrono::steady_clock::now();
+        const int result = socket.connectToName("quotes.example", 80);
+        const auto waited = std::chrono::steady_clock::now() - start;
+        std::exit(result == -1 && waited >= 200ms && waited < 4s ? 0 : 1); // while the search goes on
+    };
+    int status = -1;
+    if (const pid_t child = fork(); child == 0)
+        connect();
+    else
+        waitpid(child, &status, 0);
+    ASSERT_TRUE(WIFEXITED(status));
+    if (WEXITSTATUS(status) == 2)
+        GTEST_SKIP() << "a network of its own is not permitted here";
+    EXPECT_EQ(WEXITSTATUS(status), 0);
 }
 
 TEST(SocketDeathTest, AnObjectIsConnectedOnce)
