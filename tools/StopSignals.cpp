@@ -2,7 +2,6 @@
 
 #include <cerrno>
 #include <cstring>
-#include <poll.h>
 #include <stdexcept>
 
 namespace {
@@ -20,28 +19,27 @@ StopSignals::StopSignals()
 {
     sigemptyset(&stopping_);
     struct sigaction action {};
-    action.sa_handler = requestStop; // without SA_RESTART: a signal also ends the wait for a client's request
+    action.sa_handler = requestStop; // without SA_RESTART: a signal ends the wait
     for (const int signal : {SIGINT, SIGTERM}) {
         sigaddset(&stopping_, signal);
         sigaction(signal, &action, nullptr);
     }
 }
 
-bool StopSignals::waitFor(int descriptor) const
+bool StopSignals::waitFor(std::span<pollfd> waiting, std::optional<std::chrono::milliseconds> limit) const
 {
+    constexpr int kThousand = 1000, kMillion = 1000000; // milliseconds a second, nanoseconds a millisecond
+    const auto left = limit.value_or(std::chrono::milliseconds(0)).count();
+    const timespec time{left / kThousand, left % kThousand * kMillion};
     // They are let in only while the poll waits: one that came between the test and the poll would be overlooked.
     sigset_t usual;
     sigprocmask(SIG_BLOCK, &stopping_, &usual);
-    pollfd waiting{descriptor, POLLIN, 0};
     int ready = 0;
-    while (stopRequested == 0 && ready == 0) {
-        ready = ppoll(&waiting, 1, nullptr, &usual);
-        if (ready < 0 && errno == EINTR)
-            ready = 0;
-    }
+    if (stopRequested == 0)
+        ready = ppoll(waiting.data(), waiting.size(), limit ? &time : nullptr, &usual);
     const int error = errno;
     sigprocmask(SIG_SETMASK, &usual, nullptr);
-    if (ready < 0)
+    if (ready < 0 && error != EINTR)
         throw std::runtime_error(std::strerror(error));
     return stopRequested == 0;
 }

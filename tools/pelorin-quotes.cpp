@@ -2,13 +2,13 @@
 #include "net/Socket.h"
 #include "tools/Program.h"
 #include "tools/QuoteFolder.h"
+#include "tools/QuoteServer.h"
 #include "tools/StopSignals.h"
 
 #include <arpa/inet.h>
 #include <cerrno>
 #include <cstring>
 #include <iostream>
-#include <memory>
 #include <stdexcept>
 #include <string>
 
@@ -29,7 +29,6 @@ The address that the program listens on is printed as one line. It serves until 
 Exit status: 0, 1 when the folder or the port cannot be used, 2 for bad arguments.)";
 
 constexpr unsigned kHighestPort = 65535;
-constexpr std::chrono::seconds kSendLimit{5};
 
 struct Arguments {
     std::string folder;
@@ -63,31 +62,13 @@ void listenOn(Socket& server, const Arguments& arguments)
     std::cout << where << port << std::endl;
 }
 
-/// Answers one request. A client that does not ask, or does not take the answer, loses its turn after some seconds.
-void serve(Socket& server, const QuoteFolder& folder)
-{
-    Socket* accepted = nullptr;
-    if (server.acceptConnection(&accepted) != 0)
-        return;
-    const std::unique_ptr<Socket> client(accepted);
-    client->setTimeLimit(kSendLimit);
-    String request;
-    if (client->readLine(&request) != 0)
-        return;
-    const std::string page = folder.answer(request.bytes());
-    client->putCharacterArray(page.data(), static_cast<int>(page.size()));
-}
-
 void run(const Arguments& arguments)
 {
     const QuoteFolder folder(arguments.folder, std::cerr);
     const StopSignals signals;
     Socket server;
     listenOn(server, arguments);
-    int descriptor = -1;
-    server.getDescriptor(&descriptor);
-    while (signals.waitFor(descriptor))
-        serve(server, folder);
+    QuoteServer(server, folder).serve(signals);
 }
 
 } // namespace

@@ -3,12 +3,15 @@
 #include "net/LatestQuote.h"
 #include "net/QuoteHistory.h"
 #include "net/QuoteServers.h"
+#include "net/Socket.h"
 #include "tests/support/ServerRun.h"
 #include "tests/support/ToolRun.h"
 #include "tools/QuoteFolder.h"
 
 #include <gmock/gmock.h>
+#include <memory>
 #include <sys/stat.h>
+#include <thread>
 
 using testing::HasSubstr;
 using testing::StartsWith;
@@ -80,6 +83,35 @@ TEST_F(QuotesTest, TheProgramServesWhatTheFetchesRead)
     folder_.write("BRK.B.csv", "2005-06-01,9.5\n");
     EXPECT_EQ(latest(server, "BRK.B"), 9.5F) << "files are read anew";
     EXPECT_EQ(server.stop(SIGTERM), 0);
+}
+
+TEST_F(QuotesTest, ClientsThatDoNotAskOrDoNotListenHoldUpNobody)
+{
+    folder_.write("A.csv", "2005-01-03,97.75\n");
+    const ServerRun server(PELORIN_QUOTES, folder_.path);
+    const auto connected = [&server] {
+        auto client = std::make_unique<Socket>();
+        EXPECT_EQ(client->connectTo("127.0.0.1", server.port()), 0);
+        return client;
+    };
+    std::vector<std::unique_ptr<Socket>> idle;
+    const auto start = std::chrono::steady_clock::now();
+    for (const int clients : {20, 200}) { // more than there is room for
+        while (static_cast<int>(idle.size()) < clients)
+            idle.push_back(connected());
+        EXPECT_EQ(latest(server, "A"), 97.75F);
+    }
+    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(4)) << "the limit of a single client is 5";
+    // One that sends a character now and then, and a request without an end.
+    for (const auto& [piece, pause] : {std::pair(1, 20), {1000, 0}}) {
+        const auto client = connected();
+        const std::string text(static_cast<std::size_t>(piece), 'x');
+        const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(pause > 0 ? 12 : 4);
+        while (client->putCharacterArray(text.data(), piece) == 0 && std::chrono::steady_clock::now() < end)
+            std::this_thread::sleep_for(std::chrono::milliseconds(pause));
+        EXPECT_LT(std::chrono::steady_clock::now(), end) << piece << ": it is sent away";
+    }
+    EXPECT_EQ(latest(server, "A"), 97.75F);
 }
 
 TEST_F(QuotesTest, OtherRequestsGetAPageWithoutAPrice)

@@ -1,0 +1,66 @@
+#include "tools/QuoteClient.h"
+
+#include "tools/QuoteFolder.h"
+
+#include <cerrno>
+#include <string_view>
+
+namespace {
+
+constexpr std::size_t kLongestRequest = 4096;
+
+int descriptorOf(const Socket& socket)
+{
+    int descriptor = -1;
+    socket.getDescriptor(&descriptor);
+    return descriptor;
+}
+
+bool isOnlyNotReady()
+{
+    return errno == EAGAIN || errno == EINTR;
+}
+
+} // namespace
+
+QuoteClient::QuoteClient(std::unique_ptr<Socket> connection)
+    : connection_(std::move(connection)), deadline_(Socket::Clock::now() + kLimit)
+{}
+
+pollfd QuoteClient::waiting() const
+{
+    return {descriptorOf(*connection_), static_cast<short>(page_.empty() ? POLLIN : POLLOUT), 0};
+}
+
+bool QuoteClient::proceed(const QuoteFolder& folder)
+{
+    return page_.empty() ? receive(folder) : send();
+}
+
+/// The request ends as a line that a `Socket` reads: with a line feed, or before a zero byte.
+bool QuoteClient::receive(const QuoteFolder& folder)
+{
+    char bytes[kLongestRequest];
+    const ssize_t count = recv(descriptorOf(*connection_), bytes, sizeof bytes, MSG_DONTWAIT);
+    if (count <= 0)
+        return count < 0 && isOnlyNotReady();
+    const std::string_view come(bytes, static_cast<std::size_t>(count));
+    const std::size_t end = come.find_first_of(std::string_view("\n\0", 2));
+    request_ += come.substr(0, end);
+    if (request_.size() > kLongestRequest)
+        return false;
+    if (end == come.npos)
+        return true;
+    page_ = folder.answer(request_);
+    return send();
+}
+
+bool QuoteClient::send()
+{
+    const ssize_t count =
+        ::send(descriptorOf(*connection_), page_.data() + sent_, page_.size() - sent_, MSG_DONTWAIT | MSG_NOSIGNAL);
+    if (count < 0)
+        return isOnlyNotReady();
+    sent_ += static_cast<std::size_t>(count);
+    return sent_ < page_.size();
+}

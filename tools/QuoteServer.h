@@ -1,0 +1,34 @@
+#pragma once
+
+#include "tools/QuoteClient.h"
+
+#include <optional>
+#include <vector>
+
+class StopSignals;
+
+/// Answers quote requests out of a folder, those of several clients at once, on one thread.
+///
+/// A client that has not got its page in time is sent away, and so is the one that has been there longest when there
+/// are too many: one that asks at once is answered however many are silent.
+class QuoteServer {
+public:
+    /// `listener` listens already; it and `folder` outlive the server.
+    QuoteServer(Socket& listener, const QuoteFolder& folder);
+
+    /// Serves until it is time to stop.
+    void serve(const StopSignals& signals);
+
+private:
+    static constexpr int kMostClients = 64;
+
+    std::vector<pollfd> waiting() const;
+    std::optional<std::chrono::milliseconds> timeLeft() const;
+    void proceed(const std::vector<pollfd>& ready);
+    void acceptClients();
+    bool acceptClient();
+
+    Socket& listener_;
+    const QuoteFolder& folder_;
+    std::vector<QuoteClient> clients_; // in the order in which they came, which is also that of their deadlines
+};
