@@ -10,11 +10,10 @@
 
 namespace {
 
-/// What is wrong with the open file; null for an ordinary one.
-const char* oddityOf(int descriptor)
+/// What is wrong with a file of this status; null for an ordinary one.
+const char* oddityOf(const struct stat& status)
 {
-    struct stat status {};
-    if (fstat(descriptor, &status) == 0 && S_ISREG(status.st_mode))
+    if (S_ISREG(status.st_mode))
         return nullptr;
     return S_ISDIR(status.st_mode) ? "is a folder" : "is not an ordinary file";
 }
@@ -23,16 +22,19 @@ const char* oddityOf(int descriptor)
 
 int openForReading(const std::string& path)
 {
-    // Opening a pipe would wait for a writer, and a terminal could become the program's own. The file is looked at once
-    // it is open: by its path it could be another one by then. To an ordinary file the flags mean nothing.
+    // Opening alone may do harm: it lets a pipe's writer go on, who then writes to nobody, and some devices start.
+    struct stat status {};
+    if (const char* oddity = stat(path.c_str(), &status) == 0 ? oddityOf(status) : nullptr)
+        throw std::runtime_error(path + ": " + oddity);
+    // By now it could be something else, so it is looked at again once it is open. To an ordinary file the flags mean
+    // nothing; without them opening a pipe would wait for a writer, and a terminal could become the program's own.
     const int descriptor = open(path.c_str(), O_RDONLY | O_NONBLOCK | O_NOCTTY | O_CLOEXEC);
-    if (descriptor < 0 && errno != ENXIO) // which is what a socket gives
+    if (descriptor < 0)
         throw std::runtime_error(path + ": cannot be opened: " + std::strerror(errno));
-    const char* oddity = descriptor < 0 ? "is not an ordinary file" : oddityOf(descriptor);
+    const char* oddity = fstat(descriptor, &status) == 0 ? oddityOf(status) : "cannot be looked at";
     if (oddity == nullptr)
         return descriptor;
-    if (descriptor >= 0)
-        close(descriptor);
+    close(descriptor);
     throw std::runtime_error(path + ": " + oddity);
 }
 

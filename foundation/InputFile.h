@@ -4,7 +4,8 @@
 #include <string>
 
 /// Opens a file that a person has named. Only ordinary files, and links to them, are opened: reading anything else, a
-/// pipe or a device, could take for ever. What is not opened throws std::runtime_error with one line for the user.
+/// pipe or a device, could take for ever, and opening it have effects. What is not opened throws std::runtime_error
+/// with one line for the user.
 /// @return the descriptor, which the caller closes.
 int openForReading(const std::string& path);
 

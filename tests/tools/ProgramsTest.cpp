@@ -1,6 +1,8 @@
 #include "tests/support/ServerRun.h"
 #include "tests/support/ToolRun.h"
 
+#include <csignal>
+#include <fcntl.h>
 #include <gmock/gmock.h>
 #include <sys/socket.h>
 #include <sys/stat.h>
@@ -63,11 +65,14 @@ TEST(ProgramsTest, WhatIsNoOrdinaryFileIsRefusedAtOnce)
 {
     const TemporaryFolder folder("ProgramsTest");
     ASSERT_EQ(ToolRun(PELORIN_SAMPLE, "data --date 20/07/2025", folder).status, 0);
-    ASSERT_EQ(mkfifo((folder / "pipe").c_str(), 0600), 0); // which nobody writes into
+    ASSERT_EQ(mkfifo((folder / "pipe").c_str(), 0600), 0);
     sockaddr_un address{AF_UNIX, {}};
     (folder / "socket").copy(address.sun_path, sizeof address.sun_path - 1);
     const int socket = ::socket(AF_UNIX, SOCK_STREAM, 0);
     ASSERT_EQ(bind(socket, reinterpret_cast<const sockaddr*>(&address), sizeof address), 0);
+    const pid_t writer = fork(); // waits until somebody opens the pipe for reading, and would lose what it writes
+    if (writer == 0)
+        _exit(open((folder / "pipe").c_str(), O_WRONLY));
     std::filesystem::create_symlink("data/Companies/Sample", folder.path / "link");
     const std::pair<const char*, const char*> uses[] = {
         {PELORIN_VALUE, "% data/PortoFolios/Sample"},
@@ -86,5 +91,8 @@ TEST(ProgramsTest, WhatIsNoOrdinaryFileIsRefusedAtOnce)
             EXPECT_THAT(run.err, testing::EndsWith(": " + odd + ": is not an ordinary file\n")) << arguments;
         }
     EXPECT_EQ(ToolRun(PELORIN_VALUE, "link data/PortoFolios/Sample", folder).status, 0) << "of a file, it is one";
+    EXPECT_EQ(waitpid(writer, nullptr, WNOHANG), 0) << "the pipe is not even opened";
+    kill(writer, SIGKILL);
+    waitpid(writer, nullptr, 0);
     close(socket);
 }
