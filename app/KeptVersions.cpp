@@ -72,6 +72,9 @@ struct Version {
     auto operator<=>(const Version&) const = default;
 };
 
+constexpr std::size_t kSerialDigits = 15;
+constexpr std::int64_t kLastSerial = 999'999'999'999'999; // only ever reached from a name that was made by hand
+
 bool take(char c, std::string_view* text)
 {
     if (!text->starts_with(c))
@@ -109,7 +112,7 @@ bool readPlace(std::string_view text, Version* version)
         return true;
     if (take('-', &text))
         return takeNumber(1, 9, &text, &number) && text.empty();
-    return take(' ', &text) && take('(', &text) && takeNumber(1, 15, &text, &serial) && text == ")";
+    return take(' ', &text) && take('(', &text) && takeNumber(1, kSerialDigits, &text, &serial) && text == ")";
 }
 
 /// Where the versions of one file go: `folder/stem stamp (serial number)`.
@@ -255,7 +258,7 @@ std::string KeptVersions::keep(const std::string& path, std::time_t now) const
     std::vector<Version> versions = shelf.versions(&reason);
     if (reason)
         failFor(path, shelf.folder + ": cannot be read: " + reason.message());
-    const std::int64_t serial = versions.empty() ? 1 : versions.back().place.front() + 1;
+    const std::int64_t serial = versions.empty() ? 1 : std::min(versions.back().place.front() + 1, kLastSerial);
     removeLinkTo(file, shelf, &versions);
     removeOldest(shelf, versions); // of saves that were killed before they could prune
     const std::string version = shelf.newPath(serial, now);

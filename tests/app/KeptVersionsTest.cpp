@@ -133,3 +133,16 @@ TEST_F(KeptVersionsTest, NamesOfTheFirstReleaseGoFirstAndByTheirTime)
     save("Pelorin/Companies/Sample", "now", kNow);
     EXPECT_EQ(contents("Pelorin/Companies/Sample"), names[6] + (' ' + expected) + "now ");
 }
+
+TEST_F(KeptVersionsTest, BehindTheHighestNumberTheTimeSettlesTheOrder)
+{
+    folder_.write("Pelorin/Companies/Sample", "0");
+    folder_.write("Pelorin/Backups/Companies/Sample 2026-11-20 00.00.00 (999999999999999)", "made by hand");
+    std::string expected;
+    for (int i = 0; i < 25; ++i) {
+        save("Pelorin/Companies/Sample", std::to_string(i + 1), kNow + i);
+        if (i >= 5)
+            expected += std::to_string(i) + ' ';
+    }
+    EXPECT_EQ(contents("Pelorin/Companies/Sample"), expected);
+}
