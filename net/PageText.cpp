@@ -30,5 +30,5 @@ long leadingInteger(std::string_view text)
 
 bool isPrice(float number)
 {
-    return std::isfinite(number) && number >= 0;
+    return std::isfinite(number) && !std::signbit(number);
 }

@@ -16,5 +16,5 @@ std::size_t endOfMarker(std::string_view page, std::string_view marker);
 double leadingNumber(std::string_view text);
 long leadingInteger(std::string_view text);
 
-/// Prices are finite and not negative.
+/// Prices are finite and not negative, which "-0" counts as: it would keep its sign.
 bool isPrice(float number);

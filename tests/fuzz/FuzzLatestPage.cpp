@@ -4,6 +4,7 @@
 #include "net/LatestQuote.h"
 #include "tests/fuzz/Require.h"
 
+#include <cmath>
 #include <cstdint>
 #include <cstring>
 #include <limits>
@@ -53,7 +54,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const std::string_view page(exact.data(), size);
     if (parseLatestQuotePage(page, &price) == 0)
         require(page.find(kMarker) != page.npos, "a price stands behind the marker");
-    require(price >= 0 && price <= std::numeric_limits<float>::max(), "a price is finite and not negative");
+    require(!std::signbit(price) && price <= std::numeric_limits<float>::max(), "a price is finite and not negative");
 
     // With three tokens behind it, whatever it has has its end.
     const std::string cell = std::string(page.substr(0, page.find('\0'))) + "</td></td></td>";
@@ -61,7 +62,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     float expected = price = 0;
     const int result = parseLatestQuotePage(kMarker + cell, &price);
     cutWithTheLibrary(cell, &expected);
-    const bool isPrice = expected >= 0 && expected <= std::numeric_limits<float>::max();
+    const bool isPrice = !std::signbit(expected) && expected <= std::numeric_limits<float>::max();
     require(result == (isPrice ? 0 : -1), "a marked cell has a price unless that is none");
     require(!isPrice || std::memcmp(&price, &expected, sizeof price) == 0,
             "the price is that of the library's functions");

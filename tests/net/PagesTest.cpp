@@ -85,6 +85,7 @@ TEST(LatestPageTest, APriceIsFiniteNotNegativeAndNotCut)
         {"112 <sup>3</sup>/<sub>8<", 112.375F, true},
         {"nan</b></td>", -1, true},
         {"-7</b></td>", -1, true},
+        {"-0</b></td>", -1, true},
         {"1e99</b></td>", -1, true},
         {"1 <sup>inf</sup>/<sub>8</sub>", -1, true},
         {"none</b></td>", 0, true},
