@@ -47,6 +47,11 @@ protected:
             }
         };
     }
+    /// One that sends `page` and keeps the connection open.
+    Peer::Talk silentAfter(const std::string& page)
+    {
+        return [=, this](int client) { sending(page)(client), Peer::waitForEnd(client); };
+    }
     std::string quotes() const
     {
         std::string text;
@@ -125,12 +130,9 @@ TEST_F(FetchTest, APageCutAnywhereGivesTheTruePriceOrNone)
 TEST_F(FetchTest, AWholePageNeedsNoEndOfItsConnection)
 {
     const auto start = std::chrono::steady_clock::now();
-    const auto stayOpen = [this](const std::string& page) {
-        return [=, this](int client) { sending(page)(client), Peer::waitForEnd(client); };
-    };
-    EXPECT_EQ(latest(stayOpen(kLatestPage)), 0);
+    EXPECT_EQ(latest(silentAfter(kLatestPage)), 0);
     EXPECT_EQ(value_, 112.375F);
-    EXPECT_EQ(history(stayOpen(kHistoryPage)), 0);
+    EXPECT_EQ(history(silentAfter(kHistoryPage)), 0);
     EXPECT_EQ(quotes(), "3=45 4=47 ");
     EXPECT_LT(std::chrono::steady_clock::now() - start, limit_ / 2);
 }
@@ -151,7 +153,9 @@ TEST_F(FetchTest, PeersThatGiveNoPageFailInTime)
         {[](int) {}, "closes at once"},
         {[](int client) { Peer::receiveLine(client); }, "closes after the request"},
         {[](int client) { Peer::waitForEnd(client); }, "is silent"},
-        {[this](int client) { sending("<html>")(client), Peer::waitForEnd(client); }, "goes silent after some text"},
+        {silentAfter("<html>"), "goes silent after some text"},
+        {silentAfter("<td nowrap><b>45</b>\n"), "goes silent where a fraction may follow"},
+        {silentAfter("(00s)</b>\n5/3/1999 45 46 100\n"), "goes silent in a table, of which nothing is stored"},
         {sending("<html>no marker</html>"), "has no marker"},
         {endless("<td nowrap>", 0ms), "never ends"},
         {endless("x", 20ms), "never ends, but trickles"},
