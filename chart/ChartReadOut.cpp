@@ -24,7 +24,7 @@ std::string valueText(double value)
 
 std::string textOf(const GraphPoint& point, const GraphElement& owner, bool isDateBased)
 {
-    std::string text(owner.getLegend().bytes());
+    std::string text = legendOf(owner);
     if (!text.empty())
         text += kSpace;
     text +=

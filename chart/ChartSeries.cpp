@@ -26,11 +26,8 @@ std::vector<ChartSeries> seriesOf(GraphElement* const* elements, unsigned count,
         GraphElement& element = *elements[i];
         if (element.isUndefined())
             continue;
-        ChartSeries series{shapeOf(element),
-                           element.getColor(),
-                           std::max<float>(element.getPenSize(), 1),
-                           std::string(element.getLegend().bytes()),
-                           {}};
+        ChartSeries series{
+            shapeOf(element), element.getColor(), std::max<float>(element.getPenSize(), 1), legendOf(element), {}};
         unsigned n;
         GraphPoint* single;
         GraphPoint* const* points = pointsOf(element, &n, &single);
@@ -48,6 +45,13 @@ ChartPoint chartPointOf(const GraphPoint& point, bool isDateBased)
 {
     return {isDateBased ? dayNumber(point.getDateX()) : static_cast<double>(point.getX()),
             static_cast<double>(point.getY())};
+}
+
+std::string legendOf(const GraphElement& element)
+{
+    if (element.getType() == GraphPoint::kType)
+        return {};
+    return std::string(static_cast<const GraphPolyElement&>(element).getLegend().bytes());
 }
 
 bool hasPlace(const ChartPoint& point)

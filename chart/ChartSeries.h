@@ -24,6 +24,9 @@ struct ChartSeries {
 /// value that is infinite or not a number. A line or polygon leaves such points out.
 std::vector<ChartSeries> seriesOf(GraphElement* const* elements, unsigned count, bool isDateBased);
 
+/// The name of a line or polygon in the key; a point that stands alone has none.
+std::string legendOf(const GraphElement& element);
+
 /// The coordinates of `point`, which are not finite where it has no place.
 ChartPoint chartPointOf(const GraphPoint& point, bool isDateBased);
 bool hasPlace(const ChartPoint& point);

@@ -7,17 +7,7 @@ GraphElement::~GraphElement()
     setGraphView(nullptr);
 }
 
-ManyToOneAssociation<GraphElement, GraphView>& GraphViewToGraphElements::backLink(GraphElement& e) const
+int GraphElement::setGraphView(GraphView* view)
 {
-    return e.view_;
-}
-
-int GraphElementsToGraphView::xAdd(GraphView* partner)
-{
-    return partner->addGraphElement(owner());
-}
-
-int GraphElementsToGraphView::xRemove(GraphView* partner)
-{
-    return partner->removeGraphElement(owner());
+    return view_.set(this, view);
 }

@@ -1,7 +1,6 @@
 #pragma once
 
 #include "chart/GraphViewToGraphElements.h"
-#include "foundation/String.h"
 #include "platform/GraphicsDefs.h"
 
 /// Something that a chart shows: a line, a polygon or a point.
@@ -30,11 +29,7 @@ public:
     /// The width of the line, in pixels; a point is drawn as a disc in proportion to it.
     void setPenSize(short penSize) { penSize_ = penSize; }
     short getPenSize() const { return penSize_; }
-    /// The name of the element in the chart's key. An element without one, as at first, does not appear there.
-    void setLegend(const String& legend) { legend_ = legend; }
-    const String& getLegend() const { return legend_; }
-
-    int setGraphView(GraphView* view) { return view_.set(view); }
+    int setGraphView(GraphView* view);
     /// @return 0; -1 and a null `*out` when no chart shows the element.
     int getGraphView(GraphView** out) const { return view_.get(out); }
 
@@ -44,9 +39,8 @@ protected:
 private:
     friend class GraphViewToGraphElements;
 
-    short penSize_ = 2;
     rgb_color color_;
-    GraphElementsToGraphView view_{this};
+    short penSize_ = 2;
     bool dateBased_ = false;
-    String legend_;
+    GraphElementsToGraphView view_;
 };

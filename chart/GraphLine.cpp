@@ -3,21 +3,6 @@
 #include "chart/GraphPoint.h"
 #include "chart/PointExtremes.h"
 
-namespace {
-
-/// `sortPointsByX` for a list that may hold dates and numbers, which that takes for equal: then nothing would come
-/// before or behind anything for sure. Here the numbers come first.
-int sortPointsOfLine(const void* a, const void* b)
-{
-    const GraphPoint* first = *static_cast<GraphPoint* const*>(a);
-    const GraphPoint* second = *static_cast<GraphPoint* const*>(b);
-    if (first->isDateBased() != second->isDateBased())
-        return first->isDateBased() ? 1 : -1;
-    return sortPointsByX(a, b);
-}
-
-} // namespace
-
 GraphLine::GraphLine() : points_(this) {}
 
 GraphLine::~GraphLine()
@@ -87,10 +72,11 @@ Date GraphLine::getMaxDateX() const
     return point != nullptr ? point->getDateX() : Date();
 }
 
-GraphLineToGraphPoints::GraphLineToGraphPoints(GraphLine* owner) : OneToManyAssociation(owner, true, sortPointsOfLine)
-{}
-
-ManyToOneAssociation<GraphPoint, GraphPolyElement>& GraphLineToGraphPoints::backLink(GraphPoint& e) const
+int GraphLineToGraphPoints::compare(const void* a, const void* b)
 {
-    return e.polyElement_;
+    const GraphPoint* first = *static_cast<GraphPoint* const*>(a);
+    const GraphPoint* second = *static_cast<GraphPoint* const*>(b);
+    if (first->isDateBased() != second->isDateBased())
+        return first->isDateBased() ? 1 : -1;
+    return sortPointsByX(a, b);
 }

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "chart/GraphLineToGraphPoints.h"
+#include "chart/GraphPoint.h"
 #include "chart/GraphPolyElement.h"
 #include "foundation/Date.h"
 

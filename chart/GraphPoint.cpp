@@ -46,12 +46,7 @@ int sortPointsByX(const void* a, const void* b)
     return first.getX() > second.getX() ? 1 : first.getX() < second.getX() ? -1 : 0;
 }
 
-int GraphPointsToGraphPolyElement::xAdd(GraphPolyElement* partner)
+int GraphPoint::setGraphPolyElement(GraphPolyElement* element)
 {
-    return partner->addGraphPoint(owner());
-}
-
-int GraphPointsToGraphPolyElement::xRemove(GraphPolyElement* partner)
-{
-    return partner->removeGraphPoint(owner());
+    return polyElement_.set(this, element);
 }

@@ -2,7 +2,7 @@
 
 #include "chart/GraphElement.h"
 #include "chart/GraphPointsToGraphPolyElement.h"
-#include "foundation/Date.h"
+#include "foundation/PackedDate.h"
 
 class GraphPolyElement;
 
@@ -20,12 +20,12 @@ public:
 
     float getX() const { return x_; }
     void setX(float x);
-    const Date& getDateX() const { return dateX_; }
+    Date getDateX() const { return dateX_.date(); }
     void setDateX(const Date& date);
     float getY() const { return y_; }
     void setY(float y);
 
-    int setGraphPolyElement(GraphPolyElement* element) { return polyElement_.set(element); }
+    int setGraphPolyElement(GraphPolyElement* element);
     /// @return 0; -1 and a null `*out` when the point belongs to no line or polygon.
     int getGraphPolyElement(GraphPolyElement** out) const { return polyElement_.get(out); }
 
@@ -35,9 +35,9 @@ private:
     void notifyChange();
 
     float x_ = 0;
-    Date dateX_;
     float y_ = 0;
-    GraphPointsToGraphPolyElement polyElement_{this};
+    PackedDate dateX_;
+    GraphPointsToGraphPolyElement polyElement_;
 };
 
 /// Orders two places of an array of point pointers by x, ascending, for `qsort`: dates if both points are date based,

@@ -7,11 +7,9 @@ class GraphPolyElement;
 
 /// The point's link to the line or polygon that owns it: the counterpart of `GraphLineToGraphPoints` and of
 /// `GraphPolygonToGraphPoints`, which it reaches through the element's own operations.
-class GraphPointsToGraphPolyElement final : public ManyToOneAssociation<GraphPoint, GraphPolyElement> {
+class GraphPointsToGraphPolyElement final
+    : public ManyToOneAssociation<GraphPointsToGraphPolyElement, GraphPoint, GraphPolyElement, true> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(GraphPolyElement* partner) override;
-    int xRemove(GraphPolyElement* partner) override;
+    static int enter(auto& element, GraphPoint* point) { return element.addGraphPoint(point); }
+    static int leave(auto& element, GraphPoint* point) { return element.removeGraphPoint(point); }
 };

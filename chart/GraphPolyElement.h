@@ -1,6 +1,7 @@
 #pragma once
 
 #include "chart/GraphElement.h"
+#include "foundation/String.h"
 
 class GraphPoint;
 
@@ -15,4 +16,11 @@ public:
     virtual void graphPointChanged() = 0;
     /// Destroys all points.
     virtual void clearAll() = 0;
+
+    /// The name of the element in the chart's key. An element without one, as at first, does not appear there.
+    void setLegend(const String& legend) { legend_ = legend; }
+    const String& getLegend() const { return legend_; }
+
+private:
+    String legend_;
 };

@@ -64,10 +64,3 @@ Date GraphPolygon::getMaxDateX() const
 {
     return largest(points_, &GraphPoint::getDateX);
 }
-
-GraphPolygonToGraphPoints::GraphPolygonToGraphPoints(GraphPolygon* owner) : OneToManyAssociation(owner) {}
-
-ManyToOneAssociation<GraphPoint, GraphPolyElement>& GraphPolygonToGraphPoints::backLink(GraphPoint& e) const
-{
-    return e.polyElement_;
-}

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "chart/GraphPoint.h"
 #include "chart/GraphPolyElement.h"
 #include "chart/GraphPolygonToGraphPoints.h"
 #include "foundation/Date.h"

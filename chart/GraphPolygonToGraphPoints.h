@@ -4,13 +4,11 @@
 
 class GraphPoint;
 class GraphPolyElement;
-class GraphPolygon;
 
 /// A polygon's points, in the order in which they were added. The other end is `GraphPointsToGraphPolyElement`.
-class GraphPolygonToGraphPoints final : public OneToManyAssociation<GraphPolyElement, GraphPoint> {
+class GraphPolygonToGraphPoints final
+    : public OneToManyAssociation<GraphPolygonToGraphPoints, GraphPolyElement, GraphPoint> {
 public:
-    explicit GraphPolygonToGraphPoints(GraphPolygon* owner);
-
-private:
-    ManyToOneAssociation<GraphPoint, GraphPolyElement>& backLink(GraphPoint& e) const override;
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& point) { return point.polyElement_; }
 };

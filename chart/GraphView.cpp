@@ -2,6 +2,7 @@
 
 #include "chart/ChartLayout.h"
 #include "chart/ChartPainter.h"
+#include "chart/ChartSeries.h"
 #include "chart/GraphElement.h"
 #include "chart/GraphLine.h"
 #include "chart/GraphPoint.h"
@@ -111,7 +112,7 @@ void GraphView::askForPictureFile()
     // The first line is what the chart is about, as it is for the marks of the lowest and the highest value.
     GraphElement* const* line =
         std::find_if(elements, elements + count, [](const auto* e) { return e->getType() == GraphLine::kType; });
-    std::string name(line != elements + count ? (*line)->getLegend().bytes() : "");
+    std::string name = line != elements + count ? legendOf(**line) : "";
     constexpr std::size_t kLongest = 200; // bytes; the name of a file has 255
     name.resize(wholeCharacters(name, kLongest));
     std::replace(name.begin(), name.end(), '/', '-');

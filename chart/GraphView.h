@@ -1,7 +1,7 @@
 #pragma once
 
 #include "chart/ChartScale.h"
-#include "chart/GraphViewToGraphElements.h"
+#include "chart/GraphElement.h"
 #include "foundation/String.h"
 #include "platform/View.h"
 
@@ -65,6 +65,7 @@ public:
     GraphPoint* nearestPoint(BPoint where, float reach) const;
 
 private:
+    friend class GraphElementsToGraphView;
     ChartContents readContents() const;
     void askForPictureFile();
     void savePicture(const BMessage& answer);

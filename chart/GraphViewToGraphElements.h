@@ -6,20 +6,14 @@ class GraphElement;
 class GraphView;
 
 /// The elements that a chart shows, in the order in which they were added.
-class GraphViewToGraphElements final : public OneToManyAssociation<GraphView, GraphElement> {
+class GraphViewToGraphElements final : public OneToManyAssociation<GraphViewToGraphElements, GraphView, GraphElement> {
 public:
     using OneToManyAssociation::OneToManyAssociation;
-
-private:
-    ManyToOneAssociation<GraphElement, GraphView>& backLink(GraphElement& e) const override;
+    static auto& link(auto& element) { return element.view_; }
 };
 
 /// The element's link to the chart that shows it.
-class GraphElementsToGraphView final : public ManyToOneAssociation<GraphElement, GraphView> {
+class GraphElementsToGraphView final : public ManyToOneAssociation<GraphElementsToGraphView, GraphElement, GraphView> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(GraphView* partner) override;
-    int xRemove(GraphView* partner) override;
+    static auto& list(auto& view) { return view.elements_; }
 };

@@ -1,15 +1,12 @@
 #pragma once
 
 #include "chart/GraphPoint.h"
-#include "foundation/OneToManyAssociation.h"
 
 #include <type_traits>
 
-class GraphPolyElement;
-
-/// The first of the least values, in the order of `points`, that `get` gives; a default value without points.
-template <class Get>
-auto smallest(const OneToManyAssociation<GraphPolyElement, GraphPoint>& points, Get get)
+/// The first of the least values, in the order of the list `points`, that `get` gives; a default value without points.
+template <class Points, class Get>
+auto smallest(const Points& points, Get get)
 {
     using Value = std::decay_t<std::invoke_result_t<Get, const GraphPoint&>>;
     unsigned count;
@@ -22,8 +19,8 @@ auto smallest(const OneToManyAssociation<GraphPolyElement, GraphPoint>& points, 
 }
 
 /// The same for the greatest value.
-template <class Get>
-auto largest(const OneToManyAssociation<GraphPolyElement, GraphPoint>& points, Get get)
+template <class Points, class Get>
+auto largest(const Points& points, Get get)
 {
     using Value = std::decay_t<std::invoke_result_t<Get, const GraphPoint&>>;
     unsigned count;

@@ -63,6 +63,8 @@ public:
     String toString() const;
 
 private:
+    friend class PackedDate;
+
     /// Orders by year, month, day, each signed.
     std::uint64_t key() const
     {

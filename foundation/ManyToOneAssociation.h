@@ -1,20 +1,23 @@
 #pragma once
 
 #include <cstdint>
+#include <type_traits>
 
-template <class Owner, class Element>
+template <class ManyEnd, class Owner, class Element>
 class OneToManyAssociation;
 
 /// The link of one element to its owner, held by the element; its counterpart is the owner's `OneToManyAssociation`.
 ///
-/// Linking from either end updates the other. The named subclass of each relation reaches the owner's list in `xAdd`
-/// and `xRemove`. The link also remembers where its element stands in that list and as which it was added, so that
-/// membership and removal need no search.
-template <class Element, class Owner>
+/// Linking from either end updates the other. `OneEnd` is the relation's own class, derived from this one; it says
+/// where the list lives, in a static function `list(Owner&)`. Where linking shall do more than entering the list, it
+/// has `enter(Owner&, Element*)` and `leave(Owner&, Element*)` instead.
+///
+/// The link knows its partner and the place of its element in the partner's list, so that membership and removal need
+/// no search. `sorted` links also know as which of the list's elements theirs was added.
+template <class OneEnd, class Element, class Owner, bool sorted = false>
 class ManyToOneAssociation {
 public:
-    /// `owner` is the element that holds this link.
-    explicit ManyToOneAssociation(Element* owner) : owner_(owner) {}
+    ManyToOneAssociation() = default;
     ManyToOneAssociation(const ManyToOneAssociation&) = delete;
     ManyToOneAssociation& operator=(const ManyToOneAssociation&) = delete;
 
@@ -28,16 +31,16 @@ public:
     /// The linked object, null when there is none.
     Owner* partner() const { return partner_; }
 
-    /// Leaves the present owner's list and enters that of `p`; null only leaves.
+    /// Takes `element`, which holds this link, out of its present owner's list and into that of `p`; null only leaves.
     /// @return 0; what the old list answered when it would not let go (nothing has changed then), or what the new one
     /// answered when it refused (the element is then unlinked).
-    int set(Owner* p)
+    int set(Element* element, Owner* p)
     {
         if (p == partner_)
             return 0;
         if (Owner* old = partner_) {
-            partner_ = nullptr;
-            if (const int failure = xRemove(old)) {
+            partner_ = nullptr; // the list sees that the link has let go, and does not call back
+            if (const int failure = OneEnd::leave(*old, element)) {
                 partner_ = old;
                 return failure;
             }
@@ -45,28 +48,30 @@ public:
         partner_ = p;
         if (p == nullptr)
             return 0;
-        const int failure = xAdd(p);
+        const int failure = OneEnd::enter(*p, element);
         if (failure != 0)
             partner_ = nullptr;
         return failure;
     }
 
-    int xRmv(Owner* p) { return xRemove(p); }
-
 protected:
     ~ManyToOneAssociation() = default; // always a member, held by value and destroyed as what it is
 
-    Element* owner() const { return owner_; }
-    /// Adds this link's element to the many end of `partner`.
-    virtual int xAdd(Owner* partner) = 0;
-    /// Removes it from there.
-    virtual int xRemove(Owner* partner) = 0;
+    /// Adds the element to the owner's list, and removes it from there.
+    static int enter(Owner& owner, Element* element) { return OneEnd::list(owner).add(element); }
+    static int leave(Owner& owner, Element* element) { return OneEnd::list(owner).remove(element); }
 
 private:
-    friend class OneToManyAssociation<Owner, Element>;
+    template <class ManyEnd, class AnOwner, class AnElement>
+    friend class OneToManyAssociation;
 
-    Element* owner_;
+    struct Turn {
+        std::uint32_t number = 0;
+    };
+    struct NoTurn {};
+
     Owner* partner_ = nullptr;
-    std::uint32_t place_ = 0;    // index of the element in the partner's list, kept by that list
-    std::uint32_t sequence_ = 0; // rises with each addition to the list: the order of equal sort keys
+    std::uint32_t place_ = 0; // index of the element in the partner's list, kept by that list
+    // Rises with each addition to the list: the order of equal sort keys.
+    [[no_unique_address]] std::conditional_t<sorted, Turn, NoTurn> turn_;
 };

@@ -9,24 +9,22 @@
 
 /// The list of an owner's elements; each element holds the counterpart, a `ManyToOneAssociation`.
 ///
+/// `ManyEnd` is the relation's own class, derived from this one. It says where the link lives, in a static function
+/// `link(Element&)`, and, when the list is sorted, in which order, by a static function `compare`.
+///
 /// Membership, addition and removal take constant time. A sorted list is put in order by the next read after a change
 /// that may have disturbed it; elements with equal keys keep the order in which they were added. An unsorted list does
 /// not keep its order on removal: the last element takes the free place.
 ///
 /// The list does not own its elements. The owner empties it (`deleteAll` or `unlinkAll`) before it dies.
-template <class Owner, class Element>
+template <class ManyEnd, class Owner, class Element>
 class OneToManyAssociation {
 public:
-    /// Compares two array places, as `qsort` does: negative, 0 or positive.
-    using Compare = int (*)(const void*, const void*);
-
-    /// `owner` is the object that holds this list. The list is sorted only when `sorted` is true and `compare` given.
-    explicit OneToManyAssociation(Owner* owner, bool sorted = false, Compare compare = nullptr)
-        : owner_(owner), compare_(sorted ? compare : nullptr)
-    {}
+    /// `owner` is the object that holds this list.
+    explicit OneToManyAssociation(Owner* owner) : owner_(owner) {}
     OneToManyAssociation(const OneToManyAssociation&) = delete;
     OneToManyAssociation& operator=(const OneToManyAssociation&) = delete;
-    virtual ~OneToManyAssociation()
+    ~OneToManyAssociation()
     {
         assert(count_ == 0); // the elements would keep a link to a list that is gone
         std::free(elements_);
@@ -41,11 +39,11 @@ public:
         if (contains(e))
             return 0;
         append(e);
-        const int failure = backLink(*e).partner_ == owner_ ? 0 : xSet(e, owner_);
+        const int failure = ManyEnd::link(*e).partner_ == owner_ ? 0 : ManyEnd::link(*e).set(e, owner_);
         if (failure != 0)
             --count_;
         else
-            settle(e);
+            settle(ManyEnd::link(*e));
         return failure;
     }
 
@@ -53,10 +51,11 @@ public:
     /// counts where there are millions.
     void addNew(Element* e)
     {
-        assert(backLink(*e).partner_ == nullptr);
+        auto& link = ManyEnd::link(*e);
+        assert(link.partner_ == nullptr);
         append(e);
-        backLink(*e).partner_ = owner_;
-        settle(e);
+        link.partner_ = owner_;
+        settle(link);
     }
 
     /// @return 0 without effect for an element that is not here; otherwise what unlinking the element gives, after a
@@ -66,12 +65,12 @@ public:
         if (e == nullptr || !contains(e))
             return 0;
         // The link goes first and comes back here once it is free, so that a refusal leaves both ends as they were.
-        if (backLink(*e).partner_ == owner_)
+        if (ManyEnd::link(*e).partner_ == owner_)
             return xUnSet(e);
         const std::uint32_t place = placeOf(e);
         if (--count_ != place) {
             elements_[place] = elements_[count_];
-            backLink(*elements_[place]).place_ = place;
+            ManyEnd::link(*elements_[place]).place_ = place;
             dirty_ = true;
         }
         shrink();
@@ -118,29 +117,27 @@ public:
     /// Puts the list in order now; an unsorted list stays as it is.
     void sort() const
     {
-        if (!isSorted())
-            return;
-        // What stands in order at the front, often nearly all, is only merged with the rest.
-        const auto before = [this](Element* a, Element* b) { return isBefore(a, b); };
-        Element** end = elements_ + count_;
-        Element** rest = std::is_sorted_until(elements_, end, before);
-        std::sort(rest, end, before);
-        std::inplace_merge(elements_, rest, end, before);
-        for (std::uint32_t i = 0; i < count_; ++i)
-            backLink(*elements_[i]).place_ = i;
+        if constexpr (isSorted()) {
+            // What stands in order at the front, often nearly all, is only merged with the rest.
+            Element** end = elements_ + count_;
+            Element** rest = std::is_sorted_until(elements_, end, isBefore);
+            std::sort(rest, end, isBefore);
+            std::inplace_merge(elements_, rest, end, isBefore);
+            notePlaces();
+        }
     }
     /// To be called when the sort key of an element has changed.
     void changeNotice() { dirty_ = true; }
 
     /// Keeps a turn in the order of equal keys for an element that is added later and then given it by `setTurn`.
-    std::uint32_t reserveTurn() { return nextSequence_++; }
+    std::uint32_t reserveTurn() { return nextTurn_++; }
     void setTurn(Element* e, std::uint32_t turn)
     {
-        backLink(*e).sequence_ = turn;
+        ManyEnd::link(*e).turn_.number = turn;
         dirty_ = true;
     }
 
-    int xUnSet(Element* e) { return xSet(e, nullptr); }
+    int xUnSet(Element* e) { return ManyEnd::link(*e).set(e, nullptr); }
 
     /// Makes room for `count` elements at once; only a saving, never needed.
     void reserve(std::uint32_t count)
@@ -167,21 +164,21 @@ public:
         }
     }
 
-protected:
-    /// The link that `e` holds for this relation.
-    virtual ManyToOneAssociation<Element, Owner>& backLink(Element& e) const = 0;
-
-    /// Makes the back link of `e` point at `owner`, or clears it when `owner` is null.
-    virtual int xSet(Element* e, Owner* owner) { return backLink(*e).set(owner); }
-
 private:
-    bool isSorted() const { return compare_ != nullptr; }
+    /// The class of a relation whose list is not sorted has no `compare`.
+    static constexpr bool isSorted()
+    {
+        return requires(const void* place)
+        {
+            ManyEnd::compare(place, place);
+        };
+    }
 
     /// The place of `e`, or a number from `count_` up when it is not here. While `add` is linking its element, that
     /// stands at the end, but its link still remembers the place in the list it is leaving.
     std::uint32_t placeOf(Element* e) const
     {
-        const std::uint32_t place = backLink(*e).place_;
+        const std::uint32_t place = ManyEnd::link(*e).place_;
         if (place < count_ && elements_[place] == e)
             return place;
         return count_ > 0 && elements_[count_ - 1] == e ? count_ - 1 : count_;
@@ -191,22 +188,31 @@ private:
     {
         if (count_ == capacity_)
             setCapacity(capacity_ + capacity_ / 2 + 2);
-        if (!dirty_ && isSorted() && count_ > 0 && compare_(&elements_[count_ - 1], &e) > 0)
-            dirty_ = true;
+        if constexpr (isSorted())
+            dirty_ = dirty_ || (count_ > 0 && ManyEnd::compare(&elements_[count_ - 1], &e) > 0);
         elements_[count_++] = e;
     }
 
-    void settle(Element* e)
+    /// Tells the link of the last element its place, and its turn among those of equal keys.
+    template <class Link>
+    void settle(Link& link)
     {
-        auto& link = backLink(*e);
         link.place_ = count_ - 1;
-        link.sequence_ = nextSequence_++;
+        if constexpr (isSorted())
+            link.turn_.number = nextTurn_++;
     }
 
-    bool isBefore(Element* a, Element* b) const
+    static bool isBefore(Element* a, Element* b)
     {
-        const int order = compare_(&a, &b);
-        return order != 0 ? order < 0 : backLink(*a).sequence_ < backLink(*b).sequence_;
+        const int order = ManyEnd::compare(&a, &b);
+        return order != 0 ? order < 0 : ManyEnd::link(*a).turn_.number < ManyEnd::link(*b).turn_.number;
+    }
+
+    /// Tells every link where its element stands.
+    void notePlaces() const
+    {
+        for (std::uint32_t i = 0; i < count_; ++i)
+            ManyEnd::link(*elements_[i]).place_ = i;
     }
 
     void sortWhenDirty() const
@@ -223,8 +229,7 @@ private:
     {
         sortWhenDirty();
         std::reverse(elements_, elements_ + count_);
-        for (std::uint32_t i = 0; i < count_; ++i)
-            backLink(*elements_[i]).place_ = i;
+        notePlaces();
         dirty_ = true;
     }
 
@@ -235,7 +240,7 @@ private:
             elements_ = nullptr;
             capacity_ = 0;
             dirty_ = false;
-            nextSequence_ = 0;
+            nextTurn_ = 0;
         } else if (capacity_ > 16 && count_ <= capacity_ / 4)
             setCapacity(capacity_ / 2);
     }
@@ -253,7 +258,6 @@ private:
     Element** elements_ = nullptr; // malloc'ed, owned; null when empty
     std::uint32_t count_ = 0;
     std::uint32_t capacity_ = 0;
-    Compare compare_; // null for an unsorted list
-    std::uint32_t nextSequence_ = 0;
-    mutable bool dirty_ = false;
+    std::uint32_t nextTurn_ = 0; // only a sorted list counts them
+    mutable bool dirty_ = false; // an element may stand in the wrong place of the order
 };

@@ -84,17 +84,7 @@ const String& Company::getCurrencyRepresentation() const
     return market != nullptr ? market->getCurrencyRepresentation() : String::none();
 }
 
-ManyToOneAssociation<Company, Market>& MarketToCompanies::backLink(Company& e) const
+int Company::setMarket(Market* market)
 {
-    return e.market_;
-}
-
-int CompaniesToMarket::xAdd(Market* partner)
-{
-    return partner->addCompany(owner());
-}
-
-int CompaniesToMarket::xRemove(Market* partner)
-{
-    return partner->removeCompany(owner());
+    return market_.set(this, market);
 }

@@ -2,9 +2,8 @@
 
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
+#include "market/CompanyEvent.h"
 #include "market/CompanyQuote.h"
-#include "market/CompanyToEvents.h"
-#include "market/CompanyToQuotes.h"
 #include "market/CompanyToShares.h"
 #include "market/MarketToCompanies.h"
 #include "market/QuoteSeries.h"
@@ -28,12 +27,12 @@ public:
     void setAbbreviation(const String& abbreviation) { abbreviation_ = abbreviation; }
 
     int getMarket(Market** out) const { return market_.get(out); }
-    int setMarket(Market* market) { return market_.set(market); }
+    int setMarket(Market* market);
     /// The short symbol of the market's currency; a String without text when market or currency is missing.
     const String& getCurrencyRepresentation() const;
 
-    int addShare(Share* share) { return shares_.add(share); }
-    int removeShare(Share* share) { return shares_.remove(share); }
+    int addShare(Share* share);
+    int removeShare(Share* share);
     unsigned getNbrShares() const { return shares_.getNbr(); }
     Share** getAllShares(unsigned* n) const { return shares_.getAll(n); }
     int getShare(Share** out, unsigned i) const { return shares_.getAt(out, i); }
@@ -53,6 +52,8 @@ public:
     int setInternetLastThreeMonthsQuote();
 
 private:
+    friend class CompanyEventsToCompany;
+    friend class SharesToCompany;
     friend class MarketToCompanies;
 
     int readEvents(FILE* file);
@@ -61,5 +62,5 @@ private:
     String abbreviation_;
     CompanyToShares shares_;
     CompanyToEvents events_;
-    CompaniesToMarket market_{this};
+    CompaniesToMarket market_;
 };

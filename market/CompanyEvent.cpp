@@ -21,17 +21,7 @@ int CompanyEvent::setDate(const Date& date)
     return company == nullptr || setCompany(company) == 0 ? 0 : -1;
 }
 
-ManyToOneAssociation<CompanyEvent, Company>& CompanyToEvents::backLink(CompanyEvent& e) const
+int CompanyEvent::setCompany(Company* company)
 {
-    return e.company_;
-}
-
-int CompanyEventsToCompany::xAdd(Company* partner)
-{
-    return partner->addEvent(owner());
-}
-
-int CompanyEventsToCompany::xRemove(Company* partner)
-{
-    return partner->removeEvent(owner());
+    return company_.set(this, company);
 }

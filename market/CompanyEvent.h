@@ -18,7 +18,7 @@ public:
     int setDate(const Date& date);
 
     int getCompany(Company** out) const { return company_.get(out); }
-    int setCompany(Company* company) { return company_.set(company); }
+    int setCompany(Company* company);
 
 protected:
     CompanyEvent() = default;
@@ -27,6 +27,6 @@ protected:
 private:
     friend class CompanyToEvents;
 
-    CompanyEventsToCompany company_{this};
+    CompanyEventsToCompany company_;
     Date date_;
 };

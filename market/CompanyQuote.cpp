@@ -18,21 +18,7 @@ void CompanyQuote::notifyChange()
         company->quoteChanged();
 }
 
-CompanyToQuotes::CompanyToQuotes(Company* owner) : OneToManyAssociation(owner, true, sortQuotesByDate) {}
-
-ManyToOneAssociation<CompanyQuote, Company>& CompanyToQuotes::backLink(CompanyQuote& e) const
+int CompanyQuote::setCompany(Company* company)
 {
-    return e.company_;
-}
-
-// Through the owner's own operations, so that a quote of the same day is replaced and the trend follows.
-
-int QuotesToCompany::xAdd(Company* partner)
-{
-    return partner->addQuote(owner());
-}
-
-int QuotesToCompany::xRemove(Company* partner)
-{
-    return partner->removeQuote(owner());
+    return company_.set(this, company);
 }

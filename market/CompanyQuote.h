@@ -16,12 +16,12 @@ public:
 
     /// @return 0; -1 and a null `*out` when the quote has no company.
     int getCompany(Company** out) const { return company_.get(out); }
-    int setCompany(Company* company) { return company_.set(company); }
+    int setCompany(Company* company);
 
 protected:
     void notifyChange() override;
 
 private:
     friend class CompanyToQuotes;
-    QuotesToCompany company_{this};
+    QuotesToCompany company_;
 };

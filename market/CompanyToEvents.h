@@ -6,20 +6,14 @@ class Company;
 class CompanyEvent;
 
 /// A company's notes and splits.
-class CompanyToEvents final : public OneToManyAssociation<Company, CompanyEvent> {
+class CompanyToEvents final : public OneToManyAssociation<CompanyToEvents, Company, CompanyEvent> {
 public:
-    explicit CompanyToEvents(Company* owner) : OneToManyAssociation(owner) {}
-
-private:
-    ManyToOneAssociation<CompanyEvent, Company>& backLink(CompanyEvent& e) const override;
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& event) { return event.company_; }
 };
 
 /// The event's link to its company.
-class CompanyEventsToCompany final : public ManyToOneAssociation<CompanyEvent, Company> {
+class CompanyEventsToCompany final : public ManyToOneAssociation<CompanyEventsToCompany, CompanyEvent, Company> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Company* partner) override;
-    int xRemove(Company* partner) override;
+    static auto& list(auto& company) { return company.events_; }
 };

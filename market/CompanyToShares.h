@@ -6,23 +6,16 @@ class Company;
 class Share;
 
 /// The portfolio's holdings of a company. Holdings live a floor higher: the members are defined beside `Share`.
-class CompanyToShares final : public OneToManyAssociation<Company, Share> {
+class CompanyToShares final : public OneToManyAssociation<CompanyToShares, Company, Share> {
 public:
-    explicit CompanyToShares(Company* owner) : OneToManyAssociation(owner) {}
-
+    using OneToManyAssociation::OneToManyAssociation;
     /// Destroys every holding.
     void deleteAll();
-
-private:
-    ManyToOneAssociation<Share, Company>& backLink(Share& e) const override;
+    static auto& link(auto& share) { return share.company_; }
 };
 
 /// The holding's link to its company.
-class SharesToCompany final : public ManyToOneAssociation<Share, Company> {
+class SharesToCompany final : public ManyToOneAssociation<SharesToCompany, Share, Company> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Company* partner) override;
-    int xRemove(Company* partner) override;
+    static auto& list(auto& company) { return company.shares_; }
 };

@@ -4,8 +4,7 @@
 #include "foundation/String.h"
 #include "market/CurrencyQuote.h"
 #include "market/CurrencyToAccounts.h"
-#include "market/CurrencyToMarkets.h"
-#include "market/CurrencyToQuotes.h"
+#include "market/Market.h"
 #include "market/QuoteSeries.h"
 
 /// A money unit with its rates: a rate is the price of one unit in the reference currency, whose own rates are all 1.
@@ -37,8 +36,8 @@ public:
     /// `*out` becomes the stored reference, or this currency when there is none. Always 0.
     int getReferenceCurrency(Currency** out);
 
-    int addAccount(Account* account) { return accounts_.add(account); }
-    int removeAccount(Account* account) { return accounts_.remove(account); }
+    int addAccount(Account* account);
+    int removeAccount(Account* account);
     unsigned getNbrAccounts() const { return accounts_.getNbr(); }
     Account** getAllAccounts(unsigned* n) const { return accounts_.getAll(n); }
 
@@ -48,6 +47,8 @@ public:
     Market** getAllMarkets(unsigned* n) const { return markets_.getAll(n); }
 
 private:
+    friend class AccountsToCurrency;
+    friend class MarketsToCurrency;
     int readMarkets(FILE* file);
 
     String name_;

@@ -18,21 +18,7 @@ void CurrencyQuote::notifyChange()
         currency->quoteChanged();
 }
 
-CurrencyToQuotes::CurrencyToQuotes(Currency* owner) : OneToManyAssociation(owner, true, sortQuotesByDate) {}
-
-ManyToOneAssociation<CurrencyQuote, Currency>& CurrencyToQuotes::backLink(CurrencyQuote& e) const
+int CurrencyQuote::setCurrency(Currency* currency)
 {
-    return e.currency_;
-}
-
-// Through the owner's own operations, so that a quote of the same day is replaced and the trend follows.
-
-int QuotesToCurrency::xAdd(Currency* partner)
-{
-    return partner->addQuote(owner());
-}
-
-int QuotesToCurrency::xRemove(Currency* partner)
-{
-    return partner->removeQuote(owner());
+    return currency_.set(this, currency);
 }

@@ -15,12 +15,12 @@ public:
 
     /// @return 0; -1 and a null `*out` when the rate has no currency.
     int getCurrency(Currency** out) const { return currency_.get(out); }
-    int setCurrency(Currency* currency) { return currency_.set(currency); }
+    int setCurrency(Currency* currency);
 
 protected:
     void notifyChange() override;
 
 private:
     friend class CurrencyToQuotes;
-    QuotesToCurrency currency_{this};
+    QuotesToCurrency currency_;
 };

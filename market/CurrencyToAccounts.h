@@ -6,20 +6,16 @@ class Currency;
 class Account;
 
 /// The cash accounts held in a currency. Accounts live a floor higher: the members are defined beside `Account`.
-class CurrencyToAccounts final : public OneToManyAssociation<Currency, Account> {
+class CurrencyToAccounts final : public OneToManyAssociation<CurrencyToAccounts, Currency, Account> {
 public:
-    explicit CurrencyToAccounts(Currency* owner) : OneToManyAssociation(owner) {}
-
-private:
-    ManyToOneAssociation<Account, Currency>& backLink(Account& e) const override;
+    using OneToManyAssociation::OneToManyAssociation;
+    /// Leaves every account without a currency.
+    void unlinkAll();
+    static auto& link(auto& account) { return account.currency_; }
 };
 
 /// The account's link to its currency.
-class AccountsToCurrency final : public ManyToOneAssociation<Account, Currency> {
+class AccountsToCurrency final : public ManyToOneAssociation<AccountsToCurrency, Account, Currency> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Currency* partner) override;
-    int xRemove(Currency* partner) override;
+    static auto& list(auto& currency) { return currency.accounts_; }
 };

@@ -6,20 +6,14 @@ class Currency;
 class Market;
 
 /// The markets that trade in a currency.
-class CurrencyToMarkets final : public OneToManyAssociation<Currency, Market> {
+class CurrencyToMarkets final : public OneToManyAssociation<CurrencyToMarkets, Currency, Market> {
 public:
-    explicit CurrencyToMarkets(Currency* owner) : OneToManyAssociation(owner) {}
-
-private:
-    ManyToOneAssociation<Market, Currency>& backLink(Market& e) const override;
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& market) { return market.currency_; }
 };
 
 /// The market's link to its currency.
-class MarketsToCurrency final : public ManyToOneAssociation<Market, Currency> {
+class MarketsToCurrency final : public ManyToOneAssociation<MarketsToCurrency, Market, Currency> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Currency* partner) override;
-    int xRemove(Currency* partner) override;
+    static auto& list(auto& currency) { return currency.markets_; }
 };

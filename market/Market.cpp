@@ -67,17 +67,7 @@ int Market::getCompany(const String& abbreviation, Company** out) const
     return -1;
 }
 
-ManyToOneAssociation<Market, Currency>& CurrencyToMarkets::backLink(Market& e) const
+int Market::setCurrency(Currency* currency)
 {
-    return e.currency_;
-}
-
-int MarketsToCurrency::xAdd(Currency* partner)
-{
-    return partner->addMarket(owner());
-}
-
-int MarketsToCurrency::xRemove(Currency* partner)
-{
-    return partner->removeMarket(owner());
+    return currency_.set(this, currency);
 }

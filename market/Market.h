@@ -2,8 +2,8 @@
 
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
+#include "market/Company.h"
 #include "market/CurrencyToMarkets.h"
-#include "market/MarketToCompanies.h"
 
 /// A stock exchange: trades in one currency and lists companies, which it owns.
 class Market final : public Serializable {
@@ -20,7 +20,7 @@ public:
     void setName(const String& name) { name_ = name; }
 
     int getCurrency(Currency** out) const { return currency_.get(out); }
-    int setCurrency(Currency* currency) { return currency_.set(currency); }
+    int setCurrency(Currency* currency);
     /// The currency's short symbol; a String without text when the market has no currency.
     const String& getCurrencyRepresentation() const;
 
@@ -38,9 +38,10 @@ public:
     int setInternetLastThreeMonthsQuote(Company* company) const;
 
 private:
+    friend class CompaniesToMarket;
     friend class CurrencyToMarkets;
 
     String name_;
     MarketToCompanies companies_;
-    MarketsToCurrency currency_{this};
+    MarketsToCurrency currency_;
 };

@@ -6,20 +6,14 @@ class Market;
 class Company;
 
 /// The companies that a market lists.
-class MarketToCompanies final : public OneToManyAssociation<Market, Company> {
+class MarketToCompanies final : public OneToManyAssociation<MarketToCompanies, Market, Company> {
 public:
-    explicit MarketToCompanies(Market* owner) : OneToManyAssociation(owner) {}
-
-private:
-    ManyToOneAssociation<Company, Market>& backLink(Company& e) const override;
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& company) { return company.market_; }
 };
 
 /// The company's link to its market.
-class CompaniesToMarket final : public ManyToOneAssociation<Company, Market> {
+class CompaniesToMarket final : public ManyToOneAssociation<CompaniesToMarket, Company, Market> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Market* partner) override;
-    int xRemove(Market* partner) override;
+    static auto& list(auto& market) { return market.companies_; }
 };

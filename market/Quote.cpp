@@ -2,12 +2,10 @@
 
 #include "foundation/FieldIO.h"
 
-#include <cstring>
-
 int Quote::wrt(FILE* file) const
 {
     unsigned char bytes[kFileSize];
-    date_.encode(bytes);
+    getDate().encode(bytes);
     encodeFloat(bytes + Date::kFileSize, value_);
     return std::fwrite(bytes, sizeof bytes, 1, file) == 1 ? 0 : -1;
 }
@@ -23,7 +21,9 @@ int Quote::rd(FILE* file)
 
 void Quote::decode(const unsigned char* bytes)
 {
-    date_.decode(bytes);
+    Date date;
+    date.decode(bytes);
+    date_ = date;
     value_ = decodeFloat(bytes + Date::kFileSize);
 }
 
@@ -37,16 +37,4 @@ void Quote::setValue(float value)
 {
     value_ = value;
     notifyChange();
-}
-
-int sortQuotesByDate(const void* a, const void* b)
-{
-    // The arrays hold pointers to one of the quote classes; each begins with its Quote.
-    const Quote* left;
-    const Quote* right;
-    std::memcpy(&left, a, sizeof left);
-    std::memcpy(&right, b, sizeof right);
-    if (left->getDate() > right->getDate())
-        return 1;
-    return left->getDate() < right->getDate() ? -1 : 0;
 }

@@ -1,7 +1,9 @@
 #pragma once
 
-#include "foundation/Date.h"
+#include "foundation/PackedDate.h"
 #include "foundation/Serializable.h"
+
+#include <cstring>
 
 /// A dated value: the price of a share, or the rate of a currency in the reference currency.
 ///
@@ -17,7 +19,9 @@ public:
     /// Takes date and value from the `kFileSize` bytes of a record, without notice to an owner.
     void decode(const unsigned char* bytes);
 
-    const Date& getDate() const { return date_; }
+    Date getDate() const { return date_.date(); }
+    /// The same, to compare.
+    const PackedDate& getPackedDate() const { return date_; }
     void setDate(const Date& date);
     float getValue() const { return value_; }
     void setValue(float value);
@@ -32,10 +36,20 @@ protected:
     virtual void notifyChange() = 0;
 
 private:
-    Date date_;
+    PackedDate date_;
     float value_ = 0;
     unsigned volume_ = 0;
 };
 
 /// Orders two places of an array of quote pointers by date, ascending, for `qsort`.
-int sortQuotesByDate(const void* a, const void* b);
+inline int sortQuotesByDate(const void* a, const void* b)
+{
+    // The arrays hold pointers to one of the quote classes; each begins with its Quote.
+    const Quote* left;
+    const Quote* right;
+    std::memcpy(&left, a, sizeof left);
+    std::memcpy(&right, b, sizeof right);
+    if (left->getPackedDate() > right->getPackedDate())
+        return 1;
+    return left->getPackedDate() < right->getPackedDate() ? -1 : 0;
+}

@@ -60,6 +60,26 @@ public:
     /// Between two quotes the value is a step, not a slope. Intended: a portfolio is worth the last known price.
     float getRealQuote(const Date& d) const;
 
+    /// Gives the real quotes of days that do not go back, without a search for each.
+    class Walk {
+    public:
+        /// `series` stays as it is while the walk lasts.
+        explicit Walk(const QuoteSeries& series) : series_(&series) {}
+        /// `d` is not before the day asked for last. What `getRealQuote` gives.
+        float realQuote(const Date& d)
+        {
+            unsigned n;
+            SeriesQuote** quotes = series_->getAllQuotes(&n);
+            for (const PackedDate day = d; next_ < n && quotes[next_]->getPackedDate() < day; ++next_)
+                ;
+            return series_->realQuote(d, next_);
+        }
+
+    private:
+        const QuoteSeries* series_;
+        unsigned next_ = 0; // the first quote on or after the day asked for last
+    };
+
     /// Date of the earliest and of the latest quote; the undefined date without quotes.
     Date getFirstQuote() const { return quotes_.getNbr() > 0 ? quotes_.at(0)->getDate() : Date(); }
     Date getLastQuote() const { return quotes_.getNbr() > 0 ? quotes_.at(quotes_.getNbr() - 1)->getDate() : Date(); }
@@ -103,6 +123,7 @@ private:
 
     SeriesQuote* findQuote(const Date& d) const;
     unsigned firstOnOrAfter(const Date& d) const;
+    float realQuote(const Date& d, unsigned next) const;
     void fitTrend() const;
     void replaceWith(std::vector<LateQuote>& late);
 
@@ -117,9 +138,10 @@ unsigned QuoteSeries<Owner, SeriesQuote, ManyEnd>::firstOnOrAfter(const Date& d)
 {
     unsigned n;
     SeriesQuote** quotes = getAllQuotes(&n);
-    if (n == 0 || quotes[n - 1]->getDate() < d) // most often asked: a new quote, or a day after the last one
+    const PackedDate day = d;
+    if (n == 0 || quotes[n - 1]->getPackedDate() < day) // most often asked: a new quote, or a day after the last one
         return n;
-    const auto isBefore = [&d](const SeriesQuote* q) { return q->getDate() < d; };
+    const auto isBefore = [&day](const SeriesQuote* q) { return q->getPackedDate() < day; };
     return static_cast<unsigned>(std::partition_point(quotes, quotes + n, isBefore) - quotes);
 }
 
@@ -136,30 +158,36 @@ template <class Owner, class SeriesQuote, class ManyEnd>
 SeriesQuote* QuoteSeries<Owner, SeriesQuote, ManyEnd>::findQuote(const Date& d) const
 {
     SeriesQuote* candidate = getQuote(firstOnOrAfter(d));
-    return candidate != nullptr && candidate->getDate() == d ? candidate : nullptr;
+    return candidate != nullptr && candidate->getPackedDate() == d ? candidate : nullptr;
 }
 
 template <class Owner, class SeriesQuote, class ManyEnd>
 float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getRealQuote(const Date& d) const
 {
+    return realQuote(d, firstOnOrAfter(d));
+}
+
+/// `next` is `firstOnOrAfter(d)`.
+template <class Owner, class SeriesQuote, class ManyEnd>
+float QuoteSeries<Owner, SeriesQuote, ManyEnd>::realQuote(const Date& d, unsigned next) const
+{
     unsigned n;
     SeriesQuote** quotes = getAllQuotes(&n);
     if (n == 0)
         return 0;
-    const unsigned i = firstOnOrAfter(d);
-    if (i < n && quotes[i]->getDate() == d)
-        return quotes[i]->getValue();
-    if (i > 0 && i < n)
-        return quotes[i - 1]->getValue();
+    if (next < n && quotes[next]->getPackedDate() == d)
+        return quotes[next]->getValue();
+    if (next > 0 && next < n)
+        return quotes[next - 1]->getValue();
 
     const SeriesQuote& first = *quotes[0];
     const SeriesQuote& last = *quotes[n - 1];
-    const SeriesQuote& nearest = i == 0 ? first : last;
+    const SeriesQuote& nearest = next == 0 ? first : last;
     const int span = last.getDate() - first.getDate();
     if (n == 1 || span == 0) // quotes of one and the same day have no direction
         return nearest.getValue();
     const double rise = static_cast<double>(last.getValue()) - first.getValue();
-    if (i == 0)
+    if (next == 0)
         return static_cast<float>(first.getValue() - static_cast<double>(first.getDate() - d) / span * rise);
     return static_cast<float>(last.getValue() + static_cast<double>(d - last.getDate()) / span * rise);
 }
@@ -262,8 +290,9 @@ int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
 template <class Owner, class SeriesQuote, class ManyEnd>
 void QuoteSeries<Owner, SeriesQuote, ManyEnd>::replaceWith(std::vector<LateQuote>& late)
 {
-    std::stable_sort(late.begin(), late.end(),
-                     [](const LateQuote& a, const LateQuote& b) { return a.quote->getDate() < b.quote->getDate(); });
+    std::stable_sort(late.begin(), late.end(), [](const LateQuote& a, const LateQuote& b) {
+        return a.quote->getPackedDate() < b.quote->getPackedDate();
+    });
     std::vector<LateQuote> added;
     std::vector<SeriesQuote*> replaced;
     for (std::size_t i = 0; i < late.size(); ++i) {

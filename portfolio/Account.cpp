@@ -135,32 +135,22 @@ Account* Account::getAccountByName(const String& name) const
     return wallet_.partner() != nullptr ? wallet_.partner()->getAccountByName(name) : nullptr;
 }
 
-ManyToOneAssociation<Account, Currency>& CurrencyToAccounts::backLink(Account& e) const
+int Account::setWallet(Wallet* wallet)
 {
-    return e.currency_;
+    return wallet_.set(this, wallet);
 }
 
-int AccountsToCurrency::xAdd(Currency* partner)
+int Currency::addAccount(Account* account)
 {
-    return partner->addAccount(owner());
+    return accounts_.add(account);
 }
 
-int AccountsToCurrency::xRemove(Currency* partner)
+int Currency::removeAccount(Account* account)
 {
-    return partner->removeAccount(owner());
+    return accounts_.remove(account);
 }
 
-ManyToOneAssociation<Account, Wallet>& WalletToAccounts::backLink(Account& e) const
+void CurrencyToAccounts::unlinkAll()
 {
-    return e.wallet_;
-}
-
-int AccountsToWallet::xAdd(Wallet* partner)
-{
-    return partner->addAccount(owner());
-}
-
-int AccountsToWallet::xRemove(Wallet* partner)
-{
-    return partner->removeAccount(owner());
+    OneToManyAssociation::unlinkAll();
 }

@@ -2,10 +2,9 @@
 
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
-#include "market/CurrencyToAccounts.h"
+#include "market/Currency.h"
 #include "portfolio/AccountToAccountStates.h"
-#include "portfolio/AccountToOperations.h"
-#include "portfolio/AccountToTransferOperations.h"
+#include "portfolio/TransferAccountOperation.h"
 #include "portfolio/WalletToAccounts.h"
 
 #include <cstdint>
@@ -40,9 +39,9 @@ public:
     void setDefaultTransferAccount(bool isDefault) { defaultTransfer_ = isDefault; }
 
     int getWallet(Wallet** out) const { return wallet_.get(out); }
-    int setWallet(Wallet* wallet) { return wallet_.set(wallet); }
+    int setWallet(Wallet* wallet);
     int getCurrency(Currency** out) const { return currency_.get(out); }
-    int setCurrency(Currency* currency) { return currency_.set(currency); }
+    int setCurrency(Currency* currency) { return currency_.set(this, currency); }
     /// Of its currency; Strings without text when it has none.
     const String& getCurrencyName() const;
     const String& getCurrencyRepresentation() const;
@@ -63,8 +62,8 @@ public:
     /// To be called when the date of one of the received transfers has changed.
     void transferOperationChanged() { transfers_.changeNotice(); }
 
-    int addAccountState(AccountState* state) { return states_.add(state); }
-    int removeAccountState(AccountState* state) { return states_.remove(state); }
+    int addAccountState(AccountState* state);
+    int removeAccountState(AccountState* state);
     unsigned getNbrAccountStates() const { return states_.getNbr(); }
     AccountState** getAllAccountStates(unsigned* n) const { return states_.getAll(n); }
     AccountState* getAccountState(unsigned i) const { return states_.at(i); }
@@ -75,6 +74,9 @@ public:
     Account* getAccountByName(const String& name) const;
 
 private:
+    friend class AccountStatesToAccount;
+    friend class OperationsToAccount;
+    friend class TransferOperationsToAccount;
     friend class CurrencyToAccounts;
     friend class WalletToAccounts;
 
@@ -82,8 +84,8 @@ private:
 
     String name_;
     bool defaultTransfer_ = false;
-    AccountsToWallet wallet_{this};
-    AccountsToCurrency currency_{this};
+    AccountsToWallet wallet_;
+    AccountsToCurrency currency_;
     AccountToOperations operations_;
     AccountToTransferOperations transfers_;
     AccountToAccountStates states_;

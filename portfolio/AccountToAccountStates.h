@@ -6,23 +6,16 @@ class Account;
 class AccountState;
 
 /// The states computed for an account. They live a floor higher: the members are defined beside `AccountState`.
-class AccountToAccountStates final : public OneToManyAssociation<Account, AccountState> {
+class AccountToAccountStates final : public OneToManyAssociation<AccountToAccountStates, Account, AccountState> {
 public:
-    explicit AccountToAccountStates(Account* owner) : OneToManyAssociation(owner) {}
-
+    using OneToManyAssociation::OneToManyAssociation;
     /// Destroys every state.
     void deleteAll();
-
-private:
-    ManyToOneAssociation<AccountState, Account>& backLink(AccountState& e) const override;
+    static auto& link(auto& state) { return state.account_; }
 };
 
 /// The state's link to its account.
-class AccountStatesToAccount final : public ManyToOneAssociation<AccountState, Account> {
+class AccountStatesToAccount final : public ManyToOneAssociation<AccountStatesToAccount, AccountState, Account> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Account* partner) override;
-    int xRemove(Account* partner) override;
+    static auto& list(auto& account) { return account.states_; }
 };

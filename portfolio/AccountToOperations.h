@@ -5,21 +5,18 @@
 class Account;
 class Operation;
 
-/// Every operation on an account, by date.
-class AccountToOperations final : public OneToManyAssociation<Account, Operation> {
-public:
-    explicit AccountToOperations(Account* owner);
+int sortOperationByDate(const void* a, const void* b);
 
-private:
-    ManyToOneAssociation<Operation, Account>& backLink(Operation& e) const override;
+/// Every operation on an account, by date.
+class AccountToOperations final : public OneToManyAssociation<AccountToOperations, Account, Operation> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& operation) { return operation.account_; }
+    static int compare(const void* a, const void* b) { return sortOperationByDate(a, b); }
 };
 
 /// The operation's link to its account.
-class OperationsToAccount final : public ManyToOneAssociation<Operation, Account> {
+class OperationsToAccount final : public ManyToOneAssociation<OperationsToAccount, Operation, Account, true> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Account* partner) override;
-    int xRemove(Account* partner) override;
+    static auto& list(auto& account) { return account.operations_; }
 };

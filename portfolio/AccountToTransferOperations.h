@@ -5,21 +5,20 @@
 class Account;
 class TransferAccountOperation;
 
-/// The transfers that an account receives, by date.
-class AccountToTransferOperations final : public OneToManyAssociation<Account, TransferAccountOperation> {
-public:
-    explicit AccountToTransferOperations(Account* owner);
+int sortOperationByDate(const void* a, const void* b);
 
-private:
-    ManyToOneAssociation<TransferAccountOperation, Account>& backLink(TransferAccountOperation& e) const override;
+/// The transfers that an account receives, by date.
+class AccountToTransferOperations final
+    : public OneToManyAssociation<AccountToTransferOperations, Account, TransferAccountOperation> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& transfer) { return transfer.recipient_; }
+    static int compare(const void* a, const void* b) { return sortOperationByDate(a, b); }
 };
 
 /// The transfer's link to the account that receives it.
-class TransferOperationsToAccount final : public ManyToOneAssociation<TransferAccountOperation, Account> {
+class TransferOperationsToAccount final
+    : public ManyToOneAssociation<TransferOperationsToAccount, TransferAccountOperation, Account, true> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Account* partner) override;
-    int xRemove(Account* partner) override;
+    static auto& list(auto& account) { return account.transfers_; }
 };

@@ -43,19 +43,7 @@ int sortOperationByDate(const void* a, const void* b)
     return left->getDate() < right->getDate() ? -1 : 0;
 }
 
-AccountToOperations::AccountToOperations(Account* owner) : OneToManyAssociation(owner, true, sortOperationByDate) {}
-
-ManyToOneAssociation<Operation, Account>& AccountToOperations::backLink(Operation& e) const
+int Operation::setAccount(Account* account)
 {
-    return e.account_;
-}
-
-int OperationsToAccount::xAdd(Account* partner)
-{
-    return partner->addOperation(owner());
-}
-
-int OperationsToAccount::xRemove(Account* partner)
-{
-    return partner->removeOperation(owner());
+    return account_.set(this, account);
 }

@@ -29,7 +29,7 @@ public:
 
     /// @return 0; -1 and a null `*out` without an account, as automatic sales are.
     int getAccount(Account** out) const { return account_.get(out); }
-    int setAccount(Account* account) { return account_.set(account); }
+    int setAccount(Account* account);
 
     /// The account's currency symbol; a String without text when account or currency is missing.
     const String& getCurrencyRepresentation() const;
@@ -49,7 +49,7 @@ private:
 
     Date date_;
     bool automatic_ = false;
-    OperationsToAccount account_{this};
+    OperationsToAccount account_;
 };
 
 /// Orders two places of an array of operation pointers by date, ascending, for `qsort`.

@@ -79,37 +79,22 @@ void Share::removeAutomaticShareOperations()
         delete operation;
 }
 
-ManyToOneAssociation<Share, Company>& CompanyToShares::backLink(Share& e) const
-{
-    return e.company_;
-}
-
 void CompanyToShares::deleteAll()
 {
     OneToManyAssociation::deleteAll();
 }
 
-int SharesToCompany::xAdd(Company* partner)
+int Share::setWallet(Wallet* wallet)
 {
-    return partner->addShare(owner());
+    return wallet_.set(this, wallet);
 }
 
-int SharesToCompany::xRemove(Company* partner)
+int Company::addShare(Share* share)
 {
-    return partner->removeShare(owner());
+    return shares_.add(share);
 }
 
-ManyToOneAssociation<Share, Wallet>& WalletToShares::backLink(Share& e) const
+int Company::removeShare(Share* share)
 {
-    return e.wallet_;
-}
-
-int SharesToWallet::xAdd(Wallet* partner)
-{
-    return partner->addShare(owner());
-}
-
-int SharesToWallet::xRemove(Wallet* partner)
-{
-    return partner->removeShare(owner());
+    return shares_.remove(share);
 }

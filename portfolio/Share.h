@@ -3,8 +3,8 @@
 #include "foundation/Date.h"
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
-#include "market/CompanyToShares.h"
-#include "portfolio/ShareToShareOperations.h"
+#include "market/Company.h"
+#include "portfolio/ShareOperation.h"
 #include "portfolio/ShareToShareStates.h"
 #include "portfolio/WalletToShares.h"
 
@@ -23,9 +23,9 @@ public:
     int rd(FILE* file) override;
 
     int getWallet(Wallet** out) const { return wallet_.get(out); }
-    int setWallet(Wallet* wallet) { return wallet_.set(wallet); }
+    int setWallet(Wallet* wallet);
     int getCompany(Company** out) const { return company_.get(out); }
-    int setCompany(Company* company) { return company_.set(company); }
+    int setCompany(Company* company) { return company_.set(this, company); }
 
     int addShareOperation(ShareOperation* operation) { return operations_.add(operation); }
     int removeShareOperation(ShareOperation* operation) { return operations_.remove(operation); }
@@ -35,9 +35,8 @@ public:
     /// To be called when the date of one of the operations has changed.
     void shareOperationChanged() { operations_.changeNotice(); }
 
-    int addShareState(ShareState* state) { return states_.add(state); }
-    void addNewShareState(ShareState* state) { states_.addNew(state); }
-    int removeShareState(ShareState* state) { return states_.remove(state); }
+    int addShareState(ShareState* state);
+    int removeShareState(ShareState* state);
     unsigned getNbrShareStates() const { return states_.getNbr(); }
     ShareState** getAllShareStates(unsigned* n) const { return states_.getAll(n); }
     ShareState* getShareState(unsigned i) const { return states_.at(i); }
@@ -58,11 +57,13 @@ public:
     void removeAutomaticShareOperations();
 
 private:
+    friend class ShareOperationsToShare;
+    friend class ShareStatesToShare;
     friend class CompanyToShares;
     friend class WalletToShares;
 
-    SharesToWallet wallet_{this};
-    SharesToCompany company_{this};
+    SharesToWallet wallet_;
+    SharesToCompany company_;
     ShareToShareOperations operations_;
     ShareToShareStates states_;
 };

@@ -67,19 +67,7 @@ void ShareOperation::notifyChange()
         share_.partner()->shareOperationChanged();
 }
 
-ShareToShareOperations::ShareToShareOperations(Share* owner) : OneToManyAssociation(owner, true, sortOperationByDate) {}
-
-ManyToOneAssociation<ShareOperation, Share>& ShareToShareOperations::backLink(ShareOperation& e) const
+int ShareOperation::setShare(Share* share)
 {
-    return e.share_;
-}
-
-int ShareOperationsToShare::xAdd(Share* partner)
-{
-    return partner->addShareOperation(owner());
-}
-
-int ShareOperationsToShare::xRemove(Share* partner)
-{
-    return partner->removeShareOperation(owner());
+    return share_.set(this, share);
 }

@@ -35,7 +35,7 @@ public:
     void setOperationCost(float cost) { operationCost_ = cost; }
 
     int getShare(Share** out) const { return share_.get(out); }
-    int setShare(Share* share) { return share_.set(share); }
+    int setShare(Share* share);
 
     /// The wallet's present buy or sell rate cost, 0 without a wallet. Intended: only the fixed cost is recorded with
     /// the operation, so a changed rate counts for past operations too.
@@ -47,7 +47,7 @@ protected:
 private:
     friend class ShareToShareOperations;
 
-    ShareOperationsToShare share_{this};
+    ShareOperationsToShare share_;
     bool buy_ = false;
     int quantity_ = 0;
     float quote_ = 0;

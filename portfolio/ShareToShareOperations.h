@@ -5,21 +5,18 @@
 class Share;
 class ShareOperation;
 
-/// The buys and sells of a holding, by date.
-class ShareToShareOperations final : public OneToManyAssociation<Share, ShareOperation> {
-public:
-    explicit ShareToShareOperations(Share* owner);
+int sortOperationByDate(const void* a, const void* b);
 
-private:
-    ManyToOneAssociation<ShareOperation, Share>& backLink(ShareOperation& e) const override;
+/// The buys and sells of a holding, by date.
+class ShareToShareOperations final : public OneToManyAssociation<ShareToShareOperations, Share, ShareOperation> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& operation) { return operation.share_; }
+    static int compare(const void* a, const void* b) { return sortOperationByDate(a, b); }
 };
 
 /// The operation's link to its holding.
-class ShareOperationsToShare final : public ManyToOneAssociation<ShareOperation, Share> {
+class ShareOperationsToShare final : public ManyToOneAssociation<ShareOperationsToShare, ShareOperation, Share, true> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Share* partner) override;
-    int xRemove(Share* partner) override;
+    static auto& list(auto& share) { return share.operations_; }
 };

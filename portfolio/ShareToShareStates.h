@@ -6,23 +6,16 @@ class Share;
 class ShareState;
 
 /// The states computed for a holding. They live a floor higher: the members are defined beside `ShareState`.
-class ShareToShareStates final : public OneToManyAssociation<Share, ShareState> {
+class ShareToShareStates final : public OneToManyAssociation<ShareToShareStates, Share, ShareState> {
 public:
-    explicit ShareToShareStates(Share* owner) : OneToManyAssociation(owner) {}
-
+    using OneToManyAssociation::OneToManyAssociation;
     /// Destroys every state.
     void deleteAll();
-
-private:
-    ManyToOneAssociation<ShareState, Share>& backLink(ShareState& e) const override;
+    static auto& link(auto& state) { return state.share_; }
 };
 
 /// The state's link to its holding.
-class ShareStatesToShare final : public ManyToOneAssociation<ShareState, Share> {
+class ShareStatesToShare final : public ManyToOneAssociation<ShareStatesToShare, ShareState, Share> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Share* partner) override;
-    int xRemove(Share* partner) override;
+    static auto& list(auto& share) { return share.states_; }
 };

@@ -60,22 +60,7 @@ void TransferAccountOperation::notifyChange()
         recipient_.partner()->transferOperationChanged();
 }
 
-AccountToTransferOperations::AccountToTransferOperations(Account* owner)
-    : OneToManyAssociation(owner, true, sortOperationByDate)
-{}
-
-ManyToOneAssociation<TransferAccountOperation, Account>&
-AccountToTransferOperations::backLink(TransferAccountOperation& e) const
+int TransferAccountOperation::setRecepientAccount(Account* account)
 {
-    return e.recipient_;
-}
-
-int TransferOperationsToAccount::xAdd(Account* partner)
-{
-    return partner->addTransferOperation(owner());
-}
-
-int TransferOperationsToAccount::xRemove(Account* partner)
-{
-    return partner->removeTransferOperation(owner());
+    return recipient_.set(this, account);
 }

@@ -34,7 +34,7 @@ public:
     void setToCurrencyQuote(float quote) { toCurrencyQuote_ = quote; }
 
     int getRecepientAccount(Account** out) const { return recipient_.get(out); }
-    int setRecepientAccount(Account* account) { return recipient_.set(account); }
+    int setRecepientAccount(Account* account);
 
     /// amount * rate cost + cost: what is shown as the transfer's cost. No valuation uses it.
     float getTotalCost() const;
@@ -49,5 +49,5 @@ private:
     float cost_ = 0;
     float fromCurrencyQuote_ = 1;
     float toCurrencyQuote_ = 1;
-    TransferOperationsToAccount recipient_{this};
+    TransferOperationsToAccount recipient_;
 };

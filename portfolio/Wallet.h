@@ -3,8 +3,8 @@
 #include "foundation/Date.h"
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
-#include "portfolio/WalletToAccounts.h"
-#include "portfolio/WalletToShares.h"
+#include "portfolio/Account.h"
+#include "portfolio/Share.h"
 #include "portfolio/WalletToStates.h"
 
 #include <vector>
@@ -50,8 +50,8 @@ public:
     unsigned getNbrShares() const { return shares_.getNbr(); }
     Share** getAllShares(unsigned* n) const { return shares_.getAll(n); }
 
-    int addState(State* state) { return states_.add(state); }
-    int removeState(State* state) { return states_.remove(state); }
+    int addState(State* state);
+    int removeState(State* state);
     unsigned getNbrStates() const { return states_.getNbr(); }
     State** getAllStates(unsigned* n) const { return states_.getAll(n); }
     /// Destroys all states.
@@ -105,6 +105,9 @@ public:
     void setReinvestRate(float rate) { reinvestRate_ = rate; }
 
 private:
+    friend class AccountsToWallet;
+    friend class SharesToWallet;
+    friend class StatesToWallet;
     int readShares(FILE* file);
     int readAccounts(FILE* file);
     void readParameters(FILE* file);

@@ -6,20 +6,14 @@ class Wallet;
 class Account;
 
 /// A wallet's cash accounts.
-class WalletToAccounts final : public OneToManyAssociation<Wallet, Account> {
+class WalletToAccounts final : public OneToManyAssociation<WalletToAccounts, Wallet, Account> {
 public:
-    explicit WalletToAccounts(Wallet* owner) : OneToManyAssociation(owner) {}
-
-private:
-    ManyToOneAssociation<Account, Wallet>& backLink(Account& e) const override;
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& account) { return account.wallet_; }
 };
 
 /// The account's link to its wallet.
-class AccountsToWallet final : public ManyToOneAssociation<Account, Wallet> {
+class AccountsToWallet final : public ManyToOneAssociation<AccountsToWallet, Account, Wallet> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Wallet* partner) override;
-    int xRemove(Wallet* partner) override;
+    static auto& list(auto& wallet) { return wallet.accounts_; }
 };

@@ -6,20 +6,14 @@ class Wallet;
 class Share;
 
 /// A wallet's holdings.
-class WalletToShares final : public OneToManyAssociation<Wallet, Share> {
+class WalletToShares final : public OneToManyAssociation<WalletToShares, Wallet, Share> {
 public:
-    explicit WalletToShares(Wallet* owner) : OneToManyAssociation(owner) {}
-
-private:
-    ManyToOneAssociation<Share, Wallet>& backLink(Share& e) const override;
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& share) { return share.wallet_; }
 };
 
 /// The holding's link to its wallet.
-class SharesToWallet final : public ManyToOneAssociation<Share, Wallet> {
+class SharesToWallet final : public ManyToOneAssociation<SharesToWallet, Share, Wallet> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Wallet* partner) override;
-    int xRemove(Wallet* partner) override;
+    static auto& list(auto& wallet) { return wallet.shares_; }
 };

@@ -6,23 +6,16 @@ class Wallet;
 class State;
 
 /// The states computed for a wallet. States live a floor higher: the members are defined beside `State`.
-class WalletToStates final : public OneToManyAssociation<Wallet, State> {
+class WalletToStates final : public OneToManyAssociation<WalletToStates, Wallet, State> {
 public:
-    explicit WalletToStates(Wallet* owner) : OneToManyAssociation(owner) {}
-
+    using OneToManyAssociation::OneToManyAssociation;
     /// Destroys every state.
     void deleteAll();
-
-private:
-    ManyToOneAssociation<State, Wallet>& backLink(State& e) const override;
+    static auto& link(auto& state) { return state.wallet_; }
 };
 
 /// The state's link to its wallet.
-class StatesToWallet final : public ManyToOneAssociation<State, Wallet> {
+class StatesToWallet final : public ManyToOneAssociation<StatesToWallet, State, Wallet> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Wallet* partner) override;
-    int xRemove(Wallet* partner) override;
+    static auto& list(auto& wallet) { return wallet.states_; }
 };

@@ -77,37 +77,22 @@ const String& AccountState::getCurrencyRepresentation() const
     return account_.partner() != nullptr ? account_.partner()->getCurrencyRepresentation() : String::none();
 }
 
-ManyToOneAssociation<AccountState, Account>& AccountToAccountStates::backLink(AccountState& e) const
-{
-    return e.account_;
-}
-
 void AccountToAccountStates::deleteAll()
 {
     OneToManyAssociation::deleteAll();
 }
 
-int AccountStatesToAccount::xAdd(Account* partner)
+int AccountState::setState(State* state)
 {
-    return partner->addAccountState(owner());
+    return state_.set(this, state);
 }
 
-int AccountStatesToAccount::xRemove(Account* partner)
+int Account::addAccountState(AccountState* state)
 {
-    return partner->removeAccountState(owner());
+    return states_.add(state);
 }
 
-ManyToOneAssociation<AccountState, State>& StateToAccountStates::backLink(AccountState& e) const
+int Account::removeAccountState(AccountState* state)
 {
-    return e.state_;
-}
-
-int AccountStatesToState::xAdd(State* partner)
-{
-    return partner->addAccountState(owner());
-}
-
-int AccountStatesToState::xRemove(State* partner)
-{
-    return partner->removeAccountState(owner());
+    return states_.remove(state);
 }

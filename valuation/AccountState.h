@@ -3,7 +3,7 @@
 #include "foundation/Date.h"
 #include "foundation/Pooled.h"
 #include "foundation/String.h"
-#include "portfolio/AccountToAccountStates.h"
+#include "portfolio/Account.h"
 #include "valuation/StateToAccountStates.h"
 
 /// The cash of one account at the day of a state, in the account's own currency.
@@ -29,9 +29,9 @@ public:
     int getAccount(Account** out) const { return account_.get(out); }
     /// The linked account, null without one.
     const Account* listed() const { return account_.partner(); }
-    int setAccount(Account* account) { return account_.set(account); }
+    int setAccount(Account* account) { return account_.set(this, account); }
     int getState(State** out) const { return state_.get(out); }
-    int setState(State* state) { return state_.set(state); }
+    int setState(State* state);
 
 private:
     friend class AccountToAccountStates;
@@ -43,7 +43,7 @@ private:
 
     void replay(const Date& date, bool automatic);
 
-    AccountStatesToAccount account_{this};
-    AccountStatesToState state_{this};
+    [[no_unique_address]] AccountStatesToAccount account_;
     float cash_ = 0;
+    AccountStatesToState state_;
 };

@@ -66,7 +66,7 @@ AutomaticSale::AutomaticSale(Share& share, Wallet& wallet, const Holding& holdin
 AutomaticSale::Day AutomaticSale::dayAt(const Date& stateDate, int number) const
 {
     const Date date = dayAfter(stateDate, number);
-    const int daysLeft = holding_.endDate - date;
+    const int daysLeft = holding_.endDate.date() - date;
     const double period = wallet_.getInvestementPeriod();
     const double buyQuote = holding_.buyQuote;
     return {number, date.isValid(), share_.getPrevisionQuote(date),
@@ -103,8 +103,8 @@ AutomaticSale::Day AutomaticSale::firstSale(const Date& stateDate, const Day& fi
 void AutomaticSale::make(const Date& stateDate, Account* sellingAccount)
 {
     Outcome outcome = Outcome::Hold;
-    Date date = holding_.endDate;
-    if (const int days = daysBefore(holding_.endDate, stateDate); days > 0) {
+    Date date = holding_.endDate.date();
+    if (const int days = daysBefore(date, stateDate); days > 0) {
         const Day day = firstSale(stateDate, dayAt(stateDate, 0), dayAt(stateDate, days - 1));
         outcome = judge(day);
         // Intended: at the end of the horizon the holding is sold whatever the trend, and no gain is transferred.

@@ -114,27 +114,15 @@ void DailyStates::takeShare(Share& share)
     share.reserveShareStates(share.getNbrShareStates() + static_cast<unsigned>(days_.size()));
 }
 
-/// The company's real quote of each day, by a walk along its quotes instead of a search per day.
+/// The company's real quote of each day.
 void DailyStates::takeQuotes(Line& line) const
 {
     line.quotes.resize(days_.size());
     Company* company;
     if (line.share->getCompany(&company) != 0)
         return;
-    unsigned n;
-    CompanyQuote** quotes = company->getAllQuotes(&n);
-    unsigned next = 0; // the first quote on or after the day
-    for (std::size_t day = 0; day < days_.size(); ++day) {
-        while (next < n && quotes[next]->getDate() < days_[day])
-            ++next;
-        const bool isInside = next > 0 && next < n;
-        if (isInside && quotes[next]->getDate() != days_[day])
-            line.quotes[day] = quotes[next - 1]->getValue();
-        else if (isInside)
-            line.quotes[day] = quotes[next]->getValue();
-        else
-            line.quotes[day] = company->getRealQuote(days_[day]);
-    }
+    Company::Walk walk(*company);
+    std::ranges::transform(days_, line.quotes.begin(), [&walk](const Date& day) { return walk.realQuote(day); });
 }
 
 void DailyStates::build()

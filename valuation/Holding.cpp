@@ -28,7 +28,7 @@ void Holding::buy(const ShareOperation& purchase, int period)
         else
             // Intended: a whole-number division, so that a holding above zero keeps the end date of its first
             // purchase. Automatic sales rely on it.
-            endDate.moveBy(bought / total * (horizon - endDate));
+            endDate = endDate.date().moveBy(bought / total * (horizon - endDate.date()));
     }
     quantity = addWrapping(quantity, bought);
 }

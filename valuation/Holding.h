@@ -1,6 +1,6 @@
 #pragma once
 
-#include "foundation/Date.h"
+#include "foundation/PackedDate.h"
 
 class ShareOperation;
 
@@ -8,7 +8,7 @@ class ShareOperation;
 struct Holding {
     int quantity = 0;
     float buyQuote = 0; // average purchase price, weighted by quantity
-    Date endDate;       // end of the investment horizon
+    PackedDate endDate; // end of the investment horizon
 
     /// Adds a purchase; `period` is the length of the horizon in days. A first purchase sets the end date; a further
     /// one moves it by whole multiples of the distance to its own, which for a positive holding is none.

@@ -9,10 +9,10 @@
 #include "valuation/State.h"
 
 ShareState::ShareState(Share& share, State& state, const Holding& holding, float quote)
-    : holding_(holding), quote_(quote)
+    : quote_(quote), holding_(holding)
 {
-    share.addNewShareState(this);
-    state.addNewShareState(this);
+    ShareStatesToShare::list(share).addNew(this);
+    ShareStatesToState::list(state).addNew(this);
 }
 
 ShareState::ShareState(Share* share, State* state, const Date& date, bool automatic)
@@ -84,37 +84,22 @@ const String& ShareState::getCurrencyRepresentation() const
     return company->getCurrencyRepresentation();
 }
 
-ManyToOneAssociation<ShareState, Share>& ShareToShareStates::backLink(ShareState& e) const
-{
-    return e.share_;
-}
-
 void ShareToShareStates::deleteAll()
 {
     OneToManyAssociation::deleteAll();
 }
 
-int ShareStatesToShare::xAdd(Share* partner)
+int ShareState::setState(State* state)
 {
-    return partner->addShareState(owner());
+    return state_.set(this, state);
 }
 
-int ShareStatesToShare::xRemove(Share* partner)
+int Share::addShareState(ShareState* state)
 {
-    return partner->removeShareState(owner());
+    return states_.add(state);
 }
 
-ManyToOneAssociation<ShareState, State>& StateToShareStates::backLink(ShareState& e) const
+int Share::removeShareState(ShareState* state)
 {
-    return e.state_;
-}
-
-int ShareStatesToState::xAdd(State* partner)
-{
-    return partner->addShareState(owner());
-}
-
-int ShareStatesToState::xRemove(State* partner)
-{
-    return partner->removeShareState(owner());
+    return states_.remove(state);
 }

@@ -3,7 +3,7 @@
 #include "foundation/Date.h"
 #include "foundation/Pooled.h"
 #include "foundation/String.h"
-#include "portfolio/ShareToShareStates.h"
+#include "portfolio/Share.h"
 #include "valuation/Holding.h"
 #include "valuation/StateToShareStates.h"
 
@@ -26,7 +26,7 @@ public:
     /// The company's price at the state's day, 0 without a company.
     float getQuote() const { return quote_; }
     /// End of the investment horizon, undefined before the first purchase.
-    const Date& getEndDate() const { return holding_.endDate; }
+    Date getEndDate() const { return holding_.endDate.date(); }
     /// The state's day, undefined without a state.
     Date getDate() const;
     const String& getCompanyAbbreviation() const;
@@ -36,9 +36,9 @@ public:
     int getShare(Share** out) const { return share_.get(out); }
     /// The linked share, null without one.
     const Share* listed() const { return share_.partner(); }
-    int setShare(Share* share) { return share_.set(share); }
+    int setShare(Share* share) { return share_.set(this, share); }
     int getState(State** out) const { return state_.get(out); }
-    int setState(State* state) { return state_.set(state); }
+    int setState(State* state);
 
 private:
     friend class ShareToShareStates;
@@ -50,8 +50,10 @@ private:
 
     bool replay(const Date& date, Account** sellingAccount);
 
-    ShareStatesToShare share_{this};
-    ShareStatesToState state_{this};
-    Holding holding_;
+    // Of these there is one for each holding and day of an evolution: what follows a link takes what the link leaves
+    // of its last word.
+    [[no_unique_address]] ShareStatesToShare share_;
     float quote_ = 0;
+    ShareStatesToState state_;
+    Holding holding_;
 };

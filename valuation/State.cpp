@@ -75,22 +75,17 @@ void State::SellShares(Account* account, float amount)
         state->setCash(state->getCash() + amount);
 }
 
-ManyToOneAssociation<State, Wallet>& WalletToStates::backLink(State& e) const
-{
-    return e.wallet_;
-}
-
 void WalletToStates::deleteAll()
 {
     OneToManyAssociation::deleteAll();
 }
 
-int StatesToWallet::xAdd(Wallet* partner)
+int Wallet::addState(State* state)
 {
-    return partner->addState(owner());
+    return states_.add(state);
 }
 
-int StatesToWallet::xRemove(Wallet* partner)
+int Wallet::removeState(State* state)
 {
-    return partner->removeState(owner());
+    return states_.remove(state);
 }

@@ -1,9 +1,9 @@
 #pragma once
 
 #include "foundation/Date.h"
-#include "portfolio/WalletToStates.h"
-#include "valuation/StateToAccountStates.h"
-#include "valuation/StateToShareStates.h"
+#include "portfolio/Wallet.h"
+#include "valuation/AccountState.h"
+#include "valuation/ShareState.h"
 
 class Account;
 
@@ -21,7 +21,7 @@ public:
     State& operator=(const State&) = delete;
 
     int getWallet(Wallet** out) const { return wallet_.get(out); }
-    int setWallet(Wallet* wallet) { return wallet_.set(wallet); }
+    int setWallet(Wallet* wallet) { return wallet_.set(this, wallet); }
 
     const Date& getDate() const { return date_; }
     /// Sum of the deposits, each in the reference currency of its own day.
@@ -49,13 +49,14 @@ public:
     AccountState* getAccountState(unsigned i) const { return accountStates_.at(i); }
 
     int addShareState(ShareState* state) { return shareStates_.add(state); }
-    void addNewShareState(ShareState* state) { shareStates_.addNew(state); }
     int removeShareState(ShareState* state) { return shareStates_.remove(state); }
     unsigned getNbrShareStates() const { return shareStates_.getNbr(); }
     ShareState** getAllShareStates(unsigned* n) const { return shareStates_.getAll(n); }
     ShareState* getShareState(unsigned i) const { return shareStates_.at(i); }
 
 private:
+    friend class AccountStatesToState;
+    friend class ShareStatesToState;
     friend class WalletToStates;
     friend class DailyStates;
 
@@ -64,7 +65,7 @@ private:
 
     AccountState* findAccountState(Account* account) const;
 
-    StatesToWallet wallet_{this};
+    StatesToWallet wallet_;
     StateToShareStates shareStates_;
     StateToAccountStates accountStates_;
     float totalDeposit_ = 0;

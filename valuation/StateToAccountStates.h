@@ -6,20 +6,14 @@ class State;
 class AccountState;
 
 /// The cash of each account in a state, in the wallet's order.
-class StateToAccountStates final : public OneToManyAssociation<State, AccountState> {
+class StateToAccountStates final : public OneToManyAssociation<StateToAccountStates, State, AccountState> {
 public:
-    explicit StateToAccountStates(State* owner) : OneToManyAssociation(owner) {}
-
-private:
-    ManyToOneAssociation<AccountState, State>& backLink(AccountState& e) const override;
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& accountState) { return accountState.state_; }
 };
 
 /// The account state's link to the state it is part of.
-class AccountStatesToState final : public ManyToOneAssociation<AccountState, State> {
+class AccountStatesToState final : public ManyToOneAssociation<AccountStatesToState, AccountState, State> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(State* partner) override;
-    int xRemove(State* partner) override;
+    static auto& list(auto& state) { return state.accountStates_; }
 };

@@ -6,20 +6,14 @@ class State;
 class ShareState;
 
 /// The holdings in a state, in the wallet's order.
-class StateToShareStates final : public OneToManyAssociation<State, ShareState> {
+class StateToShareStates final : public OneToManyAssociation<StateToShareStates, State, ShareState> {
 public:
-    explicit StateToShareStates(State* owner) : OneToManyAssociation(owner) {}
-
-private:
-    ManyToOneAssociation<ShareState, State>& backLink(ShareState& e) const override;
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& shareState) { return shareState.state_; }
 };
 
 /// The holding state's link to the state it is part of.
-class ShareStatesToState final : public ManyToOneAssociation<ShareState, State> {
+class ShareStatesToState final : public ManyToOneAssociation<ShareStatesToState, ShareState, State> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(State* partner) override;
-    int xRemove(State* partner) override;
+    static auto& list(auto& state) { return state.shareStates_; }
 };

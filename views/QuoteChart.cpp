@@ -24,7 +24,7 @@ QuoteChart::QuoteChart(BRect frame) : GraphView(frame, "grvQuotes")
     SetAccessibleName("Quotes");
     setXDateBased(true);
     const struct {
-        GraphElement& element;
+        GraphPolyElement& element;
         rgb_color color;
         const char* legend;
     } elements[] = {

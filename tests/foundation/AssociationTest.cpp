@@ -13,21 +13,24 @@ namespace {
 struct Item;
 struct Box;
 
-class BoxToItems : public OneToManyAssociation<Box, Item> {
+/// Two kinds of list for one kind of link, as charts have them.
+template <bool sorted>
+class BoxToItems final : public OneToManyAssociation<BoxToItems<sorted>, Box, Item> {
 public:
-    using OneToManyAssociation::OneToManyAssociation;
-
-private:
-    ManyToOneAssociation<Item, Box>& backLink(Item& e) const override;
+    using OneToManyAssociation<BoxToItems<sorted>, Box, Item>::OneToManyAssociation;
+    static auto& link(auto& item) { return item.box; }
+    static int compare(const void* a, const void* b) requires sorted
+    {
+        const int left = keyOf(*static_cast<Item*const*>(a)), right = keyOf(*static_cast<Item*const*>(b));
+        return left < right ? -1 : left > right;
+    }
+    static int keyOf(const auto* item) { return item->key; }
 };
 
-class ItemsToBox : public ManyToOneAssociation<Item, Box> {
+class ItemsToBox final : public ManyToOneAssociation<ItemsToBox, Item, Box, true> {
 public:
-    using ManyToOneAssociation::ManyToOneAssociation;
-
-private:
-    int xAdd(Box* partner) override;
-    int xRemove(Box* partner) override;
+    static int enter(auto& box, Item* item) { return box.enter(item); }
+    static int leave(auto& box, Item* item) { return box.remove(item); }
 };
 
 struct Item {
@@ -36,62 +39,68 @@ struct Item {
     {
         if (obituary != nullptr)
             *obituary += name;
-        box.set(nullptr);
+        setBox(nullptr);
     }
+    int setBox(Box* newBox);
+
     std::string* obituary = nullptr; // gets the name in the end
     char name;
     int key;
-    ItemsToBox box{this};
+    ItemsToBox box;
 };
 
-int sortItemsByKey(const void* a, const void* b)
-{
-    const int left = (*static_cast<Item*const*>(a))->key, right = (*static_cast<Item*const*>(b))->key;
-    return left < right ? -1 : left > right;
-}
-
-/// Answers `entry`, when it is not 0, to what would enter.
 struct Box {
-    explicit Box(bool sorted = false) : items(this, sorted, sortItemsByKey) {}
-    ~Box() { items.unlinkAll(); }
+    explicit Box(bool sorted = false) : isSorted(sorted) {}
+    ~Box()
+    {
+        sortedItems.unlinkAll();
+        items.unlinkAll();
+    }
+    /// Calls `use` with the list that the box has.
+    auto with(auto use) const { return isSorted ? use(sortedItems) : use(items); }
+    /// What would enter is answered `entry`, when that is not 0.
+    int enter(Item* item) { return entry != 0 ? entry : add(item); }
+    int add(Item* item) const
+    {
+        return with([=](auto& list) { return list.add(item); });
+    }
+    int remove(Item* item) const
+    {
+        return with([=](auto& list) { return list.remove(item); });
+    }
+
     int entry = 0;
-    BoxToItems items;
+    bool isSorted;
+    mutable BoxToItems<true> sortedItems{this};
+    mutable BoxToItems<false> items{this};
 };
 
-ManyToOneAssociation<Item, Box>& BoxToItems::backLink(Item& e) const
+int Item::setBox(Box* newBox)
 {
-    return e.box;
-}
-
-int ItemsToBox::xAdd(Box* partner)
-{
-    return partner->entry != 0 ? partner->entry : partner->items.add(owner());
-}
-
-int ItemsToBox::xRemove(Box* partner)
-{
-    return partner->items.remove(owner());
+    return box.set(this, newBox);
 }
 
 /// The names in list order, read with `getAll`, after a check that `getAt`, `getElement` and the links agree.
 std::string names(const Box& box)
 {
-    unsigned n;
-    Item** items = box.items.getAll(&n);
-    EXPECT_EQ(n, box.items.getNbr());
-    EXPECT_EQ(items == nullptr, n == 0);
-    std::string result;
-    for (unsigned i = 0; i < n; ++i) {
-        Item* item;
-        unsigned index = n;
-        EXPECT_EQ(box.items.getAt(&item, i), 0);
-        EXPECT_EQ(item, items[i]);
-        EXPECT_EQ(box.items.getElement(item, &index), 0);
-        EXPECT_EQ(index, i);
-        EXPECT_EQ(item->box.partner(), &box);
-        result += item->name;
-    }
-    return result;
+    return box.with([&box](auto& list) {
+        unsigned n;
+        Item** items = list.getAll(&n);
+        EXPECT_EQ(n, list.getNbr());
+        EXPECT_EQ(items == nullptr, n == 0);
+        std::string result;
+        for (unsigned i = 0; i < n; ++i) {
+            Item* item;
+            unsigned index = n;
+            EXPECT_EQ(list.getAt(&item, i), 0);
+            EXPECT_EQ(item, items[i]);
+            EXPECT_EQ(list.getElement(item, &index), 0);
+            EXPECT_EQ(index, i);
+            EXPECT_EQ(item->box.partner(), &box);
+            result += item->name;
+        }
+        return result;
+    });
 }
 
 } // namespace
@@ -100,15 +109,15 @@ TEST(AssociationTest, WhatIsRefusedOrNotThereHasNoEffect)
 {
     Box former, box;
     Item a('a'), b('b');
-    former.items.add(&a);
+    former.add(&a);
     box.entry = 7;
-    EXPECT_EQ(a.box.set(&box), 7);
+    EXPECT_EQ(a.setBox(&box), 7);
     EXPECT_EQ(names(former) + "|" + names(box), "|") << "it has left, and is nowhere";
     EXPECT_EQ(a.box.partner(), nullptr);
     box.entry = 0;
     for (const char* turn : {"new", "again"})
-        EXPECT_EQ(box.items.add(&a), 0) << turn;
-    EXPECT_EQ(box.items.remove(&b), 0) << "what is not there";
+        EXPECT_EQ(box.add(&a), 0) << turn;
+    EXPECT_EQ(box.remove(&b), 0) << "what is not there";
     EXPECT_EQ(names(box), "a");
 }
 
@@ -129,7 +138,7 @@ TEST(AssociationTest, RandomChangesFromBothEndsAgreeWithPlainLists)
         if (below(4) == 0) {
             item->key = static_cast<int>(below(9));
             if (now != nullptr)
-                now->items.changeNotice();
+                now->with([](auto& list) { list.changeNotice(); });
         } else if (now != next) {
             if (now == &boxes[0])
                 std::erase(expected[0], item);
@@ -140,11 +149,11 @@ TEST(AssociationTest, RandomChangesFromBothEndsAgreeWithPlainLists)
             if (next != nullptr)
                 expected[next - boxes].push_back(item);
             if (now == nullptr && below(4) == 0)
-                next->items.addNew(item);
+                next->with([item](auto& list) { list.addNew(item); });
             else if (below(2) == 0)
-                item->box.set(next);
+                item->setBox(next);
             else
-                next != nullptr ? next->items.add(item) : now->items.remove(item);
+                next != nullptr ? next->add(item) : now->remove(item);
         }
         for (int i = 0; i < 2 && turn % 3 == 0; ++i) {
             std::vector<Item*> inOrder = expected[i];
@@ -171,10 +180,10 @@ TEST(AssociationTest, DestroyingAllGoesFromTheFront)
         for (const auto& [name, key] : {std::pair('a', 3), {'b', 1}, {'c', 9}, {'d', 2}}) {
             auto* item = new Item(name, key); // destroyed by `deleteAll`
             item->obituary = &order;
-            box.items.add(item);
+            box.add(item);
         }
-        box.items.deleteAll();
+        box.with([](auto& list) { list.deleteAll(); });
         EXPECT_EQ(order, c.order) << c.why;
-        EXPECT_EQ(box.items.getNbr(), 0U);
+        EXPECT_EQ(names(box), "");
     }
 }
