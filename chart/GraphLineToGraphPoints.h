@@ -6,7 +6,8 @@ class GraphPoint;
 class GraphPolyElement;
 
 /// A line's points, by x. The other end is `GraphPointsToGraphPolyElement`.
-class GraphLineToGraphPoints final : public OneToManyAssociation<GraphLineToGraphPoints, GraphPolyElement, GraphPoint> {
+class GraphLineToGraphPoints final
+    : public OneToManyAssociation<GraphLineToGraphPoints, GraphPolyElement, GraphPoint, true> {
 public:
     using OneToManyAssociation::OneToManyAssociation;
     static auto& link(auto& point) { return point.polyElement_; }

@@ -3,7 +3,7 @@
 #include <cstdint>
 #include <type_traits>
 
-template <class ManyEnd, class Owner, class Element>
+template <class ManyEnd, class Owner, class Element, bool sorted>
 class OneToManyAssociation;
 
 /// The link of one element to its owner, held by the element; its counterpart is the owner's `OneToManyAssociation`.
@@ -62,7 +62,7 @@ protected:
     static int leave(Owner& owner, Element* element) { return OneEnd::list(owner).remove(element); }
 
 private:
-    template <class ManyEnd, class AnOwner, class AnElement>
+    template <class ManyEnd, class AnOwner, class AnElement, bool isListSorted>
     friend class OneToManyAssociation;
 
     struct Turn {

@@ -10,14 +10,14 @@
 /// The list of an owner's elements; each element holds the counterpart, a `ManyToOneAssociation`.
 ///
 /// `ManyEnd` is the relation's own class, derived from this one. It says where the link lives, in a static function
-/// `link(Element&)`, and, when the list is sorted, in which order, by a static function `compare`.
+/// `link(Element&)`, and, when the list is `sorted`, in which order, by a static function `compare` as for `qsort`.
 ///
 /// Membership, addition and removal take constant time. A sorted list is put in order by the next read after a change
 /// that may have disturbed it; elements with equal keys keep the order in which they were added. An unsorted list does
 /// not keep its order on removal: the last element takes the free place.
 ///
 /// The list does not own its elements. The owner empties it (`deleteAll` or `unlinkAll`) before it dies.
-template <class ManyEnd, class Owner, class Element>
+template <class ManyEnd, class Owner, class Element, bool sorted = false>
 class OneToManyAssociation {
 public:
     /// `owner` is the object that holds this list.
@@ -71,7 +71,7 @@ public:
         if (--count_ != place) {
             elements_[place] = elements_[count_];
             ManyEnd::link(*elements_[place]).place_ = place;
-            dirty_ = true;
+            changeNotice();
         }
         shrink();
         return 0;
@@ -117,7 +117,7 @@ public:
     /// Puts the list in order now; an unsorted list stays as it is.
     void sort() const
     {
-        if constexpr (isSorted()) {
+        if constexpr (sorted) {
             // What stands in order at the front, often nearly all, is only merged with the rest.
             Element** end = elements_ + count_;
             Element** rest = std::is_sorted_until(elements_, end, isBefore);
@@ -127,14 +127,18 @@ public:
         }
     }
     /// To be called when the sort key of an element has changed.
-    void changeNotice() { dirty_ = true; }
+    void changeNotice()
+    {
+        if constexpr (sorted)
+            order_.isDisturbed = true;
+    }
 
     /// Keeps a turn in the order of equal keys for an element that is added later and then given it by `setTurn`.
-    std::uint32_t reserveTurn() { return nextTurn_++; }
+    std::uint32_t reserveTurn() { return order_.nextTurn++; }
     void setTurn(Element* e, std::uint32_t turn)
     {
         ManyEnd::link(*e).turn_.number = turn;
-        dirty_ = true;
+        changeNotice();
     }
 
     int xUnSet(Element* e) { return ManyEnd::link(*e).set(e, nullptr); }
@@ -152,10 +156,10 @@ public:
     /// an element's other owners, who lose it, too, are left with the rest of theirs.
     void deleteAll()
     {
-        if (isSorted())
+        if (sorted)
             turnRound();
         while (count_ > 0)
-            delete elements_[isSorted() ? count_ - 1 : 0];
+            delete elements_[sorted ? count_ - 1 : 0];
     }
     /// Unlinks every element and leaves it alone otherwise; stops at one that will not be unlinked.
     void unlinkAll()
@@ -165,14 +169,12 @@ public:
     }
 
 private:
-    /// The class of a relation whose list is not sorted has no `compare`.
-    static constexpr bool isSorted()
-    {
-        return requires(const void* place)
-        {
-            ManyEnd::compare(place, place);
-        };
-    }
+    /// What only a sorted list knows.
+    struct Order {
+        std::uint32_t nextTurn = 0;
+        bool isDisturbed = false; // an element may stand in the wrong place
+    };
+    struct NoOrder {};
 
     /// The place of `e`, or a number from `count_` up when it is not here. While `add` is linking its element, that
     /// stands at the end, but its link still remembers the place in the list it is leaving.
@@ -188,8 +190,9 @@ private:
     {
         if (count_ == capacity_)
             setCapacity(capacity_ + capacity_ / 2 + 2);
-        if constexpr (isSorted())
-            dirty_ = dirty_ || (count_ > 0 && ManyEnd::compare(&elements_[count_ - 1], &e) > 0);
+        if constexpr (sorted)
+            if (!order_.isDisturbed && count_ > 0 && ManyEnd::compare(&elements_[count_ - 1], &e) > 0)
+                changeNotice();
         elements_[count_++] = e;
     }
 
@@ -198,8 +201,8 @@ private:
     void settle(Link& link)
     {
         link.place_ = count_ - 1;
-        if constexpr (isSorted())
-            link.turn_.number = nextTurn_++;
+        if constexpr (sorted)
+            link.turn_.number = order_.nextTurn++;
     }
 
     static bool isBefore(Element* a, Element* b)
@@ -217,20 +220,22 @@ private:
 
     void sortWhenDirty() const
     {
-        if (!dirty_)
-            return;
-        dirty_ = false;
-        sort();
+        if constexpr (sorted) {
+            if (!order_.isDisturbed)
+                return;
+            order_.isDisturbed = false;
+            sort();
+        }
     }
 
     /// Puts a sorted list in order from the last to the first, so that the first one can leave without moving others.
-    /// The list counts as dirty from here on: whoever reads it finds it in order.
+    /// The list counts as disturbed from here on: whoever reads it finds it in order.
     void turnRound()
     {
         sortWhenDirty();
         std::reverse(elements_, elements_ + count_);
         notePlaces();
-        dirty_ = true;
+        changeNotice();
     }
 
     void shrink()
@@ -239,8 +244,7 @@ private:
             std::free(elements_);
             elements_ = nullptr;
             capacity_ = 0;
-            dirty_ = false;
-            nextTurn_ = 0;
+            order_ = {};
         } else if (capacity_ > 16 && count_ <= capacity_ / 4)
             setCapacity(capacity_ / 2);
     }
@@ -258,6 +262,5 @@ private:
     Element** elements_ = nullptr; // malloc'ed, owned; null when empty
     std::uint32_t count_ = 0;
     std::uint32_t capacity_ = 0;
-    std::uint32_t nextTurn_ = 0; // only a sorted list counts them
-    mutable bool dirty_ = false; // an element may stand in the wrong place of the order
+    [[no_unique_address]] mutable std::conditional_t<sorted, Order, NoOrder> order_;
 };

@@ -7,7 +7,7 @@ class Company;
 class CompanyQuote;
 
 /// A company's quotes, by date.
-class CompanyToQuotes final : public OneToManyAssociation<CompanyToQuotes, Company, CompanyQuote> {
+class CompanyToQuotes final : public OneToManyAssociation<CompanyToQuotes, Company, CompanyQuote, true> {
 public:
     using OneToManyAssociation::OneToManyAssociation;
     static auto& link(auto& quote) { return quote.company_; }

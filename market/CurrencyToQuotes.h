@@ -7,7 +7,7 @@ class Currency;
 class CurrencyQuote;
 
 /// A currency's rates, by date.
-class CurrencyToQuotes final : public OneToManyAssociation<CurrencyToQuotes, Currency, CurrencyQuote> {
+class CurrencyToQuotes final : public OneToManyAssociation<CurrencyToQuotes, Currency, CurrencyQuote, true> {
 public:
     using OneToManyAssociation::OneToManyAssociation;
     static auto& link(auto& quote) { return quote.currency_; }

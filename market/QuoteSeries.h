@@ -60,24 +60,29 @@ public:
     /// Between two quotes the value is a step, not a slope. Intended: a portfolio is worth the last known price.
     float getRealQuote(const Date& d) const;
 
-    /// Gives the real quotes of days that do not go back, without a search for each.
+    /// Gives the real quotes of one day after the other, and searches only for a day that goes back.
     class Walk {
     public:
         /// `series` stays as it is while the walk lasts.
         explicit Walk(const QuoteSeries& series) : series_(&series) {}
-        /// `d` is not before the day asked for last. What `getRealQuote` gives.
+        /// What `getRealQuote` gives.
         float realQuote(const Date& d)
         {
+            const PackedDate day = d;
             unsigned n;
             SeriesQuote** quotes = series_->getAllQuotes(&n);
-            for (const PackedDate day = d; next_ < n && quotes[next_]->getPackedDate() < day; ++next_)
-                ;
+            if (day < day_)
+                next_ = series_->firstOnOrAfter(d);
+            while (next_ < n && quotes[next_]->getPackedDate() < day)
+                ++next_;
+            day_ = day;
             return series_->realQuote(d, next_);
         }
 
     private:
         const QuoteSeries* series_;
-        unsigned next_ = 0; // the first quote on or after the day asked for last
+        PackedDate day_;    // asked for last
+        unsigned next_ = 0; // the first quote on or after it
     };
 
     /// Date of the earliest and of the latest quote; the undefined date without quotes.

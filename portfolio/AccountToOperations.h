@@ -8,7 +8,7 @@ class Operation;
 int sortOperationByDate(const void* a, const void* b);
 
 /// Every operation on an account, by date.
-class AccountToOperations final : public OneToManyAssociation<AccountToOperations, Account, Operation> {
+class AccountToOperations final : public OneToManyAssociation<AccountToOperations, Account, Operation, true> {
 public:
     using OneToManyAssociation::OneToManyAssociation;
     static auto& link(auto& operation) { return operation.account_; }

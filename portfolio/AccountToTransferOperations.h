@@ -9,7 +9,7 @@ int sortOperationByDate(const void* a, const void* b);
 
 /// The transfers that an account receives, by date.
 class AccountToTransferOperations final
-    : public OneToManyAssociation<AccountToTransferOperations, Account, TransferAccountOperation> {
+    : public OneToManyAssociation<AccountToTransferOperations, Account, TransferAccountOperation, true> {
 public:
     using OneToManyAssociation::OneToManyAssociation;
     static auto& link(auto& transfer) { return transfer.recipient_; }

@@ -8,7 +8,7 @@ class ShareOperation;
 int sortOperationByDate(const void* a, const void* b);
 
 /// The buys and sells of a holding, by date.
-class ShareToShareOperations final : public OneToManyAssociation<ShareToShareOperations, Share, ShareOperation> {
+class ShareToShareOperations final : public OneToManyAssociation<ShareToShareOperations, Share, ShareOperation, true> {
 public:
     using OneToManyAssociation::OneToManyAssociation;
     static auto& link(auto& operation) { return operation.share_; }

@@ -7,7 +7,7 @@
 #include "valuation/StateToAccountStates.h"
 
 /// The cash of one account at the day of a state, in the account's own currency.
-class AccountState final : public Pooled<AccountState> {
+class AccountState final : public Pooled<AccountState, (std::size_t{16} << 20)> {
 public:
     /// Replays the account's manual deposits and transfers up to and including `date`; purchases and sales reach the
     /// cash through the states of the holdings. The last argument makes no difference.

@@ -15,10 +15,12 @@ constexpr unsigned kUnknown = ~0U;
 
 Appraisal::Appraisal(const Catalogue& catalogue) : reference_(catalogue.getReferenceCurrency())
 {
+    if (reference_ != nullptr)
+        referenceWalk_.emplace(*reference_);
     for (const Currency* currency : catalogue.getCurrencies()) {
         if (currency->getRepresentation().hasText())
             bySymbol_.try_emplace(currency->getRepresentation().comparedBytes(), static_cast<unsigned>(rates_.size()));
-        rates_.push_back({currency, 0, false});
+        rates_.push_back({Currency::Walk(*currency), 0, false});
     }
 }
 
@@ -27,11 +29,11 @@ float Appraisal::totalValue(const State& state)
     if (!hasReference())
         return 0;
     day_ = state.getDate();
-    const double referenceRate = reference_->getRealQuote(day_);
+    const double referenceRate = referenceWalk_->realQuote(day_);
     if (referenceRate == 0)
         return 0;
     for (const unsigned i : used_)
-        rates_[i].value = rates_[i].currency->getRealQuote(day_);
+        rates_[i].value = rates_[i].walk.realQuote(day_);
     return sharesValue(state, referenceRate) + cashValue(state, referenceRate);
 }
 
@@ -86,7 +88,8 @@ unsigned Appraisal::findCurrency(const String& representation)
     Rate& rate = rates_[found->second];
     if (!rate.isUsed) {
         used_.push_back(found->second);
-        rate = {rate.currency, rate.currency->getRealQuote(day_), true};
+        rate.value = rate.walk.realQuote(day_);
+        rate.isUsed = true;
     }
     return found->second;
 }

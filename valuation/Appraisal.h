@@ -1,13 +1,14 @@
 #pragma once
 
 #include "foundation/Date.h"
+#include "market/Currency.h"
 
+#include <optional>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
 
 class Catalogue;
-class Currency;
 class State;
 
 /// The worth of states in the catalogue's reference currency.
@@ -28,7 +29,7 @@ public:
 private:
     /// A currency with its rate on the day of the state at hand, when it is one that anything is in.
     struct Rate {
-        const Currency* currency;
+        Currency::Walk walk;
         double value;
         bool isUsed;
     };
@@ -45,6 +46,7 @@ private:
     unsigned findCurrency(const String& representation);
 
     Currency* reference_;
+    std::optional<Currency::Walk> referenceWalk_; // unless there is no reference currency
     Date day_;                                                // of the state at hand
     std::vector<Rate> rates_;                                 // of the catalogue's currencies
     std::unordered_map<std::string_view, unsigned> bySymbol_; // indices into `rates_`

@@ -110,19 +110,19 @@ void DailyStates::takeShare(Share& share)
         const float amount = operation.isBuy() ? -purchaseCost(operation, wallet_) : saleProceeds(operation, wallet_);
         takeMove(operation, cash_[found->second], amount);
     }
-    takeQuotes(line);
+    if (Company * company; share.getCompany(&company) == 0)
+        line.walk.emplace(*company);
     share.reserveShareStates(share.getNbrShareStates() + static_cast<unsigned>(days_.size()));
 }
 
-/// The company's real quote of each day.
-void DailyStates::takeQuotes(Line& line) const
+/// The company's real quote of that day and those behind it.
+void DailyStates::takeQuotesFrom(std::size_t day)
 {
-    line.quotes.resize(days_.size());
-    Company* company;
-    if (line.share->getCompany(&company) != 0)
-        return;
-    Company::Walk walk(*company);
-    std::ranges::transform(days_, line.quotes.begin(), [&walk](const Date& day) { return walk.realQuote(day); });
+    const std::size_t count = std::min(kDaysAhead, days_.size() - day);
+    for (Line& line : lines_)
+        if (line.walk)
+            for (std::size_t i = 0; i < count; ++i)
+                line.quotes[i] = line.walk->realQuote(days_[day + i]);
 }
 
 void DailyStates::build()
@@ -133,12 +133,15 @@ void DailyStates::build()
 
 void DailyStates::buildDay(std::size_t day)
 {
+    if (day % kDaysAhead == 0)
+        takeQuotesFrom(day);
     for (const Event& event : events_[day])
         event.ledger->happen(event.rank);
 
     auto* state = new State(&wallet_, days_[day]); // owned by the wallet, and the others by it
     state->setFirstOperationDate(firstOperationDate_);
     state->setTotalDeposit(deposits_.balance());
+    state->accountStates_.reserve(static_cast<unsigned>(accounts_.size()));
     for (std::size_t i = 0; i < accounts_.size(); ++i)
         new AccountState(accounts_[i], state, cash_[i].balance());
     state->shareStates_.reserve(static_cast<unsigned>(lines_.size()));
@@ -150,6 +153,6 @@ void DailyStates::buildDay(std::size_t day)
             else
                 line.holding.sell(operation);
         }
-        new ShareState(*line.share, *state, line.holding, line.quotes[day]);
+        new ShareState(*line.share, *state, line.holding, line.quotes[day % kDaysAhead]);
     }
 }

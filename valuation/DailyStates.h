@@ -1,9 +1,12 @@
 #pragma once
 
 #include "foundation/Date.h"
+#include "market/Company.h"
 #include "valuation/Holding.h"
 #include "valuation/Ledger.h"
 
+#include <array>
+#include <optional>
 #include <unordered_map>
 #include <utility>
 #include <vector>
@@ -31,6 +34,10 @@ public:
     void build();
 
 private:
+    /// Quotes are taken for that many days at a time, one holding after the other: neighbours in a series are
+    /// neighbours in memory.
+    static constexpr std::size_t kDaysAhead = 64;
+
     /// A move that happens on a day.
     struct Event {
         Ledger* ledger;
@@ -42,13 +49,14 @@ private:
         std::vector<std::pair<std::size_t, const ShareOperation*>> operations; // with the day each counts from
         std::size_t replayed = 0;
         Holding holding;
-        std::vector<float> quotes; // of each day
+        std::optional<Company::Walk> walk;     // none without a company
+        std::array<float, kDaysAhead> quotes{}; // of the days taken ahead
     };
 
     void takeOwnMoves(std::size_t account);
     void takeReceivedTransfers(std::size_t account, bool automatic);
     void takeShare(Share& share);
-    void takeQuotes(Line& line) const;
+    void takeQuotesFrom(std::size_t day);
     void takeMove(const Operation& operation, Ledger& ledger, double amount);
     std::size_t dayOf(const Date& date) const;
     void buildDay(std::size_t day);

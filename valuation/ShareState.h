@@ -10,7 +10,7 @@
 class Account;
 
 /// One holding at the day of a state.
-class ShareState final : public Pooled<ShareState> {
+class ShareState final : public Pooled<ShareState, (std::size_t{192} << 20)> {
 public:
     /// Replays the holding's operations up to and including `date`, moving cash in the account states of `state`.
     /// `automatic` also searches the automatic sale of what is held, when no operation is dated after `date`.

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "foundation/Date.h"
+#include "foundation/PackedDate.h"
 #include "portfolio/Wallet.h"
 #include "valuation/AccountState.h"
 #include "valuation/ShareState.h"
@@ -23,12 +23,12 @@ public:
     int getWallet(Wallet** out) const { return wallet_.get(out); }
     int setWallet(Wallet* wallet) { return wallet_.set(this, wallet); }
 
-    const Date& getDate() const { return date_; }
+    Date getDate() const { return date_.date(); }
     /// Sum of the deposits, each in the reference currency of its own day.
     float getTotalDeposit() const { return totalDeposit_; }
     void setTotalDeposit(float total) { totalDeposit_ = total; }
     /// Day of the earliest operation, also when it lies after the state's day; `afterAllOperations` without any.
-    const Date& getFirstOperationDate() const { return firstOperationDate_; }
+    Date getFirstOperationDate() const { return firstOperationDate_.date(); }
     void setFirstOperationDate(const Date& date) { firstOperationDate_ = date; }
     /// Takes `date` when it is earlier than the first operation date known so far.
     void noteOperationDate(const Date& date);
@@ -69,7 +69,7 @@ private:
     StateToShareStates shareStates_;
     StateToAccountStates accountStates_;
     float totalDeposit_ = 0;
-    Date date_;
-    Date firstOperationDate_;
+    PackedDate date_;
+    PackedDate firstOperationDate_;
     bool automatic_ = false;
 };

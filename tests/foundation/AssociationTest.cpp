@@ -15,9 +15,9 @@ struct Box;
 
 /// Two kinds of list for one kind of link, as charts have them.
 template <bool sorted>
-class BoxToItems final : public OneToManyAssociation<BoxToItems<sorted>, Box, Item> {
+class BoxToItems final : public OneToManyAssociation<BoxToItems<sorted>, Box, Item, sorted> {
 public:
-    using OneToManyAssociation<BoxToItems<sorted>, Box, Item>::OneToManyAssociation;
+    using OneToManyAssociation<BoxToItems<sorted>, Box, Item, sorted>::OneToManyAssociation;
     static auto& link(auto& item) { return item.box; }
     static int compare(const void* a, const void* b) requires sorted
     {
