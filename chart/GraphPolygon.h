@@ -23,6 +23,7 @@ public:
 
     /// The points in their order; the array is the polygon's own and valid until its next change.
     GraphPoint** getAllGraphPoints(unsigned* count) const { return points_.getAll(count); }
+    std::span<GraphPoint* const> points() const { return points_.all(); }
     unsigned getNbrGraphPoints() const { return points_.getNbr(); }
 
     // The extremes; 0, or the undefined date, of a polygon without points.

@@ -6,6 +6,7 @@
 #include <cassert>
 #include <cstdlib>
 #include <new>
+#include <span>
 
 /// The list of an owner's elements; each element holds the counterpart, a `ManyToOneAssociation`.
 ///
@@ -101,6 +102,12 @@ public:
         sortWhenDirty();
         *n = count_;
         return count_ > 0 ? elements_ : nullptr; // a refused addition leaves room behind
+    }
+    /// The same as a range.
+    std::span<Element* const> all() const
+    {
+        sortWhenDirty();
+        return {elements_, count_};
     }
     unsigned getNbr() const { return count_; }
     /// `*index` becomes the element's place as the list stands: only `getAt` and `getAll` put a sorted one in order.

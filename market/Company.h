@@ -27,6 +27,8 @@ public:
     void setAbbreviation(const String& abbreviation) { abbreviation_ = abbreviation; }
 
     int getMarket(Market** out) const { return market_.get(out); }
+    /// The same; null when there is none.
+    Market* market() const { return market_.partner(); }
     int setMarket(Market* market);
     /// The short symbol of the market's currency; a String without text when market or currency is missing.
     const String& getCurrencyRepresentation() const;
@@ -35,12 +37,14 @@ public:
     int removeShare(Share* share);
     unsigned getNbrShares() const { return shares_.getNbr(); }
     Share** getAllShares(unsigned* n) const { return shares_.getAll(n); }
+    std::span<Share* const> shares() const { return shares_.all(); }
     int getShare(Share** out, unsigned i) const { return shares_.getAt(out, i); }
 
     int addEvent(CompanyEvent* event) { return events_.add(event); }
     int removeEvent(CompanyEvent* event) { return events_.remove(event); }
     unsigned getNbrEvents() const { return events_.getNbr(); }
     CompanyEvent** getAllEvents(unsigned* n) const { return events_.getAll(n); }
+    std::span<CompanyEvent* const> events() const { return events_.all(); }
 
     // Defined in net/, with the transfers:
 

@@ -18,6 +18,8 @@ public:
     int setDate(const Date& date);
 
     int getCompany(Company** out) const { return company_.get(out); }
+    /// The same; null when there is none.
+    Company* company() const { return company_.partner(); }
     int setCompany(Company* company);
 
 protected:

@@ -16,6 +16,8 @@ public:
 
     /// @return 0; -1 and a null `*out` when the quote has no company.
     int getCompany(Company** out) const { return company_.get(out); }
+    /// The same; null when there is none.
+    Company* company() const { return company_.partner(); }
     int setCompany(Company* company);
 
 protected:

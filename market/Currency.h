@@ -40,11 +40,13 @@ public:
     int removeAccount(Account* account);
     unsigned getNbrAccounts() const { return accounts_.getNbr(); }
     Account** getAllAccounts(unsigned* n) const { return accounts_.getAll(n); }
+    std::span<Account* const> accounts() const { return accounts_.all(); }
 
     int addMarket(Market* market) { return markets_.add(market); }
     int removeMarket(Market* market) { return markets_.remove(market); }
     unsigned getNbrMarkets() const { return markets_.getNbr(); }
     Market** getAllMarkets(unsigned* n) const { return markets_.getAll(n); }
+    std::span<Market* const> markets() const { return markets_.all(); }
 
 private:
     friend class AccountsToCurrency;

@@ -15,6 +15,8 @@ public:
 
     /// @return 0; -1 and a null `*out` when the rate has no currency.
     int getCurrency(Currency** out) const { return currency_.get(out); }
+    /// The same; null when there is none.
+    Currency* currency() const { return currency_.partner(); }
     int setCurrency(Currency* currency);
 
 protected:

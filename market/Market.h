@@ -20,6 +20,8 @@ public:
     void setName(const String& name) { name_ = name; }
 
     int getCurrency(Currency** out) const { return currency_.get(out); }
+    /// The same; null when there is none.
+    Currency* currency() const { return currency_.partner(); }
     int setCurrency(Currency* currency);
     /// The currency's short symbol; a String without text when the market has no currency.
     const String& getCurrencyRepresentation() const;
@@ -28,6 +30,7 @@ public:
     int removeCompany(Company* company) { return companies_.remove(company); }
     unsigned getNbrCompanies() const { return companies_.getNbr(); }
     Company** getAllCompanies(unsigned* n) const { return companies_.getAll(n); }
+    std::span<Company* const> companies() const { return companies_.all(); }
     /// `*out` becomes the first company with this ticker. @return 0; -1 and a null `*out` when there is none.
     int getCompany(const String& abbreviation, Company** out) const;
 

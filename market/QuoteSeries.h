@@ -53,6 +53,7 @@ public:
     unsigned getNbrQuotes() const { return quotes_.getNbr(); }
     /// The list's own array, by date.
     SeriesQuote** getAllQuotes(unsigned* n) const { return quotes_.getAll(n); }
+    std::span<SeriesQuote* const> quotes() const { return quotes_.all(); }
 
     /// A value for any day: that of the last quote up to it; outside the series, the straight line through the first
     /// and the last quote. A single quote holds for ever; without quotes 0.

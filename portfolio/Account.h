@@ -39,8 +39,12 @@ public:
     void setDefaultTransferAccount(bool isDefault) { defaultTransfer_ = isDefault; }
 
     int getWallet(Wallet** out) const { return wallet_.get(out); }
+    /// The same; null when there is none.
+    Wallet* wallet() const { return wallet_.partner(); }
     int setWallet(Wallet* wallet);
     int getCurrency(Currency** out) const { return currency_.get(out); }
+    /// The same; null when there is none.
+    Currency* currency() const { return currency_.partner(); }
     int setCurrency(Currency* currency) { return currency_.set(this, currency); }
     /// Of its currency; Strings without text when it has none.
     const String& getCurrencyName() const;
@@ -50,6 +54,7 @@ public:
     int removeOperation(Operation* operation) { return operations_.remove(operation); }
     unsigned getNbrOperations() const { return operations_.getNbr(); }
     Operation** getAllOperations(unsigned* n) const { return operations_.getAll(n); }
+    std::span<Operation* const> operations() const { return operations_.all(); }
     Operation* getOperation(unsigned i) const { return operations_.at(i); }
     /// To be called when the date of one of the operations has changed.
     void operationChanged() { operations_.changeNotice(); }
@@ -58,6 +63,7 @@ public:
     int removeTransferOperation(TransferAccountOperation* transfer) { return transfers_.remove(transfer); }
     unsigned getNbrTransferOperations() const { return transfers_.getNbr(); }
     TransferAccountOperation** getAllTransferOperations(unsigned* n) const { return transfers_.getAll(n); }
+    std::span<TransferAccountOperation* const> transferOperations() const { return transfers_.all(); }
     TransferAccountOperation* getTransferOperation(unsigned i) const { return transfers_.at(i); }
     /// To be called when the date of one of the received transfers has changed.
     void transferOperationChanged() { transfers_.changeNotice(); }
@@ -66,6 +72,7 @@ public:
     int removeAccountState(AccountState* state);
     unsigned getNbrAccountStates() const { return states_.getNbr(); }
     AccountState** getAllAccountStates(unsigned* n) const { return states_.getAll(n); }
+    std::span<AccountState* const> accountStates() const { return states_.all(); }
     AccountState* getAccountState(unsigned i) const { return states_.at(i); }
 
     /// The wallet's holding of that market name and ticker. @return 0; -1 and a null `*out` when there is none.

@@ -29,6 +29,8 @@ public:
 
     /// @return 0; -1 and a null `*out` without an account, as automatic sales are.
     int getAccount(Account** out) const { return account_.get(out); }
+    /// The same; null when there is none.
+    Account* account() const { return account_.partner(); }
     int setAccount(Account* account);
 
     /// The account's currency symbol; a String without text when account or currency is missing.
@@ -40,7 +42,6 @@ protected:
     Operation() = default;
     Operation(const Date& date, bool automatic) : date_(date), automatic_(automatic) {}
 
-    Account* account() const { return account_.partner(); }
     /// Tells every list that holds the operation that its date has changed.
     virtual void notifyChange();
 

@@ -23,14 +23,19 @@ public:
     int rd(FILE* file) override;
 
     int getWallet(Wallet** out) const { return wallet_.get(out); }
+    /// The same; null when there is none.
+    Wallet* wallet() const { return wallet_.partner(); }
     int setWallet(Wallet* wallet);
     int getCompany(Company** out) const { return company_.get(out); }
+    /// The same; null when there is none.
+    Company* company() const { return company_.partner(); }
     int setCompany(Company* company) { return company_.set(this, company); }
 
     int addShareOperation(ShareOperation* operation) { return operations_.add(operation); }
     int removeShareOperation(ShareOperation* operation) { return operations_.remove(operation); }
     unsigned getNbrShareOperations() const { return operations_.getNbr(); }
     ShareOperation** getAllShareOperations(unsigned* n) const { return operations_.getAll(n); }
+    std::span<ShareOperation* const> shareOperations() const { return operations_.all(); }
     ShareOperation* getShareOperation(unsigned i) const { return operations_.at(i); }
     /// To be called when the date of one of the operations has changed.
     void shareOperationChanged() { operations_.changeNotice(); }
@@ -39,6 +44,7 @@ public:
     int removeShareState(ShareState* state);
     unsigned getNbrShareStates() const { return states_.getNbr(); }
     ShareState** getAllShareStates(unsigned* n) const { return states_.getAll(n); }
+    std::span<ShareState* const> shareStates() const { return states_.all(); }
     ShareState* getShareState(unsigned i) const { return states_.at(i); }
     /// Makes room for as many states; only a saving.
     void reserveShareStates(unsigned n) { states_.reserve(n); }

@@ -35,6 +35,8 @@ public:
     void setOperationCost(float cost) { operationCost_ = cost; }
 
     int getShare(Share** out) const { return share_.get(out); }
+    /// The same; null when there is none.
+    Share* share() const { return share_.partner(); }
     int setShare(Share* share);
 
     /// The wallet's present buy or sell rate cost, 0 without a wallet. Intended: only the fixed cost is recorded with

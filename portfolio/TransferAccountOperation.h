@@ -34,6 +34,8 @@ public:
     void setToCurrencyQuote(float quote) { toCurrencyQuote_ = quote; }
 
     int getRecepientAccount(Account** out) const { return recipient_.get(out); }
+    /// The same; null when there is none.
+    Account* recipient() const { return recipient_.partner(); }
     int setRecepientAccount(Account* account);
 
     /// amount * rate cost + cost: what is shown as the transfer's cost. No valuation uses it.

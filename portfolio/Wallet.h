@@ -41,6 +41,7 @@ public:
     int removeAccount(Account* account) { return accounts_.remove(account); }
     unsigned getNbrAccounts() const { return accounts_.getNbr(); }
     Account** getAllAccounts(unsigned* n) const { return accounts_.getAll(n); }
+    std::span<Account* const> accounts() const { return accounts_.all(); }
     Account* getAccount(unsigned i) const { return accounts_.at(i); }
     /// `*place` becomes the account's index in the list. @return 0; -1 when it is not in it, or null.
     int getAccountPlace(Account* account, unsigned* place) const { return accounts_.getElement(account, place); }
@@ -49,11 +50,13 @@ public:
     int removeShare(Share* share) { return shares_.remove(share); }
     unsigned getNbrShares() const { return shares_.getNbr(); }
     Share** getAllShares(unsigned* n) const { return shares_.getAll(n); }
+    std::span<Share* const> shares() const { return shares_.all(); }
 
     int addState(State* state);
     int removeState(State* state);
     unsigned getNbrStates() const { return states_.getNbr(); }
     State** getAllStates(unsigned* n) const { return states_.getAll(n); }
+    std::span<State* const> states() const { return states_.all(); }
     /// Destroys all states.
     void removeAllStates() { states_.deleteAll(); }
 

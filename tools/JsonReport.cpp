@@ -88,7 +88,7 @@ void addAccounts(const State& state, ObjectWriter& report)
     unsigned n;
     AccountState** states = state.getAllAccountStates(&n);
     for (unsigned i = 0; i < n; ++i) {
-        const Account* account = states[i]->listed();
+        const Account* account = states[i]->account();
         report.addItem({{"name", text(states[i]->getAccountName())},
                         {"currency", text(states[i]->getCurrencyRepresentation())},
                         {"cash", states[i]->getCash()},
@@ -103,7 +103,7 @@ void addShares(const State& state, ObjectWriter& report)
     unsigned n;
     ShareState** states = state.getAllShareStates(&n);
     for (unsigned i = 0; i < n; ++i) {
-        const Share* share = states[i]->listed();
+        const Share* share = states[i]->share();
         report.addItem({{"market", share != nullptr ? text(share->getMarketName()) : ""},
                         {"ticker", text(states[i]->getCompanyAbbreviation())},
                         {"name", text(states[i]->getCompanyName())},

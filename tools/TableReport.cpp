@@ -144,7 +144,7 @@ std::string Report::accounts() const
     AccountState** states = valuation_.state().getAllAccountStates(&n);
     for (unsigned i = 0; i < n; ++i) {
         const String symbol = states[i]->getCurrencyRepresentation();
-        const Account* account = states[i]->listed();
+        const Account* account = states[i]->account();
         const bool isDefault = account != nullptr && account->isDefaultTransferAccount();
         table.addRow({plain(states[i]->getAccountName()), amountText(states[i]->getCash()), plain(symbol),
                       inReference(states[i]->getCash(), symbol), isDefault ? "default transfer account" : ""});
@@ -168,7 +168,7 @@ std::string Report::holdings() const
     ShareState** states = valuation_.state().getAllShareStates(&n);
     for (unsigned i = 0; i < n; ++i) {
         const ShareState& state = *states[i];
-        const Share* share = state.listed();
+        const Share* share = state.share();
         const String symbol = state.getCurrencyRepresentation();
         const double quote = state.getQuote();
         const bool isHeld = state.getQuantity() != 0;

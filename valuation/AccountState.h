@@ -27,10 +27,12 @@ public:
     const String& getCurrencyRepresentation() const;
 
     int getAccount(Account** out) const { return account_.get(out); }
-    /// The linked account, null without one.
-    const Account* listed() const { return account_.partner(); }
+    /// The same; null when there is none.
+    Account* account() const { return account_.partner(); }
     int setAccount(Account* account) { return account_.set(this, account); }
     int getState(State** out) const { return state_.get(out); }
+    /// The same; null when there is none.
+    State* state() const { return state_.partner(); }
     int setState(State* state);
 
 private:

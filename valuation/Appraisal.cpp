@@ -44,7 +44,7 @@ float Appraisal::sharesValue(const State& state, double referenceRate)
     shares_.resize(n);
     float value = 0;
     for (unsigned i = 0; i < n; ++i) {
-        const unsigned currency = currencyOf(shares_, i, states[i]);
+        const unsigned currency = currencyOf(shares_[i], states[i]->share(), *states[i]);
         if (currency == kUnknown)
             continue;
         const double quote = states[i]->getQuote();
@@ -60,7 +60,7 @@ float Appraisal::cashValue(const State& state, double referenceRate)
     accounts_.resize(n);
     float value = 0;
     for (unsigned i = 0; i < n; ++i) {
-        const unsigned currency = currencyOf(accounts_, i, states[i]);
+        const unsigned currency = currencyOf(accounts_[i], states[i]->account(), *states[i]);
         if (currency == kUnknown)
             continue;
         const double cash = states[i]->getCash();
@@ -69,15 +69,14 @@ float Appraisal::cashValue(const State& state, double referenceRate)
     return value;
 }
 
-/// The currency of an item's symbol. The states of a wallet have the same items in the same places, so the names are
-/// compared once for all of them.
-template <class Item>
-unsigned Appraisal::currencyOf(std::vector<Line>& lines, unsigned place, const Item* item)
+/// The currency of a state's symbol; `item` is what it is the state of. The states of a wallet have the same items in
+/// the same places, so the names are compared once for all of them.
+template <class ItemState>
+unsigned Appraisal::currencyOf(Line& line, const void* item, const ItemState& state)
 {
-    const void* listed = item->listed();
-    if (lines[place].item != listed || listed == nullptr)
-        lines[place] = {listed, findCurrency(item->getCurrencyRepresentation())};
-    return lines[place].currency;
+    if (line.item != item || item == nullptr)
+        line = {item, findCurrency(state.getCurrencyRepresentation())};
+    return line.currency;
 }
 
 unsigned Appraisal::findCurrency(const String& representation)

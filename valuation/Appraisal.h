@@ -41,12 +41,12 @@ private:
 
     float sharesValue(const State& state, double referenceRate);
     float cashValue(const State& state, double referenceRate);
-    template <class Item>
-    unsigned currencyOf(std::vector<Line>& lines, unsigned place, const Item* item);
+    template <class ItemState>
+    unsigned currencyOf(Line& line, const void* item, const ItemState& state);
     unsigned findCurrency(const String& representation);
 
     Currency* reference_;
-    std::optional<Currency::Walk> referenceWalk_; // unless there is no reference currency
+    std::optional<Currency::Walk> referenceWalk_;             // unless there is no reference currency
     Date day_;                                                // of the state at hand
     std::vector<Rate> rates_;                                 // of the catalogue's currencies
     std::unordered_map<std::string_view, unsigned> bySymbol_; // indices into `rates_`

@@ -34,10 +34,12 @@ public:
     const String& getCurrencyRepresentation() const;
 
     int getShare(Share** out) const { return share_.get(out); }
-    /// The linked share, null without one.
-    const Share* listed() const { return share_.partner(); }
+    /// The same; null when there is none.
+    Share* share() const { return share_.partner(); }
     int setShare(Share* share) { return share_.set(this, share); }
     int getState(State** out) const { return state_.get(out); }
+    /// The same; null when there is none.
+    State* state() const { return state_.partner(); }
     int setState(State* state);
 
 private:

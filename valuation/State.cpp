@@ -52,13 +52,13 @@ AccountState* State::findAccountState(Account* account) const
     unsigned place;
     if (wallet_.partner() != nullptr && wallet_.partner()->getAccountPlace(account, &place) == 0) {
         AccountState* state = getAccountState(place);
-        if (state != nullptr && state->listed() == account)
+        if (state != nullptr && state->account() == account)
             return state;
     }
     unsigned n;
     AccountState** states = getAllAccountStates(&n);
     for (unsigned i = 0; i < n; ++i)
-        if (states[i]->listed() == account)
+        if (states[i]->account() == account)
             return states[i];
     return nullptr;
 }

@@ -21,6 +21,8 @@ public:
     State& operator=(const State&) = delete;
 
     int getWallet(Wallet** out) const { return wallet_.get(out); }
+    /// The same; null when there is none.
+    Wallet* wallet() const { return wallet_.partner(); }
     int setWallet(Wallet* wallet) { return wallet_.set(this, wallet); }
 
     Date getDate() const { return date_.date(); }
@@ -46,12 +48,14 @@ public:
     int removeAccountState(AccountState* state) { return accountStates_.remove(state); }
     unsigned getNbrAccountStates() const { return accountStates_.getNbr(); }
     AccountState** getAllAccountStates(unsigned* n) const { return accountStates_.getAll(n); }
+    std::span<AccountState* const> accountStates() const { return accountStates_.all(); }
     AccountState* getAccountState(unsigned i) const { return accountStates_.at(i); }
 
     int addShareState(ShareState* state) { return shareStates_.add(state); }
     int removeShareState(ShareState* state) { return shareStates_.remove(state); }
     unsigned getNbrShareStates() const { return shareStates_.getNbr(); }
     ShareState** getAllShareStates(unsigned* n) const { return shareStates_.getAll(n); }
+    std::span<ShareState* const> shareStates() const { return shareStates_.all(); }
     ShareState* getShareState(unsigned i) const { return shareStates_.at(i); }
 
 private:

@@ -12,7 +12,7 @@ enum Column { kName, kBalance, kCurrency, kDefault };
 
 } // namespace
 
-AccountStateItem::AccountStateItem(AccountState* state) : state_(state), account_(state->listed()) {}
+AccountStateItem::AccountStateItem(AccountState* state) : state_(state), account_(state->account()) {}
 
 Cell AccountStateItem::cell(int column) const
 {

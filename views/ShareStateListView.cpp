@@ -35,7 +35,7 @@ std::string withCurrency(const ShareState& state, double amount)
 
 } // namespace
 
-ShareStateItem::ShareStateItem(ShareState* state) : state_(state), share_(state->listed())
+ShareStateItem::ShareStateItem(ShareState* state) : state_(state), share_(state->share())
 {
     const Company* company = companyOf(share_);
     if (company == nullptr || company->getNbrQuotes() == 0)
