@@ -1,6 +1,7 @@
 #pragma once
 
 #include "foundation/Date.h"
+#include "foundation/FieldIO.h"
 
 #include <compare>
 #include <cstdint>
@@ -20,14 +21,19 @@ public:
 
     auto operator<=>(const PackedDate&) const = default;
 
-private:
-    friend class Date;
+    /// From the bytes of the file form, in which the numbers stand as they do here, but for their signs.
+    void decode(const unsigned char* bytes)
+    {
+        key_ = (static_cast<std::uint64_t>(decodeInt(bytes + 4)) << kYear | decodeInt(bytes)) ^ kSigns;
+    }
 
+private:
     // The year stands above the month, and that above the day. Flipping the sign of each puts negative ones first.
     static constexpr int kMonth = 16;
     static constexpr int kYear = 32;
     static constexpr std::uint32_t kSmallSign = 0x8000;
     static constexpr std::uint32_t kSign = 0x80000000;
+    static constexpr std::uint64_t kSigns = 0x8000000080008000;
 
     std::uint64_t key_;
 };

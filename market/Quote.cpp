@@ -21,9 +21,7 @@ int Quote::rd(FILE* file)
 
 void Quote::decode(const unsigned char* bytes)
 {
-    Date date;
-    date.decode(bytes);
-    date_ = date;
+    date_.decode(bytes);
     value_ = decodeFloat(bytes + Date::kFileSize);
 }
 

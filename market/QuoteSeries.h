@@ -1,7 +1,7 @@
 #pragma once
 
-#include "foundation/Date.h"
 #include "foundation/FieldIO.h"
+#include "foundation/PackedDate.h"
 
 #include <algorithm>
 #include <cmath>
@@ -65,25 +65,23 @@ public:
     class Walk {
     public:
         /// `series` stays as it is while the walk lasts.
-        explicit Walk(const QuoteSeries& series) : series_(&series) {}
+        explicit Walk(const QuoteSeries& series) : series_(&series), quotes_(series.quotes()) {}
         /// What `getRealQuote` gives.
-        float realQuote(const Date& d)
+        float realQuote(const PackedDate& day)
         {
-            const PackedDate day = d;
-            unsigned n;
-            SeriesQuote** quotes = series_->getAllQuotes(&n);
             if (day < day_)
-                next_ = series_->firstOnOrAfter(d);
-            while (next_ < n && quotes[next_]->getPackedDate() < day)
+                next_ = series_->firstOnOrAfter(day);
+            while (next_ < quotes_.size() && quotes_[next_]->getPackedDate() < day)
                 ++next_;
             day_ = day;
-            return series_->realQuote(d, next_);
+            return series_->realQuote(day, next_);
         }
 
     private:
         const QuoteSeries* series_;
-        PackedDate day_;    // asked for last
-        unsigned next_ = 0; // the first quote on or after it
+        std::span<SeriesQuote* const> quotes_; // of the series, by date
+        PackedDate day_;                       // asked for last
+        std::size_t next_ = 0;                 // the first quote on or after it
     };
 
     /// Date of the earliest and of the latest quote; the undefined date without quotes.
@@ -128,8 +126,9 @@ private:
     };
 
     SeriesQuote* findQuote(const Date& d) const;
-    unsigned firstOnOrAfter(const Date& d) const;
-    float realQuote(const Date& d, unsigned next) const;
+    std::size_t firstOnOrAfter(const PackedDate& day) const;
+    float realQuote(const PackedDate& day, std::size_t next) const;
+    float lineValue(const Date& d, bool isBefore) const;
     void fitTrend() const;
     void replaceWith(std::vector<LateQuote>& late);
 
@@ -140,15 +139,13 @@ private:
 };
 
 template <class Owner, class SeriesQuote, class ManyEnd>
-unsigned QuoteSeries<Owner, SeriesQuote, ManyEnd>::firstOnOrAfter(const Date& d) const
+std::size_t QuoteSeries<Owner, SeriesQuote, ManyEnd>::firstOnOrAfter(const PackedDate& day) const
 {
-    unsigned n;
-    SeriesQuote** quotes = getAllQuotes(&n);
-    const PackedDate day = d;
-    if (n == 0 || quotes[n - 1]->getPackedDate() < day) // most often asked: a new quote, or a day after the last one
-        return n;
+    const auto all = quotes();
+    if (all.empty() || all.back()->getPackedDate() < day) // most often asked: a new quote, or a day after the last one
+        return all.size();
     const auto isBefore = [&day](const SeriesQuote* q) { return q->getPackedDate() < day; };
-    return static_cast<unsigned>(std::partition_point(quotes, quotes + n, isBefore) - quotes);
+    return static_cast<std::size_t>(std::ranges::partition_point(all, isBefore) - all.begin());
 }
 
 template <class Owner, class SeriesQuote, class ManyEnd>
@@ -156,15 +153,16 @@ Date QuoteSeries<Owner, SeriesQuote, ManyEnd>::getLastQuoteUpTo(const Date& d) c
 {
     if (findQuote(d) != nullptr)
         return d;
-    const unsigned next = firstOnOrAfter(d);
-    return next > 0 ? getQuote(next - 1)->getDate() : Date();
+    const std::size_t next = firstOnOrAfter(d);
+    return next > 0 ? quotes()[next - 1]->getDate() : Date();
 }
 
 template <class Owner, class SeriesQuote, class ManyEnd>
 SeriesQuote* QuoteSeries<Owner, SeriesQuote, ManyEnd>::findQuote(const Date& d) const
 {
-    SeriesQuote* candidate = getQuote(firstOnOrAfter(d));
-    return candidate != nullptr && candidate->getPackedDate() == d ? candidate : nullptr;
+    const PackedDate day = d;
+    const std::size_t next = firstOnOrAfter(day);
+    return next < getNbrQuotes() && quotes()[next]->getPackedDate() == day ? quotes()[next] : nullptr;
 }
 
 template <class Owner, class SeriesQuote, class ManyEnd>
@@ -173,27 +171,29 @@ float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getRealQuote(const Date& d) cons
     return realQuote(d, firstOnOrAfter(d));
 }
 
-/// `next` is `firstOnOrAfter(d)`.
+/// `next` is `firstOnOrAfter(day)`.
 template <class Owner, class SeriesQuote, class ManyEnd>
-float QuoteSeries<Owner, SeriesQuote, ManyEnd>::realQuote(const Date& d, unsigned next) const
+float QuoteSeries<Owner, SeriesQuote, ManyEnd>::realQuote(const PackedDate& day, std::size_t next) const
 {
-    unsigned n;
-    SeriesQuote** quotes = getAllQuotes(&n);
-    if (n == 0)
-        return 0;
-    if (next < n && quotes[next]->getPackedDate() == d)
-        return quotes[next]->getValue();
-    if (next > 0 && next < n)
-        return quotes[next - 1]->getValue();
+    const auto all = quotes();
+    if (next == all.size())
+        return all.empty() ? 0 : lineValue(day.date(), false);
+    if (all[next]->getPackedDate() == day)
+        return all[next]->getValue();
+    return next > 0 ? all[next - 1]->getValue() : lineValue(day.date(), true);
+}
 
-    const SeriesQuote& first = *quotes[0];
-    const SeriesQuote& last = *quotes[n - 1];
-    const SeriesQuote& nearest = next == 0 ? first : last;
+/// The value of day `d`, before the first quote or behind the last one, on the straight line through both.
+template <class Owner, class SeriesQuote, class ManyEnd>
+float QuoteSeries<Owner, SeriesQuote, ManyEnd>::lineValue(const Date& d, bool isBefore) const
+{
+    const SeriesQuote& first = *quotes().front();
+    const SeriesQuote& last = *quotes().back();
     const int span = last.getDate() - first.getDate();
-    if (n == 1 || span == 0) // quotes of one and the same day have no direction
-        return nearest.getValue();
+    if (getNbrQuotes() == 1 || span == 0) // quotes of one and the same day have no direction
+        return isBefore ? first.getValue() : last.getValue();
     const double rise = static_cast<double>(last.getValue()) - first.getValue();
-    if (next == 0)
+    if (isBefore)
         return static_cast<float>(first.getValue() - static_cast<double>(first.getDate() - d) / span * rise);
     return static_cast<float>(last.getValue() + static_cast<double>(d - last.getDate()) / span * rise);
 }
@@ -280,7 +280,7 @@ int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
         for (unsigned i = 0; i < whole; ++i) {
             auto* q = new SeriesQuote;
             q->decode(block + i * SeriesQuote::kFileSize);
-            if (firstOnOrAfter(q->getDate()) == quotes_.getNbr())
+            if (firstOnOrAfter(q->getPackedDate()) == quotes_.getNbr())
                 quotes_.addNew(q); // nothing of its day to replace
             else
                 late.push_back({q, quotes_.reserveTurn()});

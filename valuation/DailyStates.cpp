@@ -48,8 +48,8 @@ std::size_t DailyStates::dayOf(const Date& date) const
     if (days_.empty() || date <= days_.front())
         return 0;
     if (date.isValid())
-        return std::min(static_cast<std::size_t>(date - days_.front()), days_.size());
-    return static_cast<std::size_t>(std::lower_bound(days_.begin(), days_.end(), date) - days_.begin());
+        return std::min(static_cast<std::size_t>(date - days_.front().date()), days_.size());
+    return static_cast<std::size_t>(std::lower_bound(days_.begin(), days_.end(), PackedDate(date)) - days_.begin());
 }
 
 void DailyStates::takeMove(const Operation& operation, Ledger& ledger, double amount)
@@ -138,7 +138,7 @@ void DailyStates::buildDay(std::size_t day)
     for (const Event& event : events_[day])
         event.ledger->happen(event.rank);
 
-    auto* state = new State(&wallet_, days_[day]); // owned by the wallet, and the others by it
+    auto* state = new State(&wallet_, days_[day].date()); // owned by the wallet, and the others by it
     state->setFirstOperationDate(firstOperationDate_);
     state->setTotalDeposit(deposits_.balance());
     state->accountStates_.reserve(static_cast<unsigned>(accounts_.size()));

@@ -36,7 +36,7 @@ public:
 private:
     /// Quotes are taken for that many days at a time, one holding after the other: neighbours in a series are
     /// neighbours in memory.
-    static constexpr std::size_t kDaysAhead = 64;
+    static constexpr std::size_t kDaysAhead = 512;
 
     /// A move that happens on a day.
     struct Event {
@@ -49,7 +49,7 @@ private:
         std::vector<std::pair<std::size_t, const ShareOperation*>> operations; // with the day each counts from
         std::size_t replayed = 0;
         Holding holding;
-        std::optional<Company::Walk> walk;     // none without a company
+        std::optional<Company::Walk> walk;      // none without a company
         std::array<float, kDaysAhead> quotes{}; // of the days taken ahead
     };
 
@@ -62,7 +62,7 @@ private:
     void buildDay(std::size_t day);
 
     Wallet& wallet_;
-    std::vector<Date> days_;
+    std::vector<PackedDate> days_;
     Date firstOperationDate_;
     std::vector<Account*> accounts_;
     std::unordered_map<const Account*, std::size_t> accountIndex_;
