@@ -14,6 +14,7 @@
 #include "platform/TabView.h"
 #include "portfolio/Account.h"
 #include "portfolio/Wallet.h"
+#include "valuation/Evolution.h"
 #include "views/CompanyView.h"
 #include "views/CurrencyView.h"
 #include "views/OperationView.h"
@@ -114,6 +115,7 @@ void PLWindow::replaceWallet()
     walletView_->ForgetSelection();
     operationView_->ForgetSelection();
     wallet_ = std::make_unique<Wallet>();
+    releaseStateMemory(); // the next portfolio may be a small one
     refreshWalletCatalogue();
     showAccounts();
 }

@@ -40,6 +40,12 @@ State* refreshStates(Wallet& wallet, const Date& date, bool previsions, Evolutio
     return current;
 }
 
+void releaseStateMemory()
+{
+    ShareState::releaseKept();
+    AccountState::releaseKept();
+}
+
 std::vector<EvolutionPoint> evolutionPoints(const Wallet& wallet, const Catalogue& catalogue)
 {
     std::vector<EvolutionPoint> points;

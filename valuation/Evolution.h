@@ -21,6 +21,10 @@ enum class EvolutionOutcome {
 /// @return the current state, owned by the wallet; null when `date` is undefined.
 State* refreshStates(Wallet& wallet, const Date& date, bool previsions, EvolutionOutcome* outcome);
 
+/// Gives back the memory that removed states have left for those of the next valuation. To be called when a portfolio
+/// goes; as long as any state is there, nothing happens.
+void releaseStateMemory();
+
 /// One point of the evolution chart.
 struct EvolutionPoint {
     Date date;
