@@ -1,10 +1,11 @@
 #pragma once
 
 #include "platform/Control.h"
-#include "platform/FieldText.h"
 
+#include <memory>
 #include <string>
 
+class FieldText;
 class QLabel;
 class QLineEdit;
 
@@ -15,6 +16,8 @@ class BTextControl : public BControl {
 public:
     BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message,
                  uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
+
+    ~BTextControl() override;
 
     /// The text belongs to the control and is valid until it changes. As long as nobody has changed it, it is what it
     /// was set to, byte for byte. Of a text of more than 4096 bytes the field shows the beginning, with a mark for the
@@ -46,5 +49,5 @@ private:
     QLabel* caption_;  // and so is this
     float divider_;
     std::string committed_; // what the field showed when its text was set or sent
-    FieldText text_;
+    std::unique_ptr<FieldText> text_;
 };

@@ -6,7 +6,7 @@
 #include "chart/GraphView.h"
 #include "platform/ListView.h"
 #include "platform/TabView.h"
-#include "platform/WindowWidget.h"
+#include "platform/qt/WindowWidget.h"
 #include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"
 

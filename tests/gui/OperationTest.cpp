@@ -1,7 +1,7 @@
 // The operation commands, by their controls on the operation page.
 
 #include "platform/ListView.h"
-#include "platform/WindowWidget.h"
+#include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/SmallPortfolio.h"
 

@@ -12,7 +12,7 @@
 #include "platform/MenuField.h"
 #include "platform/MenuItem.h"
 #include "platform/TextControl.h"
-#include "platform/WindowWidget.h"
+#include "platform/qt/WindowWidget.h"
 #include "tests/gui/WindowFixture.h"
 #include "tests/support/Bytes.h"
 #include "tests/support/Links.h"

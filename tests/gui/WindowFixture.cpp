@@ -5,7 +5,7 @@
 #include "platform/ListItem.h"
 #include "platform/ListView.h"
 #include "platform/TabView.h"
-#include "platform/WindowWidget.h"
+#include "platform/qt/WindowWidget.h"
 #include "tests/support/ToolRun.h"
 
 #include <QAbstractButton>

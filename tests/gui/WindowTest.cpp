@@ -7,7 +7,7 @@
 #include "market/Market.h"
 #include "platform/ListView.h"
 #include "platform/StringView.h"
-#include "platform/WindowWidget.h"
+#include "platform/qt/WindowWidget.h"
 #include "portfolio/Share.h"
 #include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"

@@ -1,7 +1,7 @@
 // What a view shows: its picture, the state that it draws with, and the drawing itself.
 
-#include "platform/Canvas.h"
 #include "platform/View.h"
+#include "platform/qt/Canvas.h"
 
 #include <QPainter>
 #include <QWidget>

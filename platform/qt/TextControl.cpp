@@ -1,7 +1,8 @@
 #include "platform/TextControl.h"
 
-#include "platform/Keys.h"
-#include "platform/Labels.h"
+#include "platform/qt/FieldText.h"
+#include "platform/qt/Keys.h"
+#include "platform/qt/Labels.h"
 
 #include <QFont>
 #include <QKeyEvent>
@@ -52,7 +53,7 @@ BTextControl::BTextControl(BRect frame, const char* name, const char* label, con
     : BControl(frame, name, label, message, resizingMode, (flags & ~static_cast<uint32>(B_NAVIGABLE)) | B_FRAME_EVENTS,
                new QWidget),
       field_(new Field(widget())), caption_(new QLabel(labelText(label), widget())),
-      divider_(std::floor(frame.Width() / 2)), text_(kLongestShown)
+      divider_(std::floor(frame.Width() / 2)), text_(std::make_unique<FieldText>(kLongestShown))
 {
     // The field is what the keyboard reaches, so the field bears the names.
     widget()->setObjectName({});
@@ -72,6 +73,8 @@ BTextControl::BTextControl(BRect frame, const char* name, const char* label, con
     QObject::connect(field_, &QLineEdit::editingFinished, [this] { commit(); });
     QObject::connect(field_, &QLineEdit::textEdited, [this] { TextModified(); });
 }
+
+BTextControl::~BTextControl() = default;
 
 void BTextControl::AttachedToWindow()
 {
@@ -104,7 +107,7 @@ void BTextControl::commit()
 
 const char* BTextControl::Text() const
 {
-    return text_.of(shown());
+    return text_->of(shown());
 }
 
 std::string BTextControl::shown() const
@@ -114,9 +117,9 @@ std::string BTextControl::shown() const
 
 void BTextControl::show(const char* text)
 {
-    field_->setText(QString::fromStdString(text_.take(text)));
+    field_->setText(QString::fromStdString(text_->take(text)));
     committed_ = shown();
-    text_.noteShown(committed_);
+    text_->noteShown(committed_);
 }
 
 void BTextControl::SetText(const char* text)

@@ -1,4 +1,4 @@
-#include "platform/MessageQueue.h"
+#include "platform/qt/MessageQueue.h"
 
 #include "platform/Looper.h"
 

@@ -1,5 +1,7 @@
 #include "platform/TextView.h"
 
+#include "platform/qt/FieldText.h"
+
 #include <QPlainTextEdit>
 
 namespace {
@@ -9,11 +11,13 @@ constexpr std::size_t kLongestShown = 65536; // bytes: some twenty pages
 } // namespace
 
 BTextView::BTextView(BRect frame, const char* name, uint32 resizingMode, uint32 flags)
-    : BView(frame, name, resizingMode, flags, new QPlainTextEdit), text_(kLongestShown)
+    : BView(frame, name, resizingMode, flags, new QPlainTextEdit), text_(std::make_unique<FieldText>(kLongestShown))
 {
     field().setTabChangesFocus(true);
     SetAccessibleName(name);
 }
+
+BTextView::~BTextView() = default;
 
 QPlainTextEdit& BTextView::field() const
 {
@@ -22,11 +26,11 @@ QPlainTextEdit& BTextView::field() const
 
 const char* BTextView::Text() const
 {
-    return text_.of(field().toPlainText().toStdString());
+    return text_->of(field().toPlainText().toStdString());
 }
 
 void BTextView::SetText(const char* text)
 {
-    field().setPlainText(QString::fromStdString(text_.take(text)));
-    text_.noteShown(field().toPlainText().toStdString());
+    field().setPlainText(QString::fromStdString(text_->take(text)));
+    text_->noteShown(field().toPlainText().toStdString());
 }

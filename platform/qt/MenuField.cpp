@@ -1,10 +1,10 @@
 #include "platform/MenuField.h"
 
-#include "platform/Labels.h"
 #include "platform/Menu.h"
 #include "platform/MenuItem.h"
 #include "platform/ShortText.h"
 #include "platform/Window.h"
+#include "platform/qt/Labels.h"
 
 #include <QComboBox>
 #include <QLabel>

@@ -2,7 +2,7 @@
 
 #include "platform/View.h"
 #include "platform/Window.h"
-#include "platform/WindowWidget.h"
+#include "platform/qt/WindowWidget.h"
 
 #include <QApplication>
 #include <QPixmap>

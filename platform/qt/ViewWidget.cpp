@@ -1,7 +1,7 @@
-#include "platform/ViewWidget.h"
+#include "platform/qt/ViewWidget.h"
 
-#include "platform/Keys.h"
 #include "platform/View.h"
+#include "platform/qt/Keys.h"
 
 #include <QContextMenuEvent>
 #include <QKeyEvent>

@@ -1,4 +1,4 @@
-#include "platform/ListWidget.h"
+#include "platform/qt/ListWidget.h"
 
 #include "platform/ListItem.h"
 #include "platform/ListView.h"

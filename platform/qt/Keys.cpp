@@ -1,4 +1,4 @@
-#include "platform/Keys.h"
+#include "platform/qt/Keys.h"
 
 #include "platform/InterfaceDefs.h"
 

@@ -1,9 +1,9 @@
 #include "platform/ListView.h"
 
-#include "platform/Canvas.h"
 #include "platform/ListItem.h"
-#include "platform/ListWidget.h"
 #include "platform/Window.h"
+#include "platform/qt/Canvas.h"
+#include "platform/qt/ListWidget.h"
 
 #include <QItemSelectionModel>
 #include <QPainter>

@@ -6,7 +6,7 @@
 #include "platform/Path.h"
 #include "platform/View.h"
 #include "platform/Window.h"
-#include "platform/WindowWidget.h"
+#include "platform/qt/WindowWidget.h"
 
 #include <QFileDialog>
 #include <QLineEdit>

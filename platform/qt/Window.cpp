@@ -3,7 +3,7 @@
 #include "platform/Message.h"
 #include "platform/Messenger.h"
 #include "platform/View.h"
-#include "platform/WindowWidget.h"
+#include "platform/qt/WindowWidget.h"
 
 #include <QApplication>
 #include <QPoint>

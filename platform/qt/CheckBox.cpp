@@ -1,6 +1,6 @@
 #include "platform/CheckBox.h"
 
-#include "platform/Labels.h"
+#include "platform/qt/Labels.h"
 
 #include <QCheckBox>
 

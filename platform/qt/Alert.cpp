@@ -1,9 +1,9 @@
 #include "platform/Alert.h"
 
 #include "platform/DialogAnswers.h"
-#include "platform/Labels.h"
 #include "platform/Window.h"
-#include "platform/WindowWidget.h"
+#include "platform/qt/Labels.h"
+#include "platform/qt/WindowWidget.h"
 
 #include <QDialog>
 #include <QHBoxLayout>

@@ -1,8 +1,8 @@
 #include "platform/View.h"
 
-#include "platform/Canvas.h"
-#include "platform/ViewWidget.h"
 #include "platform/Window.h"
+#include "platform/qt/Canvas.h"
+#include "platform/qt/ViewWidget.h"
 
 #include <QWidget>
 

@@ -1,8 +1,8 @@
 #include "platform/PopUpMenu.h"
 
-#include "platform/Labels.h"
 #include "platform/MenuItem.h"
 #include "platform/Window.h"
+#include "platform/qt/Labels.h"
 
 #include <QMenu>
 #include <QPointer>

@@ -1,6 +1,6 @@
 #include "platform/Button.h"
 
-#include "platform/Labels.h"
+#include "platform/qt/Labels.h"
 
 #include <QPushButton>
 

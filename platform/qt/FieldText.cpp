@@ -1,4 +1,4 @@
-#include "platform/FieldText.h"
+#include "platform/qt/FieldText.h"
 
 #include "platform/ShortText.h"
 

@@ -1,6 +1,6 @@
 #include "platform/TabView.h"
 
-#include "platform/Labels.h"
+#include "platform/qt/Labels.h"
 
 #include <QShortcut>
 #include <QTabBar>

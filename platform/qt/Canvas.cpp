@@ -1,4 +1,4 @@
-#include "platform/Canvas.h"
+#include "platform/qt/Canvas.h"
 
 #include <QPainter>
 #include <QWidget>

@@ -1,4 +1,4 @@
-#include "platform/HeldKey.h"
+#include "platform/qt/HeldKey.h"
 
 #include <QCoreApplication>
 #include <QKeyEvent>

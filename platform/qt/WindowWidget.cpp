@@ -1,8 +1,8 @@
-#include "platform/WindowWidget.h"
+#include "platform/qt/WindowWidget.h"
 
-#include "platform/HeldKey.h"
 #include "platform/InterfaceDefs.h"
 #include "platform/Window.h"
+#include "platform/qt/HeldKey.h"
 
 #include <QCloseEvent>
 #include <QScreen>

@@ -1,7 +1,7 @@
 #include "platform/Looper.h"
 
 #include "platform/Message.h"
-#include "platform/MessageQueue.h"
+#include "platform/qt/MessageQueue.h"
 
 status_t BLooper::PostMessage(const BMessage* message, BHandler* handler)
 {
