@@ -15,5 +15,9 @@ struct DialogAnswers {
     /// @return the path that is chosen in a file panel; empty cancels it.
     std::function<std::string(const BFilePanel& panel)> panel;
 
-    static DialogAnswers& current();
+    static DialogAnswers& current()
+    {
+        static DialogAnswers answers;
+        return answers;
+    }
 };

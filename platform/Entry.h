@@ -15,12 +15,10 @@ struct entry_ref {
 /// A place in the file system, from a reference or a path.
 class BEntry {
 public:
-    BEntry() = default;
     explicit BEntry(const entry_ref* ref);
     explicit BEntry(const char* path);
 
-    /// `B_NO_INIT` when the entry stands for no place.
-    status_t InitCheck() const { return path_.empty() ? B_NO_INIT : B_OK; }
+    /// `B_NO_INIT` when the entry stands for no place; the same below.
     status_t GetPath(BPath* path) const;
     status_t GetRef(entry_ref* ref) const;
 

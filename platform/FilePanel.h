@@ -18,7 +18,7 @@ enum : uint32 { B_FILE_NODE = 1 };
 ///
 /// An open panel sends `B_REFS_RECEIVED` with the chosen file as "refs", a save panel `B_SAVE_REQUESTED` with the
 /// folder as the reference "directory" and the file's name as the string "name"; a save panel has asked before when
-/// there is such a file already. A panel that is left without choice sends `B_CANCEL`.
+/// there is such a file already. A panel that is left without a choice sends nothing.
 class BFilePanel {
 public:
     /// `target` is copied; `start` may be null. `message`, owned from now on, replaces the code above.
@@ -40,7 +40,6 @@ private:
     QFileDialog& dialog();
     void accept();
     void send(const std::string& path) const;
-    void sendAll(const BMessage& message) const;
 
     file_panel_mode mode_;
     BMessenger target_;

@@ -6,11 +6,9 @@
 enum : uint32 {
     B_FOLLOW_LEFT = 1,
     B_FOLLOW_RIGHT = 2,
-    B_FOLLOW_LEFT_RIGHT = B_FOLLOW_LEFT | B_FOLLOW_RIGHT,
     B_FOLLOW_TOP = 4,
     B_FOLLOW_BOTTOM = 8,
-    B_FOLLOW_TOP_BOTTOM = B_FOLLOW_TOP | B_FOLLOW_BOTTOM,
-    B_FOLLOW_ALL = B_FOLLOW_LEFT_RIGHT | B_FOLLOW_TOP_BOTTOM,
+    B_FOLLOW_ALL = B_FOLLOW_LEFT | B_FOLLOW_RIGHT | B_FOLLOW_TOP | B_FOLLOW_BOTTOM,
     B_FOLLOW_ALL_SIDES = B_FOLLOW_ALL,
 };
 
@@ -26,16 +24,12 @@ enum button_width { B_WIDTH_AS_USUAL };
 enum alignment { B_ALIGN_LEFT, B_ALIGN_RIGHT, B_ALIGN_CENTER };
 
 /// Keys that are held while another one is pressed.
-enum : uint32 { B_SHIFT_KEY = 1, B_COMMAND_KEY = 2, B_CONTROL_KEY = 4 };
+enum : uint32 { B_COMMAND_KEY = 2, B_CONTROL_KEY = 4 };
 
 constexpr int32 B_CONTROL_OFF = 0;
 constexpr int32 B_CONTROL_ON = 1;
 
-/// Keys as `KeyDown` gets them: one byte, where the key has a control character.
-constexpr char B_ENTER = 0x0a;
-constexpr char B_ESCAPE = 0x1b;
-constexpr char B_BACKSPACE = 0x08;
-constexpr char B_DELETE = 0x7f;
+/// Keys as `KeyDown` gets them that have no text of their own: one control character.
 constexpr char B_LEFT_ARROW = 0x1c;
 constexpr char B_RIGHT_ARROW = 0x1d;
 constexpr char B_UP_ARROW = 0x1e;

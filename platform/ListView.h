@@ -50,7 +50,6 @@ public:
     void Select(int32 index, bool extend = false) { Select(index, index, extend); }
     /// The same with all rows from `first` to `last`; in a list of single selection only with the first.
     void Select(int32 first, int32 last, bool extend);
-    void DeselectAll();
     /// The index of the selected row number `which`, counted from the top; negative when there are not so many.
     int32 CurrentSelection(int32 which = 0) const;
     int32 CountSelected() const;
@@ -58,7 +57,7 @@ public:
     /// The texts of the selected rows, a line each: what Ctrl+C copies.
     std::string SelectedText() const;
     void ScrollTo(int32 index);
-    void ScrollToSelection();
+    void ScrollToSelection() { ScrollTo(CurrentSelection()); }
     /// Index of the row at the upper edge, for `SetTopRow` to bring back; 0 in an empty list.
     int32 TopRow() const;
     /// The last row, when there are not so many.
@@ -68,8 +67,6 @@ public:
     void SetSelectionMessage(BMessage* message) { selectionMessage_.reset(message); }
     /// As long as `quiet` is set, changes of the selection send nothing.
     void SetQuiet(bool quiet) { quiet_ = quiet; }
-    /// Hook: the selection has changed.
-    virtual void SelectionChanged() {}
 
     /// Height of each row, in pixels.
     float RowHeight() const { return rowHeight_; }

@@ -3,7 +3,6 @@
 #include "platform/View.h"
 
 #include <memory>
-#include <string>
 
 class BMenu;
 class QComboBox;
@@ -18,20 +17,18 @@ public:
     ~BMenuField() override;
 
     BMenu* Menu() const { return menu_.get(); }
-    const char* Label() const { return label_.c_str(); }
     /// Where the menu begins, in pixels from the left.
     void SetDivider(float x);
     void SetAlignment(alignment label);
     /// Items that have no target send to the window.
     void AttachedToWindow() override;
-    void FrameResized(float width, float height) override;
+    void FrameResized(float /*width*/, float /*height*/) override { layOut(); }
 
 private:
     void layOut();
     void fill();
     void choose(int index);
 
-    std::string label_;
     std::unique_ptr<BMenu> menu_;
     QComboBox* field_; // a part of the widget
     QLabel* caption_;  // and so is this

@@ -16,7 +16,6 @@ public:
     bool IsMarked() const { return marked_; }
     /// In a pop-up menu at most one item is marked. Sends no message.
     void SetMarked(bool marked);
-    BMenu* Menu() const { return menu_; }
 
 private:
     friend class BMenu;

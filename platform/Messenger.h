@@ -12,7 +12,6 @@ public:
     BHandler* Target() const { return token_ != 0 ? BHandler::withToken(token_) : nullptr; }
     /// Queues a copy of the message. @return `B_BAD_VALUE` when the handler is gone or stands in no looper.
     status_t SendMessage(const BMessage* message) const;
-    status_t SendMessage(uint32 what) const;
 
 private:
     std::uint64_t token_ = 0;

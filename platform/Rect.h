@@ -14,10 +14,6 @@ struct BRect {
 
     float Width() const { return right - left; }
     float Height() const { return bottom - top; }
-    BPoint LeftTop() const { return {left, top}; }
-    BPoint RightBottom() const { return {right, bottom}; }
-    bool Contains(BPoint p) const { return p.x >= left && p.x <= right && p.y >= top && p.y <= bottom; }
-    bool operator==(const BRect& r) const = default;
 
     /// Moves the sides inwards by `dx` and `dy`; outwards when negative.
     BRect InsetByCopy(float dx, float dy) const { return {left + dx, top + dy, right - dx, bottom - dy}; }

@@ -2,7 +2,6 @@
 
 #include <cstdint>
 
-using int16 = std::int16_t;
 using int32 = std::int32_t;
 using uint32 = std::uint32_t;
 
@@ -14,6 +13,5 @@ enum : status_t {
     B_ERROR = -1,
     B_BAD_VALUE = -2,      ///< an argument that makes no sense here
     B_NAME_NOT_FOUND = -3, ///< a message holds nothing under this name
-    B_BAD_INDEX = -4,      ///< and not so many of them
     B_NO_INIT = -5,        ///< the object was never told what it stands for
 };

@@ -36,7 +36,7 @@ public:
     /// Hook: the text was changed by hand and not sent yet.
     virtual void TextModified() {}
     void SetFont(const BFont* font, uint32 mask = B_FONT_ALL) override;
-    void FrameResized(float width, float height) override;
+    void FrameResized(float /*width*/, float /*height*/) override { layOut(); }
     void AttachedToWindow() override;
 
 private:

@@ -31,8 +31,6 @@ public:
     // The tree of views.
     /// Takes ownership of `child`, which belongs to no other parent.
     void AddChild(BView* child);
-    /// Gives `child` back to the caller. @return false when it is not a child of this view.
-    bool RemoveChild(BView* child);
     /// @return null out of range.
     BView* ChildAt(int32 index) const;
     int32 CountChildren() const { return static_cast<int32>(children_.size()); }
@@ -45,7 +43,6 @@ public:
     BView* FindView(const char* name);
 
     // Place and size.
-    BRect Frame() const { return frame_; }
     BRect Bounds() const { return frame_.OffsetToCopy(0, 0); }
     BPoint ConvertToScreen(BPoint where) const;
     void MoveTo(float x, float y);
@@ -55,25 +52,22 @@ public:
     void Show();
 
     // Keyboard focus and what assistive tools say.
-    void MakeFocus(bool focus = true);
     bool IsFocus() const;
     void SetAccessibleName(const char* text);
     void SetToolTip(const char* text);
 
     // Hooks.
     virtual void AttachedToWindow() {}
-    virtual void Draw(BRect updateRect);
+    virtual void Draw(BRect /*updateRect*/) {}
     /// Draws on the screen, over the picture and not into it: for what comes and goes. `RefreshOver` has it called.
-    virtual void DrawOver(BRect updateRect);
-    virtual void FrameResized(float width, float height);
-    virtual void MouseDown(BPoint where);
-    virtual void MouseUp(BPoint where);
+    virtual void DrawOver(BRect /*updateRect*/) {}
+    virtual void FrameResized(float /*width*/, float /*height*/) {}
     /// Also while no button is held. `inside` is false once, when the pointer has left.
-    virtual void MouseMoved(BPoint where, bool inside);
+    virtual void MouseMoved(BPoint /*where*/, bool /*inside*/) {}
     /// `bytes` is the UTF-8 text of the key, or one of the control characters of InterfaceDefs.h.
-    virtual void KeyDown(const char* bytes, int32 numBytes);
+    virtual void KeyDown(const char* /*bytes*/, int32 /*numBytes*/) {}
     /// The right mouse button was pressed, or the key for menus.
-    virtual void MenuRequested(BPoint where);
+    virtual void MenuRequested(BPoint /*where*/) {}
 
     // Drawing state.
     void SetViewColor(rgb_color color);

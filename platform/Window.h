@@ -4,7 +4,6 @@
 #include "platform/Rect.h"
 
 #include <memory>
-#include <string>
 
 class BView;
 class QWidget;
@@ -27,8 +26,6 @@ public:
     BWindow(BRect frame, const char* title, window_type type, uint32 flags, uint32 workspaces = B_CURRENT_WORKSPACE);
     ~BWindow() override;
 
-    const char* Title() const { return title_.c_str(); }
-    BRect Frame() const { return frame_; }
     BRect Bounds() const { return frame_.OffsetToCopy(0, 0); }
 
     /// Takes ownership of `view`.
@@ -44,9 +41,8 @@ public:
 
     void Show();
     void Hide();
-    void Activate();
     /// Destroys the window.
-    virtual void Quit();
+    virtual void Quit() { delete this; }
     /// `B_QUIT_REQUESTED` closes the window as by hand.
     void MessageReceived(BMessage* message) override;
 
@@ -61,7 +57,6 @@ public:
 
 private:
     BRect frame_;
-    std::string title_;
     std::unique_ptr<WindowWidget> widget_;
     std::unique_ptr<BView> root_; // holds the views
 };

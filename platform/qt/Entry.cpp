@@ -15,12 +15,12 @@ BEntry::BEntry(const char* path) : path_(path != nullptr ? path : "") {}
 
 status_t BEntry::GetPath(BPath* path) const
 {
-    return InitCheck() == B_OK ? path->SetTo(path_.c_str()) : B_NO_INIT;
+    return path_.empty() ? B_NO_INIT : path->SetTo(path_.c_str());
 }
 
 status_t BEntry::GetRef(entry_ref* ref) const
 {
-    if (InitCheck() != B_OK)
+    if (path_.empty())
         return B_NO_INIT;
     const std::filesystem::path path(path_);
     *ref = {path.parent_path().string(), path.filename().string()};

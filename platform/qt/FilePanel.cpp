@@ -45,7 +45,6 @@ QFileDialog& BFilePanel::dialog()
     if (auto* columns = dialog_->findChild<QTreeView*>("treeView"))
         columns->hideColumn(2);
     QObject::connect(dialog_.get(), &QFileDialog::accepted, [this] { accept(); });
-    QObject::connect(dialog_.get(), &QFileDialog::rejected, [this] { sendAll(BMessage(B_CANCEL)); });
     return *dialog_;
 }
 
@@ -60,9 +59,7 @@ void BFilePanel::Show()
 {
     if (const auto& answer = DialogAnswers::current().panel) {
         const std::string path = answer(*this);
-        if (path.empty())
-            sendAll(BMessage(B_CANCEL));
-        else
+        if (!path.empty())
             send(path);
         return;
     }
@@ -98,10 +95,5 @@ void BFilePanel::send(const std::string& path) const
         answer.AddRef("directory", &folder);
         answer.AddString("name", ref.name.c_str());
     }
-    sendAll(answer);
-}
-
-void BFilePanel::sendAll(const BMessage& message) const
-{
-    target_.SendMessage(&message);
+    target_.SendMessage(&answer);
 }

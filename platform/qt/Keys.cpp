@@ -10,11 +10,9 @@ std::string keyBytes(const QKeyEvent& event)
         int key;
         char byte;
     } kControls[] = {
-        {Qt::Key_Return, B_ENTER},        {Qt::Key_Enter, B_ENTER},   {Qt::Key_Escape, B_ESCAPE},
-        {Qt::Key_Backspace, B_BACKSPACE}, {Qt::Key_Delete, B_DELETE}, {Qt::Key_Left, B_LEFT_ARROW},
-        {Qt::Key_Right, B_RIGHT_ARROW},   {Qt::Key_Up, B_UP_ARROW},   {Qt::Key_Down, B_DOWN_ARROW},
-        {Qt::Key_Home, B_HOME},           {Qt::Key_End, B_END},       {Qt::Key_PageUp, B_PAGE_UP},
-        {Qt::Key_PageDown, B_PAGE_DOWN},
+        {Qt::Key_Left, B_LEFT_ARROW}, {Qt::Key_Right, B_RIGHT_ARROW},  {Qt::Key_Up, B_UP_ARROW},
+        {Qt::Key_Down, B_DOWN_ARROW}, {Qt::Key_Home, B_HOME},          {Qt::Key_End, B_END},
+        {Qt::Key_PageUp, B_PAGE_UP},  {Qt::Key_PageDown, B_PAGE_DOWN},
     };
     for (const auto& control : kControls) {
         if (event.key() == control.key)

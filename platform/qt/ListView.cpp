@@ -97,7 +97,6 @@ BListItem* BListView::RemoveItem(int32 index)
             if (!items_[static_cast<std::size_t>(row.row())]->selected_)
                 listWidget().selectionModel()->select(row, QItemSelectionModel::Deselect);
         }
-        SelectionChanged();
     }
     return item;
 }
@@ -161,11 +160,6 @@ void BListView::Select(int32 first, int32 last, bool extend)
     listWidget().selectionModel()->setCurrentIndex(top, QItemSelectionModel::NoUpdate);
 }
 
-void BListView::DeselectAll()
-{
-    listWidget().selectionModel()->clearSelection();
-}
-
 void BListView::selectionChangedByWidget(const std::vector<int32>& on, const std::vector<int32>& off)
 {
     for (const int32 row : off) {
@@ -177,7 +171,6 @@ void BListView::selectionChangedByWidget(const std::vector<int32>& on, const std
             item->selected_ = true;
     }
     selectionStale_ = true;
-    SelectionChanged();
     if (!quiet_ && selectionMessage_ != nullptr)
         Invoke(selectionMessage_.get());
 }
@@ -226,11 +219,6 @@ void BListView::ScrollTo(int32 index)
 {
     if (ItemAt(index) != nullptr)
         listWidget().scrollTo(listWidget().rows().index(index));
-}
-
-void BListView::ScrollToSelection()
-{
-    ScrollTo(CurrentSelection());
 }
 
 int32 BListView::TopRow() const

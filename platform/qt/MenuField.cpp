@@ -15,8 +15,8 @@
 
 BMenuField::BMenuField(BRect frame, const char* name, const char* label, BMenu* menu, uint32 resizingMode, uint32 flags)
     : BView(frame, name, resizingMode, (flags & ~static_cast<uint32>(B_NAVIGABLE)) | B_FRAME_EVENTS, new QWidget),
-      label_(label), menu_(menu), field_(new QComboBox(widget())), caption_(new QLabel(labelText(label), widget())),
-      divider_(label_.empty() ? 0 : std::floor(frame.Width() / 2))
+      menu_(menu), field_(new QComboBox(widget())), caption_(new QLabel(labelText(label), widget())),
+      divider_(*label == '\0' ? 0 : std::floor(frame.Width() / 2))
 {
     // The menu is what the keyboard reaches, so the menu bears the name.
     widget()->setObjectName({});
@@ -39,11 +39,6 @@ void BMenuField::layOut()
     const int divider = static_cast<int>(divider_);
     caption_->setGeometry(0, 0, std::max(divider - kGap, 0), height);
     field_->setGeometry(divider, 0, width - divider, height);
-}
-
-void BMenuField::FrameResized(float, float)
-{
-    layOut();
 }
 
 void BMenuField::fill()

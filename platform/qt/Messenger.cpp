@@ -1,17 +1,10 @@
 #include "platform/Messenger.h"
 
 #include "platform/Looper.h"
-#include "platform/Message.h"
 
 status_t BMessenger::SendMessage(const BMessage* message) const
 {
     BHandler* target = Target();
     BLooper* looper = target != nullptr ? target->Looper() : nullptr;
     return looper != nullptr ? looper->PostMessage(message, target) : B_BAD_VALUE;
-}
-
-status_t BMessenger::SendMessage(uint32 what) const
-{
-    const BMessage message(what);
-    return SendMessage(&message);
 }

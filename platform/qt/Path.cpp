@@ -2,12 +2,10 @@
 
 #include <filesystem>
 
-status_t BPath::SetTo(const char* path, const char* leaf)
+status_t BPath::SetTo(const char* path)
 {
     path_ = path != nullptr ? path : "";
-    if (path_.empty())
-        return B_BAD_VALUE;
-    return leaf != nullptr ? Append(leaf) : B_OK;
+    return path_.empty() ? B_BAD_VALUE : B_OK;
 }
 
 status_t BPath::Append(const char* leaf)

@@ -92,11 +92,6 @@ void BTextControl::layOut()
     field_->setGeometry(divider, 0, width - divider, height);
 }
 
-void BTextControl::FrameResized(float, float)
-{
-    layOut();
-}
-
 void BTextControl::commit()
 {
     if (committed_ == shown())

@@ -6,7 +6,6 @@
 
 #include <QWidget>
 
-#include <algorithm>
 #include <cmath>
 
 namespace {
@@ -35,7 +34,7 @@ BView::BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags, Q
 BView::~BView()
 {
     if (parent_ != nullptr)
-        parent_->RemoveChild(this);
+        std::erase(parent_->children_, this);
     while (!children_.empty())
         delete children_.back(); // takes itself out
     delete widget_;
@@ -51,18 +50,6 @@ void BView::AddChild(BView* child)
     child->placeWidget();
     child->widget_->setVisible(!child->hidden_);
     child->setWindow(window_);
-}
-
-bool BView::RemoveChild(BView* child)
-{
-    const auto found = std::find(children_.begin(), children_.end(), child);
-    if (found == children_.end())
-        return false;
-    children_.erase(found);
-    child->parent_ = nullptr;
-    child->setWindow(nullptr);
-    child->widget_->setParent(nullptr);
-    return true;
 }
 
 BView* BView::ChildAt(int32 index) const
@@ -167,14 +154,6 @@ void BView::Show()
 
 // --- Keyboard focus and what assistive tools say.
 
-void BView::MakeFocus(bool focus)
-{
-    if (focus)
-        widget_->setFocus(Qt::OtherFocusReason);
-    else
-        widget_->clearFocus();
-}
-
 bool BView::IsFocus() const
 {
     return widget_->hasFocus();
@@ -188,20 +167,4 @@ void BView::SetAccessibleName(const char* text)
 void BView::SetToolTip(const char* text)
 {
     widget_->setToolTip(QString::fromUtf8(text));
-}
-
-// --- Hooks.
-
-void BView::Draw(BRect) {}
-void BView::DrawOver(BRect) {}
-void BView::MenuRequested(BPoint) {}
-void BView::FrameResized(float, float) {}
-void BView::MouseUp(BPoint) {}
-void BView::MouseMoved(BPoint, bool) {}
-void BView::KeyDown(const char*, int32) {}
-
-void BView::MouseDown(BPoint)
-{
-    if ((flags_ & B_NAVIGABLE) != 0)
-        MakeFocus();
 }

@@ -28,16 +28,6 @@ void ViewWidget::paintEvent(QPaintEvent*)
     view_.paintOn(screen);
 }
 
-void ViewWidget::mousePressEvent(QMouseEvent* event)
-{
-    view_.MouseDown(at(*event));
-}
-
-void ViewWidget::mouseReleaseEvent(QMouseEvent* event)
-{
-    view_.MouseUp(at(*event));
-}
-
 void ViewWidget::mouseMoveEvent(QMouseEvent* event)
 {
     view_.MouseMoved(at(*event), rect().contains(event->position().toPoint()));

@@ -32,7 +32,7 @@ public:
 } // namespace
 
 BWindow::BWindow(BRect frame, const char* title, window_type, uint32 flags, uint32)
-    : BLooper(title), frame_(frame), title_(title), widget_(std::make_unique<WindowWidget>(*this)),
+    : BLooper(title), frame_(frame), widget_(std::make_unique<WindowWidget>(*this)),
       root_(std::make_unique<RootView>(frame.OffsetToCopy(0, 0)))
 {
     widget_->setWindowTitle(QString::fromUtf8(title));
@@ -84,17 +84,6 @@ void BWindow::Show()
 void BWindow::Hide()
 {
     widget_->hide();
-}
-
-void BWindow::Activate()
-{
-    widget_->raise();
-    widget_->activateWindow();
-}
-
-void BWindow::Quit()
-{
-    delete this;
 }
 
 void BWindow::MessageReceived(BMessage* message)

@@ -175,7 +175,13 @@ std::vector<ChartText> textsOf(const ChartLayout& layout)
 
 bool isWithin(const BRect& inner, const BRect& outer)
 {
-    return outer.Contains(inner.LeftTop()) && outer.Contains(inner.RightBottom());
+    return inner.left >= outer.left && inner.top >= outer.top && inner.right <= outer.right &&
+           inner.bottom <= outer.bottom;
+}
+
+bool isWithin(BPoint place, const BRect& outer)
+{
+    return isWithin(BRect(place.x, place.y, place.x, place.y), outer);
 }
 
 bool overlap(const BRect& a, const BRect& b)
@@ -195,7 +201,7 @@ void expectReadable(const ChartContents& contents, const std::string& what)
     }
     EXPECT_TRUE(isWithin(layout.plot, contents.bounds)) << what;
     for (const ChartPoint& point : contents.series[0].points)
-        EXPECT_TRUE(layout.plot.Contains(layout.scale.pixel(point))) << what << ": " << point.x << ", " << point.y;
+        EXPECT_TRUE(isWithin(layout.scale.pixel(point), layout.plot)) << what << ": " << point.x << ", " << point.y;
     for (const float x : layout.columns)
         EXPECT_TRUE(x >= layout.plot.left && x <= layout.plot.right) << what;
     if (contents.bounds.Width() >= 400 && contents.bounds.Height() >= 230 && contents.labelFont.size <= 12) {
@@ -268,7 +274,7 @@ TEST(ChartReadOutTest, SaysNameDateAndValueWithinTheChart)
         const ChartReadOut shown = layOutReadOut(*point, true, scale, kFont, bounds);
         EXPECT_EQ(shown.text.text, text);
         EXPECT_TRUE(isWithin({shown.box.left, 0, shown.box.right, 0}, bounds)) << text;
-        EXPECT_FALSE(shown.box.Contains(shown.where)) << "the point itself can be seen";
+        EXPECT_FALSE(isWithin(shown.where, shown.box)) << "the point itself can be seen";
     }
     EXPECT_EQ(layOutReadOut(GraphPoint(3, 20), false, scale, kFont, bounds).text.text, "3.000   20.00");
 }

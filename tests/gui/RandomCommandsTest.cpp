@@ -108,7 +108,7 @@ protected:
     {
         BListView& rows = listOf(page, name);
         if (rows.CountItems() == 0 || under(12) == 0) {
-            rows.DeselectAll();
+            static_cast<QAbstractItemView*>(rows.widget())->clearSelection();
             return;
         }
         const auto first = static_cast<int32>(under(static_cast<std::size_t>(rows.CountItems())));

@@ -66,7 +66,8 @@ void WindowTest::open()
 /// keyboard.
 void WindowTest::activate()
 {
-    window_->Activate();
+    window_->widget().raise();
+    window_->widget().activateWindow();
     QApplication::setActiveWindow(&window_->widget());
     ASSERT_TRUE(QTest::qWaitForWindowActive(&window_->widget()));
     settle();

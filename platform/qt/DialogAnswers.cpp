@@ -1,7 +1,0 @@
-#include "platform/DialogAnswers.h"
-
-DialogAnswers& DialogAnswers::current()
-{
-    static DialogAnswers answers;
-    return answers;
-}
