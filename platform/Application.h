@@ -4,7 +4,8 @@
 
 #include <string>
 
-/// The program's connection to the desktop. There is one, made before any window and destroyed after the last.
+/// The program's connection to the desktop. There is one, made before any window; it destroys the windows that are
+/// left.
 class BApplication : public BLooper {
 public:
     /// `signature` is the program's name among all programs, such as "application/x-vnd.Someone".

@@ -19,6 +19,9 @@ enum : uint32 { B_FILE_NODE = 1 };
 /// An open panel sends `B_REFS_RECEIVED` with the chosen file as "refs", a save panel `B_SAVE_REQUESTED` with the
 /// folder as the reference "directory" and the file's name as the string "name"; a save panel has asked before when
 /// there is such a file already. A panel that is left without a choice sends nothing.
+///
+/// One file is chosen, and the panel hides when that is done. Folders are for going into and cannot be chosen, whatever
+/// `nodeFlavors` says, and there is no filter.
 class BFilePanel {
 public:
     /// `target` is copied; `start` may be null. `message`, owned from now on, replaces the code above.

@@ -19,7 +19,8 @@ public:
     const char* Name() const { return name_.c_str(); }
     /// The looper in whose queue messages to this handler wait; null when there is none yet.
     virtual BLooper* Looper() const { return nullptr; }
-    /// Called for each message, in the order of their sending. Here, where nobody understood it, it ends.
+    /// Called for each message, in the order of their sending, while its looper is locked; `message` is there as long
+    /// as the call. Here, where nobody understood it, it ends.
     virtual void MessageReceived(BMessage* message);
 
     /// A number that no other handler has or had: a handler that has died is not mistaken for a new one at its place.

@@ -5,7 +5,7 @@
 
 #include <memory>
 
-/// Something that sends a message of its own to a target when it is used.
+/// Something that sends a message of its own to a target when it is used: by way of the target's queue, never directly.
 class BInvoker {
 public:
     /// Owns `message`, which may be null.
@@ -17,7 +17,7 @@ public:
     /// Takes ownership of `message`; null sends nothing from now on.
     void SetMessage(BMessage* message) { message_.reset(message); }
     BMessage* Message() const { return message_.get(); }
-    /// A view that is told no target sends to its window.
+    /// Does not own `target`, which may die before. A view that is told none sends to its window.
     void SetTarget(const BHandler* target) { target_ = BMessenger(target); }
     bool HasTarget() const { return target_.IsValid(); }
 

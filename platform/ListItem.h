@@ -19,8 +19,8 @@ public:
     /// Draws the row into `frame` of `owner`. The list has painted the ground, in the colour of selected rows where the
     /// row is selected, and set the high colour to one that can be read on it.
     virtual void DrawItem(BView* owner, BRect frame, bool complete = false) = 0;
-    /// The row as text in one line, its cells with tabs between: what typing finds it by, what is copied, and what
-    /// assistive tools say, UTF-8.
+    /// The row as text in one line, UTF-8, with tabs between its cells: what typing finds it by, what is copied, and
+    /// what assistive tools say. The kits do not ask for it.
     virtual std::string Text() const = 0;
 
     bool IsSelected() const { return selected_; }

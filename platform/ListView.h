@@ -12,7 +12,8 @@ class ListWidget;
 
 enum list_view_type { B_SINGLE_SELECTION_LIST, B_MULTIPLE_SELECTION_LIST };
 
-/// Rows below one another, which draw themselves; scrolls, and makes no widget per row.
+/// Rows below one another, which draw themselves; scrolls by itself, without a view around it as in the kits, and makes
+/// no widget per row.
 ///
 /// A change of the selection, by hand or by a call, sends the selection message; a double click or Enter sends the
 /// invocation message, the one that the invoker holds. Rows that are taken out leave the selection silently. All rows

@@ -10,7 +10,8 @@ public:
 
     bool IsValid() const { return Target() != nullptr; }
     BHandler* Target() const { return token_ != 0 ? BHandler::withToken(token_) : nullptr; }
-    /// Queues a copy of the message. @return `B_BAD_VALUE` when the handler is gone or stands in no looper.
+    /// Queues a copy of the message, which stays the caller's. @return `B_BAD_VALUE` when the handler is gone or stands
+    /// in no looper.
     status_t SendMessage(const BMessage* message) const;
 
 private:

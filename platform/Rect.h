@@ -2,7 +2,8 @@
 
 #include "platform/Point.h"
 
-/// A rectangle by its four sides. The sides lie between the pixels: one from 0 to 800 covers 800 pixels.
+/// A rectangle by its four sides. Unlike in the kits the sides lie between the pixels, and no pixel is counted twice:
+/// one from 0 to 800 covers 800 pixels.
 struct BRect {
     float left = 0;
     float top = 0;

@@ -21,20 +21,23 @@ public:
 
     /// The text belongs to the control and is valid until it changes. As long as nobody has changed it, it is what it
     /// was set to, byte for byte. Of a text of more than 4096 bytes the field shows the beginning, with a mark for the
-    /// rest; see `FieldText`.
+    /// rest.
     const char* Text() const;
-    /// Sends no message.
+    /// Sends no message. `text` is copied; null empties the field.
     void SetText(const char* text);
     /// Where the field begins, in pixels from the left; 0 leaves no room for the label.
     void SetDivider(float x);
     void SetAlignment(alignment label, alignment text);
     void SetLabel(const char* label) override;
+
+    // What the kits do not have.
+    /// Whether the text can be changed by hand; it can be selected in either case.
     void SetEditable(bool editable);
     /// Shows by colour that the text is not understood, with the reason as tool tip; null takes the colour away.
     void MarkAsInvalid(const char* reason);
-
     /// Hook: the text was changed by hand and not sent yet.
     virtual void TextModified() {}
+
     void SetFont(const BFont* font, uint32 mask = B_FONT_ALL) override;
     void FrameResized(float /*width*/, float /*height*/) override { layOut(); }
     void AttachedToWindow() override;

@@ -21,10 +21,11 @@ class QWidget;
 /// What a view draws goes into a picture of its own, so drawing is allowed at any time and stays until the next `Draw`;
 /// `Sync` puts it on the screen at once. Coordinates are the view's own: (0, 0) is its left top corner.
 ///
-/// Owns its children. A view that stands in a window or in another view is owned by that.
+/// Owns its children, and the widget that shows it. A view that stands in a window or in another view is owned by that.
 class BView : public BHandler {
 public:
-    /// `frame` is in the coordinates of the parent to come. `name` is what tests and assistive tools find it by.
+    /// `frame` is in the coordinates of the parent to come. `name` is what tests and assistive tools find it by:
+    /// the widget that has the keyboard bears it as object name, and what `SetAccessibleName` sets beside it.
     BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags);
     ~BView() override;
 
@@ -59,14 +60,15 @@ public:
     // Hooks.
     virtual void AttachedToWindow() {}
     virtual void Draw(BRect /*updateRect*/) {}
-    /// Draws on the screen, over the picture and not into it: for what comes and goes. `RefreshOver` has it called.
+    /// Draws on the screen, over the picture and not into it: for what comes and goes. `RefreshOver` has it called. The
+    /// kits have neither.
     virtual void DrawOver(BRect /*updateRect*/) {}
     virtual void FrameResized(float /*width*/, float /*height*/) {}
-    /// Also while no button is held. `inside` is false once, when the pointer has left.
+    /// Also while no button is held. `inside` is false once, when the pointer has left. Nothing is dragged and dropped.
     virtual void MouseMoved(BPoint /*where*/, bool /*inside*/) {}
     /// `bytes` is the UTF-8 text of the key, or one of the control characters of InterfaceDefs.h.
     virtual void KeyDown(const char* /*bytes*/, int32 /*numBytes*/) {}
-    /// The right mouse button was pressed, or the key for menus.
+    /// The right mouse button was pressed, or the key for menus. The kits have no such hook.
     virtual void MenuRequested(BPoint /*where*/) {}
 
     // Drawing state.
@@ -81,7 +83,7 @@ public:
     void GetFont(BFont* font) const;
     float StringWidth(const char* text) const;
 
-    // Drawing. Upright and level lines are sharp, others smooth.
+    // Drawing. Upright and level lines are sharp, others smooth, on screens of any resolution.
     void FillRect(BRect rect, pattern p = B_SOLID_HIGH);
     void StrokeRect(BRect rect, pattern p = B_SOLID_HIGH);
     void StrokeLine(BPoint from, BPoint to, pattern p = B_SOLID_HIGH);

@@ -9,6 +9,7 @@ class BView;
 class QWidget;
 class WindowWidget;
 
+/// There is one kind of window, and one workspace for it.
 enum window_type { B_TITLED_WINDOW };
 
 enum : uint32 { B_NOT_RESIZABLE = 2 };
@@ -35,13 +36,13 @@ public:
     BView* CurrentFocus() const;
 
     /// Has `message`, which it takes ownership of, sent to `target`, or to itself when that is null, when `key` (a
-    /// letter in capitals or a digit) is pressed with `modifiers`. As by a click elsewhere, a field that is being typed
-    /// in sends its text before. Ctrl+Q, which closes the window, is there from the start.
+    /// letter in capitals or a digit) is pressed with `modifiers`. Unlike in the kits, and as by a click elsewhere, a
+    /// field that is being typed in sends its text before. Ctrl+Q, which closes the window, is there from the start.
     void AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHandler* target = nullptr);
 
     void Show();
     void Hide();
-    /// Destroys the window.
+    /// Destroys the window, which has been made with `new`, and its views.
     virtual void Quit() { delete this; }
     /// `B_QUIT_REQUESTED` closes the window as by hand.
     void MessageReceived(BMessage* message) override;
