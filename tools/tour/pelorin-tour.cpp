@@ -1,12 +1,12 @@
 // Makes the pictures of the documents: those of the guide, and every page of the window with a sample in it.
 
-#include "app/GuideTour.h"
 #include "app/PLWindow.h"
-#include "app/TourHand.h"
 #include "platform/Application.h"
 #include "platform/DialogAnswers.h"
 #include "platform/FilePanel.h"
 #include "platform/Screenshot.h"
+#include "tools/tour/GuideTour.h"
+#include "tools/tour/TourHand.h"
 
 #include <functional>
 #include <iostream>

@@ -1,6 +1,6 @@
-#include "app/GuideTour.h"
+#include "tools/tour/GuideTour.h"
 
-#include "app/TourHand.h"
+#include "tools/tour/TourHand.h"
 
 namespace {
 

@@ -1,4 +1,4 @@
-#include "app/TourHand.h"
+#include "tools/tour/TourHand.h"
 
 #include "platform/Button.h"
 #include "platform/CheckBox.h"
