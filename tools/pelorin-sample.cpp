@@ -1,3 +1,4 @@
+#include "app/DataFolder.h"
 #include "foundation/AtomicFile.h"
 #include "foundation/InputFile.h"
 #include "market/Catalogue.h"
@@ -17,7 +18,7 @@ namespace {
 
 const char* const kPurpose = "Writes a made-up market file and portfolio into a data folder, as Companies/Sample and\n"
                              "PortoFolios/Sample. A file that is there is left as it is.\n"
-                             "Example: pelorin-sample ~/Documents/Pelorin";
+                             "Example: pelorin-sample --quotes ~/quotes";
 
 const char* const kOutput =
     R"(The same date gives the same files. Companies and prices are invented.
@@ -33,13 +34,14 @@ struct Arguments {
     std::string date;
     std::string quotes;
     bool quiet = false;
+    bool onlyNews = false;
 };
 
 void describe(CLI::App& app, Arguments& arguments)
 {
     app.footer(kOutput);
-    app.add_option("FOLDER", arguments.folder, "Data folder; made when it is missing")
-        ->required()
+    app.add_option("FOLDER", arguments.folder,
+                   "Data folder, made when it is missing; without it the one that Pelorin keeps your files in")
         ->check(checkNotEmpty);
     app.add_option("--date", arguments.date, "Day up to which there are quotes and rates; without it today")
         ->type_name("DD/MM/YYYY")
@@ -48,6 +50,7 @@ void describe(CLI::App& app, Arguments& arguments)
         ->type_name("FOLDER")
         ->check(checkNotEmpty);
     app.add_flag("--quiet", arguments.quiet, "Do not tell what was written");
+    app.add_flag("--only-news", arguments.onlyNews, "Do not tell of the two files when both are there already");
 }
 
 bool isThere(const std::string& path)
@@ -56,22 +59,36 @@ bool isThere(const std::string& path)
     return std::filesystem::exists(std::filesystem::symlink_status(path, error));
 }
 
-/// Lets `object` write itself to `folder/Sample` unless that is there. @return a line on it.
-template <class Object>
-std::string writeSample(const std::filesystem::path& folder, const Object& object, const Date& stamp)
+std::filesystem::path dataFolder(const Arguments& arguments)
 {
-    const std::string path = folder / "Sample";
+    if (!arguments.folder.empty())
+        return arguments.folder;
+    const DataFolder users;
+    if (users.path().empty())
+        throw std::runtime_error("There is no home folder to keep files in; name a FOLDER.");
+    return users.path();
+}
+
+/// Lets `object` write itself to `path` unless that is there. @return whether it has.
+template <class Object>
+bool writeSample(const std::filesystem::path& path, const Object& object, const Date& stamp)
+{
     if (isThere(path))
-        return path + ": is there and left as it is";
+        return false;
     std::error_code error;
-    std::filesystem::create_directories(folder, error);
+    std::filesystem::create_directories(path.parent_path(), error);
     if (error)
-        throw std::runtime_error(folder.string() + ": cannot be made: " + error.message());
+        throw std::runtime_error(path.parent_path().string() + ": cannot be made: " + error.message());
     AtomicFile file(path, AtomicFile::Existing::kKeep);
     if (object.wrt(file.stream(), stamp) != 0)
         file.fail("cannot be written");
     file.commit();
-    return path + ": written";
+    return true;
+}
+
+void tell(const std::filesystem::path& path, bool isWritten)
+{
+    std::cout << path.string() << (isWritten ? ": written\n" : ": is there and left as it is\n");
 }
 
 /// Goes by the market file that is there, which may be older than `last`, and changed by its owner.
@@ -93,14 +110,18 @@ void run(const Arguments& arguments)
     fillSampleMarket(catalogue, days);
     fillSamplePortfolio(wallet, catalogue, days);
 
-    const std::filesystem::path folder = arguments.folder;
-    const std::string market = writeSample(folder / "Companies", catalogue, last);
-    const std::string portfolio = writeSample(folder / "PortoFolios", wallet, last);
-    if (!arguments.quiet)
-        std::cout << market << '\n' << portfolio << '\n';
+    const std::filesystem::path folder = dataFolder(arguments);
+    const std::filesystem::path market = folder / "Companies" / "Sample";
+    const std::filesystem::path portfolio = folder / "PortoFolios" / "Sample";
+    const bool isMarketNew = writeSample(market, catalogue, last);
+    const bool isPortfolioNew = writeSample(portfolio, wallet, last);
+    if (!arguments.quiet && (!arguments.onlyNews || isMarketNew || isPortfolioNew)) {
+        tell(market, isMarketNew);
+        tell(portfolio, isPortfolioNew);
+    }
     if (arguments.quotes.empty())
         return;
-    writeQuotes(arguments.quotes, folder / "Companies" / "Sample", last);
+    writeQuotes(arguments.quotes, market, last);
     if (!arguments.quiet)
         std::cout << arguments.quotes << ": quotes up to " << last.toString().bytes() << " written\n";
 }

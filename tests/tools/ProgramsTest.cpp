@@ -42,7 +42,7 @@ TEST(ProgramsTest, FailureIsOneLineThatNamesTheReasonAndMakesNoFile)
         {PELORIN_QUOTES, "none --port 0", 1, "none: No such"},
         {PELORIN_QUOTES, ". --bind localhost", 2, "--bind"},
         {PELORIN_SAMPLE, "file", 1, "pelorin-sample: file/Companies: cannot be made: Not a directory\n"},
-        {PELORIN_SAMPLE, "", 2, "FOLDER"},
+        {PELORIN_SAMPLE, "''", 2, "FOLDER"},
         {PELORIN_SAMPLE, "new --date 29/02/2025", 2, "--date"},
         {PELORIN_IMPORT, "new", 2, "--quotes"},
         {PELORIN_IMPORT, "new --rates r.csv --rates-are odd", 2, "--rates-are"},

@@ -51,6 +51,24 @@ TEST_F(SampleTest, FilesThatAreThereAreLeftAlone)
     EXPECT_GT(fs::file_size(folder_ / "a/PortoFolios/Sample"), 1000U);
 }
 
+TEST_F(SampleTest, WithoutAFolderItIsTheUsersAndTellsOnlyNewsWhenAsked)
+{
+    folder_.write("config/user-dirs.dirs", "XDG_DOCUMENTS_DIR=\"$HOME/Texte\"\n");
+    const auto told = [this](const std::string& options) {
+        return ToolRun("env", "HOME=\"$PWD\" XDG_CONFIG_HOME=\"$PWD/config\" '" PELORIN_SAMPLE "' " + options, folder_)
+            .out;
+    };
+    const std::string market = folder_ / "Texte/Pelorin/Companies/Sample";
+    const std::string portfolio = folder_ / "Texte/Pelorin/PortoFolios/Sample";
+    EXPECT_EQ(told("--only-news"), market + ": written\n" + portfolio + ": written\n");
+    EXPECT_EQ(told("--only-news"), "");
+    EXPECT_EQ(told("--quiet --quotes tables"), "");
+    EXPECT_FALSE(fs::is_empty(folder_ / "tables"));
+    fs::remove(portfolio);
+    EXPECT_EQ(told("--only-news"), market + ": is there and left as it is\n" + portfolio + ": written\n");
+    EXPECT_THAT(told(""), HasSubstr(market + ": is there and left as it is\n"));
+}
+
 TEST(SampleDataTest, NothingIsEverOverdrawnOrSoldShort)
 {
     const std::vector<Date> days = sampleDays(kLast);
