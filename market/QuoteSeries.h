@@ -5,7 +5,15 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdint>
 #include <vector>
+
+/// The next number for `QuoteSeries::revision`: one that no series of the program has had. 0 is never given.
+inline std::uint64_t nextRevision()
+{
+    static std::uint64_t last = 0;
+    return ++last;
+}
 
 /// The dated quotes of a `Company` or a `Currency`, at most one a day where `addQuote` has its way, with the answers
 /// they give: the quote of a day, a value for any day, the extremes, and a least-squares trend line (the prevision).
@@ -93,8 +101,15 @@ public:
     float getHighestQuote() const;
     float getLowestQuote() const;
 
-    /// Notes that the trend line has to be computed again; the next reader of it does so.
-    void updatePrevisions() { trendIsStale_ = true; }
+    /// Another number after every change of the quotes, their days or their values, and never that of another series,
+    /// be it gone or of another kind: who has seen this number before has seen these quotes.
+    std::uint64_t revision() const { return revision_; }
+    /// Notes that the quotes have changed: the next reader of the trend line computes it again.
+    void updatePrevisions()
+    {
+        trendIsStale_ = true;
+        revision_ = nextRevision();
+    }
     /// Slope of the trend line, in value units per day; 0 for quotes of a single day, or none.
     float getPente() const
     {
@@ -136,6 +151,7 @@ private:
     mutable float slope_ = 0;
     mutable float intercept_ = 0; // of the trend line, on the day of the first quote
     mutable bool trendIsStale_ = false;
+    std::uint64_t revision_ = nextRevision();
 };
 
 template <class Owner, class SeriesQuote, class ManyEnd>

@@ -4,7 +4,6 @@
 #include "views/Look.h"
 
 #include <cmath>
-#include <utility>
 
 namespace {
 
@@ -41,24 +40,24 @@ QuoteChart::QuoteChart(BRect frame) : GraphView(frame, "grvQuotes")
     showNothing();
 }
 
-void QuoteChart::showContent(Content content)
+bool QuoteChart::changeTo(const Content& content)
 {
     if (content == shown_)
-        return;
-    shown_ = std::move(content);
+        return false;
+    shown_ = content;
+    // From here on there are no points at all, in the chart or in its elements.
     band_.clearAll();
     trend_.clearAll();
     line_.clearAll();
     removeAllGraphPoints();
     setXLegend(("Value in " + shown_.unit).c_str());
     line_.setLegend(shown_.name.empty() ? "Quotes" : shown_.name.c_str());
-    fill();
-    Invalidate();
+    Invalidate(); // what the caller fills in now shows with the next drawing
+    return true;
 }
 
-void QuoteChart::fill()
+void QuoteChart::fill(const std::vector<Day>& days)
 {
-    const auto& days = shown_.days;
     if (days.empty())
         return;
     if (days.front().date == days.back().date) { // no line, and no trend
@@ -72,15 +71,15 @@ void QuoteChart::fill()
     }
     for (const Day& day : days)
         add(line_, day.date, day.value);
+    // The trend is a straight line: its ends are enough.
     for (const Day& day : {days.front(), days.back()})
         add(trend_, day.date, day.trend);
     if (shown_.withBand)
-        fillBand();
+        fillBand(days);
 }
 
-void QuoteChart::fillBand()
+void QuoteChart::fillBand(const std::vector<Day>& days)
 {
-    const auto& days = shown_.days;
     double squares = 0;
     for (const Day& day : days) {
         const double distance = static_cast<double>(day.value) - day.trend;

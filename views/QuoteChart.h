@@ -5,6 +5,7 @@
 #include "chart/GraphView.h"
 #include "foundation/Date.h"
 
+#include <cstdint>
 #include <string>
 #include <vector>
 
@@ -21,37 +22,39 @@ public:
     template <class Series>
     void showSeries(const Series& series, const std::string& name, const std::string& unit, bool withBand)
     {
+        if (!changeTo({series.revision(), name, unit, withBand}))
+            return;
         std::vector<Day> days;
-        unsigned n;
-        const auto* quotes = series.getAllQuotes(&n);
-        days.reserve(n);
-        for (unsigned i = 0; i < n; ++i) {
-            const Date& date = quotes[i]->getDate();
-            days.push_back({date, quotes[i]->getValue(), series.getPrevisionQuote(date)});
+        days.reserve(series.getNbrQuotes());
+        for (const auto* quote : series.quotes()) {
+            const Date date = quote->getDate();
+            days.push_back({date, quote->getValue(), series.getPrevisionQuote(date)});
         }
-        showContent({std::move(days), name, unit, withBand});
+        fill(days);
     }
     /// Shows no quotes.
-    void showNothing() { showContent({{}, "", "???", false}); }
+    void showNothing() { changeTo({0, "", "???", false}); }
 
 private:
     struct Day {
         Date date;
         float value;
         float trend;
-        bool operator==(const Day&) const = default;
     };
+    /// What a picture is made of. The revision stands for the quotes, and with them for the trend.
     struct Content {
-        std::vector<Day> days;
+        std::uint64_t revision = 0; // that of no series
         std::string name;
         std::string unit;
         bool withBand = false;
         bool operator==(const Content&) const = default;
     };
 
-    void showContent(Content content);
-    void fill();
-    void fillBand();
+    /// Empties the chart and takes over name and unit; the caller then fills it. @return false, with nothing done,
+    /// when it shows this content already.
+    bool changeTo(const Content& content);
+    void fill(const std::vector<Day>& days);
+    void fillBand(const std::vector<Day>& days);
 
     Content shown_;
     GraphPolygon band_; // these are in the chart, the last one in front

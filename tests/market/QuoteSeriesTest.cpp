@@ -2,7 +2,9 @@
 #include "tests/support/Bytes.h"
 #include "tests/support/SmallPortfolio.h"
 
+#include <functional>
 #include <gtest/gtest.h>
+#include <set>
 
 namespace {
 
@@ -116,6 +118,32 @@ TEST(QuoteSeriesTest, AnAddedQuoteReplacesTheFirstOneOfItsDay)
     EXPECT_EQ(dump(company), "1:3 1:4 ") << "a changed date replaces nothing";
     for (const auto& [day, value] : {std::pair(0, 3), {1, 3}, {2, 4}})
         EXPECT_EQ(company.getRealQuote(march(day)), static_cast<float>(value)) << "no line in one day: " << day;
+}
+
+TEST(QuoteSeriesTest, NoTwoStatesOfAnySeriesHaveTheSameRevision)
+{
+    Company company;
+    Currency currency;
+    auto* quote = new CompanyQuote(&company, march(1), 1);
+    auto* rate = new CurrencyQuote(&currency, march(1), 1);
+    std::set<std::uint64_t> seen{Company().revision(), company.revision(), currency.revision()};
+    ASSERT_EQ(seen.size(), 3U) << "nor a series that is gone";
+    const std::pair<const char*, std::function<void()>> changes[] = {
+        {"value", [&] { quote->setValue(2); }},
+        {"date", [&] { quote->setDate(march(2)); }},
+        {"addition", [&] { new CompanyQuote(&company, march(3), 1); }},
+        {"replacement", [&] { new CompanyQuote(&company, march(3), 2); }},
+        {"removal", [&] { delete quote; }},
+        {"file", [&] { company.rd(BytesFile(written([](FILE* f) { Company().wrt(f); }))); }},
+        {"rate", [&] { rate->setValue(2); }},
+    };
+    for (const auto& [name, change] : changes) {
+        change();
+        EXPECT_EQ(seen.insert(company.revision()).second, name != std::string("rate")) << name;
+        EXPECT_EQ(seen.insert(currency.revision()).second, name == std::string("rate")) << name;
+        answers(company, march(5));
+        EXPECT_TRUE(seen.contains(company.revision())) << "reading changes nothing: " << name;
+    }
 }
 
 TEST(QuoteSeriesTest, ChangesLeaveNoTrace)
