@@ -1,40 +1,19 @@
-// Currencies and their rates.
+// Currencies, and the catalogue as a whole.
 
-#include "app/PLWindow.h"
-#include "app/SeriesCommands.h"
-#include "app/StateHold.h"
-#include "app/WindowLock.h"
-#include "market/Currency.h"
-#include "market/Market.h"
+#include "app/Holds.h"
 #include "views/CompanyView.h"
 #include "views/CurrencyView.h"
 
 #include <memory>
 
-namespace {
-
-void removeMarkets(PLWindow& window, const Currency& currency)
-{
-    unsigned n;
-    while (Market** markets = currency.getAllMarkets(&n))
-        window.RemoveMarket(markets[0], false);
-}
-
-} // namespace
-
 void PLWindow::AddCurrency()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     const String name = currencyView_->getCurrencyName();
     const String representation = currencyView_->getCurrencyRepresentation();
-    if (name.isUndefined() || representation.isUndefined()) {
-        SetMessage("Please specify a currency name and representation.");
-        return;
-    }
+    if (name.isUndefined() || representation.isUndefined())
+        return SetMessage("Please specify a currency name and representation.");
     auto* currency = new Currency(name, representation, getReferenceCurrency());
-    if (getReferenceCurrency() == nullptr) {
+    if (getReferenceCurrency() == nullptr) { // whoever comes first is what all others are priced in
         setReferenceCurrency(currency);
         currencyView_->setCurrencyRefName(name);
     }
@@ -43,19 +22,13 @@ void PLWindow::AddCurrency()
 
 void PLWindow::AddCurrency(Currency* currency, bool selected)
 {
-    const WindowLock lock(*this);
     catalogue_.addCurrency(currency);
-    if (!lock.isHeld())
-        return;
     currencyView_->AddCurrency(currency, selected);
     refreshWalletCatalogue();
 }
 
 void PLWindow::UpdateCurrency()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     Currency* currency = currencyView_->GetSelectedCurrency();
     if (currency == nullptr)
         return;
@@ -70,17 +43,14 @@ void PLWindow::UpdateCurrency()
 
 void PLWindow::RemoveCurrency()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
-    if (catalogue_.getNbrCurrencies() == 1) {
-        SetMessage("You may not remove the last currency...");
-        return;
-    }
+    if (catalogue_.getNbrCurrencies() == 1)
+        return SetMessage("You may not remove the last currency...");
     if (!confirm("This will delete all attached markets, companies and accounts..."))
         return;
     const StateHold hold(*this);
     if (Currency* currency = currencyView_->GetSelectedCurrency()) {
+        // First the catalogue lets go of it, so that nothing finds it any more, and another currency is the reference;
+        // then its rows go, and at the end of the block itself, with its rates.
         const std::unique_ptr<Currency> removed(currency);
         const bool wasReference = currency == getReferenceCurrency();
         catalogue_.removeCurrency(currency);
@@ -89,7 +59,7 @@ void PLWindow::RemoveCurrency()
             CurrencySelection();
         }
         // The accounts stay, without a currency, though the question names them. Intended: its wording is kept.
-        removeMarkets(*this, *currency);
+        removeMarkets(*currency);
         currencyView_->DeleteCurrency(currency);
     }
     UpdateState();
@@ -97,25 +67,19 @@ void PLWindow::RemoveCurrency()
 
 void PLWindow::RemoveAllCurrencies()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     const StateHold hold(*this);
     companyView_->SetMarketList({}); // at once
     for (Currency* currency : catalogue_.getCurrencies()) {
-        removeMarkets(*this, *currency);
+        removeMarkets(*currency);
         currencyView_->DeleteCurrency(currency);
     }
-    catalogue_.clear();
+    catalogue_.clear(); // no row is left that stands for one of them
     currencyView_->setCurrencyRefName(String());
     UpdateState();
 }
 
 void PLWindow::CurrencySelection()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     Currency* currency = currencyView_->GetSelectedCurrency();
     currencyView_->SetMarketList(currency);
     currencyView_->SetQuoteList(currency);
@@ -125,19 +89,14 @@ void PLWindow::CurrencySelection()
     currencyView_->setCurrencyRepresentation(currency->getRepresentation());
     // On the company page, until that is refreshed. Intended, as is that the chart is not drawn here: it
     // shows the rates of the currency that is named in it until a rate is selected.
-    series_commands::showTrend(*companyView_, *currency);
+    companyView_->showTrend(*currency);
 }
 
 void PLWindow::SetCurrencyRef()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     Currency* currency = currencyView_->GetSelectedCurrency();
-    if (currency == nullptr) {
-        SetMessage("Please select a currency.");
-        return;
-    }
+    if (currency == nullptr)
+        return SetMessage("Please select a currency.");
     if (currency == getReferenceCurrency())
         return;
     SetCurrencyRef(currency);
@@ -146,38 +105,29 @@ void PLWindow::SetCurrencyRef()
 
 void PLWindow::SetCurrencyRef(Currency* newReference)
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld() || newReference == getReferenceCurrency())
+    if (newReference == getReferenceCurrency())
         return;
+    // Before and after, all rates are given in the reference currency: with it they all change.
     catalogue_.rebaseOn(newReference);
     currencyView_->setCurrencyRefName(newReference->getName());
     CurrencySelection();
 }
 
-void PLWindow::AddCurrencyQuote()
+void PLWindow::removeMarkets(const Currency& currency)
 {
-    series_commands::addQuote(*this, *currencyView_, currencyView_->GetSelectedCurrency(),
-                              "You must first select a currency");
+    while (!currency.markets().empty())
+        RemoveMarket(currency.markets().front(), false);
 }
 
-void PLWindow::UpdateCurrencyQuote()
+void PLWindow::showCatalogue(unsigned firstNew)
 {
-    series_commands::updateQuote(*this, *currencyView_);
-}
-
-void PLWindow::RemoveCurrencyQuote()
-{
-    series_commands::removeQuotes(*this, *currencyView_);
-}
-
-void PLWindow::CurrencyQuoteSelection()
-{
-    series_commands::showSelectedQuote(*this, *currencyView_);
-}
-
-void PLWindow::UpdateCurrencyQuotesChart()
-{
-    const WindowLock lock(*this);
-    if (lock.isHeld())
-        currencyView_->UpdateQuotesChart();
+    // The rows stand in the order of the catalogue, which has put the new currencies behind the others.
+    const auto& currencies = catalogue_.getCurrencies();
+    for (unsigned i = firstNew; i < currencies.size(); ++i)
+        currencyView_->AddCurrency(currencies[i], false);
+    if (getReferenceCurrency() != nullptr)
+        currencyView_->setCurrencyRefName(getReferenceCurrency()->getName());
+    CurrencySelection();
+    companyView_->SetMarketList(catalogue_.getMarkets());
+    showWallet();
 }

@@ -1,43 +1,55 @@
-// Markets.
+// Markets, their companies, and the quotes that are fetched for these.
 
-#include "app/PLWindow.h"
-#include "app/StateHold.h"
-#include "app/WindowLock.h"
-#include "market/Currency.h"
-#include "market/Market.h"
+#include "app/Holds.h"
+#include "net/QuoteServers.h"
+#include "net/StoreQuote.h"
+#include "portfolio/Wallet.h"
 #include "views/CompanyView.h"
 #include "views/CurrencyView.h"
+#include "views/OperationView.h"
+
+#include <memory>
+
+namespace {
+
+/// Fetches the company's price of today from the quote server and stores it. `view`, which may be null, is told of a
+/// quote that is new or has changed. Blocks until the server has answered.
+/// @return false when there is no price to be had, and nothing has changed then.
+bool fetchLatestQuote(Company& company, CompanyView* view)
+{
+    float price = 0;
+    Date date;
+    if (company.getInternetLastQuote(quoteServers().latestHost, QuoteServers::kLatestPath, &price, &date) != 0)
+        return false;
+    CompanyQuote* quote = nullptr;
+    const StoreOutcome outcome = storeQuote(&company, date, price, &quote);
+    if (view != nullptr && outcome == StoreOutcome::kAdded)
+        view->AddQuote(quote);
+    if (view != nullptr && outcome == StoreOutcome::kChanged)
+        view->ModifyQuote(quote);
+    return true;
+}
+
+} // namespace
 
 void PLWindow::AddMarket()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     const String name = companyView_->getMarketName();
-    if (name.isUndefined()) {
-        SetMessage("Please specify a market name.");
-        return;
-    }
+    if (name.isUndefined())
+        return SetMessage("Please specify a market name.");
     const String representation = companyView_->getMarketCurrencyRepresentation();
-    if (representation.isUndefined()) {
-        SetMessage("Please specify a currency representation.");
-        return;
-    }
+    if (representation.isUndefined())
+        return SetMessage("Please specify a currency representation.");
     Currency* currency = getCurrencyByRepresentation(representation);
-    if (currency == nullptr) {
-        SetMessage("Unknown currency...");
-        return;
-    }
+    if (currency == nullptr)
+        return SetMessage("Unknown currency...");
     auto* market = new Market(name);
-    market->setCurrency(currency);
+    market->setCurrency(currency); // which owns it from here on
     AddMarket(market, true);
 }
 
 void PLWindow::AddMarket(Market* market, bool selected)
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     companyView_->AddMarket(market, selected);
     currencyView_->AddMarket(market);
     refreshWalletCatalogue();
@@ -45,9 +57,6 @@ void PLWindow::AddMarket(Market* market, bool selected)
 
 void PLWindow::UpdateMarket()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     Market* market = companyView_->GetSelectedMarket();
     if (market == nullptr)
         return;
@@ -58,21 +67,18 @@ void PLWindow::UpdateMarket()
 
 void PLWindow::RemoveMarket(Market* market, bool ask)
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     if (ask && !confirm("This will delete all attached companies and share operations..."))
         return;
     const StateHold hold(*this);
     if (market == nullptr)
         market = companyView_->GetSelectedMarket();
     if (market != nullptr) {
-        // The rows first: those of the market's companies go with it, all at once.
+        // The rows first: those of the market's companies go with it, all at once. Then the companies, one by one,
+        // until the market stands alone and no operation is left that is about one of them.
         companyView_->DeleteMarket(market);
         currencyView_->DeleteMarket(market);
-        unsigned n;
-        while (Company** companies = market->getAllCompanies(&n))
-            RemoveCompany(companies[0], false);
+        while (!market->companies().empty())
+            RemoveCompany(market->companies().front(), false);
         delete market;
     }
     UpdateState();
@@ -80,11 +86,8 @@ void PLWindow::RemoveMarket(Market* market, bool ask)
 
 void PLWindow::RemoveAllMarkets()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     const StateHold hold(*this);
-    companyView_->SetMarketList({});
+    companyView_->SetMarketList({}); // all rows at once, not each with its market
     for (Market* market : catalogue_.getMarkets())
         RemoveMarket(market, false);
     UpdateState();
@@ -92,13 +95,123 @@ void PLWindow::RemoveAllMarkets()
 
 void PLWindow::MarketSelection()
 {
-    const WindowLock lock(*this);
-    if (!lock.isHeld())
-        return;
     Market* market = companyView_->GetSelectedMarket();
     if (market != nullptr) {
         companyView_->setMarketName(market->getName());
         companyView_->setMarketCurrencyRepresentation(market->getCurrencyRepresentation());
     }
     companyView_->SetCompanyList(market);
+}
+
+void PLWindow::AddCompany()
+{
+    Market* market = companyView_->GetSelectedMarket();
+    if (market == nullptr)
+        return SetMessage("Please first create a market.");
+    const String abbreviation = companyView_->getCompanyAbbreviation();
+    if (abbreviation.isUndefined())
+        return SetMessage("Please specify an abbreviation for your company");
+    AddCompany(new Company(market, companyView_->getCompanyName(), abbreviation), true); // the market owns it
+}
+
+void PLWindow::AddCompany(Company* company, bool selected)
+{
+    companyView_->AddCompany(company, selected);
+}
+
+void PLWindow::UpdateCompany()
+{
+    if (Company* company = companyView_->GetSelectedCompany()) {
+        SetMessage("Getting the latest quote on the Internet... Please stand by.");
+        const bool isFetched = fetchLatestQuote(*company, companyView_);
+        SetMessage(isFetched ? "Successful update to the latest quote on the Internet"
+                             : "Error Getting the latest quote on the Internet");
+        // After the fetch, which asks for the ticker as it was. Intended: one button renames and brings up to date.
+        company->setName(companyView_->getCompanyName());
+        company->setAbbreviation(companyView_->getCompanyAbbreviation());
+        companyView_->ModifyCompany(company);
+        for (const Share* share : company->shares())
+            for (ShareOperation* operation : share->shareOperations())
+                operationView_->UpdateShareOperation(operation);
+    }
+    UpdateState();
+}
+
+void PLWindow::RemoveCompany(Company* company, bool ask)
+{
+    if (ask && !confirm("This will delete all attached share operations..."))
+        return;
+    const StateHold hold(*this);
+    if (company == nullptr)
+        company = companyView_->GetSelectedCompany();
+    if (company != nullptr) {
+        // The company takes its holdings along, and they their operations: all rows of these go first.
+        for (const Share* share : company->shares())
+            for (ShareOperation* operation : share->shareOperations())
+                operationView_->RemoveShareOperation(operation);
+        companyView_->DeleteCompany(company);
+        delete company;
+    }
+    UpdateState();
+}
+
+void PLWindow::CompanySelection()
+{
+    Company* company = companyView_->GetSelectedCompany();
+    companyView_->SetQuoteList(company);
+    companyView_->SetCompanyEventList(company);
+    if (company == nullptr)
+        return;
+    companyView_->setCompanyName(company->getName());
+    companyView_->setCompanyAbbreviation(company->getAbbreviation());
+    companyView_->showTrend(*company);
+    UpdateCompanyQuotesChart();
+}
+
+void PLWindow::SplitQuotes()
+{
+    const double factor = companyView_->getSplitFactor();
+    if (factor == 0)
+        return SetMessage("Please specify a factor (ex: 1:2)");
+    // Only the selected quotes: a person selects those before the day of the split.
+    int n;
+    const std::unique_ptr<CompanyQuote*[]> quotes(companyView_->getAllSelectedQuotes(&n));
+    for (CompanyQuote* quote : std::span(quotes.get(), static_cast<std::size_t>(n))) {
+        quote->setValue(static_cast<float>(quote->getValue() * factor));
+        companyView_->ModifyQuote(quote);
+    }
+    if (n == 0)
+        return;
+    UpdateCompanyQuotesChart();
+    UpdateState();
+}
+
+void PLWindow::SetThreeMonthsCompanyQuotes()
+{
+    Company* company = companyView_->GetSelectedCompany();
+    if (company == nullptr)
+        return;
+    SetMessage("Getting the last three months of quotes on the Internet (only for NASDAQ and NYSE)");
+    if (company->setInternetLastThreeMonthsQuote() != 0) {
+        // Quotes may have been stored all the same. Intended: they show at the next refresh.
+        SetMessage("Error getting the last three months of quotes");
+        return;
+    }
+    companyView_->ModifyCompany(company);
+    UpdateState();
+    SetMessage("Last three months added...");
+}
+
+void PLWindow::UpdatePortoFolioQuotes()
+{
+    SetMessage("Getting the latest quote on the Internet... Please stand by.");
+    const Company* shown = companyView_->GetSelectedCompany();
+    for (const Share* share : wallet_->shares()) {
+        // A company that several holdings are of is fetched for each of them.
+        Company* company = share->company();
+        if (company != nullptr && !fetchLatestQuote(*company, company == shown ? companyView_ : nullptr))
+            SetMessage("Error Getting the latest quote on the Internet for a company");
+    }
+    // The portfolio is not valued anew here. Intended: the next command that does so takes the quotes into account.
+    SetMessage("All portofolio quotes are up-to-date.");
 }

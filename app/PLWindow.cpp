@@ -1,17 +1,13 @@
 #include "app/PLWindow.h"
 
+#include "app/Holds.h"
 #include "app/MessageView.h"
 #include "app/Shortcuts.h"
-#include "app/WindowLock.h"
 #include "foundation/Today.h"
-#include "market/Currency.h"
 #include "platform/Alert.h"
 #include "platform/Application.h"
-#include "platform/Message.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
-#include "views/CompanyView.h"
-#include "views/CurrencyView.h"
 #include "views/OperationView.h"
 #include "views/ParameterView.h"
 #include "views/WalletView.h"
@@ -114,13 +110,19 @@ const BRect kPageFrame(0, 0, 800, 775);
 } // namespace
 
 PLWindow::PLWindow(BRect frame, const DataFolder& folder)
-    : BWindow(frame, "Pelorin", B_TITLED_WINDOW, B_NOT_RESIZABLE, B_CURRENT_WORKSPACE), folder_(folder)
+    : BWindow(frame, "Pelorin", B_TITLED_WINDOW, B_NOT_RESIZABLE, B_CURRENT_WORKSPACE)
 {
     makePages();
     SetMessage("No Company...");
-    makePanels();
+    files_ = std::make_unique<DataFiles>(*this, *tabView_, folder);
+    companyQuotes_ = std::make_unique<QuoteEditor<Company>>(*this, *companyView_, "You must first select a company");
+    currencyQuotes_ =
+        std::make_unique<QuoteEditor<Currency>>(*this, *currencyView_, "You must first select a currency");
+    events_ = std::make_unique<EventEditor>(*this, *companyView_);
+    operations_ = std::make_unique<OperationEditor>(*this, *operationView_);
+    shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     walletView_->setDate(today());
-    ReinitWallet();
+    ReinitWallet(); // from here on there is a wallet, always
 }
 
 PLWindow::~PLWindow() = default;
@@ -138,19 +140,10 @@ void PLWindow::makePages()
     add(currencyView_ = new CurrencyView(kPageFrame, "CurrencyView", this), "Currency");
     add(walletView_ = new WalletView(kPageFrame, "WalletView", this), "PortoFolio");
     add(operationView_ = new OperationView(kPageFrame, "OperationView", this), "Operations");
-    operationView_->SetTypingHook([this] { renewOffers(); });
     add(parameterView_ = new ParameterView(kPageFrame, "ParameterView", this), "Parameters");
     messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
-    shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
-}
-
-void PLWindow::makePanels()
-{
-    const BMessenger self(this);
-    openPanel_ = std::make_unique<BFilePanel>(B_OPEN_PANEL, &self, nullptr, B_FILE_NODE);
-    savePanel_ = std::make_unique<BFilePanel>(B_SAVE_PANEL, &self, nullptr, B_FILE_NODE);
 }
 
 void PLWindow::MessageReceived(BMessage* message)
@@ -158,10 +151,13 @@ void PLWindow::MessageReceived(BMessage* message)
     const auto* command = std::find_if(std::begin(kCommands), std::end(kCommands),
                                        [&](const Command& c) { return c.code == message->what; });
     // Many text fields have codes that are no commands: typing changes nothing until a button is pressed.
-    if (command != std::end(kCommands))
-        command->run(*this, message);
-    else
+    if (command == std::end(kCommands)) {
         BWindow::MessageReceived(message);
+        return;
+    }
+    const WindowLock lock(*this);
+    if (lock.isHeld())
+        command->run(*this, message);
 }
 
 bool PLWindow::QuitRequested()
@@ -170,12 +166,12 @@ bool PLWindow::QuitRequested()
     return true;
 }
 
-void PLWindow::SetMessage(const char* text)
+void PLWindow::SetMessage(const char* text, const char* toolTip)
 {
     const WindowLock lock(*this);
     if (!lock.isHeld())
         return;
-    messageView_->SetToolTip(""); // of the message before
+    messageView_->SetToolTip(toolTip); // in place of that of the message before
     messageView_->SetMessage(text);
 }
 
@@ -194,16 +190,6 @@ Market** PLWindow::getMarkets(int* n) const
     auto** array = new Market*[markets.size()];
     std::copy(markets.begin(), markets.end(), array);
     return array;
-}
-
-Currency* PLWindow::getCurrencyByRepresentation(const String& representation) const
-{
-    return catalogue_.getCurrencyByRepresentation(representation);
-}
-
-BListView* PLWindow::getCompanyListView() const
-{
-    return companyView_->getCompanyListView();
 }
 
 void PLWindow::refreshWalletCatalogue()

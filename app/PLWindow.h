@@ -1,36 +1,32 @@
 #pragma once
 
-#include "app/DataFolder.h"
-#include "foundation/String.h"
+#include "app/DataFiles.h"
+#include "app/EventEditor.h"
+#include "app/OperationEditor.h"
+#include "app/QuoteEditor.h"
 #include "market/Catalogue.h"
-#include "platform/FilePanel.h"
 #include "platform/Window.h"
+#include "views/CompanyView.h"
+#include "views/CurrencyView.h"
 
 #include <memory>
 
-class Account;
-class AccountOperation;
-class BListView;
-class BTabView;
-class Company;
-class CompanyView;
-class CurrencyView;
 class MessageView;
-class Operation;
-class OperationView;
 class ParameterView;
-class ShareOperation;
 class Shortcuts;
 class State;
-class Wallet;
 class WalletView;
 
 /// The main window, and the controller: it owns the model and the five pages, and turns the code of every message into
 /// one command.
 ///
-/// A command locks the window, reads the pages, checks, changes the model, writes the pages, and reports one line in
-/// the status line. The pages show the model and never change it: they take a row out, and the command then destroys
-/// the object. The commands are defined by subject, in the files named beside them.
+/// A command reads the pages, checks, changes the model, writes the pages, and reports one line in the status line. The
+/// pages show the model and never change it: they take a row out, and the command then destroys the object. Between two
+/// commands every row stands for an object that lives, and the portfolio is shown as it was last valued.
+///
+/// `MessageReceived` runs a command with the window locked. What is reached in other ways, from a panel, a key or a
+/// hook of the kits, takes the lock itself and does nothing without it. The commands are defined by subject: in the
+/// classes that they are handed on to, and in the files named beside the others.
 class PLWindow : public BWindow {
 public:
     /// `frame` in screen coordinates. `folder` is where the file panels open and where replaced files are kept.
@@ -41,10 +37,12 @@ public:
     /// Ends the program. Intended: nothing is saved and nothing asked; saving is the user's own act.
     bool QuitRequested() override;
     /// Loads the file that the open panel was left with.
-    virtual void RefsReceived(BMessage* message);
+    virtual void RefsReceived(BMessage* message) { files_->load(message); }
 
-    /// Shows `text` in the status line, at once.
-    void SetMessage(const char* text);
+    /// Shows `text` in the status line, at once; `toolTip` says more of it.
+    void SetMessage(const char* text, const char* toolTip = "");
+    /// Asks in an alert titled "Warning". @return true for "Continue".
+    static bool confirm(const char* question);
 
     // The model.
     Wallet* getWallet() const { return wallet_.get(); }
@@ -57,26 +55,32 @@ public:
     /// @return an array from new[] that the caller deletes; null when there are none.
     Market** getMarkets(int* n) const;
     /// The first currency with this symbol, null when there is none.
-    Currency* getCurrencyByRepresentation(const String& representation) const;
+    Currency* getCurrencyByRepresentation(const String& representation) const
+    {
+        return catalogue_.getCurrencyByRepresentation(representation);
+    }
     /// The list of companies on the company page.
-    BListView* getCompanyListView() const;
+    BListView* getCompanyListView() const { return companyView_->getCompanyListView(); }
 
-    // The valuation (StateCommands.cpp).
+    // The portfolio as a whole (WalletCommands.cpp).
     /// Values the portfolio anew at its page's date and shows it. Within a `StateHold` that waits for its end.
     void UpdateState();
     /// Makes `state` the one that is shown; null shows none. The former one is not destroyed here.
     void SetState(State* state);
-
-    // Files (FileCommands.cpp).
-    void LoadSomething();
-    void SaveSomething();
-    /// The answer of the save panel. @return `B_OK`; what is missing in the message.
-    status_t Save(BMessage* message);
-    void Save(const String& path);
+    /// Starts a new, empty portfolio, which has no file yet.
     void ReinitWallet();
-
-    // Parameters (ParameterCommands.cpp).
     void ChangeParameter(uint32 code);
+    /// Puts an empty portfolio, without a value, in the place of the one that is here.
+    void replaceWallet();
+    /// Shows and values the portfolio after it was replaced or read.
+    void showWallet();
+
+    // Files.
+    void LoadSomething() { files_->askForLoad(); }
+    void SaveSomething() { files_->saveOrAsk(); }
+    /// The answer of the save panel. @return `B_OK`; what is missing in the message.
+    status_t Save(BMessage* message) { return files_->save(message); }
+    void Save(const String& path) { files_->save(path); }
 
     // Markets (MarketCommands.cpp).
     void AddMarket();
@@ -87,30 +91,28 @@ public:
     void RemoveAllMarkets();
     void MarketSelection();
 
-    // Companies (CompanyCommands.cpp).
+    // Companies, and the quotes that are fetched for them (MarketCommands.cpp).
     void AddCompany();
     void AddCompany(Company* company, bool selected);
     void UpdateCompany();
     /// Removes `company`, or the selected one when it is null, after a question when `ask` is set.
     void RemoveCompany(Company* company, bool ask);
     void CompanySelection();
-
-    // Quotes of the selected company (QuoteCommands.cpp).
-    void AddCompanyQuote();
-    void UpdateCompanyQuote();
-    void RemoveCompanyQuote();
-    void CompanyQuoteSelection();
     void SplitQuotes();
-    void UpdateCompanyQuotesChart();
     void SetThreeMonthsCompanyQuotes();
     void UpdatePortoFolioQuotes();
 
-    // Events of the selected company (EventCommands.cpp).
-    void ChangeCompanyEventType(short type);
-    void AddCompanyEvent();
-    void UpdateCompanyEvent();
-    void RemoveCompanyEvent();
-    void CompanyEventSelection();
+    // Quotes and events of the selected company.
+    void AddCompanyQuote() { companyQuotes_->add(); }
+    void UpdateCompanyQuote() { companyQuotes_->update(); }
+    void RemoveCompanyQuote() { companyQuotes_->remove(); }
+    void CompanyQuoteSelection() { companyQuotes_->showSelected(); }
+    void UpdateCompanyQuotesChart() { companyView_->UpdateQuotesChart(); }
+    void ChangeCompanyEventType(short type) { companyView_->SetEventType(type); }
+    void AddCompanyEvent() { events_->add(); }
+    void UpdateCompanyEvent() { events_->update(); }
+    void RemoveCompanyEvent() { events_->remove(); }
+    void CompanyEventSelection() { events_->showSelected(); }
 
     // Currencies (CurrencyCommands.cpp).
     void AddCurrency();
@@ -122,78 +124,44 @@ public:
     void CurrencySelection();
     void SetCurrencyRef();
     void SetCurrencyRef(Currency* newReference);
-    void AddCurrencyQuote();
-    void UpdateCurrencyQuote();
-    void RemoveCurrencyQuote();
-    void CurrencyQuoteSelection();
-    void UpdateCurrencyQuotesChart();
+    /// Shows the catalogue after a file was read. `firstNew` is the index of the first of the file's currencies.
+    void showCatalogue(unsigned firstNew);
+    void AddCurrencyQuote() { currencyQuotes_->add(); }
+    void UpdateCurrencyQuote() { currencyQuotes_->update(); }
+    void RemoveCurrencyQuote() { currencyQuotes_->remove(); }
+    void CurrencyQuoteSelection() { currencyQuotes_->showSelected(); }
+    void UpdateCurrencyQuotesChart() { currencyView_->UpdateQuotesChart(); }
 
-    // Accounts (AccountCommands.cpp).
+    // Accounts (WalletCommands.cpp).
     void AddAccount();
     void UpdateAccount();
     void RemoveAccount();
     void AccountSelection();
 
-    // Operations (OperationCommands.cpp).
-    void UpdateOperationTotal();
-    void AddOperation();
-    void UpdateOperation();
-    void RemoveOperation();
-    void SelectOperation();
-    void ChangeOperationType(const String& type); // OperationOffers.cpp
+    // Operations.
+    void UpdateOperationTotal() { operations_->updateTotal(); }
+    void AddOperation() { operations_->add(); }
+    void UpdateOperation() { operations_->update(); }
+    void RemoveOperation() { operations_->remove(); }
+    void SelectOperation() { operations_->showSelected(); }
+    void ChangeOperationType(const String& type) { operations_->changeType(type); }
 
 private:
     friend class StateHold;
 
     void makePages();
-    void makePanels();
-    /// Asks in an alert titled "Warning". @return true for "Continue".
-    static bool confirm(const char* question);
     /// Tells the wallet of the currencies and markets that there are now; to be called whenever they have changed.
+    /// Names are looked up among them, so between two commands they are those of the catalogue.
     void refreshWalletCatalogue();
+    void removeMarkets(const Currency& currency);
     void showParameters();
     void showAccounts();
-
-    // FileCommands.cpp
-    void replaceWallet();
-    void loadMarkets(FILE* file, const String& path);
-    void loadWallet(FILE* file, const String& path);
-    /// Has the panel open in the folder of market files, or in that of portfolios.
-    void showFolder(BFilePanel& panel, bool isMarkets);
-
-    // AccountCommands.cpp
     /// Null, after a message, when there is none.
     Account* selectedAccount();
 
-    // OperationCommands.cpp
-    // These make an operation as the page says; null, after a message or in silence, when it says none.
-    Operation* makeOperation();
-    Operation* makeTransfer(const Date& date, Account* from);
-    Operation* makeTrade(const Date& date, Account* account, bool isBuy);
-    Company* findCompany(const String& marketName, const String& ticker) const;
-    /// Values the portfolio with the operation just made, which replaces `former` unless that is null, and shows it.
-    void showMadeOperation(Operation* made, Operation* former);
-    /// Takes its row out first.
-    void destroyOperation(Operation* operation);
-    Operation* selectedOperation() const;
-    void showAccountOperation(const AccountOperation& operation);
-    void showTrade(const ShareOperation& trade);
-    void showCommonFields(const Operation& operation);
-
-    // OperationOffers.cpp
-    /// Brings what is offered on the operation page up to date with its fields, the quotes and the parameters.
-    void renewOffers();
-    void offerTransferQuotes(const Date& date);
-
     Catalogue catalogue_;
     std::unique_ptr<Wallet> wallet_;
-    State* state_ = nullptr;         // in the wallet
-    String marketPath_;              // of the file loaded or saved last; undefined before the first
-    bool isMarketPathAsked_ = false; // the next save asks for a name, whatever the path
-    String walletPath_;
-    DataFolder folder_;
-    std::unique_ptr<BFilePanel> openPanel_;
-    std::unique_ptr<BFilePanel> savePanel_;
+    State* state_ = nullptr; // in the wallet
     // The window's views own each other.
     MessageView* messageView_ = nullptr;
     BTabView* tabView_ = nullptr;
@@ -202,7 +170,12 @@ private:
     WalletView* walletView_ = nullptr;
     OperationView* operationView_ = nullptr;
     ParameterView* parameterView_ = nullptr;
+    std::unique_ptr<DataFiles> files_;
+    std::unique_ptr<QuoteEditor<Company>> companyQuotes_;
+    std::unique_ptr<QuoteEditor<Currency>> currencyQuotes_;
+    std::unique_ptr<EventEditor> events_;
+    std::unique_ptr<OperationEditor> operations_;
     std::unique_ptr<Shortcuts> shortcuts_;
-    int holds_ = 0;            // of the valuation
+    int holds_ = 0;            // of the valuation; 0 between two commands
     bool isUpdateDue_ = false; // it was asked for meanwhile
 };

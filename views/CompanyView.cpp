@@ -1,17 +1,11 @@
 #include "views/CompanyView.h"
 
+#include "foundation/NumberText.h"
 #include "platform/Box.h"
 #include "platform/CheckBox.h"
-#include "platform/Message.h"
 #include "platform/StringView.h"
-#include "platform/TextControl.h"
-#include "views/CompanyListView.h"
-#include "views/EventBox.h"
 #include "views/Look.h"
-#include "views/MarketListView.h"
-#include "views/NumberControl.h"
-#include "views/QuoteBox.h"
-#include "views/QuoteChart.h"
+#include "views/ModelText.h"
 
 using namespace look;
 
@@ -30,7 +24,7 @@ constexpr float kChartTop = kQuotesEnd + kMargin;
 
 } // namespace
 
-CompanyView::CompanyView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
+CompanyView::CompanyView(BRect frame, const char* name, BWindow*) : SeriesPage(frame, name)
 {
     addLoadAndSave(this);
     makeMarkets({kMargin, kListsTop, kMarketsEnd, kListsEnd});
@@ -38,8 +32,7 @@ CompanyView::CompanyView(BRect frame, const char* name, BWindow*) : PageView(fra
     makeQuotes({kMargin, kQuotesTop, kQuotesRight, kQuotesEnd});
     events_ = new EventBox({kQuotesRight + kMargin, kQuotesTop, kRight, kQuotesEnd});
     AddChild(events_);
-    chart_ = new QuoteChart({kMargin, kChartTop, kRight, kPageHeight - kMargin});
-    AddChild(chart_);
+    addChart({kMargin, kChartTop, kRight, kPageHeight - kMargin});
 }
 
 void CompanyView::makeMarkets(BRect frame)
@@ -104,24 +97,148 @@ void CompanyView::makeCompanies(BRect frame)
 
 void CompanyView::makeQuotes(BRect frame)
 {
-    quotes_ = new QuoteBox(frame, "Quotes", {'CQSe', 'CTQd', 'CTQv', 'CBAq', 'CBUq', 'CBRq'});
-    AddChild(quotes_);
-    const BRect area = quotes_->freeArea();
+    QuoteBox* box = addQuotes(frame, "Quotes", {'CQSe', 'CTQd', 'CTQv', 'CBAq', 'CBUq', 'CBRq'});
+    const BRect area = box->freeArea();
     float top = area.top + kMargin;
     auto* title = new BStringView({area.left, top, area.right, top + kFieldHeight}, "", "Split of the selected quotes");
-    quotes_->AddChild(title);
+    box->AddChild(title);
     top += kFieldHeight;
     constexpr float kFirst = 44 + 34;
     constexpr float kSecond = 22 + 34;
-    splitNumerator_ = addTypedNumber(quotes_, {area.left, top + 1, area.left + kFirst, top + 1 + kFieldHeight},
+    splitNumerator_ = addTypedNumber(box, {area.left, top + 1, area.left + kFirst, top + 1 + kFieldHeight},
                                      "txtSplitRangeNum", "Factor", 'CTSp', 44);
     splitDenominator_ =
-        addTypedNumber(quotes_, {area.left + kFirst, top + 1, area.left + kFirst + kSecond, top + 1 + kFieldHeight},
+        addTypedNumber(box, {area.left + kFirst, top + 1, area.left + kFirst + kSecond, top + 1 + kFieldHeight},
                        "txtSplitRangeDenum", "to", 'CTSp', 22);
-    addButton(quotes_, {area.left + kFirst + kSecond + kGap, top, area.right, top + kButtonHeight}, "btnSplitQuotes",
+    addButton(box, {area.left + kFirst + kSecond + kGap, top, area.right, top + kButtonHeight}, "btnSplitQuotes",
               "Split", 'CBSq');
-    withSafe_ = addCheckBox(quotes_, {area.left, area.bottom - kFieldHeight, area.right, area.bottom}, "cbWithSafe",
+    withSafe_ = addCheckBox(box, {area.left, area.bottom - kFieldHeight, area.right, area.bottom}, "cbWithSafe",
                             "With Safe", 'CCWs');
-    explain(*quotes_, {{"btnSplitQuotes", "Multiplies the selected quotes; operations stay as they are"},
-                       {"cbWithSafe", "Shades a band of one standard deviation of the quotes about the trend"}});
+    explain(*box, {{"btnSplitQuotes", "Multiplies the selected quotes; operations stay as they are"},
+                   {"cbWithSafe", "Shades a band of one standard deviation of the quotes about the trend"}});
+}
+
+void CompanyView::AddMarket(Market* market, bool selected)
+{
+    markets_->add(market);
+    if (selected)
+        markets_->select(market);
+}
+
+void CompanyView::DeleteMarket(Market* market)
+{
+    markets_->remove(market);
+    // Its companies go with it, and so do the quotes and events of the one that is selected.
+    if (market == shownMarket_)
+        SetCompanyList(nullptr);
+}
+
+void CompanyView::SetMarketList(const std::vector<Market*>& markets)
+{
+    markets_->setAll(markets);
+    // The market whose companies were shown may be gone, and another one at its address.
+    SetCompanyList(nullptr);
+}
+
+void CompanyView::setRelativeDailyChange(float change)
+{
+    relativeDailyChange_->SetText(finePercentText(change).c_str());
+}
+
+void CompanyView::setDiffWithAverage(float difference)
+{
+    diffWithAverage_->SetText(percentText(difference).c_str());
+}
+
+void CompanyView::AddCompany(Company* company, bool selected)
+{
+    markets_->InvalidateItems(); // they count their companies
+    const Market* market = company->market();
+    if (market == nullptr || market != shownMarket_)
+        return;
+    companies_->add(company);
+    if (selected)
+        companies_->select(company);
+}
+
+void CompanyView::ModifyCompany(Company* company)
+{
+    companies_->modify(company);
+    // Of a company that is not shown, list and chart come when it is selected.
+    if (!isShown(company))
+        return;
+    SetQuoteList(company);
+    UpdateQuotesChart();
+}
+
+void CompanyView::DeleteCompany(Company* company)
+{
+    companies_->remove(company);
+    markets_->InvalidateItems();
+    // No row of a quote or an event outlives the company that owns them.
+    if (isShown(company))
+        SetQuoteList(nullptr);
+    if (company == eventsOf_)
+        SetCompanyEventList(nullptr);
+}
+
+void CompanyView::SetCompanyList(Market* market)
+{
+    if (market != shownMarket_)
+        companies_->clear(); // what is selected in it is not to be found again
+    shownMarket_ = market;
+    std::vector<Company*> companies;
+    if (market != nullptr)
+        companies.assign(market->companies().begin(), market->companies().end());
+    companies_->setAll(companies);
+    // Quotes and events stay only when the company that they are of is selected here still.
+    const Company* selected = GetSelectedCompany();
+    if (selected == nullptr || !isShown(selected)) {
+        SetQuoteList(nullptr);
+        SetCompanyEventList(nullptr);
+    }
+}
+
+double CompanyView::getSplitFactor() const
+{
+    const double denominator = splitDenominator_->getNumber();
+    return denominator != 0 ? splitNumerator_->getNumber() / denominator : 0;
+}
+
+void CompanyView::fillChart(QuoteChart& chart, const Company& company) const
+{
+    const String unit = company.getCurrencyRepresentation();
+    chart.showSeries(company, textOf(company.getAbbreviation()), unit.isUndefined() ? "???" : textOf(unit),
+                     withSafe_->Value() == B_CONTROL_ON);
+}
+
+CompanyEvent** CompanyView::GetAllSelectedCompanyEvents(int* n) const
+{
+    return newArrayOf<CompanyEvent>(events_->list().allSelected(), n);
+}
+
+void CompanyView::AddCompanyEvent(CompanyEvent* event, bool selected)
+{
+    const Company* company = event->company();
+    if (company == nullptr || company != eventsOf_)
+        return;
+    events_->list().insert(event);
+    if (selected)
+        events_->list().select(event);
+}
+
+void CompanyView::DeleteCompanyEvents(std::span<CompanyEvent* const> events)
+{
+    events_->list().removeAll({events.begin(), events.end()});
+}
+
+void CompanyView::SetCompanyEventList(Company* company)
+{
+    if (company != eventsOf_)
+        events_->list().clear(); // what is selected in it is not to be found again
+    eventsOf_ = company;
+    std::vector<CompanyEvent*> events;
+    if (company != nullptr)
+        events.assign(company->events().begin(), company->events().end());
+    events_->list().showAll(events);
 }

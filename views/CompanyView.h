@@ -1,106 +1,93 @@
 #pragma once
 
-#include "foundation/Date.h"
-#include "foundation/String.h"
-#include "views/PageView.h"
+#include "platform/TextControl.h"
+#include "views/CompanyEventListView.h"
+#include "views/CompanyListView.h"
+#include "views/EventBox.h"
+#include "views/MarketListView.h"
+#include "views/SeriesPage.h"
 
 #include <vector>
 
-class BListView;
-class Company;
-class CompanyEvent;
-class CompanyListView;
-class CompanyQuote;
-class EventBox;
-class Market;
-class MarketListView;
-class QuoteBox;
-class QuoteChart;
-
 /// The page of markets and companies, with the quotes and events of the selected company.
 ///
-/// A row is taken out by `Delete...` before its object is destroyed. What is told of an object that is not shown has
-/// no effect.
-class CompanyView final : public PageView {
+/// The companies are those of one market, quotes and events those of one company, which need not be selected any more.
+/// So the page keeps whose rows it shows, and what is told of an object that is not shown has no effect. A row is taken
+/// out by `Delete...` before its object is destroyed.
+class CompanyView final : public SeriesPage<Company> {
 public:
     CompanyView(BRect frame, const char* name, BWindow* window);
 
     // Markets.
-    String getMarketName() const;
-    void setMarketName(const String& name);
+    String getMarketName() const { return marketName_->Text(); }
+    void setMarketName(const String& name) { showText(*marketName_, name); }
     /// The symbol as it was typed.
-    String getMarketCurrencyRepresentation() const;
-    void setMarketCurrencyRepresentation(const String& representation);
+    String getMarketCurrencyRepresentation() const { return marketCurrency_->Text(); }
+    void setMarketCurrencyRepresentation(const String& symbol) { showText(*marketCurrency_, symbol); }
     /// Null when none is selected, like all of these.
-    Market* GetSelectedMarket() const;
+    Market* GetSelectedMarket() const { return markets_->selected(); }
     void AddMarket(Market* market, bool selected);
-    void ModifyMarket(Market* market);
+    void ModifyMarket(Market* market) { markets_->modify(market); }
     /// Empties the lists of what belongs to the market, too.
     void DeleteMarket(Market* market);
     /// Fills the market list; the company list becomes empty.
     void SetMarketList(const std::vector<Market*>& markets);
 
     // Companies of the selected market.
-    String getCompanyName() const;
-    void setCompanyName(const String& name);
+    String getCompanyName() const { return companyName_->Text(); }
+    void setCompanyName(const String& name) { showText(*companyName_, name); }
     /// The ticker.
-    String getCompanyAbbreviation() const;
-    void setCompanyAbbreviation(const String& abbreviation);
+    String getCompanyAbbreviation() const { return abbreviation_->Text(); }
+    void setCompanyAbbreviation(const String& abbreviation) { showText(*abbreviation_, abbreviation); }
     /// Both as fractions of the trend; shown as percentages.
     void setRelativeDailyChange(float change);
     void setDiffWithAverage(float difference);
-    Company* GetSelectedCompany() const;
+    /// Puts into these two how much the trend line of `series` rises in a day, and how far the last quote stands above
+    /// it, both in proportion to the line on the day of that quote. A trend of 0 is not guarded against: the fields
+    /// then say that there is no number.
+    template <class Series>
+    void showTrend(const Series& series)
+    {
+        const Date last = series.getLastQuote();
+        const double trend = series.getPrevisionQuote(last);
+        setRelativeDailyChange(static_cast<float>(series.getPente() / trend));
+        setDiffWithAverage(static_cast<float>((series.getRealQuote(last) - trend) / trend));
+    }
+    Company* GetSelectedCompany() const { return companies_->selected(); }
+    Company* selectedSeries() const override { return GetSelectedCompany(); }
     void AddCompany(Company* company, bool selected);
     /// Its quotes may have changed, too.
     void ModifyCompany(Company* company);
     void DeleteCompany(Company* company);
     /// Shows the companies of `market`; null shows none.
     void SetCompanyList(Market* market);
-    BListView* getCompanyListView() const;
-
-    // Quotes of the selected company.
-    Date getQuoteDate() const;
-    void setQuoteDate(const Date& date);
-    float getQuoteValue() const;
-    void setQuoteValue(float value);
+    BListView* getCompanyListView() const { return companies_; }
     /// What quotes are multiplied by in a split, from its two fields; 0 while they hold none.
     double getSplitFactor() const;
-    CompanyQuote* GetSelectedQuote() const;
-    /// @return a new array, by date; the caller deletes it.
-    CompanyQuote** getAllSelectedQuotes(int* n) const;
-    void AddQuote(CompanyQuote* quote);
-    void ModifyQuote(CompanyQuote* quote);
-    void DeleteQuote(CompanyQuote* quote);
-    /// The same for many at once.
-    void DeleteQuotes(CompanyQuote* const* quotes, int n);
-    /// Shows the quotes of `company`, which stay as they are when they are shown already; null shows none.
-    void SetQuoteList(Company* company);
-    /// Draws the quotes of the selected company anew.
-    void UpdateQuotesChart();
 
     // Events of the selected company.
     /// 1 split, 2 note.
-    short getEventType() const;
+    short getEventType() const { return events_->getType(); }
     /// Shows the fields of that kind.
-    void SetEventType(short type);
-    Date getCompanyEventDate() const;
-    void setCompanyEventDate(const Date& date);
-    String getCompanyEventTitle() const;
-    void setCompanyEventTitle(const String& title);
-    String getCompanyEventText() const;
-    void setCompanyEventText(const String& text);
-    short getCompanyEventNumerator() const;
-    void setCompanyEventNumerator(short numerator);
-    short getCompanyEventDivider() const;
-    void setCompanyEventDivider(short divider);
-    CompanyEvent* GetSelectedCompanyEvent() const;
+    void SetEventType(short type) { events_->setType(type); }
+    Date getCompanyEventDate() const { return events_->getDate(); }
+    void setCompanyEventDate(const Date& date) { events_->setDate(date); }
+    String getCompanyEventTitle() const { return events_->getTitle(); }
+    void setCompanyEventTitle(const String& title) { events_->setTitle(title); }
+    String getCompanyEventText() const { return events_->getText(); }
+    void setCompanyEventText(const String& text) { events_->setText(text); }
+    short getCompanyEventNumerator() const { return events_->getNumerator(); }
+    void setCompanyEventNumerator(short numerator) { events_->setNumerator(numerator); }
+    short getCompanyEventDivider() const { return events_->getDivider(); }
+    void setCompanyEventDivider(short divider) { events_->setDivider(divider); }
+    CompanyEvent* GetSelectedCompanyEvent() const { return events_->list().selected(); }
     /// @return a new array, by date; the caller deletes it.
     CompanyEvent** GetAllSelectedCompanyEvents(int* n) const;
     void AddCompanyEvent(CompanyEvent* event, bool selected);
-    void ModifyCompanyEvent(CompanyEvent* event);
-    void DeleteCompanyEvent(CompanyEvent* event);
+    void ModifyCompanyEvent(CompanyEvent* event) { events_->list().update(event); }
+    void DeleteCompanyEvent(CompanyEvent* event) { DeleteCompanyEvents({&event, 1}); }
     /// The same for many at once.
-    void DeleteCompanyEvents(CompanyEvent* const* events, int n);
+    void DeleteCompanyEvents(std::span<CompanyEvent* const> events);
     /// Shows the events of `company`; null shows none.
     void SetCompanyEventList(Company* company);
 
@@ -108,6 +95,7 @@ private:
     void makeMarkets(BRect frame);
     void makeCompanies(BRect frame);
     void makeQuotes(BRect frame);
+    void fillChart(QuoteChart& chart, const Company& company) const override;
 
     MarketListView* markets_ = nullptr;
     BTextControl* marketName_ = nullptr;
@@ -117,12 +105,10 @@ private:
     BTextControl* companyName_ = nullptr;
     BTextControl* relativeDailyChange_ = nullptr;
     BTextControl* diffWithAverage_ = nullptr;
-    QuoteBox* quotes_ = nullptr;
     NumberControl* splitNumerator_ = nullptr;
     NumberControl* splitDenominator_ = nullptr;
     BCheckBox* withSafe_ = nullptr;
     EventBox* events_ = nullptr;
-    QuoteChart* chart_ = nullptr;
 
     // Whose rows the lists show; never looked into when they are not selected.
     const Market* shownMarket_ = nullptr;

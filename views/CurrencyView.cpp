@@ -1,18 +1,8 @@
 #include "views/CurrencyView.h"
 
-#include "market/Currency.h"
-#include "market/Market.h"
 #include "platform/Box.h"
-#include "platform/Message.h"
-#include "platform/TextControl.h"
-#include "views/CurrencyListView.h"
 #include "views/Look.h"
-#include "views/MarketListView.h"
 #include "views/ModelText.h"
-#include "views/QuoteBox.h"
-#include "views/QuoteChart.h"
-#include "views/QuoteListView.h"
-#include "views/Selection.h"
 
 using namespace look;
 
@@ -30,16 +20,14 @@ constexpr float kChartTop = kQuotesEnd + kMargin;
 
 } // namespace
 
-CurrencyView::CurrencyView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
+CurrencyView::CurrencyView(BRect frame, const char* name, BWindow*) : SeriesPage(frame, name)
 {
     addLoadAndSave(this);
     makeCurrencies({kMargin, kCurrenciesTop, kRight, kCurrenciesEnd});
     makeMarkets({kMargin, kQuotesTop, kQuotesLeft - kMargin, kQuotesEnd});
-    quotes_ = new QuoteBox({kQuotesLeft, kQuotesTop, kRight, kQuotesEnd}, "Rates in the reference currency",
-                           {'RQSe', 'RTQd', 'RTQv', 'RBAq', 'RBUq', 'RBRq'});
-    AddChild(quotes_);
-    chart_ = new QuoteChart({kMargin, kChartTop, kRight, kPageHeight - kMargin});
-    AddChild(chart_);
+    addQuotes({kQuotesLeft, kQuotesTop, kRight, kQuotesEnd}, "Rates in the reference currency",
+              {'RQSe', 'RTQd', 'RTQv', 'RBAq', 'RBUq', 'RBRq'});
+    addChart({kMargin, kChartTop, kRight, kPageHeight - kMargin});
 }
 
 void CurrencyView::makeCurrencies(BRect frame)
@@ -89,38 +77,12 @@ void CurrencyView::makeMarkets(BRect frame)
     markets_->addTo(box, {kBoxSide, kBoxTop, kBoxSide + width, frame.Height() - kBoxSide}, "Markets");
 }
 
-// --- Currencies.
-
-String CurrencyView::getCurrencyName() const
-{
-    return name_->Text();
-}
-
-void CurrencyView::setCurrencyName(const String& name)
-{
-    showText(*name_, name);
-}
-
-String CurrencyView::getCurrencyRepresentation() const
-{
-    return representation_->Text();
-}
-
-void CurrencyView::setCurrencyRepresentation(const String& representation)
-{
-    showText(*representation_, representation);
-}
-
 void CurrencyView::setCurrencyRefName(const String& name)
 {
     showText(*referenceName_, name);
+    // With the reference all rates have changed, those in the lists as well.
     currencies_->InvalidateItems();
-    quotes_->list().InvalidateItems();
-}
-
-Currency* CurrencyView::GetSelectedCurrency() const
-{
-    return currencies_->selected();
+    redrawQuotes();
 }
 
 void CurrencyView::AddCurrency(Currency* currency, bool selected)
@@ -138,115 +100,37 @@ void CurrencyView::ModifyCurrency(Currency* currency)
 
 void CurrencyView::DeleteCurrency(Currency* currency)
 {
+    // The rows stand in the order of the catalogue, before and after: there, too, the last one takes the free place.
     const int32 place = currencies_->indexOf(currency);
     currencies_->remove(currency);
     const int32 last = currencies_->CountItems() - 1;
     if (place >= 0 && place < last)
         currencies_->move(last, place);
+    // No row of a market or a rate outlives the currency that owns them.
     if (currency == marketsOf_)
         SetMarketList(nullptr);
-    if (quotes_->isOf(currency))
+    if (isShown(currency))
         SetQuoteList(nullptr);
 }
-
-// --- Markets.
 
 void CurrencyView::SetMarketList(Currency* currency)
 {
     marketsOf_ = currency;
-    unsigned n = 0;
-    Market** markets = currency != nullptr ? currency->getAllMarkets(&n) : nullptr;
-    markets_->setAll({markets, markets + n});
+    std::vector<Market*> markets;
+    if (currency != nullptr)
+        markets.assign(currency->markets().begin(), currency->markets().end());
+    markets_->setAll(markets);
 }
 
 void CurrencyView::AddMarket(Market* market)
 {
-    Currency* currency;
-    if (market->getCurrency(&currency) == 0 && currency == marketsOf_)
+    const Currency* currency = market->currency();
+    if (currency != nullptr && currency == marketsOf_)
         markets_->add(market);
 }
 
-void CurrencyView::ModifyMarket(Market* market)
+void CurrencyView::fillChart(QuoteChart& chart, const Currency& currency) const
 {
-    markets_->modify(market);
-}
-
-void CurrencyView::DeleteMarket(Market* market)
-{
-    markets_->remove(market);
-}
-
-// --- Rates.
-
-Date CurrencyView::getQuoteDate() const
-{
-    return quotes_->getDate();
-}
-
-void CurrencyView::setQuoteDate(const Date& date)
-{
-    quotes_->setDate(date);
-}
-
-float CurrencyView::getQuoteValue() const
-{
-    return quotes_->getValue();
-}
-
-void CurrencyView::setQuoteValue(float value)
-{
-    quotes_->setValue(value);
-}
-
-CurrencyQuote* CurrencyView::GetSelectedQuote() const
-{
-    return static_cast<CurrencyQuote*>(quotes_->list().selected());
-}
-
-CurrencyQuote** CurrencyView::getAllSelectedQuotes(int* n) const
-{
-    return newArrayOf<CurrencyQuote>(quotes_->list().allSelected(), n);
-}
-
-void CurrencyView::AddQuote(CurrencyQuote* quote)
-{
-    Currency* currency;
-    if (quote->getCurrency(&currency) == 0 && quotes_->isOf(currency))
-        quotes_->list().insert(quote);
-    currencies_->InvalidateItems(); // they show their latest rate
-}
-
-void CurrencyView::ModifyQuote(CurrencyQuote* quote)
-{
-    quotes_->list().update(quote);
-    currencies_->InvalidateItems();
-}
-
-void CurrencyView::DeleteQuote(CurrencyQuote* quote)
-{
-    DeleteQuotes(&quote, 1);
-}
-
-void CurrencyView::DeleteQuotes(CurrencyQuote* const* quotes, int n)
-{
-    quotes_->list().removeAll({quotes, quotes + n});
-    currencies_->InvalidateItems();
-}
-
-void CurrencyView::SetQuoteList(Currency* currency)
-{
-    quotes_->showQuotes(currency);
-    if (currency == nullptr)
-        UpdateQuotesChart();
-}
-
-void CurrencyView::UpdateQuotesChart()
-{
-    const Currency* currency = GetSelectedCurrency();
-    if (currency == nullptr) {
-        chart_->showNothing();
-        return;
-    }
     const std::string reference = textOf(referenceName_->Text());
-    chart_->showSeries(*currency, textOf(currency->getRepresentation()), reference.empty() ? "???" : reference, false);
+    chart.showSeries(currency, textOf(currency.getRepresentation()), reference.empty() ? "???" : reference, false);
 }

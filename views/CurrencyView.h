@@ -1,34 +1,29 @@
 #pragma once
 
-#include "foundation/Date.h"
-#include "foundation/String.h"
-#include "views/PageView.h"
-
-class Currency;
-class CurrencyListView;
-class CurrencyQuote;
-class Market;
-class MarketListView;
-class QuoteBox;
-class QuoteChart;
+#include "platform/TextControl.h"
+#include "views/CurrencyListView.h"
+#include "views/MarketListView.h"
+#include "views/SeriesPage.h"
 
 /// The page of currencies, with the markets and rates of the selected currency.
 ///
-/// A row is taken out by `Delete...` before its object is destroyed. What is told of an object that is not shown has
-/// no effect.
-class CurrencyView final : public PageView {
+/// Markets and rates are those of one currency, which need not be selected any more. So the page keeps whose rows it
+/// shows, and what is told of an object that is not shown has no effect. A row is taken out by `Delete...` before its
+/// object is destroyed.
+class CurrencyView final : public SeriesPage<Currency> {
 public:
     CurrencyView(BRect frame, const char* name, BWindow* window);
 
-    String getCurrencyName() const;
-    void setCurrencyName(const String& name);
+    String getCurrencyName() const { return name_->Text(); }
+    void setCurrencyName(const String& name) { showText(*name_, name); }
     /// The symbol.
-    String getCurrencyRepresentation() const;
-    void setCurrencyRepresentation(const String& representation);
+    String getCurrencyRepresentation() const { return representation_->Text(); }
+    void setCurrencyRepresentation(const String& representation) { showText(*representation_, representation); }
     /// Shows the name of the reference currency. Its rates and those of the others may have changed with it.
     void setCurrencyRefName(const String& name);
     /// Null when none is selected.
-    Currency* GetSelectedCurrency() const;
+    Currency* GetSelectedCurrency() const { return currencies_->selected(); }
+    Currency* selectedSeries() const override { return GetSelectedCurrency(); }
     void AddCurrency(Currency* currency, bool selected);
     void ModifyCurrency(Currency* currency);
     /// Takes the row out, the last one moves into its place.
@@ -38,39 +33,20 @@ public:
     /// Null shows none.
     void SetMarketList(Currency* currency);
     void AddMarket(Market* market);
-    void ModifyMarket(Market* market);
-    void DeleteMarket(Market* market);
-
-    // Rates of the selected currency.
-    Date getQuoteDate() const;
-    void setQuoteDate(const Date& date);
-    float getQuoteValue() const;
-    void setQuoteValue(float value);
-    /// Null when none is selected.
-    CurrencyQuote* GetSelectedQuote() const;
-    /// @return a new array, by date; the caller deletes it.
-    CurrencyQuote** getAllSelectedQuotes(int* n) const;
-    void AddQuote(CurrencyQuote* quote);
-    void ModifyQuote(CurrencyQuote* quote);
-    void DeleteQuote(CurrencyQuote* quote);
-    /// The same for many at once.
-    void DeleteQuotes(CurrencyQuote* const* quotes, int n);
-    /// Shows the rates of `currency`, which stay as they are when they are shown already; null shows none.
-    void SetQuoteList(Currency* currency);
-    /// Draws the rates of the selected currency anew.
-    void UpdateQuotesChart();
+    void ModifyMarket(Market* market) { markets_->modify(market); }
+    void DeleteMarket(Market* market) { markets_->remove(market); }
 
 private:
     void makeCurrencies(BRect frame);
     void makeMarkets(BRect frame);
+    void fillChart(QuoteChart& chart, const Currency& currency) const override;
+    void noteQuoteChange() override { currencies_->InvalidateItems(); } // they show their latest rate
 
     CurrencyListView* currencies_ = nullptr;
     BTextControl* name_ = nullptr;
     BTextControl* representation_ = nullptr;
     BTextControl* referenceName_ = nullptr;
     MarketListView* markets_ = nullptr;
-    QuoteBox* quotes_ = nullptr;
-    QuoteChart* chart_ = nullptr;
 
     const Currency* marketsOf_ = nullptr; // whose markets are listed; never looked into
 };

@@ -1,11 +1,20 @@
 #include "views/QuoteBox.h"
 
-#include "views/DateControl.h"
+#include "foundation/NumberText.h"
+#include "views/DateText.h"
 #include "views/Look.h"
-#include "views/NumberControl.h"
 #include "views/PageView.h"
 
 using namespace look;
+
+Cell QuoteItem::cell(int column) const
+{
+    return {column == 0 ? dateText(quote_->getDate()) : exactText(quote_->getValue())};
+}
+
+QuoteListView::QuoteListView(const char* name)
+    : DatedListView({}, name, B_MULTIPLE_SELECTION_LIST, {{"Date", 82}, {"Value", 96, B_ALIGN_RIGHT}})
+{}
 
 QuoteBox::QuoteBox(BRect frame, const char* title, const Codes& codes) : BBox(frame, "")
 {
@@ -31,24 +40,4 @@ QuoteBox::QuoteBox(BRect frame, const char* title, const Codes& codes) : BBox(fr
                           {"btnUpdateQuote", "Update", codes.update},
                           {"btnRemoveQuote", "Remove", codes.remove}});
     freeArea_ = {kLeft, top + kButtonHeight + kMargin, right, bottom};
-}
-
-Date QuoteBox::getDate() const
-{
-    return date_->getDate();
-}
-
-void QuoteBox::setDate(const Date& date)
-{
-    date_->setDate(date);
-}
-
-float QuoteBox::getValue() const
-{
-    return value_->getNumber();
-}
-
-void QuoteBox::setValue(float value)
-{
-    value_->setNumber(value);
 }

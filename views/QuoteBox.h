@@ -1,14 +1,35 @@
 #pragma once
 
-#include "foundation/Date.h"
+#include "market/Quote.h"
 #include "platform/Box.h"
-#include "platform/SupportDefs.h"
-#include "views/QuoteListView.h"
+#include "views/DateControl.h"
+#include "views/DatedListView.h"
+#include "views/NumberControl.h"
 
-class DateControl;
-class NumberControl;
+/// A day and the value of that day.
+class QuoteItem final : public ColumnItem {
+public:
+    explicit QuoteItem(Quote* quote) : quote_(quote) {}
+
+    Quote* object() const { return quote_; }
+    const void* key() const { return quote_; }
+    void release() { quote_ = nullptr; }
+    Cell cell(int column) const override;
+
+private:
+    Quote* quote_;
+};
+
+/// The quotes of a company or the rates of a currency, by date; several can be selected.
+class QuoteListView final : public DatedListView<Quote, QuoteItem> {
+public:
+    explicit QuoteListView(const char* name);
+};
 
 /// A list of quotes with the fields and buttons to add, change and remove them.
+///
+/// The rows are those of one series. Its address is kept to tell it from others and never looked into, so the series
+/// may be gone before the list is emptied, as long as the rows are not drawn.
 class QuoteBox final : public BBox {
 public:
     /// What is sent by the list, by the fields, and by the buttons.
@@ -30,11 +51,12 @@ public:
     {
         const bool isOther = !isOf(series);
         if (isOther)
-            list_->clear();
+            list_->clear(); // before the address changes: what was selected is not to be found again
         series_ = series;
-        unsigned n = 0;
-        const auto quotes = series != nullptr ? series->getAllQuotes(&n) : nullptr;
-        list_->showAll({quotes, quotes + n});
+        std::vector<Quote*> quotes;
+        if (series != nullptr)
+            quotes.assign(series->quotes().begin(), series->quotes().end());
+        list_->showAll(std::move(quotes));
         if (isOther)
             list_->ScrollTo(list_->CountItems() - 1); // the latest quote
     }
@@ -42,10 +64,10 @@ public:
     bool isOf(const void* series) const { return series == series_; }
 
     /// Undefined while the text is no date.
-    Date getDate() const;
-    void setDate(const Date& date);
-    float getValue() const;
-    void setValue(float value);
+    Date getDate() const { return date_->getDate(); }
+    void setDate(const Date& date) { date_->setDate(date); }
+    float getValue() const { return value_->getNumber(); }
+    void setValue(float value) { value_->setNumber(value); }
 
     /// What is left free for more controls, in the box's coordinates.
     BRect freeArea() const { return freeArea_; }

@@ -1,0 +1,58 @@
+#pragma once
+
+#include "app/DataFolder.h"
+#include "foundation/String.h"
+#include "platform/FilePanel.h"
+
+#include <cstdio>
+#include <optional>
+
+class BMessage;
+class BTabView;
+class PLWindow;
+
+/// The commands on files: asking for one in a panel, loading and saving it. The tab that is in front decides which kind
+/// of file a command is about.
+///
+/// Of each kind the file loaded or saved last is remembered, and saved to without asking. That file is whole: what was
+/// read of a damaged one is never written over it unasked.
+class DataFiles {
+public:
+    /// The panels open in `folder`, and it keeps the files that are replaced. Window and tabs outlive this.
+    DataFiles(PLWindow& window, const BTabView& tabs, const DataFolder& folder);
+
+    /// Asks whether what is here may go, and shows the open panel; while the window closes, without a question.
+    void askForLoad();
+    /// The answer of the open panel: loads the file, and the portfolio goes in any case.
+    void load(BMessage* message);
+    /// Saves to the file that is remembered, or shows the save panel.
+    void saveOrAsk();
+    /// The answer of the save panel. @return `B_OK`; what is missing in the message.
+    status_t save(BMessage* message);
+    void save(const String& path);
+    /// The next save of the portfolio asks for a name.
+    void forgetWallet() { wallet_ = {}; }
+
+private:
+    enum class Kind { kMarkets, kWallet };
+    struct Remembered {
+        String path;          // undefined before the first file
+        bool isAsked = false; // the next save asks for a name, whatever the path
+    };
+
+    /// That of the tab in front; the operation and the parameter page have none.
+    std::optional<Kind> kindInFront() const;
+    Remembered& remembered(Kind kind) { return kind == Kind::kMarkets ? markets_ : wallet_; }
+    /// Has the panel open in the folder of that kind.
+    void showFolder(BFilePanel& panel, Kind kind);
+    void loadMarkets(std::FILE* file, const char* path);
+    void loadWallet(std::FILE* file, const char* path);
+
+    PLWindow& window_;
+    const BTabView& tabs_;
+    DataFolder folder_;
+    Remembered markets_;
+    Remembered wallet_;
+    BFilePanel openPanel_;
+    BFilePanel savePanel_;
+};

@@ -1,0 +1,36 @@
+#pragma once
+
+#include "views/SeriesPage.h"
+
+class PLWindow;
+
+/// The commands on the quotes of the series that is selected on a page: of a company, or of a currency.
+///
+/// After each of them the chart shows the quotes that there are now, and the portfolio is valued by them. What a check
+/// refuses has changed nothing.
+template <class Series>
+class QuoteEditor {
+public:
+    /// `unselected` is what the status line says when no series is selected. Window and page outlive this.
+    QuoteEditor(PLWindow& window, SeriesPage<Series>& page, const char* unselected)
+        : window_(window), page_(page), unselected_(unselected)
+    {}
+
+    /// A quote that stands on that day already takes the value.
+    void add();
+    /// Gives the selected quote the day and the value of the page's fields.
+    void update();
+    /// Destroys all selected quotes.
+    void remove();
+    /// Puts the selected quote into the page's fields.
+    void showSelected();
+
+private:
+    using SeriesQuote = typename SeriesPage<Series>::SeriesQuote;
+
+    void showChange();
+
+    PLWindow& window_;
+    SeriesPage<Series>& page_;
+    const char* unselected_;
+};

@@ -1,0 +1,238 @@
+// The portfolio: its accounts, its parameters, its value.
+
+#include "app/Holds.h"
+#include "portfolio/Wallet.h"
+#include "valuation/AccountState.h"
+#include "valuation/Evolution.h"
+#include "valuation/State.h"
+#include "views/OperationView.h"
+#include "views/ParameterView.h"
+#include "views/WalletView.h"
+
+#include <algorithm>
+#include <iterator>
+
+namespace {
+
+/// How a parameter comes from its page, and whether the portfolio's value depends on it.
+struct Parameter {
+    uint32 code;
+    void (*store)(Wallet& wallet, const ParameterView& view);
+    bool revalues;
+};
+
+constexpr Parameter kParameters[] = {
+    // The fixed costs are only what a new operation starts with. Intended: each operation stores its own.
+    {'PTBc', [](Wallet& w, const ParameterView& v) { w.setBuyCost(v.getBuyCost()); }, false},
+    {'PTSc', [](Wallet& w, const ParameterView& v) { w.setSellCost(v.getSellCost()); }, false},
+    {'PTBr', [](Wallet& w, const ParameterView& v) { w.setBuyRateCost(v.getBuyRateCost()); }, true},
+    {'PTSr', [](Wallet& w, const ParameterView& v) { w.setSellRateCost(v.getSellRateCost()); }, true},
+    {'PTIn', [](Wallet& w, const ParameterView& v) { w.setInvestementPeriod(v.getInvestementPeriod()); }, true},
+    {'PTBp', [](Wallet& w, const ParameterView& v) { w.setBeginProfitSellRate(v.getBeginProfitSellRate()); }, true},
+    {'PTEp', [](Wallet& w, const ParameterView& v) { w.setEndProfitSellRate(v.getEndProfitSellRate()); }, true},
+    {'PTBl', [](Wallet& w, const ParameterView& v) { w.setBeginLoseSellRate(v.getBeginLoseSellRate()); }, true},
+    {'PTEl', [](Wallet& w, const ParameterView& v) { w.setEndLoseSellRate(v.getEndLoseSellRate()); }, true},
+    {'PTRe', [](Wallet& w, const ParameterView& v) { w.setReinvestRate(v.getReinvestRate()); }, true},
+};
+
+} // namespace
+
+void PLWindow::AddAccount()
+{
+    const String name = walletView_->getAccountName();
+    const String representation = walletView_->getAccountCurrency();
+    if (name.isUndefined() || representation.isUndefined())
+        return SetMessage("Please specify an account name and a currency.");
+    Currency* currency = getCurrencyByRepresentation(representation);
+    if (currency == nullptr)
+        return SetMessage("Unknown currency.");
+    // Intended: a name may be given twice; operations then go to the first account that bears it.
+    auto* account = new Account(name);
+    account->setCurrency(currency);
+    account->setWallet(wallet_.get()); // which owns it from here on
+    account->setDefaultTransferAccount(walletView_->isDefaultTransferAccount());
+    showAccounts();
+    UpdateState();
+}
+
+void PLWindow::UpdateAccount()
+{
+    const String name = walletView_->getAccountName();
+    const String representation = walletView_->getAccountCurrency();
+    if (name.isUndefined() || representation.isUndefined())
+        return SetMessage("Please specify an account name and a currency.");
+    Account* account = selectedAccount();
+    if (account == nullptr)
+        return;
+    // An account without currency has no symbol, which differs from any.
+    if (representation != account->getCurrencyRepresentation()) {
+        if (!confirm("This will modify the currency used in all attached operations"))
+            return;
+        if (Currency* currency = getCurrencyByRepresentation(representation))
+            account->setCurrency(currency);
+        else
+            SetMessage("Unknown currency."); // Intended: the new name is not lost for that.
+    }
+    account->setName(name);
+    account->setDefaultTransferAccount(walletView_->isDefaultTransferAccount());
+    showAccounts();
+    UpdateState();
+}
+
+void PLWindow::RemoveAccount()
+{
+    Account* account = selectedAccount();
+    if (account == nullptr || !confirm("This will delete all attached operations"))
+        return;
+    walletView_->SetAccountStateList(nullptr); // its states go with it
+    // The account takes its operations along, and the transfers it has received: all rows of these go first.
+    for (const Operation* operation : account->operations())
+        operationView_->RemoveOperation(operation);
+    for (const TransferAccountOperation* received : account->transferOperations())
+        operationView_->RemoveOperation(received);
+    delete account;
+    showAccounts();
+    UpdateState();
+}
+
+void PLWindow::AccountSelection()
+{
+    const AccountState* state = walletView_->GetSelectedAccountState();
+    if (state == nullptr)
+        return;
+    const Account* account = state->account();
+    if (account == nullptr)
+        return SetMessage("Error getting the selected account.");
+    walletView_->setAccountName(account->getName());
+    walletView_->setAccountCurrency(account->getCurrencyRepresentation());
+    walletView_->setDefaultTransferAccount(account->isDefaultTransferAccount());
+}
+
+Account* PLWindow::selectedAccount()
+{
+    const AccountState* state = walletView_->GetSelectedAccountState();
+    if (state == nullptr) {
+        SetMessage("You must select an account to update."); // Intended: the same for a removal.
+        return nullptr;
+    }
+    if (state->account() == nullptr)
+        SetMessage("Error accessing the account.");
+    return state->account();
+}
+
+void PLWindow::ChangeParameter(uint32 code)
+{
+    const auto* parameter = std::find_if(std::begin(kParameters), std::end(kParameters),
+                                         [&](const Parameter& p) { return p.code == code; });
+    if (parameter == std::end(kParameters))
+        return;
+    parameter->store(*wallet_, *parameterView_);
+    showParameters(); // what was understood, in place of what was typed
+    if (parameter->revalues)
+        UpdateState();
+    else
+        operations_->renewOffers();
+}
+
+void PLWindow::showParameters()
+{
+    parameterView_->setBuyCost(wallet_->getBuyCost());
+    parameterView_->setSellCost(wallet_->getSellCost());
+    parameterView_->setBuyRateCost(wallet_->getBuyRateCost());
+    parameterView_->setSellRateCost(wallet_->getSellRateCost());
+    parameterView_->setInvestementPeriod(wallet_->getInvestementPeriod());
+    parameterView_->setBeginProfitSellRate(wallet_->getBeginProfitSellRate());
+    parameterView_->setEndProfitSellRate(wallet_->getEndProfitSellRate());
+    parameterView_->setBeginLoseSellRate(wallet_->getBeginLoseSellRate());
+    parameterView_->setEndLoseSellRate(wallet_->getEndLoseSellRate());
+    parameterView_->setReinvestRate(wallet_->getReinvestRate());
+}
+
+void PLWindow::showAccounts()
+{
+    unsigned n;
+    Account** accounts = wallet_->getAllAccounts(&n);
+    operationView_->SetAccountsList(accounts, static_cast<int>(n));
+}
+
+void PLWindow::showWallet()
+{
+    showParameters();
+    showAccounts();
+    UpdateState();
+}
+
+void PLWindow::replaceWallet()
+{
+    // No row and no selection refers to the former portfolio any more when it goes.
+    SetState(nullptr);
+    walletView_->ClearEvolution();
+    walletView_->ForgetSelection();
+    operationView_->ForgetSelection();
+    wallet_ = std::make_unique<Wallet>();
+    releaseStateMemory(); // the next portfolio may be a small one
+    refreshWalletCatalogue();
+    showAccounts();
+}
+
+void PLWindow::ReinitWallet()
+{
+    replaceWallet();
+    files_->forgetWallet();
+    showWallet();
+}
+
+void PLWindow::UpdateState()
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    isUpdateDue_ = holds_ > 0;
+    if (isUpdateDue_)
+        return;
+
+    // The valuation destroys all states: no row shows one, and the window has none, until there is a new one.
+    walletView_->ClearState();
+    state_ = nullptr;
+    refreshWalletCatalogue();
+    const Date date = walletView_->getDate();
+    const bool isEvolutionAsked = walletView_->isComputeEvolution();
+    EvolutionOutcome outcome = EvolutionOutcome::Built;
+    State* state = refreshStates(*wallet_, date, operationView_->isPrevision(), isEvolutionAsked ? &outcome : nullptr);
+    if (state == nullptr) {
+        walletView_->ClearEvolution();
+        operationView_->DropRemovedOperations();
+        operations_->renewOffers();
+        return;
+    }
+    if (isEvolutionAsked)
+        walletView_->UpdateEvolution(*wallet_, catalogue_, outcome);
+    else
+        walletView_->ClearEvolution();
+    SetState(state);
+}
+
+void PLWindow::SetState(State* state)
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    state_ = state;
+    walletView_->SetState(state, catalogue_);
+    // The list is emptied and filled: automatic operations have come and gone with the valuation. A portfolio that is
+    // not shown has no operations to show either.
+    operationView_->ClearAllOperations();
+    if (state != nullptr) {
+        for (const Account* account : wallet_->accounts()) {
+            unsigned n;
+            Operation** operations = account->getAllOperations(&n);
+            operationView_->AddOperationList(operations, static_cast<int>(n));
+        }
+    }
+    operationView_->RecallSelection();
+    if (state != nullptr) {
+        operationView_->offerDate(state->getDate());
+        operations_->renewOffers();
+    }
+    CompanySelection();
+}
