@@ -14,8 +14,8 @@ class PLWindow;
 /// The commands on files: asking for one in a panel, loading and saving it. The tab that is in front decides which kind
 /// of file a command is about.
 ///
-/// Of each kind the file loaded or saved last is remembered, and saved to without asking. That file is whole: what was
-/// read of a damaged one is never written over it unasked.
+/// Of each kind the file loaded or saved last is remembered, and saved to without asking. A market file of which only a
+/// part could be read is not: the next save of the markets then asks.
 class DataFiles {
 public:
     /// The panels open in `folder`, and it keeps the files that are replaced. Window and tabs outlive this.

@@ -28,8 +28,7 @@ public:
 
 /// A list of quotes with the fields and buttons to add, change and remove them.
 ///
-/// The rows are those of one series. Its address is kept to tell it from others and never looked into, so the series
-/// may be gone before the list is emptied, as long as the rows are not drawn.
+/// The rows are those of one series, by date. Its address is kept to tell it from others, and never looked into.
 class QuoteBox final : public BBox {
 public:
     /// What is sent by the list, by the fields, and by the buttons.
