@@ -22,6 +22,7 @@ void PLWindow::AddCurrency()
 
 void PLWindow::AddCurrency(Currency* currency, bool selected)
 {
+    // Catalogue and page both put it last, so that the rows keep to the order of the catalogue.
     catalogue_.addCurrency(currency);
     currencyView_->AddCurrency(currency, selected);
     refreshWalletCatalogue();

@@ -38,6 +38,7 @@ DataFiles::DataFiles(PLWindow& window, const BTabView& tabs, const DataFolder& f
 
 std::optional<DataFiles::Kind> DataFiles::kindInFront() const
 {
+    // The order of the tabs is that of `PLWindow::makePages`.
     switch (tabs_.Selection()) {
     case 0:
     case 1:
@@ -180,6 +181,7 @@ void DataFiles::save(const String& path)
             return window_.catalogue().wrt(file, today());
         return wallet != nullptr ? wallet->wrt(file, today()) : 0; // without a wallet the file is left empty
     };
+    // Whatever fails, the path is that of the old file or of the new one, and never of a part.
     const auto result = DurableSave(folder_).save(path.getCharacterArray(), write);
     const char* text = "Currencies successfully saved...";
     if (result.outcome == DurableSave::Outcome::kOpenFailed)

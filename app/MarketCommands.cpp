@@ -95,6 +95,7 @@ void PLWindow::RemoveAllMarkets()
 
 void PLWindow::MarketSelection()
 {
+    // Without a selection the company list becomes empty, while the fields keep what they hold.
     Market* market = companyView_->GetSelectedMarket();
     if (market != nullptr) {
         companyView_->setMarketName(market->getName());
@@ -129,6 +130,7 @@ void PLWindow::UpdateCompany()
         // After the fetch, which asks for the ticker as it was. Intended: one button renames and brings up to date.
         company->setName(companyView_->getCompanyName());
         company->setAbbreviation(companyView_->getCompanyAbbreviation());
+        // All rows that show the name or the ticker are drawn again.
         companyView_->ModifyCompany(company);
         for (const Share* share : company->shares())
             for (ShareOperation* operation : share->shareOperations())
@@ -157,6 +159,7 @@ void PLWindow::RemoveCompany(Company* company, bool ask)
 
 void PLWindow::CompanySelection()
 {
+    // The lists and the chart follow the selection, also to nothing; the fields keep what they hold then.
     Company* company = companyView_->GetSelectedCompany();
     companyView_->SetQuoteList(company);
     companyView_->SetCompanyEventList(company);

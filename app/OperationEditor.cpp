@@ -52,6 +52,7 @@ Wallet& OperationEditor::wallet() const
 
 void OperationEditor::updateTotal()
 {
+    // For the eye only: no command reads the total.
     const double quote = page_.getQuote();
     page_.setTotal(static_cast<float>(page_.getQuantity() * quote));
 }
@@ -219,6 +220,7 @@ void OperationEditor::showCommonFields(const Operation& operation)
 
 void OperationEditor::changeType(const String& type)
 {
+    // The fields of that type show with what they held; each kind of trade has a fixed cost of its own to offer.
     page_.SetType(type);
     if (const auto cost = shareCost(wallet(), type))
         page_.offerShareCost(*cost);
@@ -227,6 +229,7 @@ void OperationEditor::changeType(const String& type)
 
 void OperationEditor::renewOffers()
 {
+    // Offers follow what they depend on until a person types over them: the page then leaves the field alone.
     const Date date = page_.getDate();
     const String type = page_.getType();
     if (type == "TRANSFER")

@@ -114,6 +114,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
 {
     makePages();
     SetMessage("No Company...");
+    // All that commands are handed on to is made before the first message can come.
     files_ = std::make_unique<DataFiles>(*this, *tabView_, folder);
     companyQuotes_ = std::make_unique<QuoteEditor<Company>>(*this, *companyView_, "You must first select a company");
     currencyQuotes_ =
@@ -136,6 +137,7 @@ void PLWindow::makePages()
         tab->SetToolTip(("Alt+" + std::to_string(tabView_->CountTabs() + 1)).c_str());
         tabView_->AddTab(page, tab);
     };
+    // `DataFiles` goes by this order.
     add(companyView_ = new CompanyView(kPageFrame, "CompanyView", this), "Company");
     add(currencyView_ = new CurrencyView(kPageFrame, "CurrencyView", this), "Currency");
     add(walletView_ = new WalletView(kPageFrame, "WalletView", this), "PortoFolio");
@@ -155,6 +157,7 @@ void PLWindow::MessageReceived(BMessage* message)
         BWindow::MessageReceived(message);
         return;
     }
+    // A command that asks in an alert keeps the lock while it waits for the answer.
     const WindowLock lock(*this);
     if (lock.isHeld())
         command->run(*this, message);

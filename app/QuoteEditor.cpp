@@ -39,7 +39,7 @@ void QuoteEditor<Series>::update()
         const Date date = page_.getQuoteDate();
         if (date.isUndefined())
             return window_.SetMessage("Please specify a date.");
-        // Another quote may have that day; both stay.
+        // Another quote may have that day; both stay. The row moves to where the new day belongs.
         quote->setDate(date);
         quote->setValue(page_.getQuoteValue());
         page_.ModifyQuote(quote);

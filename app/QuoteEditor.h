@@ -6,8 +6,8 @@ class PLWindow;
 
 /// The commands on the quotes of the series that is selected on a page: of a company, or of a currency.
 ///
-/// Those that change quotes leave a chart that shows the quotes that there are now, and a portfolio valued by them. What
-/// a check refuses has changed nothing.
+/// Those that change quotes leave a chart that shows the quotes that there are now, and a portfolio valued by them.
+/// What a check refuses has changed nothing.
 template <class Series>
 class QuoteEditor {
 public:

@@ -73,6 +73,7 @@ void PLWindow::UpdateAccount()
         else
             SetMessage("Unknown currency."); // Intended: the new name is not lost for that.
     }
+    // The menus and the lists show the name, and the value rests on the currency: both are brought up to date.
     account->setName(name);
     account->setDefaultTransferAccount(walletView_->isDefaultTransferAccount());
     showAccounts();
@@ -200,6 +201,7 @@ void PLWindow::UpdateState()
     EvolutionOutcome outcome = EvolutionOutcome::Built;
     State* state = refreshStates(*wallet_, date, operationView_->isPrevision(), isEvolutionAsked ? &outcome : nullptr);
     if (state == nullptr) {
+        // Without a day there is no value. The page stays empty, and the operations stay listed but for those removed.
         walletView_->ClearEvolution();
         operationView_->DropRemovedOperations();
         operations_->renewOffers();

@@ -98,6 +98,7 @@ void CompanyView::makeCompanies(BRect frame)
 void CompanyView::makeQuotes(BRect frame)
 {
     QuoteBox* box = addQuotes(frame, "Quotes", {'CQSe', 'CTQd', 'CTQv', 'CBAq', 'CBUq', 'CBRq'});
+    // Splits and the band are about a company's quotes only: their controls go into what the box leaves free.
     const BRect area = box->freeArea();
     float top = area.top + kMargin;
     auto* title = new BStringView({area.left, top, area.right, top + kFieldHeight}, "", "Split of the selected quotes");
@@ -174,7 +175,7 @@ void CompanyView::ModifyCompany(Company* company)
 void CompanyView::DeleteCompany(Company* company)
 {
     companies_->remove(company);
-    markets_->InvalidateItems();
+    markets_->InvalidateItems(); // they count their companies
     // No row of a quote or an event outlives the company that owns them.
     if (isShown(company))
         SetQuoteList(nullptr);

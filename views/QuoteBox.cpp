@@ -21,6 +21,7 @@ QuoteBox::QuoteBox(BRect frame, const char* title, const Codes& codes) : BBox(fr
     SetLabel(title);
     const float right = frame.Width() - kBoxSide;
     const float bottom = frame.Height() - kBoxSide;
+    // The list stands at the left, fields and buttons at the right; what is below these is left free.
     constexpr float kListWidth = 82 + 96 + kScrollBar;
     list_ = new QuoteListView("lstQuotes");
     list_->addTo(this, {kBoxSide, kBoxTop, kBoxSide + kListWidth, bottom}, title);

@@ -86,6 +86,7 @@ void QuoteChart::fillBand(const std::vector<Day>& days)
         squares += distance * distance;
     }
     const double deviation = std::sqrt(squares / static_cast<double>(days.size()));
+    // Round the trend: above it from the first day to the last, and below it back again.
     const Day& first = days.front();
     const Day& last = days.back();
     add(band_, first.date, first.trend + deviation);
