@@ -5,37 +5,10 @@
 #include "valuation/AccountState.h"
 #include "valuation/Evolution.h"
 #include "valuation/State.h"
+#include "valuation/Totals.h"
 #include "views/OperationView.h"
 #include "views/ParameterView.h"
 #include "views/WalletView.h"
-
-#include <algorithm>
-#include <iterator>
-
-namespace {
-
-/// How a parameter comes from its page, and whether the portfolio's value depends on it.
-struct Parameter {
-    uint32 code;
-    void (*store)(Wallet& wallet, const ParameterView& view);
-    bool revalues;
-};
-
-constexpr Parameter kParameters[] = {
-    // The fixed costs are only what a new operation starts with. Intended: each operation stores its own.
-    {'PTBc', [](Wallet& w, const ParameterView& v) { w.setBuyCost(v.getBuyCost()); }, false},
-    {'PTSc', [](Wallet& w, const ParameterView& v) { w.setSellCost(v.getSellCost()); }, false},
-    {'PTBr', [](Wallet& w, const ParameterView& v) { w.setBuyRateCost(v.getBuyRateCost()); }, true},
-    {'PTSr', [](Wallet& w, const ParameterView& v) { w.setSellRateCost(v.getSellRateCost()); }, true},
-    {'PTIn', [](Wallet& w, const ParameterView& v) { w.setInvestementPeriod(v.getInvestementPeriod()); }, true},
-    {'PTBp', [](Wallet& w, const ParameterView& v) { w.setBeginProfitSellRate(v.getBeginProfitSellRate()); }, true},
-    {'PTEp', [](Wallet& w, const ParameterView& v) { w.setEndProfitSellRate(v.getEndProfitSellRate()); }, true},
-    {'PTBl', [](Wallet& w, const ParameterView& v) { w.setBeginLoseSellRate(v.getBeginLoseSellRate()); }, true},
-    {'PTEl', [](Wallet& w, const ParameterView& v) { w.setEndLoseSellRate(v.getEndLoseSellRate()); }, true},
-    {'PTRe', [](Wallet& w, const ParameterView& v) { w.setReinvestRate(v.getReinvestRate()); }, true},
-};
-
-} // namespace
 
 void PLWindow::AddAccount()
 {
@@ -123,13 +96,12 @@ Account* PLWindow::selectedAccount()
 
 void PLWindow::ChangeParameter(uint32 code)
 {
-    const auto* parameter = std::find_if(std::begin(kParameters), std::end(kParameters),
-                                         [&](const Parameter& p) { return p.code == code; });
-    if (parameter == std::end(kParameters))
+    const auto parameter = ParameterView::parameterOf(code);
+    if (!parameter)
         return;
-    parameter->store(*wallet_, *parameterView_);
+    wallet_->setParameter(*parameter, parameterView_->getParameter(*parameter));
     showParameters(); // what was understood, in place of what was typed
-    if (parameter->revalues)
+    if (ParameterView::revalues(*parameter))
         UpdateState();
     else
         operations_->renewOffers();
@@ -137,16 +109,10 @@ void PLWindow::ChangeParameter(uint32 code)
 
 void PLWindow::showParameters()
 {
-    parameterView_->setBuyCost(wallet_->getBuyCost());
-    parameterView_->setSellCost(wallet_->getSellCost());
-    parameterView_->setBuyRateCost(wallet_->getBuyRateCost());
-    parameterView_->setSellRateCost(wallet_->getSellRateCost());
-    parameterView_->setInvestementPeriod(wallet_->getInvestementPeriod());
-    parameterView_->setBeginProfitSellRate(wallet_->getBeginProfitSellRate());
-    parameterView_->setEndProfitSellRate(wallet_->getEndProfitSellRate());
-    parameterView_->setBeginLoseSellRate(wallet_->getBeginLoseSellRate());
-    parameterView_->setEndLoseSellRate(wallet_->getEndLoseSellRate());
-    parameterView_->setReinvestRate(wallet_->getReinvestRate());
+    for (int i = 0; i < Wallet::kParameterCount; ++i) {
+        const auto parameter = static_cast<Wallet::Parameter>(i);
+        parameterView_->setParameter(parameter, wallet_->getParameter(parameter));
+    }
 }
 
 void PLWindow::showAccounts()
@@ -198,7 +164,7 @@ void PLWindow::UpdateState()
     refreshWalletCatalogue();
     const Date date = walletView_->getDate();
     const bool isEvolutionAsked = walletView_->isComputeEvolution();
-    EvolutionOutcome outcome = EvolutionOutcome::Built;
+    EvolutionOutcome outcome = EvolutionOutcome::kBuilt;
     State* state = refreshStates(*wallet_, date, operationView_->isPrevision(), isEvolutionAsked ? &outcome : nullptr);
     if (state == nullptr) {
         // Without a day there is no value. The page stays empty, and the operations stay listed but for those removed.
@@ -208,7 +174,7 @@ void PLWindow::UpdateState()
         return;
     }
     if (isEvolutionAsked)
-        walletView_->UpdateEvolution(*wallet_, catalogue_, outcome);
+        walletView_->UpdateEvolution(evolutionPoints(*wallet_, catalogue_), catalogue_.getReferenceCurrency(), outcome);
     else
         walletView_->ClearEvolution();
     SetState(state);
@@ -220,7 +186,7 @@ void PLWindow::SetState(State* state)
     if (!lock.isHeld())
         return;
     state_ = state;
-    walletView_->SetState(state, catalogue_);
+    walletView_->SetState(state, state != nullptr ? Totals(*state, catalogue_) : Totals());
     // The list is emptied and filled: automatic operations have come and gone with the valuation. A portfolio that is
     // not shown has no operations to show either.
     operationView_->ClearAllOperations();

@@ -21,7 +21,7 @@ std::vector<const ChartSeries*> markedSeries(const std::vector<ChartSeries>& ser
 {
     std::vector<const ChartSeries*> all;
     for (const ChartSeries& one : series) {
-        if (one.shape == ChartSeries::Shape::Line)
+        if (one.shape == ChartSeries::Shape::kLine)
             return {&one};
         all.push_back(&one);
     }

@@ -68,10 +68,10 @@ void ChartPainter::drawChart(const ChartLayout& layout, const std::vector<ChartS
                 draw(one);
     };
     drawGrid(layout);
-    drawAll(Shape::Polygon, [&](const ChartSeries& one) { drawPolygon(one, layout.scale); });
+    drawAll(Shape::kPolygon, [&](const ChartSeries& one) { drawPolygon(one, layout.scale); });
     drawAxes(layout);
-    drawAll(Shape::Line, [&](const ChartSeries& one) { drawLine(one, layout.scale); });
-    drawAll(Shape::Point, [&](const ChartSeries& one) {
+    drawAll(Shape::kLine, [&](const ChartSeries& one) { drawLine(one, layout.scale); });
+    drawAll(Shape::kPoint, [&](const ChartSeries& one) {
         fillDisc(layout.scale.pixel(one.points.front()), discRadius(one.penSize), one.color);
     });
     for (const ChartMark& mark : layout.marks)
@@ -180,19 +180,19 @@ void ChartPainter::drawKeyEntry(const ChartKeyEntry& entry)
     const BRect& box = entry.sample;
     const float middle = std::round((box.top + box.bottom) / 2);
     switch (entry.shape) {
-    case ChartSeries::Shape::Line:
+    case ChartSeries::Shape::kLine:
         view_.SetPenSize(entry.penSize);
         view_.SetHighColor(opaque(entry.color));
         view_.StrokeLine({box.left, middle}, {box.right, middle});
         break;
-    case ChartSeries::Shape::Polygon: {
+    case ChartSeries::Shape::kPolygon: {
         constexpr float kHalfHeight = 5;
         setAreaColor(entry.color);
         view_.FillRect({box.left, middle - kHalfHeight, box.right, middle + kHalfHeight});
         view_.SetDrawingMode(B_OP_COPY);
         break;
     }
-    case ChartSeries::Shape::Point:
+    case ChartSeries::Shape::kPoint:
         fillDisc({(box.left + box.right) / 2, middle}, discRadius(entry.penSize), entry.color);
         break;
     }

@@ -13,8 +13,8 @@ namespace {
 ChartSeries::Shape shapeOf(const GraphElement& element)
 {
     if (element.getType() == GraphLine::kType)
-        return ChartSeries::Shape::Line;
-    return element.getType() == GraphPolygon::kType ? ChartSeries::Shape::Polygon : ChartSeries::Shape::Point;
+        return ChartSeries::Shape::kLine;
+    return element.getType() == GraphPolygon::kType ? ChartSeries::Shape::kPolygon : ChartSeries::Shape::kPoint;
 }
 
 } // namespace
@@ -62,11 +62,11 @@ bool hasPlace(const ChartPoint& point)
 GraphPoint* const* pointsOf(GraphElement& element, unsigned* count, GraphPoint** single)
 {
     switch (shapeOf(element)) {
-    case ChartSeries::Shape::Line:
+    case ChartSeries::Shape::kLine:
         return static_cast<GraphLine&>(element).getAllGraphPoints(count);
-    case ChartSeries::Shape::Polygon:
+    case ChartSeries::Shape::kPolygon:
         return static_cast<GraphPolygon&>(element).getAllGraphPoints(count);
-    case ChartSeries::Shape::Point:
+    case ChartSeries::Shape::kPoint:
         break;
     }
     *single = &static_cast<GraphPoint&>(element);

@@ -11,9 +11,9 @@ class GraphPoint;
 
 /// What one element of a chart shows, in numbers.
 struct ChartSeries {
-    enum class Shape { Line, Polygon, Point };
+    enum class Shape { kLine, kPolygon, kPoint };
 
-    Shape shape = Shape::Line;
+    Shape shape = Shape::kLine;
     rgb_color color;
     float penSize = 1;
     std::string name;               // in the key; empty for none

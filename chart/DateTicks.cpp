@@ -20,9 +20,9 @@ double daysOf(DateStep step)
 std::string label(const Date& date, Unit unit)
 {
     char text[40];
-    if (unit == Unit::Year)
+    if (unit == Unit::kYear)
         std::snprintf(text, sizeof text, "%d", date.getYear());
-    else if (unit == Unit::Month)
+    else if (unit == Unit::kMonth)
         std::snprintf(text, sizeof text, "%d/%d", date.getMonth(), date.getYear());
     else
         std::snprintf(text, sizeof text, "%d/%d/%d", date.getDay(), date.getMonth(), date.getYear());
@@ -39,7 +39,7 @@ std::int64_t roundUp(std::int64_t value, std::int64_t step)
 std::vector<AxisTick> ticksByDays(const ChartRange& range, DateStep step)
 {
     constexpr std::int64_t kFirstMonday = 2;
-    const bool isWeek = step.unit == Unit::Week;
+    const bool isWeek = step.unit == Unit::kWeek;
     const std::int64_t days = isWeek ? 7 * step.count : step.count;
     const std::int64_t shift = isWeek ? kFirstMonday : 0;
     std::vector<AxisTick> ticks;
@@ -51,7 +51,7 @@ std::vector<AxisTick> ticksByDays(const ChartRange& range, DateStep step)
 
 std::vector<AxisTick> ticksByMonths(const ChartRange& range, DateStep step)
 {
-    const std::int64_t months = step.unit == Unit::Year ? std::int64_t{kMonths} * step.count : step.count;
+    const std::int64_t months = step.unit == Unit::kYear ? std::int64_t{kMonths} * step.count : step.count;
     const Date first = dateOfDay(range.min);
     std::vector<AxisTick> ticks;
     for (auto month = roundUp(std::int64_t{first.getYear()} * kMonths + first.getMonth() - 1, months);;
@@ -69,16 +69,16 @@ std::vector<AxisTick> ticksByMonths(const ChartRange& range, DateStep step)
 /// The step after `step`: some that divide weeks, months and years well, then 1, 2 and 5 times a power of ten years.
 DateStep coarser(DateStep step)
 {
-    constexpr DateStep kSteps[] = {{Unit::Day, 1},   {Unit::Day, 2},   {Unit::Week, 1},
-                                   {Unit::Week, 2},  {Unit::Month, 1}, {Unit::Month, 2},
-                                   {Unit::Month, 3}, {Unit::Month, 6}, {Unit::Year, 1}};
+    constexpr DateStep kSteps[] = {{Unit::kDay, 1},   {Unit::kDay, 2},   {Unit::kWeek, 1},
+                                   {Unit::kWeek, 2},  {Unit::kMonth, 1}, {Unit::kMonth, 2},
+                                   {Unit::kMonth, 3}, {Unit::kMonth, 6}, {Unit::kYear, 1}};
     for (std::size_t i = 0; i + 1 < std::size(kSteps); ++i)
         if (kSteps[i].unit == step.unit && kSteps[i].count == step.count)
             return kSteps[i + 1];
     int leading = step.count;
     while (leading >= 10)
         leading /= 10;
-    return {Unit::Year, leading == 2 ? step.count / 2 * 5 : step.count * 2};
+    return {Unit::kYear, leading == 2 ? step.count / 2 * 5 : step.count * 2};
 }
 
 /// The ends of the range, or only the first day when there is no room for both.
@@ -87,7 +87,7 @@ std::vector<AxisTick> endTicks(const ChartRange& range, double pixelsPerDay, con
     std::vector<AxisTick> ticks;
     for (const double day : {std::ceil(range.min), std::floor(range.max)})
         if (day >= range.min && day <= range.max && (ticks.empty() || day > ticks.back().value))
-            ticks.push_back({day, label(dateOfDay(day), Unit::Day)});
+            ticks.push_back({day, label(dateOfDay(day), Unit::kDay)});
     if (!areLabelsApart(ticks, pixelsPerDay, width, gap))
         ticks.pop_back();
     return ticks;
@@ -97,13 +97,13 @@ std::vector<AxisTick> endTicks(const ChartRange& range, double pixelsPerDay, con
 
 std::vector<AxisTick> dateTicks(const ChartRange& range, DateStep step)
 {
-    return step.unit == Unit::Day || step.unit == Unit::Week ? ticksByDays(range, step) : ticksByMonths(range, step);
+    return step.unit == Unit::kDay || step.unit == Unit::kWeek ? ticksByDays(range, step) : ticksByMonths(range, step);
 }
 
 std::vector<AxisTick> levelDateTicks(const ChartRange& range, double pixelsPerDay, const TextWidth& width, float gap)
 {
     const double narrowest = static_cast<double>(width("0") + gap);
-    DateStep step{Unit::Day, 1};
+    DateStep step{Unit::kDay, 1};
     std::vector<AxisTick> ticks;
     for (;; step = coarser(step)) {
         if (daysOf(step) * pixelsPerDay < narrowest)

@@ -4,7 +4,7 @@
 
 /// What a calendar axis goes by: every so many days, weeks, months or years.
 struct DateStep {
-    enum class Unit { Day, Week, Month, Year };
+    enum class Unit { kDay, kWeek, kMonth, kYear };
 
     Unit unit;
     int count;

@@ -14,13 +14,9 @@ constexpr int kMostReferences = 100;
 
 void expressIn(const Currency& newReference, const Currency& currency)
 {
-    unsigned n;
-    CurrencyQuote** quotes = currency.getAllQuotes(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const double rate = newReference.getRealQuote(quotes[i]->getDate());
-        if (rate != 1)
-            quotes[i]->setValue(static_cast<float>(quotes[i]->getValue() / rate));
-    }
+    for (CurrencyQuote* quote : currency.quotes())
+        if (const double rate = newReference.getRealQuote(quote->getDate()); rate != 1)
+            quote->setValue(static_cast<float>(quote->getValue() / rate));
 }
 
 } // namespace
@@ -119,9 +115,8 @@ std::vector<Market*> Catalogue::getMarkets() const
 {
     std::vector<Market*> markets;
     for (const Currency* currency : currencies_) {
-        unsigned n;
-        Market** own = currency->getAllMarkets(&n);
-        markets.insert(markets.end(), own, own + n);
+        const auto own = currency->markets();
+        markets.insert(markets.end(), own.begin(), own.end());
     }
     return markets;
 }
@@ -135,10 +130,8 @@ void Catalogue::rebaseOn(Currency* newReference)
         for (const Currency* currency : currencies_)
             if (currency != newReference)
                 expressIn(*newReference, *currency);
-        unsigned n;
-        CurrencyQuote** quotes = newReference->getAllQuotes(&n);
-        for (unsigned i = 0; i < n; ++i)
-            quotes[i]->setValue(1);
+        for (CurrencyQuote* quote : newReference->quotes())
+            quote->setValue(1);
     }
     reference_ = newReference;
 }

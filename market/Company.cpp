@@ -45,12 +45,10 @@ int Company::wrt(FILE* file) const
     abbreviation_.wrt(file);
     if (writeQuotes(file) != 0)
         return -1;
-    unsigned n;
-    CompanyEvent** events = getAllEvents(&n);
-    fwriteint(file, static_cast<int>(n));
-    for (unsigned i = 0; i < n; ++i) {
-        fwriteshort(file, static_cast<unsigned short>(events[i]->getType()));
-        if (events[i]->wrt(file) != 0)
+    fwriteint(file, static_cast<int>(getNbrEvents()));
+    for (const CompanyEvent* event : events()) {
+        fwriteshort(file, static_cast<unsigned short>(event->getType()));
+        if (event->wrt(file) != 0)
             return -1;
     }
     return 0;

@@ -36,11 +36,9 @@ int Currency::wrt(FILE* file, const Date& stamp) const
     stamp.wrt(file);
     name_.wrt(file);
     representation_.wrt(file);
-    unsigned n;
-    Market** markets = getAllMarkets(&n);
-    fwriteint(file, static_cast<int>(n));
-    for (unsigned i = 0; i < n; ++i)
-        if (markets[i]->wrt(file) != 0)
+    fwriteint(file, static_cast<int>(getNbrMarkets()));
+    for (const Market* market : markets())
+        if (market->wrt(file) != 0)
             return -1;
     return writeQuotes(file) == 0 && std::ferror(file) == 0 ? 0 : -1;
 }

@@ -22,11 +22,9 @@ Market::~Market()
 int Market::wrt(FILE* file) const
 {
     name_.wrt(file);
-    unsigned n;
-    Company** companies = getAllCompanies(&n);
-    fwriteint(file, static_cast<int>(n));
-    for (unsigned i = 0; i < n; ++i)
-        if (companies[i]->wrt(file) != 0)
+    fwriteint(file, static_cast<int>(getNbrCompanies()));
+    for (const Company* company : companies())
+        if (company->wrt(file) != 0)
             return -1;
     return 0;
 }
@@ -56,11 +54,9 @@ const String& Market::getCurrencyRepresentation() const
 
 int Market::getCompany(const String& abbreviation, Company** out) const
 {
-    unsigned n;
-    Company** companies = getAllCompanies(&n);
-    for (unsigned i = 0; i < n; ++i)
-        if (companies[i]->getAbbreviation() == abbreviation) {
-            *out = companies[i];
+    for (Company* company : companies())
+        if (company->getAbbreviation() == abbreviation) {
+            *out = company;
             return 0;
         }
     *out = nullptr;

@@ -217,24 +217,20 @@ float QuoteSeries<Owner, SeriesQuote, ManyEnd>::lineValue(const Date& d, bool is
 template <class Owner, class SeriesQuote, class ManyEnd>
 float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getHighestQuote() const
 {
-    unsigned n;
-    SeriesQuote** quotes = getAllQuotes(&n);
-    float highest = n > 0 ? quotes[0]->getValue() : 0;
-    for (unsigned i = 1; i < n; ++i)
-        if (quotes[i]->getValue() > highest)
-            highest = quotes[i]->getValue();
+    float highest = getNbrQuotes() > 0 ? getQuote(0)->getValue() : 0;
+    for (const SeriesQuote* quote : quotes())
+        if (quote->getValue() > highest)
+            highest = quote->getValue();
     return highest;
 }
 
 template <class Owner, class SeriesQuote, class ManyEnd>
 float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getLowestQuote() const
 {
-    unsigned n;
-    SeriesQuote** quotes = getAllQuotes(&n);
-    float lowest = n > 0 ? quotes[0]->getValue() : 0;
-    for (unsigned i = 1; i < n; ++i)
-        if (quotes[i]->getValue() < lowest)
-            lowest = quotes[i]->getValue();
+    float lowest = getNbrQuotes() > 0 ? getQuote(0)->getValue() : 0;
+    for (const SeriesQuote* quote : quotes())
+        if (quote->getValue() < lowest)
+            lowest = quote->getValue();
     return lowest;
 }
 
@@ -249,19 +245,19 @@ void QuoteSeries<Owner, SeriesQuote, ManyEnd>::fitTrend() const
         return;
     trendIsStale_ = false;
     slope_ = intercept_ = 0;
-    unsigned n;
-    SeriesQuote** quotes = getAllQuotes(&n);
+    const auto all = quotes();
+    if (all.empty())
+        return;
     double sumX = 0, sumY = 0, sumXX = 0, sumXY = 0;
-    for (unsigned i = 0; i < n; ++i) {
-        const double x = quotes[i]->getDate() - quotes[0]->getDate();
-        const double y = quotes[i]->getValue();
+    for (const SeriesQuote* quote : all) {
+        const double x = quote->getDate() - all.front()->getDate();
+        const double y = quote->getValue();
         sumX += x;
         sumY += y;
         sumXX += x * x;
         sumXY += x * y;
     }
-    if (n == 0)
-        return;
+    const auto n = static_cast<double>(all.size());
     const double meanX = sumX / n, meanY = sumY / n, meanXX = sumXX / n, meanXY = sumXY / n;
     const double variance = meanXX - meanX * meanX;
     if (variance == 0) // a single day
@@ -273,11 +269,9 @@ void QuoteSeries<Owner, SeriesQuote, ManyEnd>::fitTrend() const
 template <class Owner, class SeriesQuote, class ManyEnd>
 int QuoteSeries<Owner, SeriesQuote, ManyEnd>::writeQuotes(FILE* file) const
 {
-    unsigned n;
-    SeriesQuote** quotes = getAllQuotes(&n);
-    fwriteint(file, static_cast<int>(n));
-    for (unsigned i = 0; i < n; ++i)
-        if (quotes[i]->wrt(file) != 0)
+    fwriteint(file, static_cast<int>(getNbrQuotes()));
+    for (const SeriesQuote* quote : quotes())
+        if (quote->wrt(file) != 0)
             return -1;
     return 0;
 }

@@ -211,6 +211,5 @@ int Market::setInternetLastThreeMonthsQuote(Company* company) const
 
 int Company::setInternetLastThreeMonthsQuote()
 {
-    Market* market;
-    return getMarket(&market) == 0 ? market->setInternetLastThreeMonthsQuote(this) : -1;
+    return market() != nullptr ? market()->setInternetLastThreeMonthsQuote(this) : -1;
 }

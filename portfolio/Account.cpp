@@ -13,6 +13,11 @@ namespace {
 
 constexpr unsigned char kLetters[] = {'?', 'D', 'T', 'B', 'S'}; // by type code
 
+bool isTransfer(const Operation* operation)
+{
+    return operation->getType() == Operation::kTransfer;
+}
+
 } // namespace
 
 Account::Account() : operations_(this), transfers_(this), states_(this) {}
@@ -35,14 +40,11 @@ int Account::wrt(FILE* file) const
 {
     name_.wrt(file);
     fwritechar(file, defaultTransfer_ ? 'Y' : 'N');
-    unsigned n;
-    Operation** operations = getAllOperations(&n);
-    fwriteint(file, static_cast<int>(n));
-    for (unsigned i = 0; i < n; ++i) {
-        const short type = operations[i]->getType();
-        fwritechar(file, kLetters[type]);
+    fwriteint(file, static_cast<int>(getNbrOperations()));
+    for (const Operation* operation : operations()) {
+        fwritechar(file, kLetters[operation->getType()]);
         // A transfer names its recipient, which may be an account that comes later: it waits for the transfer block.
-        if (type != Operation::kTransfer && operations[i]->wrt(file) != 0)
+        if (!isTransfer(operation) && operation->wrt(file) != 0)
             return -1;
     }
     return 0;
@@ -83,12 +85,9 @@ int Account::readOperation(FILE* file)
 
 int Account::writeTransferOperations(FILE* file) const
 {
-    unsigned n;
-    Operation** operations = getAllOperations(&n);
-    const auto isTransfer = [](const Operation* operation) { return operation->getType() == Operation::kTransfer; };
-    fwriteint(file, static_cast<int>(std::count_if(operations, operations + n, isTransfer)));
-    for (unsigned i = 0; i < n; ++i)
-        if (isTransfer(operations[i]) && operations[i]->wrt(file) != 0)
+    fwriteint(file, static_cast<int>(std::ranges::count_if(operations(), isTransfer)));
+    for (const Operation* operation : operations())
+        if (isTransfer(operation) && operation->wrt(file) != 0)
             return -1;
     return 0;
 }
@@ -116,23 +115,23 @@ int Account::readTransferOperations(FILE* file)
 
 const String& Account::getCurrencyName() const
 {
-    return currency_.partner() != nullptr ? currency_.partner()->getName() : String::none();
+    return currency() != nullptr ? currency()->getName() : String::none();
 }
 
 const String& Account::getCurrencyRepresentation() const
 {
-    return currency_.partner() != nullptr ? currency_.partner()->getRepresentation() : String::none();
+    return currency() != nullptr ? currency()->getRepresentation() : String::none();
 }
 
 int Account::getShare(const String& market, const String& abbreviation, Share** out) const
 {
     *out = nullptr;
-    return wallet_.partner() != nullptr ? wallet_.partner()->getShare(market, abbreviation, out) : -1;
+    return wallet() != nullptr ? wallet()->getShare(market, abbreviation, out) : -1;
 }
 
 Account* Account::getAccountByName(const String& name) const
 {
-    return wallet_.partner() != nullptr ? wallet_.partner()->getAccountByName(name) : nullptr;
+    return wallet() != nullptr ? wallet()->getAccountByName(name) : nullptr;
 }
 
 int Account::setWallet(Wallet* wallet)

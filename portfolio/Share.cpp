@@ -37,44 +37,36 @@ int Share::rd(FILE*)
 
 const String& Share::getMarketName() const
 {
-    Market* market = nullptr;
-    const Company* company = company_.partner();
-    return company != nullptr && company->getMarket(&market) == 0 ? market->getName() : String::none();
+    const Market* market = company() != nullptr ? company()->market() : nullptr;
+    return market != nullptr ? market->getName() : String::none();
 }
 
 const String& Share::getCompanyAbbreviation() const
 {
-    const Company* company = company_.partner();
-    return company != nullptr ? company->getAbbreviation() : String::none();
+    return company() != nullptr ? company()->getAbbreviation() : String::none();
 }
 
 const String& Share::getCompanyName() const
 {
-    const Company* company = company_.partner();
-    return company != nullptr ? company->getName() : String::none();
+    return company() != nullptr ? company()->getName() : String::none();
 }
 
 int Share::getQuote(const Date& date, float* out) const
 {
-    const Company* company = company_.partner();
-    *out = company != nullptr ? company->getRealQuote(date) : 0;
-    return company != nullptr ? 0 : -1;
+    *out = company() != nullptr ? company()->getRealQuote(date) : 0;
+    return company() != nullptr ? 0 : -1;
 }
 
 float Share::getPrevisionQuote(const Date& date) const
 {
-    const Company* company = company_.partner();
-    return company != nullptr ? company->getPrevisionQuote(date) : 0;
+    return company() != nullptr ? company()->getPrevisionQuote(date) : 0;
 }
 
 void Share::removeAutomaticShareOperations()
 {
     // Gathered first: each removal disturbs the order, and the list is to be sorted once.
-    unsigned n;
-    ShareOperation** operations = getAllShareOperations(&n);
     std::vector<ShareOperation*> automatic;
-    std::copy_if(operations, operations + n, std::back_inserter(automatic),
-                 [](const ShareOperation* operation) { return operation->isAutomatic(); });
+    std::ranges::copy_if(shareOperations(), std::back_inserter(automatic), &ShareOperation::isAutomatic);
     for (ShareOperation* operation : automatic)
         delete operation;
 }

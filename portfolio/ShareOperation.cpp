@@ -19,12 +19,11 @@ ShareOperation::~ShareOperation()
 
 int ShareOperation::wrt(FILE* file) const
 {
-    const Share* share = share_.partner();
-    if (share == nullptr)
+    if (share() == nullptr)
         return -1;
     fwritechar(file, buy_ ? 'Y' : 'N');
-    share->getMarketName().wrt(file);
-    share->getCompanyAbbreviation().wrt(file);
+    share()->getMarketName().wrt(file);
+    share()->getCompanyAbbreviation().wrt(file);
     fwriteint(file, quantity_);
     fwritefloat(file, quote_);
     getDate().wrt(file);
@@ -39,10 +38,10 @@ int ShareOperation::rd(FILE* file)
     String abbreviation;
     if (market.rd(file) != 0 || abbreviation.rd(file) != 0)
         return -1;
-    Share* share = nullptr;
-    if (account() == nullptr || account()->getShare(market, abbreviation, &share) != 0)
+    Share* held;
+    if (account() == nullptr || account()->getShare(market, abbreviation, &held) != 0)
         return -1;
-    setShare(share);
+    setShare(held);
     quantity_ = freadint(file);
     quote_ = freadfloat(file);
     Date date;
@@ -54,8 +53,8 @@ int ShareOperation::rd(FILE* file)
 
 float ShareOperation::getOperationRateCost() const
 {
-    Wallet* wallet = nullptr;
-    if (share_.partner() == nullptr || share_.partner()->getWallet(&wallet) != 0)
+    const Wallet* wallet = share() != nullptr ? share()->wallet() : nullptr;
+    if (wallet == nullptr)
         return 0;
     return buy_ ? wallet->getBuyRateCost() : wallet->getSellRateCost();
 }
@@ -63,8 +62,8 @@ float ShareOperation::getOperationRateCost() const
 void ShareOperation::notifyChange()
 {
     Operation::notifyChange();
-    if (share_.partner() != nullptr)
-        share_.partner()->shareOperationChanged();
+    if (share() != nullptr)
+        share()->shareOperationChanged();
 }
 
 int ShareOperation::setShare(Share* share)

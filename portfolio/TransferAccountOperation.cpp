@@ -17,8 +17,7 @@ TransferAccountOperation::~TransferAccountOperation()
 
 int TransferAccountOperation::wrt(FILE* file) const
 {
-    const Account* recipient = recipient_.partner();
-    const String name = recipient != nullptr ? recipient->getName() : String();
+    const String name = recipient() != nullptr ? recipient()->getName() : String();
     name.wrt(file);
     fwritefloat(file, getAmount());
     fwritefloat(file, rateCost_);
@@ -33,10 +32,10 @@ int TransferAccountOperation::rd(FILE* file)
     String name;
     if (name.rd(file) != 0)
         return -1;
-    Account* recipient = getAccountByName(name);
-    if (recipient == nullptr)
+    Account* named = getAccountByName(name);
+    if (named == nullptr)
         return -1;
-    setRecepientAccount(recipient);
+    setRecepientAccount(named);
     setAmount(freadfloat(file));
     rateCost_ = freadfloat(file);
     cost_ = freadfloat(file);
@@ -56,8 +55,8 @@ float TransferAccountOperation::getTotalCost() const
 void TransferAccountOperation::notifyChange()
 {
     AccountOperation::notifyChange();
-    if (recipient_.partner() != nullptr)
-        recipient_.partner()->transferOperationChanged();
+    if (recipient() != nullptr)
+        recipient()->transferOperationChanged();
 }
 
 int TransferAccountOperation::setRecepientAccount(Account* account)

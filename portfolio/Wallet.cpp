@@ -9,6 +9,9 @@
 #include "portfolio/Share.h"
 #include "portfolio/WalletNames.h"
 
+#include <algorithm>
+#include <iterator>
+
 Wallet::Wallet() : shares_(this), accounts_(this), states_(this) {}
 
 Wallet::~Wallet()
@@ -62,11 +65,9 @@ int Wallet::getShare(const String& market, const String& abbreviation, Share** o
 {
     if (names_ != nullptr)
         return names_->getShare(market, abbreviation, out);
-    unsigned n;
-    Share** shares = getAllShares(&n);
-    for (unsigned i = 0; i < n; ++i)
-        if (shares[i]->getCompanyAbbreviation() == abbreviation && shares[i]->getMarketName() == market) {
-            *out = shares[i];
+    for (Share* share : shares())
+        if (share->getCompanyAbbreviation() == abbreviation && share->getMarketName() == market) {
+            *out = share;
             return 0;
         }
     *out = nullptr;
@@ -77,43 +78,33 @@ Account* Wallet::getAccountByName(const String& name) const
 {
     if (names_ != nullptr)
         return names_->getAccount(name);
-    unsigned n;
-    Account** accounts = getAllAccounts(&n);
-    for (unsigned i = 0; i < n; ++i)
-        if (accounts[i]->getName() == name)
-            return accounts[i];
+    for (Account* account : accounts())
+        if (account->getName() == name)
+            return account;
     return nullptr;
 }
 
 Account* Wallet::findDefaultTransferAccount(const String& currencyRepresentation) const
 {
-    unsigned n;
-    Account** accounts = getAllAccounts(&n);
     Account* first = nullptr;
-    for (unsigned i = 0; i < n; ++i) {
-        Currency* currency;
-        if (accounts[i]->getCurrency(&currency) != 0 || currency->getRepresentation() != currencyRepresentation)
+    for (Account* account : accounts()) {
+        const Currency* currency = account->currency();
+        if (currency == nullptr || currency->getRepresentation() != currencyRepresentation)
             continue;
-        if (accounts[i]->isDefaultTransferAccount())
-            return accounts[i];
+        if (account->isDefaultTransferAccount())
+            return account;
         if (first == nullptr)
-            first = accounts[i];
+            first = account;
     }
     return first;
 }
 
 void Wallet::removeAutomaticOperations()
 {
-    unsigned nAccounts;
-    Account** accounts = getAllAccounts(&nAccounts);
-    for (unsigned i = 0; i < nAccounts; ++i) {
+    for (const Account* account : accounts()) {
         // Gathered first: each removal disturbs the order, and the list is to be sorted once.
-        unsigned n;
-        Operation** operations = accounts[i]->getAllOperations(&n);
         std::vector<Operation*> automatic;
-        for (unsigned k = 0; k < n; ++k)
-            if (operations[k]->isAutomatic())
-                automatic.push_back(operations[k]);
+        std::ranges::copy_if(account->operations(), std::back_inserter(automatic), &Operation::isAutomatic);
         for (Operation* operation : automatic)
             delete operation;
     }

@@ -7,6 +7,7 @@
 #include "portfolio/Share.h"
 #include "portfolio/WalletToStates.h"
 
+#include <array>
 #include <vector>
 
 class Catalogue;
@@ -80,32 +81,50 @@ public:
     /// stay until the wallet is loaded again.
     void removeAutomaticOperations();
 
+    /// The ten trading parameters, in the order of the file and of their page.
+    enum Parameter {
+        kBuyCost,
+        kSellCost,
+        kBuyRateCost,
+        kSellRateCost,
+        kInvestementPeriod,
+        kBeginProfitSellRate,
+        kEndProfitSellRate,
+        kBeginLoseSellRate,
+        kEndLoseSellRate,
+        kReinvestRate,
+        kParameterCount
+    };
+    /// Each by its number, as below by its name.
+    float getParameter(Parameter parameter) const { return parameters_[parameter]; }
+    void setParameter(Parameter parameter, float value) { parameters_[parameter] = value; }
+
     /// Fixed cost of one purchase or sale, in the account's currency: what a new operation starts with.
-    float getBuyCost() const { return buyCost_; }
-    void setBuyCost(float cost) { buyCost_ = cost; }
-    float getSellCost() const { return sellCost_; }
-    void setSellCost(float cost) { sellCost_ = cost; }
+    float getBuyCost() const { return parameters_[kBuyCost]; }
+    void setBuyCost(float cost) { parameters_[kBuyCost] = cost; }
+    float getSellCost() const { return parameters_[kSellCost]; }
+    void setSellCost(float cost) { parameters_[kSellCost] = cost; }
     /// Proportional cost, a fraction of the traded value.
-    float getBuyRateCost() const { return buyRateCost_; }
-    void setBuyRateCost(float rate) { buyRateCost_ = rate; }
-    float getSellRateCost() const { return sellRateCost_; }
-    void setSellRateCost(float rate) { sellRateCost_ = rate; }
+    float getBuyRateCost() const { return parameters_[kBuyRateCost]; }
+    void setBuyRateCost(float rate) { parameters_[kBuyRateCost] = rate; }
+    float getSellRateCost() const { return parameters_[kSellRateCost]; }
+    void setSellRateCost(float rate) { parameters_[kSellRateCost] = rate; }
     /// Length of the investment horizon, in days.
-    short getInvestementPeriod() const { return investementPeriod_; }
-    void setInvestementPeriod(short days) { investementPeriod_ = days; }
+    short getInvestementPeriod() const { return static_cast<short>(parameters_[kInvestementPeriod]); }
+    void setInvestementPeriod(short days) { parameters_[kInvestementPeriod] = days; }
     /// Ratios to the average buy quote, at the begin and the end of the horizon: above the profit rate a holding is
     /// sold with profit, below the lose rate at a loss.
-    float getBeginProfitSellRate() const { return beginProfitSellRate_; }
-    void setBeginProfitSellRate(float rate) { beginProfitSellRate_ = rate; }
-    float getEndProfitSellRate() const { return endProfitSellRate_; }
-    void setEndProfitSellRate(float rate) { endProfitSellRate_ = rate; }
-    float getBeginLoseSellRate() const { return beginLoseSellRate_; }
-    void setBeginLoseSellRate(float rate) { beginLoseSellRate_ = rate; }
-    float getEndLoseSellRate() const { return endLoseSellRate_; }
-    void setEndLoseSellRate(float rate) { endLoseSellRate_ = rate; }
+    float getBeginProfitSellRate() const { return parameters_[kBeginProfitSellRate]; }
+    void setBeginProfitSellRate(float rate) { parameters_[kBeginProfitSellRate] = rate; }
+    float getEndProfitSellRate() const { return parameters_[kEndProfitSellRate]; }
+    void setEndProfitSellRate(float rate) { parameters_[kEndProfitSellRate] = rate; }
+    float getBeginLoseSellRate() const { return parameters_[kBeginLoseSellRate]; }
+    void setBeginLoseSellRate(float rate) { parameters_[kBeginLoseSellRate] = rate; }
+    float getEndLoseSellRate() const { return parameters_[kEndLoseSellRate]; }
+    void setEndLoseSellRate(float rate) { parameters_[kEndLoseSellRate] = rate; }
     /// The part of an automatic sale's net profit that stays in the selling account.
-    float getReinvestRate() const { return reinvestRate_; }
-    void setReinvestRate(float rate) { reinvestRate_ = rate; }
+    float getReinvestRate() const { return parameters_[kReinvestRate]; }
+    void setReinvestRate(float rate) { parameters_[kReinvestRate] = rate; }
 
 private:
     friend class AccountsToWallet;
@@ -124,14 +143,7 @@ private:
     WalletNames* names_ = nullptr;      // only while a file is read
     String unknownName_;
 
-    float buyCost_ = 29.95F;
-    float sellCost_ = 29.95F;
-    float buyRateCost_ = 0.0017F;
-    float sellRateCost_ = 0.0017F;
-    short investementPeriod_ = 90;
-    float beginProfitSellRate_ = 2.0F;
-    float endProfitSellRate_ = 1.1F;
-    float beginLoseSellRate_ = 0.8F; // equal to the end rate: by default the loss limit stands still
-    float endLoseSellRate_ = 0.8F;
-    float reinvestRate_ = 0.9F;
+    // By number. The period is a whole number of 16 bits, which a float holds exactly; the two lose rates are equal, so
+    // that by default the loss limit stands still.
+    std::array<float, kParameterCount> parameters_{29.95F, 29.95F, 0.0017F, 0.0017F, 90, 2.0F, 1.1F, 0.8F, 0.8F, 0.9F};
 };

@@ -23,26 +23,22 @@ int Wallet::rd(FILE*)
 int Wallet::wrt(FILE* file, const Date& stamp) const
 {
     stamp.wrt(file);
-    unsigned nShares;
-    Share** shares = getAllShares(&nShares);
-    fwriteint(file, static_cast<int>(nShares));
-    for (unsigned i = 0; i < nShares; ++i) {
-        shares[i]->getMarketName().wrt(file);
-        shares[i]->getCompanyAbbreviation().wrt(file);
+    fwriteint(file, static_cast<int>(getNbrShares()));
+    for (const Share* share : shares()) {
+        share->getMarketName().wrt(file);
+        share->getCompanyAbbreviation().wrt(file);
     }
-    unsigned nAccounts;
-    Account** accounts = getAllAccounts(&nAccounts);
-    fwriteint(file, static_cast<int>(nAccounts));
-    for (unsigned i = 0; i < nAccounts; ++i) {
-        const String currency = accounts[i]->getCurrencyName();
+    fwriteint(file, static_cast<int>(getNbrAccounts()));
+    for (const Account* account : accounts()) {
+        const String& currency = account->getCurrencyName();
         if (currency.isUndefined())
             return -1; // a reader could not find the account's currency again
         currency.wrt(file);
-        if (accounts[i]->wrt(file) != 0)
+        if (account->wrt(file) != 0)
             return -1;
     }
-    for (unsigned i = 0; i < nAccounts; ++i)
-        if (accounts[i]->writeTransferOperations(file) != 0)
+    for (const Account* account : accounts())
+        if (account->writeTransferOperations(file) != 0)
             return -1;
     writeParameters(file);
     return std::ferror(file) == 0 ? 0 : -1;
@@ -62,12 +58,11 @@ int Wallet::rd(FILE* file, Date* stamp)
     WalletNames names(markets_, currencies_);
     names_ = &names;
     const bool isRead = readShares(file) == 0 && readAccounts(file) == 0;
-    unsigned n;
-    Account** accounts = getAllAccounts(&n);
     // Intended: a transfer to an unknown account does not fail the file, so that a portfolio that names an account it
     // no longer has still opens; what follows is then read out of place.
-    for (unsigned i = 0; isRead && i < n; ++i)
-        accounts[i]->readTransferOperations(file);
+    if (isRead)
+        for (Account* account : accounts())
+            account->readTransferOperations(file);
     names_ = nullptr;
     unknownName_ = isRead ? String() : names.getUnknown();
     if (!isRead)
@@ -117,28 +112,18 @@ int Wallet::readAccounts(FILE* file)
 
 void Wallet::writeParameters(FILE* file) const
 {
-    fwritefloat(file, buyCost_);
-    fwritefloat(file, sellCost_);
-    fwritefloat(file, buyRateCost_);
-    fwritefloat(file, sellRateCost_);
-    fwriteshort(file, static_cast<unsigned short>(investementPeriod_));
-    fwritefloat(file, beginProfitSellRate_);
-    fwritefloat(file, endProfitSellRate_);
-    fwritefloat(file, beginLoseSellRate_);
-    fwritefloat(file, endLoseSellRate_);
-    fwritefloat(file, reinvestRate_);
+    for (int i = 0; i < kParameterCount; ++i)
+        if (i == kInvestementPeriod)
+            fwriteshort(file, static_cast<unsigned short>(getInvestementPeriod()));
+        else
+            fwritefloat(file, parameters_[static_cast<std::size_t>(i)]);
 }
 
 void Wallet::readParameters(FILE* file)
 {
-    buyCost_ = freadfloat(file);
-    sellCost_ = freadfloat(file);
-    buyRateCost_ = freadfloat(file);
-    sellRateCost_ = freadfloat(file);
-    investementPeriod_ = static_cast<short>(freadshort(file));
-    beginProfitSellRate_ = freadfloat(file);
-    endProfitSellRate_ = freadfloat(file);
-    beginLoseSellRate_ = freadfloat(file);
-    endLoseSellRate_ = freadfloat(file);
-    reinvestRate_ = freadfloat(file);
+    for (int i = 0; i < kParameterCount; ++i)
+        if (i == kInvestementPeriod)
+            setInvestementPeriod(static_cast<short>(freadshort(file)));
+        else
+            parameters_[static_cast<std::size_t>(i)] = freadfloat(file);
 }

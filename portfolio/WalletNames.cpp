@@ -12,27 +12,27 @@ std::size_t WalletNames::PairHash::operator()(const Pair& pair) const
     return hash(pair.first) * 31 + hash(pair.second);
 }
 
+WalletNames::Pair WalletNames::pairOf(const Market& market, const Company& company)
+{
+    return {market.getName().comparedBytes(), company.getAbbreviation().comparedBytes()};
+}
+
 WalletNames::WalletNames(const std::vector<Market*>& markets, const std::vector<Currency*>& currencies)
 {
     for (Currency* currency : currencies)
         if (currency->getName().hasText())
             currencies_.try_emplace(currency->getName().comparedBytes(), currency);
-    for (const Market* market : markets) {
-        unsigned n;
-        Company** companies = market->getAllCompanies(&n);
-        for (unsigned i = 0; i < n; ++i)
-            if (market->getName().hasText() && companies[i]->getAbbreviation().hasText())
-                companies_.try_emplace(
-                    {market->getName().comparedBytes(), companies[i]->getAbbreviation().comparedBytes()}, companies[i]);
-    }
+    for (const Market* market : markets)
+        for (Company* company : market->companies())
+            if (market->getName().hasText() && company->getAbbreviation().hasText())
+                companies_.try_emplace(pairOf(*market, *company), company);
 }
 
 void WalletNames::add(Share* share)
 {
-    Company* company = nullptr;
-    Market* market = nullptr;
-    if (share->getCompany(&company) == 0 && company->getMarket(&market) == 0)
-        shares_.try_emplace({market->getName().comparedBytes(), company->getAbbreviation().comparedBytes()}, share);
+    const Company* company = share->company();
+    if (company != nullptr && company->market() != nullptr)
+        shares_.try_emplace(pairOf(*company->market(), *company), share);
 }
 
 void WalletNames::add(Account* account)

@@ -45,6 +45,7 @@ private:
     template <class T>
     using Map = std::unordered_map<std::string_view, T*>;
 
+    static Pair pairOf(const Market& market, const Company& company);
     template <class T>
     int find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out);
     template <class T>

@@ -85,13 +85,11 @@ void addTotals(const Valuation& valuation, ObjectWriter& report)
 void addAccounts(const State& state, ObjectWriter& report)
 {
     report.beginList("accounts");
-    unsigned n;
-    AccountState** states = state.getAllAccountStates(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const Account* account = states[i]->account();
-        report.addItem({{"name", text(states[i]->getAccountName())},
-                        {"currency", text(states[i]->getCurrencyRepresentation())},
-                        {"cash", states[i]->getCash()},
+    for (const AccountState* cash : state.accountStates()) {
+        const Account* account = cash->account();
+        report.addItem({{"name", text(cash->getAccountName())},
+                        {"currency", text(cash->getCurrencyRepresentation())},
+                        {"cash", cash->getCash()},
                         {"defaultTransfer", account != nullptr && account->isDefaultTransferAccount()}});
     }
     report.endList();
@@ -100,27 +98,24 @@ void addAccounts(const State& state, ObjectWriter& report)
 void addShares(const State& state, ObjectWriter& report)
 {
     report.beginList("shares");
-    unsigned n;
-    ShareState** states = state.getAllShareStates(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const Share* share = states[i]->share();
+    for (const ShareState* holding : state.shareStates()) {
+        const Share* share = holding->share();
         report.addItem({{"market", share != nullptr ? text(share->getMarketName()) : ""},
-                        {"ticker", text(states[i]->getCompanyAbbreviation())},
-                        {"name", text(states[i]->getCompanyName())},
-                        {"quantity", states[i]->getQuantity()},
-                        {"buyQuote", states[i]->getBuyQuote()},
-                        {"quote", states[i]->getQuote()},
-                        {"endDate", day(states[i]->getEndDate())},
-                        {"currency", text(states[i]->getCurrencyRepresentation())}});
+                        {"ticker", text(holding->getCompanyAbbreviation())},
+                        {"name", text(holding->getCompanyName())},
+                        {"quantity", holding->getQuantity()},
+                        {"buyQuote", holding->getBuyQuote()},
+                        {"quote", holding->getQuote()},
+                        {"endDate", day(holding->getEndDate())},
+                        {"currency", text(holding->getCurrencyRepresentation())}});
     }
     report.endList();
 }
 
 Json describe(const TransferAccountOperation& transfer)
 {
-    Account* recipient;
-    const bool isReceived = transfer.getRecepientAccount(&recipient) == 0;
-    return {{"recipient", isReceived ? Json(text(recipient->getName())) : Json()},
+    const Account* recipient = transfer.recipient();
+    return {{"recipient", recipient != nullptr ? Json(text(recipient->getName())) : Json()},
             {"amount", transfer.getAmount()},
             {"rateCost", transfer.getRateCost()},
             {"cost", transfer.getCost()},
@@ -130,10 +125,9 @@ Json describe(const TransferAccountOperation& transfer)
 
 Json describe(const ShareOperation& trade)
 {
-    Share* share;
-    const bool isOfShare = trade.getShare(&share) == 0;
-    return {{"market", isOfShare ? text(share->getMarketName()) : ""},
-            {"ticker", isOfShare ? text(share->getCompanyAbbreviation()) : ""},
+    const Share* share = trade.share();
+    return {{"market", share != nullptr ? text(share->getMarketName()) : ""},
+            {"ticker", share != nullptr ? text(share->getCompanyAbbreviation()) : ""},
             {"quantity", trade.getQuantity()},
             {"quote", trade.getQuote()},
             {"operationCost", trade.getOperationCost()}};
@@ -158,14 +152,9 @@ Json describe(const Account& account, const Operation& operation)
 void addOperations(const Wallet& wallet, ObjectWriter& report)
 {
     report.beginList("operations");
-    unsigned nAccounts;
-    Account** accounts = wallet.getAllAccounts(&nAccounts);
-    for (unsigned i = 0; i < nAccounts; ++i) {
-        unsigned n;
-        Operation** operations = accounts[i]->getAllOperations(&n);
-        for (unsigned j = 0; j < n; ++j)
-            report.addItem(describe(*accounts[i], *operations[j]));
-    }
+    for (const Account* account : wallet.accounts())
+        for (const Operation* operation : account->operations())
+            report.addItem(describe(*account, *operation));
     report.endList();
 }
 

@@ -45,28 +45,26 @@ struct AutomaticLine {
 
 void takeSales(const Share& share, std::vector<AutomaticLine>* lines)
 {
-    Company* company;
-    if (share.getCompany(&company) != 0)
+    const Company* company = share.company();
+    if (company == nullptr)
         return;
-    for (unsigned i = 0; i < share.getNbrShareOperations(); ++i) {
-        const ShareOperation& sale = *share.getShareOperation(i);
-        if (!sale.isAutomatic())
+    for (const ShareOperation* sale : share.shareOperations()) {
+        if (!sale->isAutomatic())
             continue;
-        const std::string text = plain(company->getAbbreviation()) + " at " + amountText(sale.getQuote()) + ' ' +
+        const std::string text = plain(company->getAbbreviation()) + " at " + amountText(sale->getQuote()) + ' ' +
                                  plain(company->getCurrencyRepresentation());
-        lines->push_back({sale.getDate(), "sell", countText(sale.getQuantity()), text});
+        lines->push_back({sale->getDate(), "sell", countText(sale->getQuantity()), text});
     }
 }
 
 void takeTransfers(const Account& account, std::vector<AutomaticLine>* lines)
 {
-    for (unsigned i = 0; i < account.getNbrOperations(); ++i) {
-        const auto* transfer = dynamic_cast<const TransferAccountOperation*>(account.getOperation(i));
-        Account* recipient;
-        if (transfer == nullptr || !transfer->isAutomatic() || transfer->getRecepientAccount(&recipient) != 0)
+    for (const Operation* operation : account.operations()) {
+        const auto* transfer = dynamic_cast<const TransferAccountOperation*>(operation);
+        if (transfer == nullptr || !transfer->isAutomatic() || transfer->recipient() == nullptr)
             continue;
         const std::string text = plain(account.getCurrencyRepresentation()) + " from " + plain(account.getName()) +
-                                 " to " + plain(recipient->getName());
+                                 " to " + plain(transfer->recipient()->getName());
         lines->push_back({transfer->getDate(), "transfer", amountText(transfer->getAmount()), text});
     }
 }
@@ -140,14 +138,12 @@ std::string Report::inReference(double amount, const String& symbol) const
 std::string Report::accounts() const
 {
     TextTable table({{"Account"}, {"Cash", kRight}, {""}, {valueHeading(), kRight}, {""}});
-    unsigned n;
-    AccountState** states = valuation_.state().getAllAccountStates(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const String symbol = states[i]->getCurrencyRepresentation();
-        const Account* account = states[i]->account();
+    for (const AccountState* state : valuation_.state().accountStates()) {
+        const String& symbol = state->getCurrencyRepresentation();
+        const Account* account = state->account();
         const bool isDefault = account != nullptr && account->isDefaultTransferAccount();
-        table.addRow({plain(states[i]->getAccountName()), amountText(states[i]->getCash()), plain(symbol),
-                      inReference(states[i]->getCash(), symbol), isDefault ? "default transfer account" : ""});
+        table.addRow({plain(state->getAccountName()), amountText(state->getCash()), plain(symbol),
+                      inReference(state->getCash(), symbol), isDefault ? "default transfer account" : ""});
     }
     return table.isEmpty() ? "" : '\n' + table.toString();
 }
@@ -164,20 +160,15 @@ std::string Report::holdings() const
                      {"Gain", kRight},
                      {valueHeading(), kRight},
                      {"End date"}});
-    unsigned n;
-    ShareState** states = valuation_.state().getAllShareStates(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const ShareState& state = *states[i];
-        const Share* share = state.share();
-        const String symbol = state.getCurrencyRepresentation();
-        const double quote = state.getQuote();
-        const bool isHeld = state.getQuantity() != 0;
-        table.addRow({plain(state.getCompanyName()), plain(state.getCompanyAbbreviation()),
-                      share != nullptr ? plain(share->getMarketName()) : "", countText(state.getQuantity()),
-                      isHeld ? amountText(state.getBuyQuote()) : "", amountText(quote), plain(symbol),
-                      isHeld ? changeText(quote / state.getBuyQuote() - 1) : "",
-                      isHeld ? inReference(quote * state.getQuantity(), symbol) : "",
-                      isHeld ? dateText(state.getEndDate()) : ""});
+    for (const ShareState* state : valuation_.state().shareStates()) {
+        const Share* share = state->share();
+        const String& symbol = state->getCurrencyRepresentation();
+        const bool isHeld = state->isHeld();
+        table.addRow({plain(state->getCompanyName()), plain(state->getCompanyAbbreviation()),
+                      share != nullptr ? plain(share->getMarketName()) : "", countText(state->getQuantity()),
+                      isHeld ? amountText(state->getBuyQuote()) : "", amountText(state->getQuote()), plain(symbol),
+                      isHeld ? changeText(state->gain()) : "", isHeld ? inReference(state->worth(), symbol) : "",
+                      isHeld ? dateText(state->getEndDate()) : ""});
     }
     return table.isEmpty() ? "" : '\n' + table.toString();
 }
@@ -186,13 +177,10 @@ std::string Report::holdings() const
 std::string Report::automaticOperations() const
 {
     std::vector<AutomaticLine> lines;
-    unsigned n;
-    Share** shares = valuation_.wallet().getAllShares(&n);
-    for (unsigned i = 0; i < n; ++i)
-        takeSales(*shares[i], &lines);
-    Account** accounts = valuation_.wallet().getAllAccounts(&n);
-    for (unsigned i = 0; i < n; ++i)
-        takeTransfers(*accounts[i], &lines);
+    for (const Share* share : valuation_.wallet().shares())
+        takeSales(*share, &lines);
+    for (const Account* account : valuation_.wallet().accounts())
+        takeTransfers(*account, &lines);
     const auto isEarlier = [](const AutomaticLine& a, const AutomaticLine& b) { return a.date < b.date; };
     std::stable_sort(lines.begin(), lines.end(), isEarlier);
 

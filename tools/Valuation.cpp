@@ -66,7 +66,7 @@ void Valuation::readPortfolio()
 void Valuation::compute(const Date& date, bool previsions, bool evolution)
 {
     hasEvolution_ = evolution;
-    EvolutionOutcome outcome = EvolutionOutcome::Built;
+    EvolutionOutcome outcome = EvolutionOutcome::kBuilt;
     state_ = refreshStates(wallet_, date, previsions, evolution ? &outcome : nullptr);
     checkOutcome(outcome);
     evolution_.clear();
@@ -80,11 +80,11 @@ void Valuation::compute(const Date& date, bool previsions, bool evolution)
 
 void Valuation::checkOutcome(EvolutionOutcome outcome) const
 {
-    if (outcome == EvolutionOutcome::Built)
+    if (outcome == EvolutionOutcome::kBuilt)
         return;
     const std::string first = state_->getFirstOperationDate().toString().getCharacterArray();
     const std::string start = "no evolution, since its first operation is of " + first;
-    if (outcome == EvolutionOutcome::BadFirstDay)
+    if (outcome == EvolutionOutcome::kBadFirstDay)
         failFor(portfolioPath_, start + ", which is no day of the calendar");
     const std::string days = std::to_string(state_->getDate() - state_->getFirstOperationDate());
     failFor(portfolioPath_, start + ": too many days (" + days + ") for its accounts and holdings");
@@ -93,18 +93,12 @@ void Valuation::checkOutcome(EvolutionOutcome outcome) const
 /// The account of a transfer without recipient. No wallet has such a transfer but by an unknown name in its file.
 const Account* Valuation::senderToNowhere() const
 {
-    unsigned nAccounts;
-    Account** accounts = wallet_.getAllAccounts(&nAccounts);
-    for (unsigned i = 0; i < nAccounts; ++i) {
-        unsigned n;
-        Operation** operations = accounts[i]->getAllOperations(&n);
-        for (unsigned j = 0; j < n; ++j) {
-            const auto* transfer = dynamic_cast<const TransferAccountOperation*>(operations[j]);
-            Account* recipient;
-            if (transfer != nullptr && transfer->getRecepientAccount(&recipient) != 0)
-                return accounts[i];
+    for (const Account* account : wallet_.accounts())
+        for (const Operation* operation : account->operations()) {
+            const auto* transfer = dynamic_cast<const TransferAccountOperation*>(operation);
+            if (transfer != nullptr && transfer->recipient() == nullptr)
+                return account;
         }
-    }
     return nullptr;
 }
 

@@ -34,47 +34,43 @@ void AccountState::processAutomaticOperations(const Date& date)
 
 void AccountState::replay(const Date& date, bool automatic)
 {
-    const Account* account = account_.partner();
-    State* state = state_.partner();
-    Currency* currency = nullptr;
-    if (account == nullptr || state == nullptr || account->getCurrency(&currency) != 0)
+    const Currency* currency = account() != nullptr ? account()->currency() : nullptr;
+    if (state() == nullptr || currency == nullptr)
         return;
-    unsigned n;
-    Operation** operations = account->getAllOperations(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const Operation& operation = *operations[i];
-        state->noteOperationDate(operation.getDate()); // before the test: a later operation counts as the first, too
-        if (operation.getDate() > date)
+    State& whole = *state();
+    for (const Operation* operation : account()->operations()) {
+        whole.noteOperationDate(operation->getDate()); // before the test: a later operation counts as the first, too
+        if (operation->getDate() > date)
             break;
-        if (operation.isAutomatic() != automatic)
+        if (operation->isAutomatic() != automatic)
             continue;
-        if (operation.getType() == Operation::kDeposit)
-            state->setTotalDeposit(addRounded(state->getTotalDeposit(), depositInReference(operation, *currency)));
-        cash_ = addRounded(cash_, ownCashMove(operation));
+        if (operation->getType() == Operation::kDeposit)
+            whole.setTotalDeposit(addRounded(whole.getTotalDeposit(), depositInReference(*operation, *currency)));
+        cash_ = addRounded(cash_, ownCashMove(*operation));
     }
-    TransferAccountOperation** transfers = account->getAllTransferOperations(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        state->noteOperationDate(transfers[i]->getDate());
-        if (transfers[i]->getDate() > date)
+    // The received transfers come after all moves of the account's own: the roundings depend on the order.
+    for (const TransferAccountOperation* transfer : account()->transferOperations()) {
+        whole.noteOperationDate(transfer->getDate());
+        if (transfer->getDate() > date)
             break;
-        if (transfers[i]->isAutomatic() == automatic)
-            cash_ = addRounded(cash_, receivedCash(*transfers[i]));
+        if (transfer->isAutomatic() == automatic)
+            cash_ = addRounded(cash_, receivedCash(*transfer));
     }
 }
 
 Date AccountState::getDate() const
 {
-    return state_.partner() != nullptr ? state_.partner()->getDate() : Date();
+    return state() != nullptr ? state()->getDate() : Date();
 }
 
 const String& AccountState::getAccountName() const
 {
-    return account_.partner() != nullptr ? account_.partner()->getName() : String::none();
+    return account() != nullptr ? account()->getName() : String::none();
 }
 
 const String& AccountState::getCurrencyRepresentation() const
 {
-    return account_.partner() != nullptr ? account_.partner()->getCurrencyRepresentation() : String::none();
+    return account() != nullptr ? account()->getCurrencyRepresentation() : String::none();
 }
 
 void AccountToAccountStates::deleteAll()

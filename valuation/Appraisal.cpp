@@ -39,11 +39,10 @@ float Appraisal::totalValue(const State& state)
 
 float Appraisal::sharesValue(const State& state, double referenceRate)
 {
-    unsigned n;
-    ShareState** states = state.getAllShareStates(&n);
-    shares_.resize(n);
+    const auto states = state.shareStates();
+    shares_.resize(states.size());
     float value = 0;
-    for (unsigned i = 0; i < n; ++i) {
+    for (std::size_t i = 0; i < states.size(); ++i) {
         const unsigned currency = currencyOf(shares_[i], states[i]->share(), *states[i]);
         if (currency == kUnknown)
             continue;
@@ -55,11 +54,10 @@ float Appraisal::sharesValue(const State& state, double referenceRate)
 
 float Appraisal::cashValue(const State& state, double referenceRate)
 {
-    unsigned n;
-    AccountState** states = state.getAllAccountStates(&n);
-    accounts_.resize(n);
+    const auto states = state.accountStates();
+    accounts_.resize(states.size());
     float value = 0;
-    for (unsigned i = 0; i < n; ++i) {
+    for (std::size_t i = 0; i < states.size(); ++i) {
         const unsigned currency = currencyOf(accounts_[i], states[i]->account(), *states[i]);
         if (currency == kUnknown)
             continue;

@@ -77,8 +77,8 @@ AutomaticSale::Day AutomaticSale::dayAt(const Date& stateDate, int number) const
 AutomaticSale::Outcome AutomaticSale::judge(const Day& day)
 {
     if (day.lossLimit > day.prevision)
-        return Outcome::Loss;
-    return day.profitLimit < day.prevision ? Outcome::Profit : Outcome::Hold;
+        return Outcome::kLoss;
+    return day.profitLimit < day.prevision ? Outcome::kProfit : Outcome::kHold;
 }
 
 /// The first day from `first` to `last` on which the holding is sold, else `last`.
@@ -88,7 +88,7 @@ AutomaticSale::Outcome AutomaticSale::judge(const Day& day)
 /// number comes from files. From an impossible state date on, the lines begin with the first real day.
 AutomaticSale::Day AutomaticSale::firstSale(const Date& stateDate, const Day& first, const Day& last) const
 {
-    if (judge(first) != Outcome::Hold)
+    if (judge(first) != Outcome::kHold)
         return first;
     const bool canSell = first.isReal != last.isReal ||
                          canExceed(first.lossLimit, last.lossLimit, first.prevision, last.prevision) ||
@@ -97,34 +97,33 @@ AutomaticSale::Day AutomaticSale::firstSale(const Date& stateDate, const Day& fi
         return last;
     const Day middle = dayAt(stateDate, first.number + (last.number - first.number) / 2);
     const Day sale = firstSale(stateDate, first, middle);
-    return judge(sale) != Outcome::Hold ? sale : firstSale(stateDate, middle, last);
+    return judge(sale) != Outcome::kHold ? sale : firstSale(stateDate, middle, last);
 }
 
 void AutomaticSale::make(const Date& stateDate, Account* sellingAccount)
 {
-    Outcome outcome = Outcome::Hold;
+    Outcome outcome = Outcome::kHold;
     Date date = holding_.endDate.date();
     if (const int days = daysBefore(date, stateDate); days > 0) {
         const Day day = firstSale(stateDate, dayAt(stateDate, 0), dayAt(stateDate, days - 1));
         outcome = judge(day);
         // Intended: at the end of the horizon the holding is sold whatever the trend, and no gain is transferred.
-        if (outcome != Outcome::Hold)
+        if (outcome != Outcome::kHold)
             date = dayAfter(stateDate, day.number);
     }
     const float quote = share_.getPrevisionQuote(date);
     // Owned by the holding. Intended: without an account, so it is no part of any balance, is not written to the
     // portfolio file, and stays when the accounts' automatic operations are removed.
     new ShareOperation(date, &share_, false, holding_.quantity, quote, true, wallet_.getSellCost());
-    if (outcome == Outcome::Profit)
+    if (outcome == Outcome::kProfit)
         transferGain(date, quote, sellingAccount);
 }
 
 void AutomaticSale::transferGain(const Date& date, float quote, Account* sellingAccount)
 {
-    Company* company = nullptr;
-    if (sellingAccount == nullptr || share_.getCompany(&company) != 0)
+    if (sellingAccount == nullptr || share_.company() == nullptr)
         return;
-    Account* recipient = wallet_.findDefaultTransferAccount(company->getCurrencyRepresentation());
+    Account* recipient = wallet_.findDefaultTransferAccount(share_.company()->getCurrencyRepresentation());
     if (recipient == nullptr || recipient == sellingAccount)
         return;
     const double h = holding_.quantity;

@@ -23,7 +23,7 @@ public:
     void make(const Date& stateDate, Account* sellingAccount);
 
 private:
-    enum class Outcome { Hold, Loss, Profit };
+    enum class Outcome { kHold, kLoss, kProfit };
 
     /// A day of the search, by its number from the state's day.
     struct Day {

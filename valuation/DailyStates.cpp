@@ -22,23 +22,19 @@ DailyStates::DailyStates(Wallet& wallet, const Date& first, const Date& end)
         days_.push_back(day);
     events_.resize(days_.size());
 
-    unsigned nAccounts;
-    Account** accounts = wallet.getAllAccounts(&nAccounts);
-    accounts_.assign(accounts, accounts + nAccounts);
-    cash_.resize(nAccounts); // the events point into it: it must not grow later
+    accounts_.assign(wallet.accounts().begin(), wallet.accounts().end());
+    cash_.resize(accounts_.size()); // the events point into it: it must not grow later
     // The order in which a state moves cash: every account's own moves, then holding by holding, then what is
     // automatic.
-    for (std::size_t i = 0; i < nAccounts; ++i) {
+    for (std::size_t i = 0; i < accounts_.size(); ++i) {
         accountIndex_.emplace(accounts_[i], i);
         takeOwnMoves(i);
         takeReceivedTransfers(i, false);
     }
-    unsigned nShares;
-    Share** shares = wallet.getAllShares(&nShares);
-    lines_.reserve(nShares);
-    for (unsigned i = 0; i < nShares; ++i)
-        takeShare(*shares[i]);
-    for (std::size_t i = 0; i < nAccounts; ++i)
+    lines_.reserve(wallet.getNbrShares());
+    for (Share* share : wallet.shares())
+        takeShare(*share);
+    for (std::size_t i = 0; i < accounts_.size(); ++i)
         takeReceivedTransfers(i, true);
 }
 
@@ -62,33 +58,27 @@ void DailyStates::takeMove(const Operation& operation, Ledger& ledger, double am
 
 void DailyStates::takeOwnMoves(std::size_t account)
 {
-    Currency* currency;
-    if (accounts_[account]->getCurrency(&currency) != 0)
+    const Currency* currency = accounts_[account]->currency();
+    if (currency == nullptr)
         return;
-    unsigned n;
-    Operation** operations = accounts_[account]->getAllOperations(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const Operation& operation = *operations[i];
-        firstOperationDate_ = std::min(firstOperationDate_, operation.getDate());
-        const short type = operation.getType();
+    for (const Operation* operation : accounts_[account]->operations()) {
+        firstOperationDate_ = std::min(firstOperationDate_, operation->getDate());
+        const short type = operation->getType();
         if (type == Operation::kDeposit)
-            takeMove(operation, deposits_, depositInReference(operation, *currency));
+            takeMove(*operation, deposits_, depositInReference(*operation, *currency));
         if (type == Operation::kDeposit || type == Operation::kTransfer)
-            takeMove(operation, cash_[account], ownCashMove(operation));
+            takeMove(*operation, cash_[account], ownCashMove(*operation));
     }
 }
 
 void DailyStates::takeReceivedTransfers(std::size_t account, bool automatic)
 {
-    Currency* currency;
-    if (accounts_[account]->getCurrency(&currency) != 0)
+    if (accounts_[account]->currency() == nullptr)
         return;
-    unsigned n;
-    TransferAccountOperation** transfers = accounts_[account]->getAllTransferOperations(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        firstOperationDate_ = std::min(firstOperationDate_, transfers[i]->getDate());
-        if (transfers[i]->isAutomatic() == automatic)
-            takeMove(*transfers[i], cash_[account], receivedCash(*transfers[i]));
+    for (const TransferAccountOperation* transfer : accounts_[account]->transferOperations()) {
+        firstOperationDate_ = std::min(firstOperationDate_, transfer->getDate());
+        if (transfer->isAutomatic() == automatic)
+            takeMove(*transfer, cash_[account], receivedCash(*transfer));
     }
 }
 
@@ -96,22 +86,18 @@ void DailyStates::takeShare(Share& share)
 {
     Line& line = lines_.emplace_back();
     line.share = &share;
-    unsigned n;
-    ShareOperation** operations = share.getAllShareOperations(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const ShareOperation& operation = *operations[i];
-        firstOperationDate_ = std::min(firstOperationDate_, operation.getDate());
-        line.operations.emplace_back(dayOf(operation.getDate()), &operation);
-        Account* account;
-        operation.getAccount(&account);
-        const auto found = accountIndex_.find(account);
+    for (const ShareOperation* operation : share.shareOperations()) {
+        firstOperationDate_ = std::min(firstOperationDate_, operation->getDate());
+        line.operations.emplace_back(dayOf(operation->getDate()), operation);
+        const auto found = accountIndex_.find(operation->account());
         if (found == accountIndex_.end()) // none, or one of another wallet: it moves no cash here
             continue;
-        const float amount = operation.isBuy() ? -purchaseCost(operation, wallet_) : saleProceeds(operation, wallet_);
-        takeMove(operation, cash_[found->second], amount);
+        const float amount =
+            operation->isBuy() ? -purchaseCost(*operation, wallet_) : saleProceeds(*operation, wallet_);
+        takeMove(*operation, cash_[found->second], amount);
     }
-    if (Company * company; share.getCompany(&company) == 0)
-        line.walk.emplace(*company);
+    if (share.company() != nullptr)
+        line.walk.emplace(*share.company());
     share.reserveShareStates(share.getNbrShareStates() + static_cast<unsigned>(days_.size()));
 }
 

@@ -17,14 +17,14 @@ constexpr std::int64_t kMostHoldingDays = 20000000;
 EvolutionOutcome buildDailyStates(Wallet& wallet, const Date& first, const Date& end)
 {
     if (first >= end)
-        return EvolutionOutcome::Built;
+        return EvolutionOutcome::kBuilt;
     if (!first.isValid() || !end.isValid())
-        return EvolutionOutcome::BadFirstDay;
+        return EvolutionOutcome::kBadFirstDay;
     const std::int64_t days = end - first;
     if (days > kMostDays || days * (wallet.getNbrShares() + wallet.getNbrAccounts()) > kMostHoldingDays)
-        return EvolutionOutcome::TooLong;
+        return EvolutionOutcome::kTooLong;
     DailyStates(wallet, first, end).build();
-    return EvolutionOutcome::Built;
+    return EvolutionOutcome::kBuilt;
 }
 
 } // namespace
@@ -52,10 +52,8 @@ std::vector<EvolutionPoint> evolutionPoints(const Wallet& wallet, const Catalogu
     Appraisal appraisal(catalogue);
     if (!appraisal.hasReference())
         return points;
-    unsigned n;
-    State** states = wallet.getAllStates(&n);
-    points.reserve(n);
-    for (unsigned i = 0; i < n; ++i)
-        points.push_back({states[i]->getDate(), appraisal.totalValue(*states[i])});
+    points.reserve(wallet.getNbrStates());
+    for (const State* state : wallet.states())
+        points.push_back({state->getDate(), appraisal.totalValue(*state)});
     return points;
 }

@@ -10,9 +10,9 @@ class Wallet;
 
 /// What came of an evolution.
 enum class EvolutionOutcome {
-    Built,       ///< a state for every day from the first operation up to the current state's day
-    BadFirstDay, ///< the first operation, or the day to end at, has no real date: no daily states
-    TooLong,     ///< too many days for that many holdings: no daily states
+    kBuilt,       ///< a state for every day from the first operation up to the current state's day
+    kBadFirstDay, ///< the first operation, or the day to end at, has no real date: no daily states
+    kTooLong,     ///< too many days for that many holdings: no daily states
 };
 
 /// Recomputes the states of `wallet`: destroys all of them, builds the current one for `date`, with automatic sales

@@ -1,6 +1,8 @@
 #include "valuation/ShareState.h"
 
 #include "market/Company.h"
+#include "market/Currency.h"
+#include "market/Market.h"
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/Wallet.h"
@@ -19,14 +21,13 @@ ShareState::ShareState(Share* share, State* state, const Date& date, bool automa
 {
     setShare(share);
     setState(state);
-    Wallet* wallet = nullptr;
-    if (share == nullptr || state == nullptr || state->getWallet(&wallet) != 0)
+    if (share == nullptr || state == nullptr || state->wallet() == nullptr)
         return;
     Account* sellingAccount = nullptr;
     const bool isComplete = replay(date, &sellingAccount);
     share->getQuote(date, &quote_);
     if (automatic && isComplete && holding_.quantity >= 1)
-        AutomaticSale(*share, *wallet, holding_).make(date, sellingAccount);
+        AutomaticSale(*share, *state->wallet(), holding_).make(date, sellingAccount);
 }
 
 ShareState::~ShareState()
@@ -39,49 +40,56 @@ ShareState::~ShareState()
 /// @return false when a later operation exists.
 bool ShareState::replay(const Date& date, Account** sellingAccount)
 {
-    State& state = *state_.partner();
-    Wallet* wallet;
-    state.getWallet(&wallet);
-    unsigned n;
-    ShareOperation** operations = share_.partner()->getAllShareOperations(&n);
-    for (unsigned i = 0; i < n; ++i) {
-        const ShareOperation& operation = *operations[i];
-        state.noteOperationDate(operation.getDate());
-        if (operation.getDate() > date)
+    State& whole = *state();
+    const Wallet& wallet = *whole.wallet();
+    for (const ShareOperation* operation : share()->shareOperations()) {
+        whole.noteOperationDate(operation->getDate());
+        if (operation->getDate() > date)
             return false;
-        operation.getAccount(sellingAccount);
-        if (operation.isBuy()) {
-            state.BuyShares(*sellingAccount, purchaseCost(operation, *wallet));
-            holding_.buy(operation, wallet->getInvestementPeriod());
+        *sellingAccount = operation->account();
+        if (operation->isBuy()) {
+            whole.BuyShares(*sellingAccount, purchaseCost(*operation, wallet));
+            holding_.buy(*operation, wallet.getInvestementPeriod());
         } else {
-            state.SellShares(*sellingAccount, saleProceeds(operation, *wallet));
-            holding_.sell(operation);
+            whole.SellShares(*sellingAccount, saleProceeds(*operation, wallet));
+            holding_.sell(*operation);
         }
     }
     return true;
 }
 
+QuoteBasis ShareState::quoteBasis() const
+{
+    const Company* company = share() != nullptr ? share()->company() : nullptr;
+    if (company == nullptr || company->getNbrQuotes() == 0)
+        return {};
+    const Currency* currency = company->market() != nullptr ? company->market()->currency() : nullptr;
+    const Date day = getDate();
+    const Date quoted = company->getLastQuoteUpTo(day);
+    const bool isOutside = quoted.isUndefined() || day > company->getLastQuote();
+    return {true, currency != nullptr && currency->getNbrQuotes() > 0, isOutside && company->getNbrQuotes() > 1,
+            quoted.isUndefined() ? company->getFirstQuote() : quoted};
+}
+
 Date ShareState::getDate() const
 {
-    return state_.partner() != nullptr ? state_.partner()->getDate() : Date();
+    return state() != nullptr ? state()->getDate() : Date();
 }
 
 const String& ShareState::getCompanyAbbreviation() const
 {
-    return share_.partner() != nullptr ? share_.partner()->getCompanyAbbreviation() : String::none();
+    return share() != nullptr ? share()->getCompanyAbbreviation() : String::none();
 }
 
 const String& ShareState::getCompanyName() const
 {
-    return share_.partner() != nullptr ? share_.partner()->getCompanyName() : String::none();
+    return share() != nullptr ? share()->getCompanyName() : String::none();
 }
 
 const String& ShareState::getCurrencyRepresentation() const
 {
-    Company* company = nullptr;
-    if (share_.partner() == nullptr || share_.partner()->getCompany(&company) != 0)
-        return String::none();
-    return company->getCurrencyRepresentation();
+    const Company* company = share() != nullptr ? share()->company() : nullptr;
+    return company != nullptr ? company->getCurrencyRepresentation() : String::none();
 }
 
 void ShareToShareStates::deleteAll()

@@ -9,6 +9,14 @@
 
 class Account;
 
+/// What the quote of a holding rests on, on the day of its state.
+struct QuoteBasis {
+    bool isKnown = false;    ///< false without any quote: the holding counts as 0 then
+    bool hasRate = false;    ///< whether the quote's currency has a rate: without one the holding counts as 0, too
+    bool isEstimate = false; ///< outside the series, where the quote is on a straight line
+    Date day;                ///< of the quote that counts, or that the estimate starts from
+};
+
 /// One holding at the day of a state.
 class ShareState final : public Pooled<ShareState, (std::size_t{192} << 20)> {
 public:
@@ -21,10 +29,19 @@ public:
 
     /// Number of shares held; negative when more were sold than held.
     int getQuantity() const { return holding_.quantity; }
+    /// False for what was sold whole; such a holding stays in the portfolio.
+    bool isHeld() const { return holding_.quantity != 0; }
     /// Average purchase price, in the currency of the company's market.
     float getBuyQuote() const { return holding_.buyQuote; }
     /// The company's price at the state's day, 0 without a company.
     float getQuote() const { return quote_; }
+    /// By the company's quotes as they are now.
+    QuoteBasis quoteBasis() const;
+    /// Quantity times quote.
+    double worth() const { return static_cast<double>(quote_) * holding_.quantity; }
+    /// Change from the average purchase price to the quote, a fraction; -1 without any quote, not finite when the
+    /// purchase price is 0.
+    double gain() const { return static_cast<double>(quote_) / holding_.buyQuote - 1; }
     /// End of the investment horizon, undefined before the first purchase.
     Date getEndDate() const { return holding_.endDate.date(); }
     /// The state's day, undefined without a state.

@@ -19,16 +19,12 @@ State::State(Wallet* wallet, const Date& date, bool automatic) : State(wallet, d
     firstOperationDate_ = afterAllOperations();
 
     // Accounts first: the replay of the holdings moves their cash. The states link themselves in and are owned here.
-    unsigned nAccounts;
-    Account** accounts = wallet->getAllAccounts(&nAccounts);
-    for (unsigned i = 0; i < nAccounts; ++i)
-        new AccountState(accounts[i], this, date, automatic);
-    unsigned nShares;
-    Share** shares = wallet->getAllShares(&nShares);
-    for (unsigned i = 0; i < nShares; ++i)
-        new ShareState(shares[i], this, date, automatic);
-    for (unsigned i = 0; i < getNbrAccountStates(); ++i)
-        getAccountState(i)->processAutomaticOperations(date);
+    for (Account* account : wallet->accounts())
+        new AccountState(account, this, date, automatic);
+    for (Share* share : wallet->shares())
+        new ShareState(share, this, date, automatic);
+    for (AccountState* state : accountStates())
+        state->processAutomaticOperations(date);
 }
 
 State::~State()
@@ -50,16 +46,14 @@ AccountState* State::findAccountState(Account* account) const
         return nullptr;
     // A state lists the accounts in the order of the wallet: only when that has changed since is there a search.
     unsigned place;
-    if (wallet_.partner() != nullptr && wallet_.partner()->getAccountPlace(account, &place) == 0) {
+    if (wallet() != nullptr && wallet()->getAccountPlace(account, &place) == 0) {
         AccountState* state = getAccountState(place);
         if (state != nullptr && state->account() == account)
             return state;
     }
-    unsigned n;
-    AccountState** states = getAllAccountStates(&n);
-    for (unsigned i = 0; i < n; ++i)
-        if (states[i]->account() == account)
-            return states[i];
+    for (AccountState* state : accountStates())
+        if (state->account() == account)
+            return state;
     return nullptr;
 }
 

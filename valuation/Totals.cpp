@@ -25,8 +25,9 @@ Totals::Totals(const State& state, const Catalogue& catalogue)
     if (!appraisal.hasReference())
         return;
     isKnown = true;
+    reference = catalogue.getReferenceCurrency();
     totalDeposit = state.getTotalDeposit();
-    if (catalogue.getReferenceCurrency()->getRealQuote(state.getDate()) == 0)
+    if (reference->getRealQuote(state.getDate()) == 0)
         return;
     totalValue = appraisal.totalValue(state);
     profit = totalValue - totalDeposit;

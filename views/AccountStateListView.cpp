@@ -16,9 +16,7 @@ AccountStateItem::AccountStateItem(AccountState* state) : state_(state), account
 
 Cell AccountStateItem::cell(int column) const
 {
-    Currency* currency = nullptr;
-    if (account_ != nullptr)
-        account_->getCurrency(&currency);
+    const Currency* currency = account_ != nullptr ? account_->currency() : nullptr;
     switch (column) {
     case kName:
         return {textOf(state_->getAccountName())};

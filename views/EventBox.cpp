@@ -6,14 +6,8 @@
 #include "platform/MenuItem.h"
 #include "platform/PopUpMenu.h"
 #include "platform/StringView.h"
-#include "platform/TextControl.h"
-#include "platform/TextView.h"
 #include "views/CompanyEventListView.h"
-#include "views/DateControl.h"
 #include "views/Look.h"
-#include "views/ModelText.h"
-#include "views/NumberControl.h"
-#include "views/PageView.h"
 
 using namespace look;
 
@@ -102,54 +96,4 @@ void EventBox::setType(short type)
         setVisible(*view, isNote);
     for (BView* view : {numerator_, divider_})
         setVisible(*view, !isNote);
-}
-
-Date EventBox::getDate() const
-{
-    return date_->getDate();
-}
-
-void EventBox::setDate(const Date& date)
-{
-    date_->setDate(date);
-}
-
-String EventBox::getTitle() const
-{
-    return title_->Text();
-}
-
-void EventBox::setTitle(const String& title)
-{
-    PageView::showText(*title_, title);
-}
-
-String EventBox::getText() const
-{
-    return text_->Text();
-}
-
-void EventBox::setText(const String& text)
-{
-    text_->SetText(wholeTextOf(text));
-}
-
-short EventBox::getNumerator() const
-{
-    return numerator_->getShort();
-}
-
-void EventBox::setNumerator(short numerator)
-{
-    numerator_->setInteger(numerator);
-}
-
-short EventBox::getDivider() const
-{
-    return divider_->getShort();
-}
-
-void EventBox::setDivider(short divider)
-{
-    divider_->setInteger(divider);
 }

@@ -3,13 +3,14 @@
 #include "foundation/Date.h"
 #include "foundation/String.h"
 #include "platform/Box.h"
+#include "platform/TextView.h"
+#include "views/DateControl.h"
+#include "views/ModelText.h"
+#include "views/NumberControl.h"
+#include "views/PageView.h"
 
 class BMenuField;
-class BTextControl;
-class BTextView;
 class CompanyEventListView;
-class DateControl;
-class NumberControl;
 
 /// A company's events with the fields and buttons to add, change and remove them. Of the fields, those of the chosen
 /// kind show.
@@ -23,16 +24,16 @@ public:
     short getType() const { return type_; }
     void setType(short type);
     /// Undefined while the text is no date.
-    Date getDate() const;
-    void setDate(const Date& date);
-    String getTitle() const;
-    void setTitle(const String& title);
-    String getText() const;
-    void setText(const String& text);
-    short getNumerator() const;
-    void setNumerator(short numerator);
-    short getDivider() const;
-    void setDivider(short divider);
+    Date getDate() const { return date_->getDate(); }
+    void setDate(const Date& date) { date_->setDate(date); }
+    String getTitle() const { return title_->Text(); }
+    void setTitle(const String& title) { PageView::showText(*title_, title); }
+    String getText() const { return text_->Text(); }
+    void setText(const String& text) { text_->SetText(wholeTextOf(text)); }
+    short getNumerator() const { return numerator_->getShort(); }
+    void setNumerator(short numerator) { numerator_->setInteger(numerator); }
+    short getDivider() const { return divider_->getShort(); }
+    void setDivider(short divider) { divider_->setInteger(divider); }
 
 private:
     BMenuField* makeMenu(BRect frame);

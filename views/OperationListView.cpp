@@ -33,23 +33,22 @@ const TransferAccountOperation& asTransfer(const Operation& operation)
 
 std::string accountName(const Operation& operation)
 {
-    Account* account;
-    return operation.getAccount(&account) == 0 ? textOf(account->getName()) : std::string();
+    return operation.account() != nullptr ? textOf(operation.account()->getName()) : std::string();
 }
 
 /// Ticker and company, or the account that receives a transfer.
 Cell what(const Operation& operation)
 {
     if (isTrade(operation)) {
-        Share* share;
-        if (asTrade(operation).getShare(&share) != 0)
+        const Share* share = asTrade(operation).share();
+        if (share == nullptr)
             return {"no company", look::kWarning};
         return {textOf(share->getCompanyAbbreviation()) + "  " + textOf(share->getCompanyName())};
     }
     if (operation.getType() != Operation::kTransfer)
         return {};
-    Account* recipient;
-    if (asTransfer(operation).getRecepientAccount(&recipient) != 0)
+    const Account* recipient = asTransfer(operation).recipient();
+    if (recipient == nullptr)
         return {"to no account", look::kWarning};
     return {"to " + textOf(recipient->getName())};
 }

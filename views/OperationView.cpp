@@ -1,19 +1,14 @@
 #include "views/OperationView.h"
 
 #include "platform/Box.h"
-#include "platform/CheckBox.h"
 #include "platform/MenuField.h"
 #include "platform/MenuItem.h"
 #include "platform/PopUpMenu.h"
 #include "portfolio/Account.h"
 #include "portfolio/AccountOperation.h"
 #include "portfolio/ShareOperation.h"
-#include "views/DateControl.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
-#include "views/NumberControl.h"
-#include "views/OfferField.h"
-#include "views/OperationListView.h"
 
 namespace {
 
@@ -184,57 +179,10 @@ void OperationView::Draw(BRect)
     DrawString(kLegend, {left + kPadding, kMargin + kFieldHeight - kPadding + 1});
 }
 
-bool OperationView::isPrevision() const
-{
-    return prevision_->Value() == B_CONTROL_ON;
-}
-
-// --- The list.
-
 void OperationView::ClearAllOperations()
 {
     operations_->remember();
     operations_->clear();
-}
-
-void OperationView::AddOperationList(Operation** operations, int count)
-{
-    operations_->addAll({operations, operations + count});
-}
-
-void OperationView::RecallSelection()
-{
-    operations_->recall();
-}
-
-void OperationView::ForgetSelection()
-{
-    operations_->forget();
-}
-
-void OperationView::RemoveOperation(const Operation* operation)
-{
-    operations_->release(operation);
-}
-
-void OperationView::RemoveAccountOperation(AccountOperation* operation)
-{
-    RemoveOperation(operation);
-}
-
-void OperationView::RemoveShareOperation(ShareOperation* operation)
-{
-    RemoveOperation(operation);
-}
-
-void OperationView::DropRemovedOperations()
-{
-    operations_->dropReleased();
-}
-
-void OperationView::UpdateShareOperation(ShareOperation* operation)
-{
-    operations_->modify(operation);
 }
 
 void OperationView::ShowOperation(const Operation* operation)
@@ -246,11 +194,6 @@ void OperationView::ShowOperation(const Operation* operation)
     operations_->SetQuiet(false);
 }
 
-bool OperationView::IsSelectedAccountOperation() const
-{
-    return GetSelectedAccountOperation() != nullptr;
-}
-
 AccountOperation* OperationView::GetSelectedAccountOperation() const
 {
     return dynamic_cast<AccountOperation*>(operations_->selected());
@@ -260,8 +203,6 @@ ShareOperation* OperationView::GetSelectedShareOperation() const
 {
     return dynamic_cast<ShareOperation*>(operations_->selected());
 }
-
-// --- The menus.
 
 void OperationView::SetAccountsList(Account** accounts, int count)
 {

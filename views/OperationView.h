@@ -2,6 +2,13 @@
 
 #include "foundation/Date.h"
 #include "foundation/String.h"
+#include "platform/CheckBox.h"
+#include "portfolio/AccountOperation.h"
+#include "portfolio/ShareOperation.h"
+#include "views/DateControl.h"
+#include "views/NumberControl.h"
+#include "views/OfferField.h"
+#include "views/OperationListView.h"
 #include "views/PageView.h"
 
 #include <functional>
@@ -9,14 +16,8 @@
 #include <vector>
 
 class Account;
-class AccountOperation;
 class BMenu;
 class BMenuField;
-class Operation;
-class OperationListView;
-class ShareOperation;
-template <class Control>
-class OfferField;
 
 /// The page of the operations on the portfolio's accounts: a list of all of them, and the fields of one.
 ///
@@ -27,30 +28,30 @@ public:
     OperationView(BRect frame, const char* name, BWindow* window);
 
     /// Whether automatic sales are searched.
-    bool isPrevision() const;
+    bool isPrevision() const { return prevision_->Value() == B_CONTROL_ON; }
 
     // The list.
     /// Empties the list, keeping in mind what was selected.
     void ClearAllOperations();
     /// Puts rows behind the others.
-    void AddOperationList(Operation** operations, int count);
+    void AddOperationList(Operation** operations, int count) { operations_->addAll({operations, operations + count}); }
     /// To be called when the list is filled again: selects what was selected, where it still is.
-    void RecallSelection();
+    void RecallSelection() { operations_->recall(); }
     /// What was selected belongs to a portfolio that is gone.
-    void ForgetSelection();
+    void ForgetSelection() { operations_->forget(); }
     /// Shows nothing of the operation any more, in constant time; its row goes with the next refresh.
-    void RemoveOperation(const Operation* operation);
-    void RemoveAccountOperation(AccountOperation* operation);
-    void RemoveShareOperation(ShareOperation* operation);
+    void RemoveOperation(const Operation* operation) { operations_->release(operation); }
+    void RemoveAccountOperation(AccountOperation* operation) { RemoveOperation(operation); }
+    void RemoveShareOperation(ShareOperation* operation) { RemoveOperation(operation); }
     /// Takes the rows of removed operations out of a list that is not filled again.
-    void DropRemovedOperations();
+    void DropRemovedOperations() { operations_->dropReleased(); }
     /// Draws the operation's row again.
-    void UpdateShareOperation(ShareOperation* operation);
+    void UpdateShareOperation(ShareOperation* operation) { operations_->modify(operation); }
     /// Selects the operation's row and brings it into view; the fields stay as they are.
     void ShowOperation(const Operation* operation);
 
     /// False also when nothing is selected.
-    bool IsSelectedAccountOperation() const;
+    bool IsSelectedAccountOperation() const { return GetSelectedAccountOperation() != nullptr; }
     /// Null when no such operation is selected.
     AccountOperation* GetSelectedAccountOperation() const;
     ShareOperation* GetSelectedShareOperation() const;
@@ -64,36 +65,36 @@ public:
     /// The same, and shows the fields of that type in place of those of another one.
     void SetType(const String& type);
     /// Undefined while the field holds no date.
-    Date getDate() const;
+    Date getDate() const { return date_->getDate(); }
     void setDate(const Date& date);
-    bool getAutomatic() const;
-    void setAutomatic(bool automatic);
+    bool getAutomatic() const { return automatic_->Value() == B_CONTROL_ON; }
+    void setAutomatic(bool automatic) { automatic_->SetValue(automatic); }
     /// Names; undefined while no account is chosen.
-    String getBaseAccount() const;
-    void setBaseAccount(const String& name);
-    String getTransferAccount() const;
-    void setTransferAccount(const String& name);
-    float getAmount() const;
-    void setAmount(float amount);
-    float getTransferCost() const;
-    void setTransferCost(float cost);
+    String getBaseAccount() const { return chosen(*baseAccount_); }
+    void setBaseAccount(const String& name) { choose(*baseAccount_, name); }
+    String getTransferAccount() const { return chosen(*transferAccount_); }
+    void setTransferAccount(const String& name) { choose(*transferAccount_, name); }
+    float getAmount() const { return amount_->getNumber(); }
+    void setAmount(float amount) { amount_->setNumber(amount); }
+    float getTransferCost() const { return transferCost_->getNumber(); }
+    void setTransferCost(float cost) { transferCost_->setNumber(cost); }
     /// As a fraction of the amount.
-    float getTransferRateCost() const;
-    void setTransferRateCost(float rate);
-    float getTransferFromQuote() const;
-    void setTransferFromQuote(float quote);
-    float getTransferToQuote() const;
-    void setTransferToQuote(float quote);
-    String getMarketName() const;
-    void setMarketName(const String& name);
-    String getCompanyAbbreviation() const;
-    void setCompanyAbbreviation(const String& ticker);
-    int getQuantity() const;
-    void setQuantity(int quantity);
-    float getQuote() const;
-    void setQuote(float quote);
-    float getShareCost() const;
-    void setShareCost(float cost);
+    float getTransferRateCost() const { return transferRateCost_->getNumber(); }
+    void setTransferRateCost(float rate) { transferRateCost_->setNumber(rate); }
+    float getTransferFromQuote() const { return transferFromQuote_->getNumber(); }
+    void setTransferFromQuote(float quote) { show(*transferFromQuote_, quote); }
+    float getTransferToQuote() const { return transferToQuote_->getNumber(); }
+    void setTransferToQuote(float quote) { show(*transferToQuote_, quote); }
+    String getMarketName() const { return marketName_->Text(); }
+    void setMarketName(const String& name) { showText(*marketName_, name); }
+    String getCompanyAbbreviation() const { return companyAbbreviation_->Text(); }
+    void setCompanyAbbreviation(const String& ticker) { showText(*companyAbbreviation_, ticker); }
+    int getQuantity() const { return quantity_->getInteger(); }
+    void setQuantity(int quantity) { quantity_->setInteger(quantity); }
+    float getQuote() const { return quote_->getNumber(); }
+    void setQuote(float quote) { show(*quote_, quote); }
+    float getShareCost() const { return shareCost_->getNumber(); }
+    void setShareCost(float cost) { show(*shareCost_, cost); }
     void setTotal(float total);
 
     // Offers.
@@ -101,17 +102,23 @@ public:
     /// ticker.
     void SetTypingHook(const std::function<void()>& hook);
     void offerDate(const Date& date);
-    void offerShareCost(float cost);
+    void offerShareCost(float cost) { offer(*shareCost_, cost); }
     /// Only where a former offer stands: a field emptied by hand says that there is no cost.
     void renewShareCost(float cost);
     /// Without a value what was offered before is taken back.
-    void offerQuote(std::optional<float> quote);
+    void offerQuote(std::optional<float> quote) { offer(*quote_, quote); }
     void offerTransferQuotes(std::optional<float> from, std::optional<float> to);
 
     void Draw(BRect updateRect) override;
 
 private:
     using OfferNumber = OfferField<NumberControl>;
+
+    static String chosen(const BMenuField& field);
+    /// Marks the item of that label, or none.
+    static void choose(BMenuField& field, const String& label);
+    static void show(OfferNumber& field, float value);
+    static void offer(OfferNumber& field, std::optional<float> value);
 
     void makeList();
     void makeFields();

@@ -8,33 +8,44 @@
 #include <cstdlib>
 #include <iterator>
 #include <limits>
+#include <string>
 
 namespace {
 
-struct FieldPlan {
+enum class Kind { kAmount, kRate, kDays };
+
+/// How a parameter is shown and read, and what depends on it.
+struct Plan {
     const char* label;
     const char* name;
     uint32 code;
+    Kind kind;
+    bool revalues;
     const char* help; // what the parameter is for, one line
 };
 
-// In the order of the page.
-constexpr FieldPlan kPlan[] = {
-    {"Buy Cost", "txtBuyCost", 'PTBc', "Fixed cost that a new purchase starts with, in the account's currency"},
-    {"Sell Cost", "txtSellCost", 'PTSc', "Fixed cost that a new sale starts with, and that of simulated sales"},
-    {"Buy Rate Cost", "txtBuyRateCost", 'PTBr', "Cost of every purchase in proportion to its value"},
-    {"Sell Rate Cost", "txtSellRateCost", 'PTSr', "Cost of every sale in proportion to its value"},
-    {"Investement Period", "txtInvestementPeriod", 'PTIn', "Days from the purchase of a share to its planned end"},
-    {"Begin profit sell rate", "txtBeginProfitSellRate", 'PTBp',
+// By the parameter's number. The page, its command, a load and a new portfolio all go by this table.
+constexpr Plan kPlan[] = {
+    {"Buy Cost", "txtBuyCost", 'PTBc', Kind::kAmount, false,
+     "Fixed cost that a new purchase starts with, in the account's currency"},
+    {"Sell Cost", "txtSellCost", 'PTSc', Kind::kAmount, false,
+     "Fixed cost that a new sale starts with, and that of simulated sales"},
+    {"Buy Rate Cost", "txtBuyRateCost", 'PTBr', Kind::kRate, true, "Cost of every purchase in proportion to its value"},
+    {"Sell Rate Cost", "txtSellRateCost", 'PTSr', Kind::kRate, true, "Cost of every sale in proportion to its value"},
+    {"Investement Period", "txtInvestementPeriod", 'PTIn', Kind::kDays, true,
+     "Days from the purchase of a share to its planned end"},
+    {"Begin profit sell rate", "txtBeginProfitSellRate", 'PTBp', Kind::kRate, true,
      "Quote at which a share is sold with profit when the period begins, of its buy quote"},
-    {"End profit sell rate", "txtEndProfitSellRate", 'PTEp',
+    {"End profit sell rate", "txtEndProfitSellRate", 'PTEp', Kind::kRate, true,
      "The same when the period ends; between them it moves evenly"},
-    {"Begin lose sell rate", "txtBeginLoseSellRate", 'PTBl',
+    {"Begin lose sell rate", "txtBeginLoseSellRate", 'PTBl', Kind::kRate, true,
      "Quote below which a share is sold at a loss when the period begins, of its buy quote"},
-    {"End lose sell rate", "txtEndLoseSellRate", 'PTEl', "The same when the period ends; between them it moves evenly"},
-    {"Reinvestement rate", "txtReinvestRate", 'PTRe',
+    {"End lose sell rate", "txtEndLoseSellRate", 'PTEl', Kind::kRate, true,
+     "The same when the period ends; between them it moves evenly"},
+    {"Reinvestement rate", "txtReinvestRate", 'PTRe', Kind::kRate, true,
      "Part of a simulated sale's profit that stays in the account; the rest goes to the transfer account"},
 };
+static_assert(std::size(kPlan) == Wallet::kParameterCount);
 
 constexpr float kLeft = 5;
 constexpr float kRight = 185;
@@ -72,7 +83,6 @@ float number(const std::string& token, double unit)
 
 ParameterView::ParameterView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
 {
-    static_assert(std::size(kPlan) == kFieldCount);
     for (std::size_t i = 0; i < fields_.size(); ++i) {
         const float top = kTop + kPitch * static_cast<float>(i);
         fields_[i] = addNumber(this, {kLeft, top, kRight, top + kHeight}, kPlan[i].name, kPlan[i].label, kPlan[i].code,
@@ -100,33 +110,40 @@ void ParameterView::KeyDown(const char* bytes, int32 numBytes)
     PageView::KeyDown(bytes, numBytes);
 }
 
-void ParameterView::show(Field field, const char* format, double value)
+std::optional<Wallet::Parameter> ParameterView::parameterOf(uint32 code)
 {
-    constexpr std::size_t kLongest = 400; // the largest double has 309 digits before the point
+    const auto* plan = std::ranges::find(kPlan, code, &Plan::code);
+    if (plan == std::end(kPlan))
+        return std::nullopt;
+    return static_cast<Wallet::Parameter>(plan - kPlan);
+}
+
+bool ParameterView::revalues(Wallet::Parameter parameter)
+{
+    return kPlan[parameter].revalues;
+}
+
+void ParameterView::setParameter(Wallet::Parameter parameter, float value)
+{
+    const Kind kind = kPlan[parameter].kind;
+    constexpr std::size_t kLongest = 60; // the largest float has 39 digits before the point
     char text[kLongest];
-    std::snprintf(text, sizeof text, format, value);
-    fields_[field]->SetText(text);
+    if (kind == Kind::kDays)
+        std::snprintf(text, sizeof text, "%.0f", static_cast<double>(value));
+    else if (kind == Kind::kRate)
+        std::snprintf(text, sizeof text, "%.2f %%", value * 100.0);
+    else
+        std::snprintf(text, sizeof text, "%.2f", static_cast<double>(value));
+    fields_[parameter]->SetText(text);
 }
 
-float ParameterView::amount(Field field) const
+float ParameterView::getParameter(Wallet::Parameter parameter) const
 {
-    return number(firstToken(fields_[field]->Text(), false), 1);
-}
-
-float ParameterView::rate(Field field) const
-{
-    return number(firstToken(fields_[field]->Text(), true), 100);
-}
-
-void ParameterView::setInvestementPeriod(short days)
-{
-    fields_[kInvestementPeriod]->SetText(std::to_string(days).c_str());
-}
-
-short ParameterView::getInvestementPeriod() const
-{
-    const std::string token = firstToken(fields_[kInvestementPeriod]->Text(), false);
+    const Kind kind = kPlan[parameter].kind;
+    const std::string token = firstToken(fields_[parameter]->Text(), kind == Kind::kRate);
+    if (kind != Kind::kDays)
+        return number(token, kind == Kind::kRate ? 100 : 1);
     constexpr long kShortest = std::numeric_limits<short>::min();
     constexpr long kLongest = std::numeric_limits<short>::max();
-    return static_cast<short>(std::clamp(std::strtol(token.c_str(), nullptr, 10), kShortest, kLongest));
+    return static_cast<float>(std::clamp(std::strtol(token.c_str(), nullptr, 10), kShortest, kLongest));
 }

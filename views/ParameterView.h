@@ -1,9 +1,10 @@
 #pragma once
 
+#include "portfolio/Wallet.h"
 #include "views/PageView.h"
 
 #include <array>
-#include <string>
+#include <optional>
 
 /// The page of the ten trading parameters.
 ///
@@ -14,52 +15,42 @@ class ParameterView final : public PageView {
 public:
     ParameterView(BRect frame, const char* name, BWindow* window);
 
-    void setBuyCost(float cost) { showAmount(kBuyCost, cost); }
-    float getBuyCost() const { return amount(kBuyCost); }
-    void setSellCost(float cost) { showAmount(kSellCost, cost); }
-    float getSellCost() const { return amount(kSellCost); }
-    void setBuyRateCost(float rate) { showRate(kBuyRateCost, rate); }
-    float getBuyRateCost() const { return rate(kBuyRateCost); }
-    void setSellRateCost(float rate) { showRate(kSellRateCost, rate); }
-    float getSellRateCost() const { return rate(kSellRateCost); }
+    /// Whose field sends `code`; nothing for any other code.
+    static std::optional<Wallet::Parameter> parameterOf(uint32 code);
+    /// Whether the value of a portfolio depends on it. The fixed costs are only what a new operation starts with.
+    /// Intended: each operation stores its own.
+    static bool revalues(Wallet::Parameter parameter);
+
+    /// Any of the ten by its number, as below by its name.
+    void setParameter(Wallet::Parameter parameter, float value);
+    float getParameter(Wallet::Parameter parameter) const;
+
+    void setBuyCost(float cost) { setParameter(Wallet::kBuyCost, cost); }
+    float getBuyCost() const { return getParameter(Wallet::kBuyCost); }
+    void setSellCost(float cost) { setParameter(Wallet::kSellCost, cost); }
+    float getSellCost() const { return getParameter(Wallet::kSellCost); }
+    void setBuyRateCost(float rate) { setParameter(Wallet::kBuyRateCost, rate); }
+    float getBuyRateCost() const { return getParameter(Wallet::kBuyRateCost); }
+    void setSellRateCost(float rate) { setParameter(Wallet::kSellRateCost, rate); }
+    float getSellRateCost() const { return getParameter(Wallet::kSellRateCost); }
     /// In days.
-    void setInvestementPeriod(short days);
-    short getInvestementPeriod() const;
-    void setBeginProfitSellRate(float rate) { showRate(kBeginProfitSellRate, rate); }
-    float getBeginProfitSellRate() const { return rate(kBeginProfitSellRate); }
-    void setEndProfitSellRate(float rate) { showRate(kEndProfitSellRate, rate); }
-    float getEndProfitSellRate() const { return rate(kEndProfitSellRate); }
-    void setBeginLoseSellRate(float rate) { showRate(kBeginLoseSellRate, rate); }
-    float getBeginLoseSellRate() const { return rate(kBeginLoseSellRate); }
-    void setEndLoseSellRate(float rate) { showRate(kEndLoseSellRate, rate); }
-    float getEndLoseSellRate() const { return rate(kEndLoseSellRate); }
-    void setReinvestRate(float rate) { showRate(kReinvestRate, rate); }
-    float getReinvestRate() const { return rate(kReinvestRate); }
+    void setInvestementPeriod(short days) { setParameter(Wallet::kInvestementPeriod, days); }
+    short getInvestementPeriod() const { return static_cast<short>(getParameter(Wallet::kInvestementPeriod)); }
+    void setBeginProfitSellRate(float rate) { setParameter(Wallet::kBeginProfitSellRate, rate); }
+    float getBeginProfitSellRate() const { return getParameter(Wallet::kBeginProfitSellRate); }
+    void setEndProfitSellRate(float rate) { setParameter(Wallet::kEndProfitSellRate, rate); }
+    float getEndProfitSellRate() const { return getParameter(Wallet::kEndProfitSellRate); }
+    void setBeginLoseSellRate(float rate) { setParameter(Wallet::kBeginLoseSellRate, rate); }
+    float getBeginLoseSellRate() const { return getParameter(Wallet::kBeginLoseSellRate); }
+    void setEndLoseSellRate(float rate) { setParameter(Wallet::kEndLoseSellRate, rate); }
+    float getEndLoseSellRate() const { return getParameter(Wallet::kEndLoseSellRate); }
+    void setReinvestRate(float rate) { setParameter(Wallet::kReinvestRate, rate); }
+    float getReinvestRate() const { return getParameter(Wallet::kReinvestRate); }
 
     void Draw(BRect updateRect) override;
     void FrameResized(float width, float height) override;
     void KeyDown(const char* bytes, int32 numBytes) override;
 
 private:
-    enum Field {
-        kBuyCost,
-        kSellCost,
-        kBuyRateCost,
-        kSellRateCost,
-        kInvestementPeriod,
-        kBeginProfitSellRate,
-        kEndProfitSellRate,
-        kBeginLoseSellRate,
-        kEndLoseSellRate,
-        kReinvestRate,
-        kFieldCount
-    };
-
-    void show(Field field, const char* format, double value);
-    void showAmount(Field field, float amount) { show(field, "%.2f", amount); }
-    void showRate(Field field, float rate) { show(field, "%.2f %%", rate * 100.0); }
-    float amount(Field field) const;
-    float rate(Field field) const;
-
-    std::array<BTextControl*, kFieldCount> fields_{};
+    std::array<BTextControl*, Wallet::kParameterCount> fields_{};
 };

@@ -1,10 +1,6 @@
 #include "views/ShareStateListView.h"
 
 #include "foundation/NumberText.h"
-#include "market/Company.h"
-#include "market/Currency.h"
-#include "market/Market.h"
-#include "portfolio/Share.h"
 #include "views/DateText.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
@@ -13,21 +9,6 @@ namespace {
 
 enum Column { kTicker, kCompany, kQuantity, kBuyQuote, kQuote, kQuoteDay, kValue, kGain, kEndDate };
 
-const Company* companyOf(const Share* share)
-{
-    Company* company = nullptr;
-    if (share != nullptr)
-        share->getCompany(&company);
-    return company;
-}
-
-bool hasRate(const Company& company)
-{
-    Market* market = nullptr;
-    Currency* currency = nullptr;
-    return company.getMarket(&market) == 0 && market->getCurrency(&currency) == 0 && currency->getNbrQuotes() > 0;
-}
-
 std::string withCurrency(const ShareState& state, double amount)
 {
     return amountText(amount) + ' ' + textOf(state.getCurrencyRepresentation());
@@ -35,43 +16,31 @@ std::string withCurrency(const ShareState& state, double amount)
 
 } // namespace
 
-ShareStateItem::ShareStateItem(ShareState* state) : state_(state), share_(state->share())
-{
-    const Company* company = companyOf(share_);
-    if (company == nullptr || company->getNbrQuotes() == 0)
-        return;
-    hasQuote_ = true;
-    hasRate_ = hasRate(*company);
-    const Date day = state->getDate();
-    const Date quoted = company->getLastQuoteUpTo(day);
-    quoteDay_ = quoted.isUndefined() ? company->getFirstQuote() : quoted;
-    isEstimate_ = company->getNbrQuotes() > 1 && (quoted.isUndefined() || day > company->getLastQuote());
-}
-
 Cell ShareStateItem::cell(int column) const
 {
+    const bool isHeld = state_->isHeld();
     switch (column) {
     case kTicker:
-        return {textOf(state_->getCompanyAbbreviation()), isHeld() ? look::kText : look::kFaint};
+        return {textOf(state_->getCompanyAbbreviation()), isHeld ? look::kText : look::kFaint};
     case kCompany:
-        return {textOf(state_->getCompanyName()), isHeld() ? look::kText : look::kFaint};
+        return {textOf(state_->getCompanyName()), isHeld ? look::kText : look::kFaint};
     case kQuantity:
         return {countText(state_->getQuantity()), state_->getQuantity() < 0 ? look::kLoss : look::kText};
     case kBuyQuote:
-        return {isHeld() ? amountText(state_->getBuyQuote()) : ""};
+        return {isHeld ? amountText(state_->getBuyQuote()) : ""};
     case kQuote:
         // Without a quote the holding counts as 0 in the totals.
-        return hasQuote_ ? Cell{amountText(state_->getQuote())} : Cell{"no quote", look::kWarning};
+        return basis_.isKnown ? Cell{amountText(state_->getQuote())} : Cell{"no quote", look::kWarning};
     case kQuoteDay:
         return quoteDay();
     case kValue:
-        if (hasQuote_ && isHeld() && !hasRate_)
+        if (basis_.isKnown && isHeld && !basis_.hasRate)
             return {"no rate", look::kWarning}; // and so it counts as 0 in the totals
-        return {hasQuote_ && isHeld() ? withCurrency(*state_, 1.0 * state_->getQuantity() * state_->getQuote()) : ""};
+        return {basis_.isKnown && isHeld ? withCurrency(*state_, state_->worth()) : ""};
     case kGain:
         return gain();
     case kEndDate:
-        return {isHeld() ? dateText(state_->getEndDate()) : ""};
+        return {isHeld ? dateText(state_->getEndDate()) : ""};
     default:
         return {};
     }
@@ -82,17 +51,16 @@ Cell ShareStateItem::cell(int column) const
 Cell ShareStateItem::quoteDay() const
 {
     const Date day = state_->getDate();
-    if (!hasQuote_ || quoteDay_ == day)
+    if (!basis_.isKnown || basis_.day == day)
         return {};
-    return {(isEstimate_ ? "~ " : "") + dateText(quoteDay_), quoteDay_ > day ? look::kWarning : look::kFaint};
+    return {(basis_.isEstimate ? "~ " : "") + dateText(basis_.day), basis_.day > day ? look::kWarning : look::kFaint};
 }
 
 Cell ShareStateItem::gain() const
 {
-    if (!hasQuote_ || state_->getBuyQuote() == 0 || !isHeld())
+    if (!basis_.isKnown || state_->getBuyQuote() == 0 || !state_->isHeld())
         return {};
-    const double gain = static_cast<double>(state_->getQuote()) / state_->getBuyQuote() - 1;
-    return {changeText(gain), gain < 0 ? look::kLoss : look::kGain};
+    return {changeText(state_->gain()), state_->gain() < 0 ? look::kLoss : look::kGain};
 }
 
 ShareStateListView::ShareStateListView(const char* name)

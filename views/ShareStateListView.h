@@ -7,26 +7,19 @@
 /// next.
 class ShareStateItem final : public ColumnItem {
 public:
-    explicit ShareStateItem(ShareState* state);
+    explicit ShareStateItem(ShareState* state) : state_(state), share_(state->share()), basis_(state->quoteBasis()) {}
 
     ShareState* object() const { return state_; }
     const void* key() const { return share_; }
     Cell cell(int column) const override;
 
 private:
-    /// False for what was sold whole; such a holding stays in the portfolio.
-    bool isHeld() const { return state_->getQuantity() != 0; }
     Cell quoteDay() const;
     Cell gain() const;
 
     ShareState* state_;
     const Share* share_;
-
-    // What the state's quote rests on, from when the row was made.
-    bool hasQuote_ = false;
-    bool hasRate_ = false;
-    bool isEstimate_ = false; // outside the series, where the quote is on a straight line
-    Date quoteDay_;           // of the quote that counts
+    QuoteBasis basis_; // from when the row was made
 };
 
 /// The holdings of the portfolio.

@@ -3,16 +3,13 @@
 #include "chart/GraphPoint.h"
 #include "chart/GraphView.h"
 #include "foundation/NumberText.h"
-#include "market/Catalogue.h"
 #include "market/Currency.h"
 #include "platform/Box.h"
-#include "platform/CheckBox.h"
 #include "platform/StringView.h"
 #include "valuation/Evolution.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
 #include "views/AccountStateListView.h"
-#include "views/DateControl.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
 #include "views/ShareStateListView.h"
@@ -31,12 +28,6 @@ constexpr float kAccountsEnd = kAccountsTop + 148;
 constexpr float kHoldingsTop = kAccountsEnd + kMargin;
 constexpr float kHoldingsEnd = kHoldingsTop + 210;
 constexpr float kChartTop = kHoldingsEnd + kMargin;
-
-template <class Object>
-std::vector<Object*> all(unsigned n, Object** objects)
-{
-    return {objects, objects + n};
-}
 
 } // namespace
 
@@ -87,7 +78,7 @@ void WalletView::makeTotals()
     totalDeposit_ = add("txtTotalDeposit", "Total Deposit", 'WTTd', 84, kAmount);
     totalValue_ = add("txtTotalValue", "Total Value", 'WTTv', 74, kAmount);
     profit_ = add("txtProfit", "Profit", 'WTPr', 42, kAmount);
-    annualRevenu_ = add("txtAnnualRevenu", "Annual Revenu", 'WTAr', 96, kPercent);
+    annualRevenue_ = add("txtAnnualRevenu", "Annual Revenu", 'WTAr', 96, kPercent);
 }
 
 void WalletView::makeAccounts()
@@ -139,43 +130,17 @@ void WalletView::makeChart()
     AddChild(evolution_);
 }
 
-void WalletView::setDate(const Date& date)
-{
-    date_->setDate(date);
-}
-
-Date WalletView::getDate() const
-{
-    return date_->getDate();
-}
-
-bool WalletView::isComputeEvolution() const
-{
-    return computeEvolution_->Value() == B_CONTROL_ON;
-}
-
-// --- The state.
-
-void WalletView::SetState(const State* state, const Catalogue& catalogue)
+void WalletView::SetState(const State* state, const Totals& totals)
 {
     SetAccountStateList(state);
     shares_->clear();
-    if (state == nullptr) {
-        showNoTotals();
-        return;
+    if (state != nullptr) {
+        const auto shares = state->shareStates();
+        shares_->addAll({shares.begin(), shares.end()});
+        accounts_->recall();
+        shares_->recall();
     }
-    unsigned n;
-    ShareState** shares = state->getAllShareStates(&n);
-    shares_->addAll(all(n, shares));
-    accounts_->recall();
-    shares_->recall();
-
-    const Totals totals(*state, catalogue);
-    const Currency* reference = catalogue.getReferenceCurrency();
-    if (totals.isKnown)
-        showTotals(totals, textOf(reference->getRepresentation()), reference->getNbrQuotes() > 0);
-    else
-        showNoTotals();
+    showTotals(totals);
 }
 
 void WalletView::ClearState()
@@ -184,7 +149,7 @@ void WalletView::ClearState()
     shares_->remember();
     accounts_->clear();
     shares_->clear();
-    showNoTotals();
+    showTotals({});
 }
 
 void WalletView::ForgetSelection()
@@ -193,8 +158,16 @@ void WalletView::ForgetSelection()
     shares_->forget();
 }
 
-void WalletView::showTotals(const Totals& totals, const std::string& symbol, bool hasRate)
+void WalletView::showTotals(const Totals& totals)
 {
+    if (!totals.isKnown) {
+        totalsBox_->SetLabel("Totals");
+        for (BTextControl* field : {totalDeposit_, totalValue_, profit_, annualRevenue_})
+            field->SetText("");
+        return;
+    }
+    const std::string symbol = textOf(totals.reference->getRepresentation());
+    const bool hasRate = totals.reference->getNbrQuotes() > 0;
     totalsBox_->SetLabel(hasRate ? "Totals" : ("Totals: " + symbol + " has no rate, so nothing has a value").c_str());
     const auto show = [&](BTextControl* field, float amount) {
         field->SetText((amountText(amount) + ' ' + symbol).c_str());
@@ -202,28 +175,21 @@ void WalletView::showTotals(const Totals& totals, const std::string& symbol, boo
     show(totalDeposit_, totals.totalDeposit);
     show(totalValue_, totals.totalValue);
     show(profit_, totals.profit);
-    annualRevenu_->SetText(percentText(totals.annualRevenue).c_str());
+    annualRevenue_->SetText(percentText(totals.annualRevenue).c_str());
 }
 
-void WalletView::showNoTotals()
-{
-    totalsBox_->SetLabel("Totals");
-    for (BTextControl* field : {totalDeposit_, totalValue_, profit_, annualRevenu_})
-        field->SetText("");
-}
-
-void WalletView::UpdateEvolution(const Wallet& wallet, const Catalogue& catalogue, EvolutionOutcome outcome)
+void WalletView::UpdateEvolution(const std::vector<EvolutionPoint>& points, const Currency* reference,
+                                 EvolutionOutcome outcome)
 {
     ClearEvolution();
-    const Currency* reference = catalogue.getReferenceCurrency();
     const std::string symbol = reference != nullptr ? textOf(reference->getRepresentation()) : "???";
     evolution_->setXLegend(("Value in " + symbol).c_str());
-    if (outcome != EvolutionOutcome::Built)
-        noEvolution_->SetText(outcome == EvolutionOutcome::TooLong
+    if (outcome != EvolutionOutcome::kBuilt)
+        noEvolution_->SetText(outcome == EvolutionOutcome::kTooLong
                                   ? "The evolution would be too long: is the date of an operation mistyped?"
                                   : "The first operation has no real date.");
-    for (const auto& point : evolutionPoints(wallet, catalogue)) {
-        auto* shown = new GraphPoint;
+    for (const EvolutionPoint& point : points) {
+        auto* shown = new GraphPoint; // the line's from below on
         shown->setDateBased(true);
         shown->setDateX(point.date);
         shown->setY(point.totalValue);
@@ -240,49 +206,16 @@ void WalletView::ClearEvolution()
     evolution_->Invalidate();
 }
 
-// --- Accounts.
-
 void WalletView::SetAccountStateList(const State* state)
 {
     accounts_->clear();
     if (state == nullptr)
         return;
-    unsigned n;
-    AccountState** accounts = state->getAllAccountStates(&n);
-    accounts_->addAll(all(n, accounts));
+    const auto accounts = state->accountStates();
+    accounts_->addAll({accounts.begin(), accounts.end()});
 }
 
 AccountState* WalletView::GetSelectedAccountState() const
 {
     return accounts_->selected();
-}
-
-String WalletView::getAccountName() const
-{
-    return accountName_->Text();
-}
-
-void WalletView::setAccountName(const String& name)
-{
-    showText(*accountName_, name);
-}
-
-String WalletView::getAccountCurrency() const
-{
-    return accountCurrency_->Text();
-}
-
-void WalletView::setAccountCurrency(const String& representation)
-{
-    showText(*accountCurrency_, representation);
-}
-
-bool WalletView::isDefaultTransferAccount() const
-{
-    return defaultTransferAccount_->Value() == B_CONTROL_ON;
-}
-
-void WalletView::setDefaultTransferAccount(bool isDefault)
-{
-    defaultTransferAccount_->SetValue(isDefault ? B_CONTROL_ON : B_CONTROL_OFF);
 }

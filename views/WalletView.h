@@ -3,18 +3,19 @@
 #include "chart/GraphLine.h"
 #include "foundation/Date.h"
 #include "foundation/String.h"
+#include "platform/CheckBox.h"
+#include "views/DateControl.h"
 #include "views/PageView.h"
 
 class AccountState;
 class BStringView;
 class AccountStateListView;
-class Catalogue;
-class DateControl;
+class Currency;
 class GraphView;
 class ShareStateListView;
 class State;
-class Wallet;
 enum class EvolutionOutcome;
+struct EvolutionPoint;
 struct Totals;
 
 /// The page of the portfolio as it stands on a day: totals, accounts, holdings, and how its value came about.
@@ -23,29 +24,30 @@ public:
     WalletView(BRect frame, const char* name, BWindow* window);
     ~WalletView() override;
 
-    void setDate(const Date& date);
+    void setDate(const Date& date) { date_->setDate(date); }
     /// The day that is valued; undefined while the field holds no date.
-    Date getDate() const;
-    bool isComputeEvolution() const;
+    Date getDate() const { return date_->getDate(); }
+    bool isComputeEvolution() const { return computeEvolution_->Value() == B_CONTROL_ON; }
 
-    /// Shows `state` by the rates of `catalogue`; null empties the page. What was selected before `ClearState` is
-    /// selected again, where it still is.
-    void SetState(const State* state, const Catalogue& catalogue);
+    /// Shows `state` and its totals; null empties the page. What was selected before `ClearState` is selected again,
+    /// where it still is.
+    void SetState(const State* state, const Totals& totals);
     /// Empties the page before its state is destroyed, keeping in mind what was selected.
     void ClearState();
     /// What was selected belongs to a portfolio that is gone.
     void ForgetSelection();
-    /// Fills the chart with the wallet's states, or says why there are none.
-    void UpdateEvolution(const Wallet& wallet, const Catalogue& catalogue, EvolutionOutcome outcome);
+    /// Fills the chart with values in the reference currency, null without one, or says why there are none.
+    void UpdateEvolution(const std::vector<EvolutionPoint>& points, const Currency* reference,
+                         EvolutionOutcome outcome);
     void ClearEvolution();
 
-    String getAccountName() const;
-    void setAccountName(const String& name);
+    String getAccountName() const { return accountName_->Text(); }
+    void setAccountName(const String& name) { showText(*accountName_, name); }
     /// The symbol as it was typed.
-    String getAccountCurrency() const;
-    void setAccountCurrency(const String& representation);
-    bool isDefaultTransferAccount() const;
-    void setDefaultTransferAccount(bool isDefault);
+    String getAccountCurrency() const { return accountCurrency_->Text(); }
+    void setAccountCurrency(const String& representation) { showText(*accountCurrency_, representation); }
+    bool isDefaultTransferAccount() const { return defaultTransferAccount_->Value() == B_CONTROL_ON; }
+    void setDefaultTransferAccount(bool isDefault) { defaultTransferAccount_->SetValue(isDefault); }
     /// Null when no account is selected.
     AccountState* GetSelectedAccountState() const;
     /// Fills the account list; null empties it.
@@ -57,8 +59,7 @@ private:
     void makeAccounts();
     void makeHoldings();
     void makeChart();
-    void showTotals(const Totals& totals, const std::string& symbol, bool hasRate);
-    void showNoTotals();
+    void showTotals(const Totals& totals);
 
     DateControl* date_ = nullptr;
     BCheckBox* computeEvolution_ = nullptr;
@@ -66,7 +67,7 @@ private:
     BTextControl* totalDeposit_ = nullptr;
     BTextControl* totalValue_ = nullptr;
     BTextControl* profit_ = nullptr;
-    BTextControl* annualRevenu_ = nullptr;
+    BTextControl* annualRevenue_ = nullptr;
     AccountStateListView* accounts_ = nullptr;
     BTextControl* accountName_ = nullptr;
     BTextControl* accountCurrency_ = nullptr;

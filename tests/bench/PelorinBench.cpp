@@ -106,7 +106,7 @@ bool evolve(Portfolio& portfolio, const Files&)
 {
     EvolutionOutcome outcome;
     refreshStates(portfolio.wallet, Portfolio::lastDay(), false, &outcome);
-    return outcome == EvolutionOutcome::Built;
+    return outcome == EvolutionOutcome::kBuilt;
 }
 
 bool loadAndEvolve(Portfolio& portfolio, const Files& files)

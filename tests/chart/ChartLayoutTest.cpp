@@ -152,8 +152,8 @@ ChartContents contentsOf(const BRect& bounds, const std::vector<ChartPoint>& poi
 {
     ChartContents contents;
     contents.bounds = bounds;
-    contents.series.push_back({ChartSeries::Shape::Line, {}, 2, "Quotes", points});
-    contents.series.push_back({ChartSeries::Shape::Polygon, {}, 2, "One standard deviation", points});
+    contents.series.push_back({ChartSeries::Shape::kLine, {}, 2, "Quotes", points});
+    contents.series.push_back({ChartSeries::Shape::kPolygon, {}, 2, "One standard deviation", points});
     contents.isDateBased = isDateBased;
     contents.xLegend = "Value in EUR";
     contents.yLegend = isDateBased ? "" : "Something of a long name, which may not fit";

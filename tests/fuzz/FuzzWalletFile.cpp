@@ -58,9 +58,9 @@ void checkEvolution(Wallet& wallet, const Catalogue& catalogue, const Date& end)
     appraise(wallet, catalogue);
     const Date first = current->getFirstOperationDate();
     const bool isLate = first >= end;
-    require((outcome == EvolutionOutcome::BadFirstDay) == (!isLate && !first.isValid()), "a bad first day is noticed");
+    require((outcome == EvolutionOutcome::kBadFirstDay) == (!isLate && !first.isValid()), "a bad first day is noticed");
     const std::vector<State*> states = all(wallet, &Wallet::getAllStates);
-    const std::size_t days = outcome == EvolutionOutcome::Built && !isLate ? static_cast<unsigned>(end - first) : 0;
+    const std::size_t days = outcome == EvolutionOutcome::kBuilt && !isLate ? static_cast<unsigned>(end - first) : 0;
     require(states.size() == days + 1, "there is a state for every day");
     for (std::size_t i = 1; i <= days; i += days / 4 + 1)
         requireSame(*states[i], State(&wallet, states[i]->getDate(), false), "a day equals its full replay");

@@ -20,9 +20,9 @@ TEST(EvolutionTest, TheCurrentStateComesFirstThenEveryDayBeforeIt)
     SmallPortfolio p;
     deposit(addAccount(p.wallet, "Main", p.euro), 58, 100); // 28 February
     new State(&p.wallet, kStart, false);
-    EvolutionOutcome outcome = EvolutionOutcome::TooLong;
+    EvolutionOutcome outcome = EvolutionOutcome::kTooLong;
     const State* current = refreshStates(p.wallet, Date(2, 3, 1999), true, &outcome);
-    EXPECT_EQ(outcome, EvolutionOutcome::Built);
+    EXPECT_EQ(outcome, EvolutionOutcome::kBuilt);
     EXPECT_EQ(datesOf(p.wallet), (std::vector<Date>{{2, 3, 1999}, {28, 2, 1999}, {1, 3, 1999}}));
     EXPECT_TRUE(current->isAutomatic());
     EXPECT_FALSE(all(p.wallet, &Wallet::getAllStates).back()->isAutomatic());
@@ -40,8 +40,8 @@ TEST(EvolutionTest, TheCurrentStateComesFirstThenEveryDayBeforeIt)
 
 TEST(EvolutionTest, WithoutARealFirstDayOrWithTooManyThereAreNoDailyStates)
 {
-    constexpr auto Built = EvolutionOutcome::Built, BadFirstDay = EvolutionOutcome::BadFirstDay,
-                   TooLong = EvolutionOutcome::TooLong;
+    constexpr auto Built = EvolutionOutcome::kBuilt, BadFirstDay = EvolutionOutcome::kBadFirstDay,
+                   TooLong = EvolutionOutcome::kTooLong;
     const struct {
         const char* why;
         std::vector<Date> operations;
@@ -140,7 +140,7 @@ TEST(EvolutionTest, EveryDailyStateIsBitForBitTheFullReplayOfItsDay)
         refreshStates(p.wallet, daysAfterStart(20), true, nullptr); // leaves automatic sales behind
         EvolutionOutcome outcome;
         refreshStates(p.wallet, daysAfterStart(45), seed % 2 == 0, &outcome);
-        if (outcome != EvolutionOutcome::Built) // of a short sale, an automatic sale without a real date has remained
+        if (outcome != EvolutionOutcome::kBuilt) // of a short sale, an automatic sale without a real date has remained
             continue;
         ++evolutions;
         const std::vector<State*> states = all(p.wallet, &Wallet::getAllStates);
