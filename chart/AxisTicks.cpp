@@ -41,6 +41,7 @@ std::vector<AxisTick> levelNumberTicks(const ChartRange& range, double pixelsPer
         std::vector<AxisTick> ticks = numberTicks(range, minStep);
         if (areLabelsApart(ticks, pixelsPerUnit, width, gap))
             return ticks;
+        // The labels overlap: the next larger step is tried. In the end a single label, or none, is left.
         minStep *= kStepGrowth;
     }
 }

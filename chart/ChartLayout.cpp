@@ -34,6 +34,7 @@ public:
         placeValueAxis();
         if (!isLargeEnough())
             return bareChart();
+        // The top, the bottom and the left side of the plot are settled; the x axis may still move its sides inwards.
         placeXAxis();
         placeYLegend();
         out_.marks = placeMarks(in_, out_.plot, out_.scale);
@@ -48,6 +49,7 @@ private:
                 x_.include(point.x);
                 values_.include(point.y);
             }
+        // `values_` stays as found; `x_` and `y_` have a length above 0 from here on, as a scale needs.
         y_ = values_;
         widenEmpty(x_, in_.isDateBased ? 1 : std::abs(x_.min) / 10);
         widenEmpty(y_, std::abs(y_.min) / 20);
@@ -71,7 +73,7 @@ private:
         float left = in_.bounds.left + kMargin;
         // It names the values although it is called after x. Intended: the pages set it to the unit of the values,
         // so it stands above the value axis, where a reader looks for that.
-        const std::string legend = fitText(in_.xLegend, in_.legendFont, rightEnd() - left);
+        const std::string legend = fitText(in_.xLegend, in_.legendFont.width, rightEnd() - left);
         if (!legend.empty()) {
             const ChartText text = textAt(legend, in_.legendFont, left, top);
             out_.legends.push_back(text);
@@ -109,6 +111,7 @@ private:
         const std::vector<const ChartSeries*> named = keySeries();
         if (named.empty())
             return top;
+        // There is no gap behind the last entry.
         float width = -kEntryGap;
         for (const ChartSeries* series : named)
             width += entryWidth(series->name) + kEntryGap;
@@ -123,7 +126,7 @@ private:
         float x = left;
         for (const ChartSeries* series : named) {
             const std::string name =
-                fitText(series->name, in_.legendFont, rightEnd() - left - kSampleWidth - kSampleGap);
+                fitText(series->name, in_.legendFont.width, rightEnd() - left - kSampleWidth - kSampleGap);
             if (x > left && x + entryWidth(name) > rightEnd()) {
                 x = left;
                 top += height;
@@ -140,6 +143,7 @@ private:
 
     void placeFooter()
     {
+        // Room for the labels in any case: whether there are any is known only when the width is.
         out_.plot.bottom -= std::ceil(kLabelGap + in_.labelFont.height() + kLegendGap / 2);
         if (!in_.yLegend.empty())
             out_.plot.bottom -= std::ceil(in_.legendFont.height() + kLegendGap / 2);
@@ -150,6 +154,7 @@ private:
     ChartLayout bareChart() const
     {
         ChartLayout bare;
+        // What was placed so far is dropped: a new layout has neither legends nor key.
         bare.plot = in_.bounds;
         const float inset = std::min({2.0F, in_.bounds.Width() / 4, in_.bounds.Height() / 4});
         const BRect area = in_.bounds.InsetByCopy(inset, inset);
@@ -182,6 +187,8 @@ private:
         float widest = 0;
         for (const AxisTick& tick : ticks)
             widest = std::max(widest, in_.labelFont.width(tick.label));
+        // The labels have their room now, but their places depend on the left side, which may still move:
+        // `placeValueLabels` puts them.
         out_.plot.left = std::ceil(out_.plot.left + kMargin + widest + kLabelGap);
         out_.plot.right = std::floor(out_.plot.right - kRightMargin);
         for (const AxisTick& tick : ticks)
@@ -196,6 +203,7 @@ private:
         const ChartText text = textAt(tick.label, in_.labelFont, 0, top);
         if (text.box.top < out_.plot.top || text.box.bottom > out_.plot.bottom)
             return;
+        // A grid line stands only where its value is written.
         out_.rows.push_back(y);
         valueLabels_.push_back({tick.label, top});
     }
@@ -218,6 +226,7 @@ private:
             if (!widenMargins(ticks))
                 break;
         }
+        // The sides are settled now.
         placeValueLabels();
         const float top = out_.plot.bottom + kLabelGap;
         for (const AxisTick& tick : ticks) {
@@ -242,6 +251,7 @@ private:
         const float right = std::ceil(end(ticks.back(), 1) + kMargin / 2 - in_.bounds.right);
         if (left <= 0 && right <= 0)
             return false;
+        // Either both sides move, or the plot would become too small and stays as it was.
         const BRect before = out_.plot;
         out_.plot.left += std::max(left, 0.0F);
         out_.plot.right -= std::max(right, 0.0F);
@@ -261,7 +271,7 @@ private:
     void placeYLegend()
     {
         const ChartFont& font = in_.legendFont;
-        const std::string legend = fitText(in_.yLegend, font, out_.plot.right - in_.bounds.left - kMargin);
+        const std::string legend = fitText(in_.yLegend, font.width, out_.plot.right - in_.bounds.left - kMargin);
         if (legend.empty())
             return;
         const float top = out_.plot.bottom + kLabelGap + std::ceil(in_.labelFont.height());

@@ -32,6 +32,7 @@ void findExtremes(const std::vector<const ChartSeries*>& marked, Extreme* lowest
 {
     for (const ChartSeries* series : marked)
         for (const ChartPoint& point : series->points) {
+            // Of equal values the first one stays.
             if (lowest->series == nullptr || point.y < lowest->point.y)
                 *lowest = {series, point};
             if (highest->series == nullptr || point.y > highest->point.y)
@@ -75,6 +76,7 @@ std::vector<ChartMark> placeMarks(const ChartContents& contents, const BRect& pl
             mark.label = labelAt(format(extreme.point.y), font, where.x, where.y + gap, plot);
         marks.push_back(mark);
     };
+    // Each series has a point, so both extremes are known.
     add(highest, -kMarkGap - std::ceil(font.height()));
     if (lowest.point.y < highest.point.y)
         add(lowest, kMarkGap);

@@ -67,6 +67,7 @@ void ChartPainter::drawChart(const ChartLayout& layout, const std::vector<ChartS
             if (one.shape == shape)
                 draw(one);
     };
+    // From back to front. Polygons lie below the axes, and lines above both.
     drawGrid(layout);
     drawAll(Shape::kPolygon, [&](const ChartSeries& one) { drawPolygon(one, layout.scale); });
     drawAxes(layout);
@@ -93,6 +94,7 @@ void ChartPainter::drawFocus()
 
 void ChartPainter::drawReadOut(const ChartReadOut& readOut)
 {
+    // Three discs of falling size: a dark ring, a light one, and the point in its colour.
     fillDisc(readOut.where, kMarkRadius + 2, text_);
     fillDisc(readOut.where, kMarkRadius + 1, background_);
     fillDisc(readOut.where, kMarkRadius, readOut.color);
@@ -138,6 +140,7 @@ void ChartPainter::drawPolygon(const ChartSeries& series, const ChartScale& scal
 {
     const std::vector<BPoint> corners = reduceByColumn(series.points, scale);
     setAreaColor(series.color);
+    // The drawing mode is B_OP_ALPHA for a translucent polygon, and B_OP_COPY again after it.
     view_.FillPolygon(corners.data(), static_cast<int32>(corners.size()));
     view_.SetDrawingMode(B_OP_COPY);
 }
@@ -158,6 +161,7 @@ void ChartPainter::drawLine(const ChartSeries& series, const ChartScale& scale)
 
 void ChartPainter::drawMark(const ChartMark& mark)
 {
+    // A ring of background parts the point from the line that it is on.
     fillDisc(mark.where, kMarkRadius + 1, background_);
     fillDisc(mark.where, kMarkRadius, mark.color);
     if (!mark.label.text.empty())

@@ -37,9 +37,9 @@ std::string textOf(const GraphPoint& point, const GraphElement& owner, bool isDa
 ChartReadOut layOutReadOut(const GraphPoint& point, bool isDateBased, const ChartScale& scale, const ChartFont& font,
                            const BRect& bounds)
 {
-    GraphPolyElement* line;
-    const GraphElement& owner = point.getGraphPolyElement(&line) == 0 ? *line : static_cast<const GraphElement&>(point);
-    const std::string text = fitText(textOf(point, owner, isDateBased), font, bounds.Width() - 2 * kPadding);
+    const GraphPolyElement* line = point.polyElement();
+    const GraphElement& owner = line != nullptr ? *line : static_cast<const GraphElement&>(point);
+    const std::string text = fitText(textOf(point, owner, isDateBased), font.width, bounds.Width() - 2 * kPadding);
     const float width = font.width(text) + 2 * kPadding;
     const float height = std::ceil(font.height()) + 2 * kPadding;
     const BPoint where = scale.pixel(chartPointOf(point, isDateBased));

@@ -5,7 +5,7 @@
 #include <algorithm>
 #include <limits>
 
-/// A stretch of an axis: values, numbers or days (see ChartDays.h).
+/// A stretch of an axis: values, numbers or days (see DateTicks.h).
 struct ChartRange {
     double min = std::numeric_limits<double>::infinity(); // above max: holds nothing yet
     double max = -std::numeric_limits<double>::infinity();

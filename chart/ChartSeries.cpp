@@ -1,6 +1,6 @@
 #include "chart/ChartSeries.h"
 
-#include "chart/ChartDays.h"
+#include "chart/DateTicks.h"
 #include "chart/GraphLine.h"
 #include "chart/GraphPoint.h"
 #include "chart/GraphPolygon.h"
@@ -19,22 +19,20 @@ ChartSeries::Shape shapeOf(const GraphElement& element)
 
 } // namespace
 
-std::vector<ChartSeries> seriesOf(GraphElement* const* elements, unsigned count, bool isDateBased)
+std::vector<ChartSeries> seriesOf(std::span<GraphElement* const> elements, bool isDateBased)
 {
     std::vector<ChartSeries> all;
-    for (unsigned i = 0; i < count; ++i) {
-        GraphElement& element = *elements[i];
-        if (element.isUndefined())
+    for (GraphElement* element : elements) {
+        if (element->isUndefined())
             continue;
         ChartSeries series{
-            shapeOf(element), element.getColor(), std::max<float>(element.getPenSize(), 1), legendOf(element), {}};
-        unsigned n;
+            shapeOf(*element), element->getColor(), std::max<float>(element->getPenSize(), 1), legendOf(*element), {}};
         GraphPoint* single;
-        GraphPoint* const* points = pointsOf(element, &n, &single);
-        series.points.reserve(n);
-        for (unsigned k = 0; k < n; ++k)
-            if (const ChartPoint point = chartPointOf(*points[k], isDateBased); hasPlace(point))
-                series.points.push_back(point);
+        const auto points = pointsOf(*element, single);
+        series.points.reserve(points.size());
+        for (const GraphPoint* point : points)
+            if (const ChartPoint place = chartPointOf(*point, isDateBased); hasPlace(place))
+                series.points.push_back(place);
         if (!series.points.empty())
             all.push_back(std::move(series));
     }
@@ -59,17 +57,16 @@ bool hasPlace(const ChartPoint& point)
     return std::isfinite(point.x) && std::isfinite(point.y);
 }
 
-GraphPoint* const* pointsOf(GraphElement& element, unsigned* count, GraphPoint** single)
+std::span<GraphPoint* const> pointsOf(GraphElement& element, GraphPoint*& single)
 {
     switch (shapeOf(element)) {
     case ChartSeries::Shape::kLine:
-        return static_cast<GraphLine&>(element).getAllGraphPoints(count);
+        return static_cast<GraphLine&>(element).points();
     case ChartSeries::Shape::kPolygon:
-        return static_cast<GraphPolygon&>(element).getAllGraphPoints(count);
+        return static_cast<GraphPolygon&>(element).points();
     case ChartSeries::Shape::kPoint:
         break;
     }
-    *single = &static_cast<GraphPoint&>(element);
-    *count = 1;
-    return single;
+    single = &static_cast<GraphPoint&>(element);
+    return {&single, 1};
 }

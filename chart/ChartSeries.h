@@ -3,6 +3,7 @@
 #include "chart/ChartScale.h"
 #include "platform/GraphicsDefs.h"
 
+#include <span>
 #include <string>
 #include <vector>
 
@@ -22,7 +23,7 @@ struct ChartSeries {
 
 /// The defined ones of `elements` that have a place on a chart that goes by dates or by numbers: no undefined date, no
 /// value that is infinite or not a number. A line or polygon leaves such points out.
-std::vector<ChartSeries> seriesOf(GraphElement* const* elements, unsigned count, bool isDateBased);
+std::vector<ChartSeries> seriesOf(std::span<GraphElement* const> elements, bool isDateBased);
 
 /// The name of a line or polygon in the key; a point that stands alone has none.
 std::string legendOf(const GraphElement& element);
@@ -31,5 +32,5 @@ std::string legendOf(const GraphElement& element);
 ChartPoint chartPointOf(const GraphPoint& point, bool isDateBased);
 bool hasPlace(const ChartPoint& point);
 
-/// The points of an element: of a point, itself. `*single` is room for that, and has to outlive the result.
-GraphPoint* const* pointsOf(GraphElement& element, unsigned* count, GraphPoint** single);
+/// The points of an element: of a point, itself. `single` is room for that, and has to outlive the result.
+std::span<GraphPoint* const> pointsOf(GraphElement& element, GraphPoint*& single);

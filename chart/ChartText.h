@@ -28,4 +28,4 @@ ChartText textAt(const std::string& text, const ChartFont& font, float left, flo
 
 /// `text`, or as much of its beginning as fits into `width` with an ellipsis behind it; empty when nothing does.
 /// Does not cut a UTF-8 character in two.
-std::string fitText(const std::string& text, const ChartFont& font, float width);
+std::string fitText(const std::string& text, const TextWidth& widthOf, float width);

@@ -53,8 +53,10 @@ std::vector<BPoint> reduceByColumn(std::span<const ChartPoint> points, const Cha
         const float right = left + 1;
         for (++i; i < pixels.size() && pixels[i].x >= left && pixels[i].x < right; ++i)
             run.add(i, pixels);
+        // What stays moves to the front of `pixels`: `end` never passes the points still to be looked at.
         end = run.moveTo(end, pixels);
     }
+    // Behind `end` stand points that have been dropped or moved.
     pixels.resize(end);
     return pixels;
 }

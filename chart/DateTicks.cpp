@@ -1,15 +1,22 @@
 #include "chart/DateTicks.h"
 
-#include "chart/ChartDays.h"
-
+#include <algorithm>
 #include <cmath>
+#include <cstdint>
 #include <cstdio>
+#include <limits>
 
 namespace {
 
 using Unit = DateStep::Unit;
 
 constexpr int kMonths = 12;
+
+const Date& firstDay()
+{
+    static const Date day(1, 1, 2000);
+    return day;
+}
 
 double daysOf(DateStep step)
 {
@@ -52,6 +59,7 @@ std::vector<AxisTick> ticksByDays(const ChartRange& range, DateStep step)
 std::vector<AxisTick> ticksByMonths(const ChartRange& range, DateStep step)
 {
     const std::int64_t months = step.unit == Unit::kYear ? std::int64_t{kMonths} * step.count : step.count;
+    // Months are counted from year 0, so that multiples of a step are the same in every chart.
     const Date first = dateOfDay(range.min);
     std::vector<AxisTick> ticks;
     for (auto month = roundUp(std::int64_t{first.getYear()} * kMonths + first.getMonth() - 1, months);;
@@ -95,6 +103,20 @@ std::vector<AxisTick> endTicks(const ChartRange& range, double pixelsPerDay, con
 
 } // namespace
 
+double dayNumber(const Date& date)
+{
+    constexpr int kLimit = std::numeric_limits<int>::max(); // where `Date` cuts differences
+    const int days = date.isValid() ? date - firstDay() : kLimit;
+    return days > -kLimit && days < kLimit ? days : std::numeric_limits<double>::quiet_NaN();
+}
+
+Date dateOfDay(double day)
+{
+    constexpr double kLimit = std::numeric_limits<int>::max();
+    Date date = firstDay();
+    return date.moveBy(static_cast<std::int64_t>(std::floor(std::clamp(day, -kLimit, kLimit))));
+}
+
 std::vector<AxisTick> dateTicks(const ChartRange& range, DateStep step)
 {
     return step.unit == Unit::kDay || step.unit == Unit::kWeek ? ticksByDays(range, step) : ticksByMonths(range, step);
@@ -106,6 +128,7 @@ std::vector<AxisTick> levelDateTicks(const ChartRange& range, double pixelsPerDa
     DateStep step{Unit::kDay, 1};
     std::vector<AxisTick> ticks;
     for (;; step = coarser(step)) {
+        // Labels of that step would overlap whatever they are: no ticks are made for it.
         if (daysOf(step) * pixelsPerDay < narrowest)
             continue;
         ticks = dateTicks(range, step);

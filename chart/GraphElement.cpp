@@ -4,6 +4,7 @@
 
 GraphElement::~GraphElement()
 {
+    // The chart does not list the element any more; it shows at the next drawing.
     setGraphView(nullptr);
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "chart/GraphViewToGraphElements.h"
+#include "chart/GraphLinks.h"
 #include "platform/GraphicsDefs.h"
 
 /// Something that a chart shows: a line, a polygon or a point.

@@ -6,6 +6,7 @@
 
 GraphPoint::~GraphPoint()
 {
+    // Leaves the line or polygon that owns it, which does not destroy it a second time.
     setGraphPolyElement(nullptr);
 }
 
@@ -17,6 +18,7 @@ void GraphPoint::setX(float x)
 
 void GraphPoint::setDateX(const Date& date)
 {
+    // The line sorts its points again before the next read.
     dateX_ = date;
     notifyChange();
 }
@@ -44,6 +46,15 @@ int sortPointsByX(const void* a, const void* b)
     if (std::isnan(first.getX()) || std::isnan(second.getX()))
         return static_cast<int>(std::isnan(first.getX())) - static_cast<int>(std::isnan(second.getX()));
     return first.getX() > second.getX() ? 1 : first.getX() < second.getX() ? -1 : 0;
+}
+
+int GraphLineToGraphPoints::compare(const void* a, const void* b)
+{
+    const GraphPoint& first = **static_cast<GraphPoint* const*>(a);
+    const GraphPoint& second = **static_cast<GraphPoint* const*>(b);
+    if (first.isDateBased() != second.isDateBased())
+        return first.isDateBased() ? 1 : -1;
+    return sortPointsByX(a, b);
 }
 
 int GraphPoint::setGraphPolyElement(GraphPolyElement* element)

@@ -1,7 +1,6 @@
 #pragma once
 
 #include "chart/GraphElement.h"
-#include "chart/GraphPointsToGraphPolyElement.h"
 #include "foundation/PackedDate.h"
 
 class GraphPolyElement;
@@ -28,6 +27,8 @@ public:
     int setGraphPolyElement(GraphPolyElement* element);
     /// @return 0; -1 and a null `*out` when the point belongs to no line or polygon.
     int getGraphPolyElement(GraphPolyElement** out) const { return polyElement_.get(out); }
+    /// The same; null when there is none.
+    GraphPolyElement* polyElement() const { return polyElement_.partner(); }
 
 private:
     friend class GraphLineToGraphPoints;

@@ -44,6 +44,7 @@ GraphView::GraphView(BRect frame, const char* name)
 
 GraphView::~GraphView()
 {
+    // The single points are ours and go. What is left are lines and polygons of the page: they only lose their link.
     removeAllGraphPoints();
     elements_.unlinkAll();
 }
@@ -65,12 +66,12 @@ void GraphView::Draw(BRect)
     painter.fillBackground();
     const ChartContents contents = readContents();
     if (contents.series.empty()) {
-        scale_.reset();
+        scale_.reset(); // there is nothing that the pointer could be near to
         painter.drawNotice("No data", kNoDataPlace, contents.legendFont.size);
         return;
     }
     const ChartLayout layout = layOutChart(contents);
-    scale_ = layout.scale;
+    scale_ = layout.scale; // stays until the next drawing, so that the pointer is matched with what is seen
     painter.drawChart(layout, contents.series);
 }
 
@@ -81,6 +82,7 @@ void GraphView::DrawOver(BRect)
         painter.drawFocus();
     if (!pointer_)
         return;
+    // A pointer over a chart without data finds no point: `nearestPoint` needs the scale, and there is none.
     if (const GraphPoint* point = nearestPoint(*pointer_, kPointerReach))
         painter.drawReadOut(layOutReadOut(*point, xDateBased_, *scale_, fontOf(legendSize_), Bounds()));
 }
@@ -88,10 +90,8 @@ void GraphView::DrawOver(BRect)
 void GraphView::MouseMoved(BPoint where, bool inside)
 {
     pointer_ = inside ? std::optional(where) : std::nullopt;
-    RefreshOver();
+    RefreshOver(); // only the layer above the chart is drawn again
 }
-
-// --- The picture.
 
 void GraphView::MenuRequested(BPoint where)
 {
@@ -104,15 +104,13 @@ void GraphView::MenuRequested(BPoint where)
 void GraphView::askForPictureFile()
 {
     const BMessenger self(this);
+    // The panel is made when it is first asked for, and then kept: it remembers its folder.
     if (savePanel_ == nullptr)
         savePanel_ =
             std::make_unique<BFilePanel>(B_SAVE_PANEL, &self, nullptr, B_FILE_NODE, new BMessage(kPictureFile), true);
-    unsigned count;
-    GraphElement* const* elements = elements_.getAll(&count);
     // The first line is what the chart is about, as it is for the marks of the lowest and the highest value.
-    GraphElement* const* line =
-        std::find_if(elements, elements + count, [](const auto* e) { return e->getType() == GraphLine::kType; });
-    std::string name = line != elements + count ? legendOf(**line) : "";
+    const auto line = std::ranges::find(graphElements(), GraphLine::kType, &GraphElement::getType);
+    std::string name = line != graphElements().end() ? legendOf(**line) : "";
     constexpr std::size_t kLongest = 200; // bytes; the name of a file has 255
     name.resize(wholeCharacters(name, kLongest));
     std::replace(name.begin(), name.end(), '/', '-');
@@ -144,10 +142,8 @@ void GraphView::savePicture(const BMessage& answer)
 
 ChartContents GraphView::readContents() const
 {
-    unsigned count;
-    GraphElement* const* elements = elements_.getAll(&count);
     return {Bounds(),
-            seriesOf(elements, count, xDateBased_),
+            seriesOf(graphElements(), xDateBased_),
             xDateBased_,
             std::string(xLegend_.bytes()),
             std::string(yLegend_.bytes()),
@@ -159,21 +155,18 @@ GraphPoint* GraphView::nearestPoint(BPoint where, float reach) const
 {
     if (!scale_)
         return nullptr;
+    // From here on `reach` is the distance of the nearest point found: of equally near ones the first stays.
     GraphPoint* nearest = nullptr;
-    unsigned count;
-    GraphElement* const* elements = elements_.getAll(&count);
-    for (unsigned i = 0; i < count; ++i) {
-        if (elements[i]->getType() == GraphPolygon::kType)
-            continue; // its corners are no values
-        unsigned n;
+    for (GraphElement* element : graphElements()) {
+        if (element->getType() == GraphPolygon::kType || element->isUndefined())
+            continue; // the corners of a polygon are no values
         GraphPoint* single;
-        GraphPoint* const* points = pointsOf(*elements[i], &n, &single);
-        for (unsigned k = 0; k < n && !elements[i]->isUndefined(); ++k) {
-            const ChartPoint point = chartPointOf(*points[k], xDateBased_);
+        for (GraphPoint* candidate : pointsOf(*element, single)) {
+            const ChartPoint point = chartPointOf(*candidate, xDateBased_);
             const BPoint away = scale_->pixel(point) - where;
             const float distance = std::hypot(away.x, away.y);
             if (hasPlace(point) && distance <= reach && (nearest == nullptr || distance < reach)) {
-                nearest = points[k];
+                nearest = candidate;
                 reach = distance;
             }
         }

@@ -49,6 +49,7 @@ public:
     unsigned getNbrGraphElements() const { return elements_.getNbr(); }
     /// The elements; the array is the chart's own and valid until its next change.
     GraphElement** getAllGraphElements(unsigned* count) const { return elements_.getAll(count); }
+    std::span<GraphElement* const> graphElements() const { return elements_.all(); }
     /// Destroys the points that stand alone; lines and polygons stay.
     void removeAllGraphPoints();
 

@@ -86,7 +86,7 @@ bool lockCreated(int descriptor)
 int createIn(const std::string& folder, mode_t mode, std::string* name)
 {
     // A name of its own length, since that of the target may already be as long as the file system allows. It never
-    // comes twice, so that nobody takes a new file for the left-over that he has just seen under that name.
+    // comes twice, so that nobody takes a new file for the left-over that was just seen under that name.
     static unsigned number = 0;
     const std::string stem = folder + '/' + std::string(kPrefix) + std::to_string(getpid()) + '-';
     constexpr int kAttempts = 100; // a crash may have left such a file behind
@@ -120,7 +120,7 @@ bool isTemporary(std::string_view name)
            isNumber(numbers.substr(hyphen + 1));
 }
 
-/// Removes a temporary file unless somebody has it locked: he is still writing it.
+/// Removes a temporary file unless it is locked: it is still being written.
 void removeUnlessLocked(const std::string& path)
 {
     constexpr int kFlags = O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC;
@@ -129,6 +129,7 @@ void removeUnlessLocked(const std::string& path)
         descriptor = open(path.c_str(), O_WRONLY | kFlags);
     if (descriptor < 0)
         return;
+    // Nobody writes what nobody has locked: its program has died.
     if (flock(descriptor, LOCK_EX | LOCK_NB) == 0)
         unlink(path.c_str());
     close(descriptor);
@@ -170,12 +171,14 @@ void AtomicFile::removeLeftOvers(const std::string& folder)
 AtomicFile::AtomicFile(const std::string& path, Existing existing) : path_(path), existing_(existing)
 {
     check(path, existing);
+    // The links stay: it is the file behind them that is replaced.
     target_ = withoutLinks(path);
     create();
 }
 
 AtomicFile::~AtomicFile()
 {
+    // Not committed: nobody may find the temporary file. After a commit there is none.
     if (!temporary_.empty())
         unlink(temporary_.c_str());
     if (stream_ != nullptr)
@@ -210,9 +213,11 @@ void AtomicFile::flush()
     // The reason of a write that failed earlier may be forgotten by now.
     if (std::ferror(stream_) != 0 && errno == 0)
         errno = EIO;
+    // Until here the file is for its writer alone, if it replaces another one.
     keepPermissions();
     if (std::ferror(stream_) != 0 || std::fflush(stream_) != 0 || fsync(fileno(stream_)) != 0)
         fail(kCannotWrite);
+    // The content is on the disk; only the name is still that of the temporary file.
     flushed_ = true;
 }
 
@@ -226,6 +231,7 @@ void AtomicFile::commit()
 {
     if (!flushed_)
         flush();
+    // Before: the old file or none has the name. After: the new one has it, whole, and nothing is left to remove.
     giveName();
     temporary_.clear();
     // Closed only now, because that unlocks it.

@@ -48,6 +48,7 @@ String::String(String&& other) noexcept : Serializable(other), text_(other.text_
 
 String& String::operator=(const String& other)
 {
+    // Copied first: when there is no memory for it, this String stays as it was.
     if (this != &other)
         *this = String(other);
     return *this;
@@ -55,6 +56,7 @@ String& String::operator=(const String& other)
 
 String& String::operator=(String&& other) noexcept
 {
+    // The other String frees what was here.
     std::swap(text_, other.text_);
     std::swap(length_, other.length_);
     return *this;
@@ -78,6 +80,7 @@ int String::rd(FILE* file)
     constexpr std::size_t kFirstPiece = 4096;
     const auto length = static_cast<std::uint32_t>(freadint(file));
     const std::size_t wanted = reachedEnd(file) ? 0 : std::min<std::size_t>(length, INT_MAX - 1);
+    // The former text is gone from here on, also when the file ends early.
     release();
     std::size_t got = 0;
     std::size_t room = std::min(wanted, kFirstPiece);
@@ -88,6 +91,7 @@ int String::rd(FILE* file)
             break;
         room = std::min(wanted, room * 2);
     }
+    // What has come is the text, whole or not; the caller learns of it by the result.
     text_[got] = '\0';
     length_ = static_cast<int>(got);
     return got == length && !reachedEnd(file) ? 0 : -1;

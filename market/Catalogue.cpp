@@ -14,6 +14,7 @@ constexpr int kMostReferences = 100;
 
 void expressIn(const Currency& newReference, const Currency& currency)
 {
+    // Dividing by 1 would change nothing but mark the trend as out of date.
     for (CurrencyQuote* quote : currency.quotes())
         if (const double rate = newReference.getRealQuote(quote->getDate()); rate != 1)
             quote->setValue(static_cast<float>(quote->getValue() / rate));
@@ -41,9 +42,11 @@ int Catalogue::rd(FILE* file)
         // A currency cut short stays for the sake of what is whole in it.
         if (result != 0 && currency->getNbrMarkets() + currency->getNbrQuotes() == 0)
             return -1;
+        // From here on the catalogue owns the currency, whatever happens to the rest of the file.
         Currency* added = currency.release();
         addCurrency(added);
         const bool isReference = !reference.isUndefined() && added->getRepresentation() == reference;
+        // The first one becomes the reference of what was read before it; a further one divides all of that anew.
         if (isReference && references++ < kMostReferences)
             rebaseOn(added);
         if (result != 0 || references > kMostReferences)
@@ -54,6 +57,7 @@ int Catalogue::rd(FILE* file)
 
 int Catalogue::wrt(FILE* file, const Date& stamp) const
 {
+    // Without a reference the undefined name is written; a reader then sets none.
     const String reference = reference_ != nullptr ? reference_->getRepresentation() : String();
     reference.wrt(file);
     fwriteint(file, static_cast<int>(currencies_.size()));
@@ -73,8 +77,10 @@ void Catalogue::removeCurrency(Currency* currency)
     const auto place = std::find(currencies_.begin(), currencies_.end(), currency);
     if (place == currencies_.end())
         return;
+    // The last currency fills the gap; the list holds `currency` no more, though others may still refer to it.
     *place = currencies_.back();
     currencies_.pop_back();
+    // `currency` still has its rates here, but it is not divided: it is in the list no more.
     if (currency == reference_) {
         if (currencies_.empty())
             reference_ = nullptr;
@@ -92,6 +98,7 @@ void Catalogue::removeCurrency(Currency* currency)
 
 void Catalogue::clear()
 {
+    // Each takes its markets, and through them companies and the portfolio's holdings, along.
     for (Currency* currency : currencies_)
         delete currency;
     currencies_.clear();
@@ -133,5 +140,6 @@ void Catalogue::rebaseOn(Currency* newReference)
         for (CurrencyQuote* quote : newReference->quotes())
             quote->setValue(1);
     }
+    // From here on all rates count as prices in `newReference`.
     reference_ = newReference;
 }

@@ -33,6 +33,8 @@ Company::Company(Market* market, const String& name, const String& abbreviation)
 
 Company::~Company()
 {
+    // Everything that the company owns unlinks itself from these lists, so they are emptied while the company is still
+    // whole. The market lists the company until the last line.
     shares_.deleteAll();
     deleteQuotes();
     events_.deleteAll();
@@ -56,6 +58,7 @@ int Company::wrt(FILE* file) const
 
 int Company::rd(FILE* file)
 {
+    // What was read before an error stays: the caller decides whether the company is worth keeping.
     if (name_.rd(file) != 0 || abbreviation_.rd(file) != 0 || readQuotes(file) != 0)
         return -1;
     return readEvents(file);
@@ -71,6 +74,7 @@ int Company::readEvents(FILE* file)
             continue;
         if (event->rd(file) != 0)
             return -1;
+        // Only an event that was read whole is linked; the company owns it from here on.
         event.release()->setCompany(this);
     }
     return reachedEnd(file) ? -1 : 0;

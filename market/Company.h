@@ -4,8 +4,7 @@
 #include "foundation/String.h"
 #include "market/CompanyEvent.h"
 #include "market/CompanyQuote.h"
-#include "market/CompanyToShares.h"
-#include "market/MarketToCompanies.h"
+#include "market/MarketLinks.h"
 #include "market/QuoteSeries.h"
 
 /// A listed company with its dated quotes, in the currency of its market, its notes and splits.

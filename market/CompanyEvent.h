@@ -2,7 +2,7 @@
 
 #include "foundation/Date.h"
 #include "foundation/Serializable.h"
-#include "market/CompanyToEvents.h"
+#include "market/MarketLinks.h"
 
 /// Something that happened to a company on a day; shown, but without effect on quotes or valuations.
 class CompanyEvent : public Serializable {

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "foundation/Pooled.h"
-#include "market/CompanyToQuotes.h"
+#include "market/MarketLinks.h"
 #include "market/Quote.h"
 
 /// One dated price of a company's share, in the currency of the company's market.

@@ -16,6 +16,7 @@ Currency::Currency(const String& name, const String& representation, Currency* r
 
 Currency::~Currency()
 {
+    // Accounts belong to the wallet and stay, without a currency. Rates and markets are the currency's own and go.
     accounts_.unlinkAll();
     deleteQuotes();
     markets_.deleteAll();
@@ -49,6 +50,7 @@ int Currency::rd(FILE* file, Date* stamp)
     date.rd(file);
     if (stamp != nullptr)
         *stamp = date;
+    // The rates come last: a record that ends before them leaves a currency with names and markets.
     if (name_.rd(file) != 0 || representation_.rd(file) != 0 || readMarkets(file) != 0)
         return -1;
     return readQuotes(file);
@@ -71,12 +73,14 @@ int Currency::readMarkets(FILE* file)
 
 int Currency::setReferenceCurrency(Currency* reference)
 {
+    // The rates stay as they are: `Catalogue::rebaseOn` divides them, where they are to mean something else.
     reference_ = reference;
     return 0;
 }
 
 int Currency::getReferenceCurrency(Currency** out)
 {
+    // A currency that was given no reference is its own.
     *out = reference_ != nullptr ? reference_ : this;
     return 0;
 }

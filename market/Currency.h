@@ -3,8 +3,8 @@
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
 #include "market/CurrencyQuote.h"
-#include "market/CurrencyToAccounts.h"
 #include "market/Market.h"
+#include "market/MarketLinks.h"
 #include "market/QuoteSeries.h"
 
 /// A money unit with its rates: a rate is the price of one unit in the reference currency, whose own rates are all 1.

@@ -4,6 +4,7 @@
 
 CurrencyQuote::CurrencyQuote(Currency* currency, const Date& date, float value) : Quote(date, value)
 {
+    // A rate that the currency has of that day is destroyed by this.
     setCurrency(currency);
 }
 
@@ -12,6 +13,7 @@ CurrencyQuote::~CurrencyQuote()
     setCurrency(nullptr);
 }
 
+/// Date or value has changed already. The currency sorts its series before the next read, and fits the trend anew.
 void CurrencyQuote::notifyChange()
 {
     if (Currency* currency = currency_.partner())

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "market/CurrencyToQuotes.h"
+#include "market/MarketLinks.h"
 #include "market/Quote.h"
 
 /// One dated rate of a currency: the price of one unit of it in the reference currency.

@@ -15,6 +15,7 @@ Market::Market(const String& name) : Market()
 
 Market::~Market()
 {
+    // The companies first, since they unlink themselves from the list. Then the currency lists the market no more.
     companies_.deleteAll();
     setCurrency(nullptr);
 }
@@ -54,6 +55,7 @@ const String& Market::getCurrencyRepresentation() const
 
 int Market::getCompany(const String& abbreviation, Company** out) const
 {
+    // Several companies may have one ticker: the first one counts, in the order of the list.
     for (Company* company : companies())
         if (company->getAbbreviation() == abbreviation) {
             *out = company;

@@ -3,7 +3,7 @@
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
 #include "market/Company.h"
-#include "market/CurrencyToMarkets.h"
+#include "market/MarketLinks.h"
 
 /// A stock exchange: trades in one currency and lists companies, which it owns.
 class Market final : public Serializable {

@@ -15,12 +15,14 @@ int Quote::rd(FILE* file)
     unsigned char bytes[kFileSize];
     freadbytes(file, bytes, sizeof bytes);
     decode(bytes);
+    // The series is told even when the file has ended: date and value have changed.
     notifyChange();
     return reachedEnd(file) ? -1 : 0;
 }
 
 void Quote::decode(const unsigned char* bytes)
 {
+    // Nobody is told: a quote is decoded before it is linked, or by `rd`, which tells.
     date_.decode(bytes);
     value_ = decodeFloat(bytes + Date::kFileSize);
 }

@@ -19,6 +19,7 @@ int SplitCompanyEvent::rd(FILE* file)
     Date date;
     date.rd(file);
     setDate(date);
+    // The file has unsigned numbers; those above 32767 stand for negative ones, as they were written.
     numerator_ = static_cast<short>(freadshort(file));
     divider_ = static_cast<short>(freadshort(file));
     return reachedEnd(file) ? -1 : 0;

@@ -52,6 +52,7 @@ void Socket::setTimeLimit(std::chrono::milliseconds limit)
 
 int Socket::connectTo(const String& address, unsigned short port)
 {
+    // From here on nothing of a former connection is left, though its descriptor may be lost where closing failed.
     closePrevious();
     address_ = {};
     address_.sin_addr.s_addr = inet_addr(address.getCharacterArray());
@@ -90,6 +91,7 @@ int Socket::serverOn(unsigned short port, in_addr local)
     if (bind(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_) != 0 ||
         listen(descriptor_, kBacklog) != 0)
         return -1;
+    // Only now may connections be accepted.
     isServer_ = true;
     return 0;
 }
@@ -109,6 +111,7 @@ int Socket::acceptConnection(Socket** connection)
 
 int Socket::closeConnection()
 {
+    // In any case: a socket that could not be closed is no server either.
     isServer_ = false;
     if (descriptor_ < 0)
         return 0;
@@ -126,6 +129,7 @@ int Socket::readLine(String* line)
     if (!canTransferLines())
         return -1;
     const Clock::time_point deadline = Clock::now() + lineLimit_;
+    // `line` changes only when the whole line has come.
     std::string text;
     char c = '\0';
     do {
@@ -194,6 +198,7 @@ int Socket::receive(char* bytes, std::size_t count, Clock::time_point deadline, 
             *received = static_cast<std::size_t>(n);
             return 0;
         }
+        // A signal, or data that others have taken: the wait goes on until the same deadline.
         if (errno != EINTR && errno != EAGAIN)
             return -1;
     }
@@ -260,6 +265,7 @@ int Socket::connectToAddress(unsigned short port, std::optional<Clock::time_poin
     if (deadline)
         applyTimeLimit(std::max(millisecondsUntil(*deadline), std::chrono::milliseconds(1)));
     const int result = connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_);
+    // Whatever came of it, later transfers have the whole limit again.
     applyTimeLimit(timeLimit_);
     return result == 0 ? 0 : -1;
 }

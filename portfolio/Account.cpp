@@ -29,9 +29,12 @@ Account::Account(const String& name) : Account()
 
 Account::~Account()
 {
+    // A transfer is in two lists. Those that the account sent are destroyed with its operations and leave the lists of
+    // their recipients; those that it received are destroyed, too, and leave the lists of their senders.
     operations_.deleteAll();
     transfers_.deleteAll();
     states_.deleteAll();
+    // Nothing refers to the account any more but wallet and currency, which only list it.
     setWallet(nullptr);
     setCurrency(nullptr);
 }
@@ -52,6 +55,7 @@ int Account::wrt(FILE* file) const
 
 int Account::rd(FILE* file)
 {
+    // From here on the account changes in place: what is read whole stays, whatever comes behind it.
     if (name_.rd(file) != 0)
         return -1;
     defaultTransfer_ = freadchar(file) == 'Y';
@@ -76,6 +80,8 @@ int Account::readOperation(FILE* file)
         operation = std::make_unique<DepositAccountOperation>();
     else
         operation = std::make_unique<ShareOperation>();
+    // Linked before it is read: a purchase looks up its holding by way of the account's wallet. If the record is cut
+    // short, the destructor unlinks it again.
     operation->setAccount(this);
     if (operation->rd(file) != 0)
         return -1;
@@ -94,11 +100,13 @@ int Account::writeTransferOperations(FILE* file) const
 
 int Account::readTransferOperations(FILE* file)
 {
+    // The turns are good for one reading: the account keeps none of them from here on.
     const std::vector<std::uint32_t> turns = std::move(transferTurns_);
     transferTurns_.clear();
     const auto count = static_cast<unsigned>(freadint(file));
     for (unsigned i = 0; i < count && !reachedEnd(file); ++i) {
         auto transfer = std::make_unique<TransferAccountOperation>();
+        // It stands behind the operations of its day now, and is given back the place that its letter had.
         transfer->setAccount(this);
         if (i < turns.size())
             operations_.setTurn(transfer.get(), turns[i]);
@@ -125,6 +133,7 @@ const String& Account::getCurrencyRepresentation() const
 
 int Account::getShare(const String& market, const String& abbreviation, Share** out) const
 {
+    // An account that is in no wallet has no holdings to look up.
     *out = nullptr;
     return wallet() != nullptr ? wallet()->getShare(market, abbreviation, out) : -1;
 }

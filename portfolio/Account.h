@@ -3,9 +3,8 @@
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
 #include "market/Currency.h"
-#include "portfolio/AccountToAccountStates.h"
+#include "portfolio/PortfolioLinks.h"
 #include "portfolio/TransferAccountOperation.h"
-#include "portfolio/WalletToAccounts.h"
 
 #include <cstdint>
 #include <vector>

@@ -4,6 +4,7 @@
 
 #include <cstring>
 
+/// The lists of derived classes have been left before: their destructors ran first.
 Operation::~Operation()
 {
     setAccount(nullptr);
@@ -11,6 +12,7 @@ Operation::~Operation()
 
 void Operation::setDate(const Date& date)
 {
+    // The lists are out of order now, and sort themselves before they are read again.
     date_ = date;
     notifyChange();
 }

@@ -2,7 +2,7 @@
 
 #include "foundation/Date.h"
 #include "foundation/Serializable.h"
-#include "portfolio/AccountToOperations.h"
+#include "portfolio/PortfolioLinks.h"
 
 /// A dated event on a cash account: a deposit, a transfer, a purchase or a sale.
 ///

@@ -19,6 +19,7 @@ Share::Share(Wallet* wallet, Company* company) : Share()
 
 Share::~Share()
 {
+    // Each operation leaves its account's list, too, so the balances change with the holding.
     operations_.deleteAll();
     states_.deleteAll();
     setWallet(nullptr);
@@ -67,6 +68,7 @@ void Share::removeAutomaticShareOperations()
     // Gathered first: each removal disturbs the order, and the list is to be sorted once.
     std::vector<ShareOperation*> automatic;
     std::ranges::copy_if(shareOperations(), std::back_inserter(automatic), &ShareOperation::isAutomatic);
+    // Each unlinks itself from the holding, and from an account if it has one.
     for (ShareOperation* operation : automatic)
         delete operation;
 }

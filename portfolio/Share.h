@@ -4,9 +4,8 @@
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
 #include "market/Company.h"
+#include "portfolio/PortfolioLinks.h"
 #include "portfolio/ShareOperation.h"
-#include "portfolio/ShareToShareStates.h"
-#include "portfolio/WalletToShares.h"
 
 /// The wallet's holding of one company: ties the wallet to the company and lists the buys and sells, manual and
 /// automatic. Quantity, average price and value at a day are computed by a `ShareState`.

@@ -36,11 +36,13 @@ int ShareOperation::rd(FILE* file)
     buy_ = freadchar(file) == 'Y';
     String market;
     String abbreviation;
+    // Market and ticker stand for the holding: the wallet finds it by them.
     if (market.rd(file) != 0 || abbreviation.rd(file) != 0)
         return -1;
     Share* held;
     if (account() == nullptr || account()->getShare(market, abbreviation, &held) != 0)
         return -1;
+    // The holding lists the operation from here on. Its date, which follows, puts it in its place there.
     setShare(held);
     quantity_ = freadint(file);
     quote_ = freadfloat(file);
@@ -61,6 +63,7 @@ float ShareOperation::getOperationRateCost() const
 
 void ShareOperation::notifyChange()
 {
+    // Both lists that hold the operation go by its date.
     Operation::notifyChange();
     if (share() != nullptr)
         share()->shareOperationChanged();

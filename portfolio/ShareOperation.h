@@ -1,7 +1,7 @@
 #pragma once
 
 #include "portfolio/Operation.h"
-#include "portfolio/ShareToShareOperations.h"
+#include "portfolio/PortfolioLinks.h"
 
 /// A purchase or sale of a number of shares at a price, paid from or to a cash account; listed by both the account and
 /// the holding. An automatic sale has no account.

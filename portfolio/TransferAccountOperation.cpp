@@ -35,6 +35,7 @@ int TransferAccountOperation::rd(FILE* file)
     Account* named = getAccountByName(name);
     if (named == nullptr)
         return -1;
+    // Both accounts list the transfer from here on; what follows in the record changes it in place.
     setRecepientAccount(named);
     setAmount(freadfloat(file));
     rateCost_ = freadfloat(file);
@@ -54,6 +55,7 @@ float TransferAccountOperation::getTotalCost() const
 
 void TransferAccountOperation::notifyChange()
 {
+    // Both lists that hold the transfer go by its date.
     AccountOperation::notifyChange();
     if (recipient() != nullptr)
         recipient()->transferOperationChanged();

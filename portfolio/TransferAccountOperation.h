@@ -1,7 +1,7 @@
 #pragma once
 
 #include "portfolio/AccountOperation.h"
-#include "portfolio/AccountToTransferOperations.h"
+#include "portfolio/PortfolioLinks.h"
 
 /// Money moved from one account to another, listed by both: by the sender among its operations, by the recipient among
 /// its transfers. The sender owns it.

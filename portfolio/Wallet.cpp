@@ -16,6 +16,7 @@ Wallet::Wallet() : shares_(this), accounts_(this), states_(this) {}
 
 Wallet::~Wallet()
 {
+    // States refer to accounts and holdings, operations to holdings. What refers goes before what it refers to.
     states_.deleteAll();
     accounts_.deleteAll();
     shares_.deleteAll();
@@ -33,6 +34,7 @@ void Wallet::setMarkets(int count, Market** markets)
 
 void Wallet::setCatalogue(const Catalogue& catalogue)
 {
+    // Copies: what is added to the catalogue later is not known here until the next call.
     currencies_ = catalogue.getCurrencies();
     markets_ = catalogue.getMarkets();
 }
@@ -105,6 +107,7 @@ void Wallet::removeAutomaticOperations()
         // Gathered first: each removal disturbs the order, and the list is to be sorted once.
         std::vector<Operation*> automatic;
         std::ranges::copy_if(account->operations(), std::back_inserter(automatic), &Operation::isAutomatic);
+        // Each leaves the lists it is in: a transfer those of both accounts.
         for (Operation* operation : automatic)
             delete operation;
     }

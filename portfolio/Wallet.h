@@ -4,8 +4,8 @@
 #include "foundation/Serializable.h"
 #include "foundation/String.h"
 #include "portfolio/Account.h"
+#include "portfolio/PortfolioLinks.h"
 #include "portfolio/Share.h"
-#include "portfolio/WalletToStates.h"
 
 #include <array>
 #include <vector>

@@ -50,6 +50,7 @@ int Wallet::rd(FILE* file, Date* stamp)
     date.rd(file);
     if (stamp != nullptr)
         *stamp = date;
+    // The former content goes in any case, also when the file turns out to be damaged.
     shares_.deleteAll();
     accounts_.deleteAll();
     removeAllStates();
@@ -63,6 +64,7 @@ int Wallet::rd(FILE* file, Date* stamp)
     if (isRead)
         for (Account* account : accounts())
             account->readTransferOperations(file);
+    // The names may change again from here on, which the index would not see.
     names_ = nullptr;
     unknownName_ = isRead ? String() : names.getUnknown();
     if (!isRead)
@@ -98,6 +100,7 @@ int Wallet::readAccounts(FILE* file)
         if (currencyName.rd(file) != 0 || getCurrency(currencyName, &currency) != 0)
             return -1;
         auto account = std::make_unique<Account>();
+        // Wallet and currency come first: the operations are read by way of them.
         account->setWallet(this);
         account->setCurrency(currency);
         const int result = account->rd(file);

@@ -19,6 +19,7 @@ WalletNames::Pair WalletNames::pairOf(const Market& market, const Company& compa
 
 WalletNames::WalletNames(const std::vector<Market*>& markets, const std::vector<Currency*>& currencies)
 {
+    // `try_emplace` keeps what is there: of equal names the first counts, as in a search from the front.
     for (Currency* currency : currencies)
         if (currency->getName().hasText())
             currencies_.try_emplace(currency->getName().comparedBytes(), currency);
@@ -45,6 +46,7 @@ int WalletNames::find(const PairMap<T>& map, const String& market, const String&
 {
     const bool canMatch = market.hasText() && abbreviation.hasText();
     const auto found = canMatch ? map.find({market.comparedBytes(), abbreviation.comparedBytes()}) : map.end();
+    // The wallet reports the name that was looked for last without success as the reason of a failed read.
     *out = found != map.end() ? found->second : nullptr;
     if (*out == nullptr)
         unknown_ = abbreviation;

@@ -24,6 +24,7 @@ CsvReader::~CsvReader()
 bool CsvReader::next()
 {
     while (readLine()) {
+        // A malformed line is left without fields: the table tells it by its number and goes on.
         if (!split())
             fields_.clear();
         // Spreadsheets write lines of mere separators.
@@ -49,6 +50,7 @@ bool CsvReader::readLine()
     if (c < 0 && text_.empty())
         return false;
     constexpr const char* kByteOrderMark = "\xEF\xBB\xBF";
+    // The mark belongs to the file, not to its first heading.
     if (++line_ == 1 && text_.starts_with(kByteOrderMark))
         text_.erase(0, std::strlen(kByteOrderMark));
     if (text_.ends_with('\r'))
@@ -79,6 +81,7 @@ bool CsvReader::split()
     if (text_.size() > kLongestLine)
         return false;
     std::size_t at = 0;
+    // At the beginning of each round `at` stands where a field begins, after it at a separator or the end.
     do {
         std::string& field = fields_.emplace_back();
         if (text_[at] == '"') {

@@ -58,6 +58,7 @@ std::size_t addAll(Map& valuesByOwner, Date* latest)
             new Quoted(owner, date, value); // owned by the series it links itself into
         *latest = std::max(*latest, values.rbegin()->first);
         count += values.size();
+        // They are in the series now.
         values.clear();
     }
     return count;
@@ -73,6 +74,7 @@ const TableForm& quotesOfOneTicker()
 Importer::Importer(const ImportOptions& options, Catalogue& catalogue, std::ostream& log)
     : options_(options), catalogue_(catalogue), log_(log)
 {
+    // The reference exists from here on, so that every other currency is made with it.
     catalogue.setReferenceCurrency(findCurrency(options_.reference));
 }
 
@@ -134,6 +136,7 @@ void Importer::takeRate(Table& row, bool units)
         throw UnusableRow("has no currency");
     const Date date = row.date();
     const float rate = row.value(units);
+    // All else is relative to it: a file that gives it another rate means another reference.
     if (symbol == options_.reference && rate != 1)
         throw UnusableRow("gives the reference currency a rate that is not 1");
     addValue(rates_[findCurrency(symbol)], date, rate);
@@ -187,6 +190,7 @@ Importer::CompanyValues* Importer::placeCompany(const Table& row, const std::str
     Market* market = findMarket(marketName, currency);
     Company*& company = companies_[{market, ticker.c_str()}];
     if (company == nullptr)
+        // The market owns it. Names that come later in the file replace the ticker that stands in for one.
         company = new Company(market, toString(listed.name.empty() ? ticker : listed.name), toString(ticker));
     return &*quotes_.try_emplace(company).first;
 }
@@ -226,6 +230,7 @@ Date Importer::finish()
 {
     if (quotes_.empty() && rates_.empty())
         throw std::runtime_error("there is no usable quote or rate in the input");
+    // Until here rates and quotes are only gathered. Each series is filled once, and in order.
     giveReferenceItsRates();
     tellDoubts();
     counts_.companies = quotes_.size();

@@ -1,5 +1,6 @@
-#include "tools/JsonReport.h"
+#include "tools/Reports.h"
 
+#include "foundation/DateText.h"
 #include "market/Currency.h"
 #include "portfolio/Account.h"
 #include "portfolio/DepositAccountOperation.h"
@@ -67,7 +68,7 @@ std::string text(const String& text)
 
 Json day(const Date& date)
 {
-    return date.isUndefined() ? Json() : Json(text(date.toString()));
+    return date.isUndefined() ? Json() : Json(dateText(date));
 }
 
 void addTotals(const Valuation& valuation, ObjectWriter& report)

@@ -1,5 +1,8 @@
 #include "tools/Program.h"
 
+#include "foundation/DateText.h"
+#include "foundation/Today.h"
+
 #include <clocale>
 #include <csignal>
 #include <exception>
@@ -15,6 +18,7 @@ int runProgram(CLI::App& app, int argc, char** argv, const std::function<void()>
     std::setlocale(LC_CTYPE, "C.UTF-8");
     app.set_version_flag("--version", PELORIN_VERSION);
     try {
+        // Nothing has been read or written so far: bad arguments leave no trace.
         app.parse(argc, argv);
         run();
         return 0;
@@ -24,6 +28,17 @@ int runProgram(CLI::App& app, int argc, char** argv, const std::function<void()>
         std::cerr << app.get_name() << ": " << error.what() << '\n';
         return kFailure;
     }
+}
+
+std::string checkDateArgument(const std::string& text)
+{
+    const bool isDate = text.find('/') != std::string::npos && parseDate(text);
+    return isDate ? std::string() : "is not a date DD/MM/YYYY: " + text;
+}
+
+Date dateArgument(const std::string& text)
+{
+    return text.empty() ? today() : *parseDate(text);
 }
 
 std::string checkNotEmpty(const std::string& text)

@@ -57,6 +57,7 @@ Closes QuoteFolder::closesOf(std::string_view ticker) const
         Table table(file, quotesOfOneTicker());
         table.forEach([&] { closes.insert_or_assign(table.date(), table.value(false)); }, log_);
     } catch (const std::runtime_error& reason) {
+        // What stands before the damage is served all the same.
         log_ << reason.what() << '\n';
     }
     return closes;

@@ -1,6 +1,6 @@
 #include "tools/Table.h"
 
-#include "tools/DateText.h"
+#include "foundation/DateText.h"
 #include "tools/TextTable.h"
 
 #include <algorithm>
@@ -56,6 +56,7 @@ Table::Table(const std::string& path, const TableForm& form) : path_(path), read
     for (std::size_t i = 0; i < form.required; ++i)
         if (!has(form.plain[i]))
             throw std::runtime_error(path + ": the header line names no column for the " + describe(form.plain[i]));
+    // The header line is no row: the first one is behind it. Without a header the record read is a row.
     if (header)
         more_ = reader_.next();
 }
@@ -75,6 +76,7 @@ bool Table::takeHeader(const TableForm& form)
             const auto at = std::find_if(present.begin(), present.end(), isOfName);
             if (at == present.end())
                 continue;
+            // The names are in order of preference, so the first that is there settles the column.
             place(column) = static_cast<std::size_t>(at - present.begin());
             if (column == Column::kValue)
                 valueHeading_ = *at;
@@ -144,6 +146,7 @@ float Table::value(bool inverted)
     const double number = isAllowed ? numberOf(text) : 0;
     const double value = inverted && number != 0 ? 1 / number : number;
     if (value > 0 && value <= static_cast<double>(std::numeric_limits<float>::max()) && static_cast<float>(value) > 0) {
+        // Settled by the first number that has a mark; a whole number leaves it open.
         decimalMark_ = mark;
         return static_cast<float>(value);
     }

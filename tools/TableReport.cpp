@@ -1,5 +1,6 @@
-#include "tools/TableReport.h"
+#include "tools/Reports.h"
 
+#include "foundation/DateText.h"
 #include "foundation/NumberText.h"
 #include "market/Company.h"
 #include "market/Currency.h"
@@ -25,10 +26,6 @@
 namespace {
 
 constexpr auto kRight = TextTable::Align::kRight;
-std::string dateText(const Date& date)
-{
-    return date.isUndefined() ? std::string() : date.toString().getCharacterArray();
-}
 
 std::string plain(const String& text)
 {

@@ -54,6 +54,7 @@ TextTable::TextTable(std::vector<Column> columns)
         aligns_.push_back(column.align);
         headings.push_back(std::move(column.heading));
     }
+    // The headings are the first row: `isEmpty` counts on it.
     rows_.push_back(std::move(headings));
 }
 

@@ -39,6 +39,7 @@ std::string quoted(const String& name)
 Valuation::Valuation(const std::string& marketPath, const std::string& portfolioPath)
     : marketPath_(marketPath), portfolioPath_(portfolioPath)
 {
+    // In this order: the portfolio's names are looked up in the market data.
     readMarket();
     readPortfolio();
 }
@@ -48,6 +49,7 @@ void Valuation::readMarket()
     const InputFile file(marketPath_);
     if (catalogue_.rd(file.stream()) != 0)
         failReading(file, "market", "is damaged: it has the reference currency over and over");
+    // The wallet keeps copies of the lists, so they are set when the catalogue is whole.
     wallet_.setCatalogue(catalogue_);
 }
 
@@ -69,6 +71,7 @@ void Valuation::compute(const Date& date, bool previsions, bool evolution)
     EvolutionOutcome outcome = EvolutionOutcome::kBuilt;
     state_ = refreshStates(wallet_, date, previsions, evolution ? &outcome : nullptr);
     checkOutcome(outcome);
+    // Of an earlier computation.
     evolution_.clear();
     if (!evolution)
         return;

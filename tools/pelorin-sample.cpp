@@ -3,7 +3,6 @@
 #include "foundation/InputFile.h"
 #include "market/Catalogue.h"
 #include "portfolio/Wallet.h"
-#include "tools/DateText.h"
 #include "tools/Program.h"
 #include "tools/SampleMarket.h"
 #include "tools/SamplePortfolio.h"

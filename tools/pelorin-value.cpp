@@ -1,7 +1,5 @@
-#include "tools/DateText.h"
-#include "tools/JsonReport.h"
 #include "tools/Program.h"
-#include "tools/TableReport.h"
+#include "tools/Reports.h"
 #include "tools/Valuation.h"
 
 #include <cerrno>

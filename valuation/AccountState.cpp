@@ -16,6 +16,7 @@ AccountState::AccountState(Account* account, State* state, const Date& date, boo
 {
     if (account == nullptr)
         return;
+    // The links first: the replay reads the account and writes the state's deposits.
     setAccount(account);
     setState(state);
     replay(date, false);
@@ -29,6 +30,8 @@ AccountState::~AccountState()
 
 void AccountState::processAutomaticOperations(const Date& date)
 {
+    // The manual operations are in the balance already, and so are the moves of the holdings. Intended: automatic ones
+    // are added behind all of these whatever their dates, and the evolution adds them up in the same order.
     replay(date, true);
 }
 

@@ -4,7 +4,7 @@
 #include "foundation/Pooled.h"
 #include "foundation/String.h"
 #include "portfolio/Account.h"
-#include "valuation/StateToAccountStates.h"
+#include "valuation/StateLinks.h"
 
 /// The cash of one account at the day of a state, in the account's own currency.
 class AccountState final : public Pooled<AccountState, (std::size_t{16} << 20)> {

@@ -20,6 +20,7 @@ Appraisal::Appraisal(const Catalogue& catalogue) : reference_(catalogue.getRefer
     for (const Currency* currency : catalogue.getCurrencies()) {
         if (currency->getRepresentation().hasText())
             bySymbol_.try_emplace(currency->getRepresentation().comparedBytes(), static_cast<unsigned>(rates_.size()));
+        // Of currencies with one symbol the first is found, as by `getCurrencyByRepresentation`.
         rates_.push_back({Currency::Walk(*currency), 0, false});
     }
 }
@@ -28,6 +29,8 @@ float Appraisal::totalValue(const State& state)
 {
     if (!hasReference())
         return 0;
+    // From here on `day_` and the values of the used rates belong to this state. A rate that comes into use later is
+    // taken for the same day, in `findCurrency`.
     day_ = state.getDate();
     const double referenceRate = referenceWalk_->realQuote(day_);
     if (referenceRate == 0)
@@ -40,6 +43,7 @@ float Appraisal::totalValue(const State& state)
 float Appraisal::sharesValue(const State& state, double referenceRate)
 {
     const auto states = state.shareStates();
+    // Lines of places that the last state had and this one has not are dropped; new ones are empty, and looked up.
     shares_.resize(states.size());
     float value = 0;
     for (std::size_t i = 0; i < states.size(); ++i) {
@@ -72,6 +76,8 @@ float Appraisal::cashValue(const State& state, double referenceRate)
 template <class ItemState>
 unsigned Appraisal::currencyOf(Line& line, const void* item, const ItemState& state)
 {
+    // Afterwards the line is that of `item`. A state without item has no address to know it by and is looked up each
+    // time.
     if (line.item != item || item == nullptr)
         line = {item, findCurrency(state.getCurrencyRepresentation())};
     return line.currency;
@@ -82,6 +88,7 @@ unsigned Appraisal::findCurrency(const String& representation)
     const auto found = representation.hasText() ? bySymbol_.find(representation.comparedBytes()) : bySymbol_.end();
     if (found == bySymbol_.end())
         return kUnknown;
+    // A currency is valued on each day from the first state on that anything in it is met in.
     Rate& rate = rates_[found->second];
     if (!rate.isUsed) {
         used_.push_back(found->second);

@@ -95,6 +95,8 @@ AutomaticSale::Day AutomaticSale::firstSale(const Date& stateDate, const Day& fi
                          canExceed(first.prevision, last.prevision, first.profitLimit, last.profitLimit);
     if (!canSell || last.number - first.number <= 1)
         return last;
+    // The half with the earlier days is searched first. Where it ends without a sale, its last day is the first one of
+    // the other half.
     const Day middle = dayAt(stateDate, first.number + (last.number - first.number) / 2);
     const Day sale = firstSale(stateDate, first, middle);
     return judge(sale) != Outcome::kHold ? sale : firstSale(stateDate, middle, last);
@@ -104,6 +106,7 @@ void AutomaticSale::make(const Date& stateDate, Account* sellingAccount)
 {
     Outcome outcome = Outcome::kHold;
     Date date = holding_.endDate.date();
+    // A holding whose end date has passed is sold on that date: then there is no day to search.
     if (const int days = daysBefore(date, stateDate); days > 0) {
         const Day day = firstSale(stateDate, dayAt(stateDate, 0), dayAt(stateDate, days - 1));
         outcome = judge(day);
@@ -127,8 +130,10 @@ void AutomaticSale::transferGain(const Date& date, float quote, Account* selling
     if (recipient == nullptr || recipient == sellingAccount)
         return;
     const double h = holding_.quantity;
+    // What the sale brings and what the purchase cost, each with its proportional and its fixed cost.
     const double proceeds = quote * h * (1.0 - wallet_.getSellRateCost()) - wallet_.getSellCost();
     const double gain = proceeds - holding_.buyQuote * h * (1.0 + wallet_.getBuyRateCost()) - wallet_.getBuyCost();
+    // A gain that the costs have used up is none to share.
     if (gain > 0) {
         const auto amount = static_cast<float>((1.0 - wallet_.getReinvestRate()) * gain);
         new TransferAccountOperation(date, sellingAccount, recipient, amount, true); // owned by the selling account

@@ -18,6 +18,7 @@ DailyStates::DailyStates(Wallet& wallet, const Date& first, const Date& end)
     : wallet_(wallet), firstOperationDate_(State::afterAllOperations())
 {
     wallet.removeAutomaticOperations();
+    // `days_` is in ascending order without a gap, so that a day's index is its distance from the first.
     for (Date day = first; day < end; day + 1)
         days_.push_back(day);
     events_.resize(days_.size());
@@ -31,6 +32,7 @@ DailyStates::DailyStates(Wallet& wallet, const Date& first, const Date& end)
         takeOwnMoves(i);
         takeReceivedTransfers(i, false);
     }
+    // From here on every own and received move has its rank. The trades get theirs behind them, holding by holding.
     lines_.reserve(wallet.getNbrShares());
     for (Share* share : wallet.shares())
         takeShare(*share);
@@ -43,21 +45,26 @@ std::size_t DailyStates::dayOf(const Date& date) const
 {
     if (days_.empty() || date <= days_.front())
         return 0;
+    // Days have no gaps: the distance is the index. A date before `end` lies within them.
     if (date.isValid())
         return std::min(static_cast<std::size_t>(date - days_.front().date()), days_.size());
+    // A date that no calendar has is at no distance, but it has its place in the order of dates.
     return static_cast<std::size_t>(std::lower_bound(days_.begin(), days_.end(), PackedDate(date)) - days_.begin());
 }
 
 void DailyStates::takeMove(const Operation& operation, Ledger& ledger, double amount)
 {
     const std::size_t day = dayOf(operation.getDate());
+    // It never happens in this evolution, so it needs no rank.
     if (day == days_.size())
         return;
+    // The ranks of a ledger rise from call to call: the order of the calls is the order of its sum.
     events_[day].push_back({&ledger, ledger.addMove(amount)});
 }
 
 void DailyStates::takeOwnMoves(std::size_t account)
 {
+    // Of an account without currency the own moves do not count, as in a replay.
     const Currency* currency = accounts_[account]->currency();
     if (currency == nullptr)
         return;
@@ -84,6 +91,7 @@ void DailyStates::takeReceivedTransfers(std::size_t account, bool automatic)
 
 void DailyStates::takeShare(Share& share)
 {
+    // The operations are sorted by date, so `line.operations` is in the order of days, too.
     Line& line = lines_.emplace_back();
     line.share = &share;
     for (const ShareOperation* operation : share.shareOperations()) {
@@ -96,6 +104,7 @@ void DailyStates::takeShare(Share& share)
             operation->isBuy() ? -purchaseCost(*operation, wallet_) : saleProceeds(*operation, wallet_);
         takeMove(*operation, cash_[found->second], amount);
     }
+    // The walk begins before the first quote and is only asked for later and later days.
     if (share.company() != nullptr)
         line.walk.emplace(*share.company());
     share.reserveShareStates(share.getNbrShareStates() + static_cast<unsigned>(days_.size()));
@@ -105,6 +114,7 @@ void DailyStates::takeShare(Share& share)
 void DailyStates::takeQuotesFrom(std::size_t day)
 {
     const std::size_t count = std::min(kDaysAhead, days_.size() - day);
+    // Before: each walk has been asked for the days before `day`, in order. After: for those taken ahead, too.
     for (Line& line : lines_)
         if (line.walk)
             for (std::size_t i = 0; i < count; ++i)
@@ -119,19 +129,24 @@ void DailyStates::build()
 
 void DailyStates::buildDay(std::size_t day)
 {
+    // `line.quotes` then covers this day and up to `kDaysAhead` - 1 behind it.
     if (day % kDaysAhead == 0)
         takeQuotesFrom(day);
+    // All earlier days have been built: the ledgers hold what has happened up to the day before. After this loop they
+    // hold this day's moves, too, and a balance is summed again only where one has changed.
     for (const Event& event : events_[day])
         event.ledger->happen(event.rank);
 
     auto* state = new State(&wallet_, days_[day].date()); // owned by the wallet, and the others by it
     state->setFirstOperationDate(firstOperationDate_);
     state->setTotalDeposit(deposits_.balance());
+    // In the wallet's order, as the replay makes them: accounts, then holdings.
     state->accountStates_.reserve(static_cast<unsigned>(accounts_.size()));
     for (std::size_t i = 0; i < accounts_.size(); ++i)
         new AccountState(accounts_[i], state, cash_[i].balance());
     state->shareStates_.reserve(static_cast<unsigned>(lines_.size()));
     for (Line& line : lines_) {
+        // Before: the holding has taken in the operations up to `replayed`. After: all those that count by this day.
         for (; line.replayed < line.operations.size() && line.operations[line.replayed].first <= day; ++line.replayed) {
             const ShareOperation& operation = *line.operations[line.replayed].second;
             if (operation.isBuy())

@@ -20,6 +20,7 @@ EvolutionOutcome buildDailyStates(Wallet& wallet, const Date& first, const Date&
         return EvolutionOutcome::kBuilt;
     if (!first.isValid() || !end.isValid())
         return EvolutionOutcome::kBadFirstDay;
+    // Refused before anything is built: the current state stands alone then.
     const std::int64_t days = end - first;
     if (days > kMostDays || days * (wallet.getNbrShares() + wallet.getNbrAccounts()) > kMostHoldingDays)
         return EvolutionOutcome::kTooLong;
@@ -31,9 +32,11 @@ EvolutionOutcome buildDailyStates(Wallet& wallet, const Date& first, const Date&
 
 State* refreshStates(Wallet& wallet, const Date& date, bool previsions, EvolutionOutcome* outcome)
 {
+    // Rows and pages must not refer to a state from here on.
     wallet.removeAllStates();
     if (date.isUndefined())
         return nullptr;
+    // The current state comes first in the wallet's list; the days of the evolution stand behind it.
     auto* current = new State(&wallet, date, previsions); // owned by the wallet
     if (outcome != nullptr)
         *outcome = buildDailyStates(wallet, current->getFirstOperationDate(), date);

@@ -30,10 +30,12 @@ void Holding::buy(const ShareOperation& purchase, int period)
             // purchase. Automatic sales rely on it.
             endDate = endDate.date().moveBy(bought / total * (horizon - endDate.date()));
     }
+    // Price and end date above were taken from the former quantity, so it changes last.
     quantity = addWrapping(quantity, bought);
 }
 
 void Holding::sell(const ShareOperation& sale)
 {
+    // Below zero is possible: a sale is replayed whatever is held.
     quantity = addWrapping(quantity, -static_cast<std::int64_t>(sale.getQuantity()));
 }

@@ -13,19 +13,23 @@
 ShareState::ShareState(Share& share, State& state, const Holding& holding, float quote)
     : quote_(quote), holding_(holding)
 {
+    // The state has just been made and is in no list: both links are entered without asking.
     ShareStatesToShare::list(share).addNew(this);
     ShareStatesToState::list(state).addNew(this);
 }
 
 ShareState::ShareState(Share* share, State* state, const Date& date, bool automatic)
 {
+    // The links first, so that the state is listed and owned even where there is nothing to replay.
     setShare(share);
     setState(state);
     if (share == nullptr || state == nullptr || state->wallet() == nullptr)
         return;
     Account* sellingAccount = nullptr;
+    // The accounts of the state have been replayed before: the trades move their cash from here on.
     const bool isComplete = replay(date, &sellingAccount);
     share->getQuote(date, &quote_);
+    // A holding with operations behind the state's day has a known future: nothing is simulated there.
     if (automatic && isComplete && holding_.quantity >= 1)
         AutomaticSale(*share, *state->wallet(), holding_).make(date, sellingAccount);
 }
@@ -46,6 +50,7 @@ bool ShareState::replay(const Date& date, Account** sellingAccount)
         whole.noteOperationDate(operation->getDate());
         if (operation->getDate() > date)
             return false;
+        // The account of the last trade, a purchase or a sale, is the one that a simulated sale sells from.
         *sellingAccount = operation->account();
         if (operation->isBuy()) {
             whole.BuyShares(*sellingAccount, purchaseCost(*operation, wallet));

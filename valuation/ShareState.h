@@ -5,7 +5,7 @@
 #include "foundation/String.h"
 #include "portfolio/Share.h"
 #include "valuation/Holding.h"
-#include "valuation/StateToShareStates.h"
+#include "valuation/StateLinks.h"
 
 class Account;
 

@@ -15,6 +15,7 @@ State::State(Wallet* wallet, const Date& date, bool automatic) : State(wallet, d
     automatic_ = automatic;
     if (wallet == nullptr || date.isUndefined())
         return;
+    // What an earlier valuation has made up is no part of this one.
     wallet->removeAutomaticOperations();
     firstOperationDate_ = afterAllOperations();
 
@@ -23,12 +24,14 @@ State::State(Wallet* wallet, const Date& date, bool automatic) : State(wallet, d
         new AccountState(account, this, date, automatic);
     for (Share* share : wallet->shares())
         new ShareState(share, this, date, automatic);
+    // The transfers that the automatic sales have just made, and whatever else is automatic.
     for (AccountState* state : accountStates())
         state->processAutomaticOperations(date);
 }
 
 State::~State()
 {
+    // Each state unlinks itself from its account or holding, whose list of states shrinks with it.
     accountStates_.deleteAll();
     shareStates_.deleteAll();
     setWallet(nullptr);
@@ -42,6 +45,7 @@ void State::noteOperationDate(const Date& date)
 
 AccountState* State::findAccountState(Account* account) const
 {
+    // A trade without account, such as an automatic sale, moves no cash.
     if (account == nullptr)
         return nullptr;
     // A state lists the accounts in the order of the wallet: only when that has changed since is there a search.

@@ -11,6 +11,7 @@ constexpr double kDaysInYear = 365.25;
 
 float annualRevenueOf(const State& state, double profit)
 {
+    // No time has passed, or nothing was put in: there is no revenue per year.
     if (state.getDate() <= state.getFirstOperationDate() || state.getTotalDeposit() == 0)
         return 0;
     const int days = state.getDate() - state.getFirstOperationDate();
@@ -24,6 +25,7 @@ Totals::Totals(const State& state, const Catalogue& catalogue)
     Appraisal appraisal(catalogue);
     if (!appraisal.hasReference())
         return;
+    // From here on the deposit is known; the others stay 0 where they would be divided by a rate of 0.
     isKnown = true;
     reference = catalogue.getReferenceCurrency();
     totalDeposit = state.getTotalDeposit();

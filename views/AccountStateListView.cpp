@@ -17,6 +17,7 @@ AccountStateItem::AccountStateItem(AccountState* state) : state_(state), account
 Cell AccountStateItem::cell(int column) const
 {
     const Currency* currency = account_ != nullptr ? account_->currency() : nullptr;
+    // Name and currency are the account's as they are now, the balance is that of the valuation.
     switch (column) {
     case kName:
         return {textOf(state_->getAccountName())};

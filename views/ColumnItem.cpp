@@ -1,33 +1,11 @@
 #include "views/ColumnItem.h"
 
-#include "platform/ShortText.h"
+#include "chart/ChartText.h"
 #include "platform/View.h"
 #include "views/ColumnListView.h"
 #include "views/Look.h"
 
 #include <algorithm>
-
-namespace {
-
-/// `text`, cut at a character of UTF-8 and ended with three dots when it is wider than `width`.
-std::string fitted(const BView& view, std::string text, float width)
-{
-    if (view.StringWidth(text.c_str()) <= width)
-        return text;
-    std::size_t end = text.size();
-    std::size_t shortest = 0;
-    // The width grows with the length, so halving finds the cut.
-    while (end - shortest > 1) {
-        std::size_t middle = (end + shortest) / 2;
-        if (view.StringWidth((text.substr(0, middle) + kEllipsis).c_str()) <= width)
-            shortest = middle;
-        else
-            end = middle;
-    }
-    return text.substr(0, wholeCharacters(text, shortest)) + kEllipsis;
-}
-
-} // namespace
 
 std::string ColumnItem::Text() const
 {
@@ -47,12 +25,14 @@ void ColumnItem::DrawItem(BView* owner, BRect frame, bool)
     const auto& list = static_cast<const ColumnListView&>(*owner);
     const rgb_color ground = owner->HighColor(); // that of a selected row's text, where the row is selected
     const float base = baseLine(*owner, frame);
+    const TextWidth widthOf = [owner](const std::string& text) { return owner->StringWidth(text.c_str()); };
     float left = frame.left;
     for (int i = 0; i < list.CountColumns(); ++i) {
         const ListColumn& column = list.ColumnAt(i);
         const Cell shown = cell(i);
+        // On a selected row the text takes the colour that can be read on the selection.
         owner->SetHighColor(ground == look::kText ? shown.color : ground);
-        column.drawText(*owner, fitted(*owner, shown.text, column.textWidth()), left, base);
+        column.drawText(*owner, fitText(shown.text, widthOf, column.textWidth()), left, base);
         left += column.width;
     }
 }

@@ -1,6 +1,5 @@
 #include "views/ColumnListView.h"
 
-#include "views/ColumnHeading.h"
 #include "views/ColumnItem.h"
 #include "views/Look.h"
 
@@ -10,6 +9,42 @@
 namespace {
 
 constexpr float kPadding = 4; // from the sides of a column to its text
+
+/// The titles above the columns of a list.
+class ColumnHeading final : public BView {
+public:
+    ColumnHeading(BRect frame, std::vector<ListColumn> columns);
+
+    void Draw(BRect updateRect) override;
+
+private:
+    std::vector<ListColumn> columns_;
+};
+
+ColumnHeading::ColumnHeading(BRect frame, std::vector<ListColumn> columns)
+    : BView(frame, "", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW), columns_(std::move(columns))
+{
+    SetViewColor(look::kHeading);
+    SetFont(be_bold_font, B_FONT_FAMILY_AND_STYLE);
+    SetFontSize(11);
+}
+
+void ColumnHeading::Draw(BRect)
+{
+    const BRect bounds = Bounds();
+    const float base = baseLine(*this, bounds);
+    float left = 0;
+    for (const auto& column : columns_) {
+        SetHighColor(look::kText);
+        column.drawText(*this, column.title, left, base);
+        left += column.width;
+        SetHighColor(look::kLine);
+        if (left < bounds.right - look::kScrollBar)
+            FillRect({left - 1, 3, left, bounds.bottom - 3});
+    }
+    SetHighColor(look::kLine);
+    FillRect({0, bounds.bottom - 1, bounds.right, bounds.bottom});
+}
 
 } // namespace
 
@@ -51,6 +86,7 @@ void ColumnListView::addTo(BView* parent, BRect area, const char* title)
     parent->AddChild(new ColumnHeading({area.left, area.top, area.right, top}, columns_));
     MoveTo(area.left, top);
     ResizeTo(area.Width(), area.bottom - top);
+    // From here on the parent owns list and heading.
     parent->AddChild(this);
     SetAccessibleName(title);
 }
@@ -70,6 +106,7 @@ void ColumnListView::addRows(const std::vector<ColumnItem*>& rows)
 
 void ColumnListView::destroyRow(int32 index)
 {
+    // The list does not know the row any more when it dies.
     delete RemoveItem(index);
 }
 
@@ -78,6 +115,7 @@ void ColumnListView::destroyRows()
     std::vector<BListItem*> rows;
     for (int32 i = 0; i < CountItems(); ++i)
         rows.push_back(ItemAt(i));
+    // The list lets go of all rows before the first is destroyed, so that it draws none that is gone.
     MakeEmpty();
     for (BListItem* row : rows)
         delete row;

@@ -1,8 +1,8 @@
 #include "views/CompanyEventListView.h"
 
+#include "foundation/DateText.h"
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
-#include "views/DateText.h"
 #include "views/ModelText.h"
 
 namespace {
@@ -13,6 +13,7 @@ std::string contentOf(const CompanyEvent& event)
 {
     if (const auto* note = dynamic_cast<const NoteCompanyEvent*>(&event))
         return textOf(note->getTitle());
+    // There are two kinds of events.
     const auto& split = static_cast<const SplitCompanyEvent&>(event);
     return std::to_string(split.getNumerator()) + " : " + std::to_string(split.getDivider());
 }
@@ -23,11 +24,11 @@ Cell CompanyEventItem::cell(int column) const
 {
     switch (column) {
     case kDate:
-        return {dateText(event_->getDate())};
+        return {dateText(object_->getDate())};
     case kKind:
-        return {event_->getType() == NoteCompanyEvent::kType ? "Note" : "Split"};
+        return {object_->getType() == NoteCompanyEvent::kType ? "Note" : "Split"};
     case kContent:
-        return {contentOf(*event_)};
+        return {contentOf(*object_)};
     default:
         return {};
     }

@@ -4,17 +4,10 @@
 #include "views/DatedListView.h"
 
 /// A note or a split.
-class CompanyEventItem final : public ColumnItem {
+class CompanyEventItem final : public ObjectItem<CompanyEvent> {
 public:
-    explicit CompanyEventItem(CompanyEvent* event) : event_(event) {}
-
-    CompanyEvent* object() const { return event_; }
-    const void* key() const { return event_; }
-    void release() { event_ = nullptr; }
+    using ObjectItem::ObjectItem;
     Cell cell(int column) const override;
-
-private:
-    CompanyEvent* event_;
 };
 
 /// The events of a company, by date; several can be selected.

@@ -4,7 +4,7 @@
 
 Cell CompanyItem::cell(int column) const
 {
-    return {textOf(column == 0 ? company_->getAbbreviation() : company_->getName())};
+    return {textOf(column == 0 ? object_->getAbbreviation() : object_->getName())};
 }
 
 CompanyListView::CompanyListView(const char* name)

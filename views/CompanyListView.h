@@ -4,16 +4,10 @@
 #include "views/ObjectListView.h"
 
 /// A company's ticker and name.
-class CompanyItem final : public ColumnItem {
+class CompanyItem final : public ObjectItem<Company> {
 public:
-    explicit CompanyItem(Company* company) : company_(company) {}
-
-    Company* object() const { return company_; }
-    const void* key() const { return company_; }
+    using ObjectItem::ObjectItem;
     Cell cell(int column) const override;
-
-private:
-    Company* company_;
 };
 
 /// The companies of a market, in its order.

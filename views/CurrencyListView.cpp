@@ -1,7 +1,7 @@
 #include "views/CurrencyListView.h"
 
+#include "foundation/DateText.h"
 #include "foundation/NumberText.h"
-#include "views/DateText.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
 
@@ -13,18 +13,17 @@ enum Column { kName, kSymbol, kRate, kRateDay };
 
 Cell CurrencyItem::cell(int column) const
 {
-    const unsigned rates = currency_->getNbrQuotes();
+    const unsigned rates = object_->getNbrQuotes();
     switch (column) {
     case kName:
-        return {textOf(currency_->getName())};
+        return {textOf(object_->getName())};
     case kSymbol:
-        return {textOf(currency_->getRepresentation())};
+        return {textOf(object_->getRepresentation())};
     case kRate:
         // What is held in a currency without a rate has no value.
-        return rates > 0 ? Cell{exactText(currency_->getQuote(rates - 1)->getValue())}
-                         : Cell{"no rate", look::kWarning};
+        return rates > 0 ? Cell{exactText(object_->getQuote(rates - 1)->getValue())} : Cell{"no rate", look::kWarning};
     case kRateDay:
-        return {dateText(currency_->getLastQuote()), look::kFaint};
+        return {dateText(object_->getLastQuote()), look::kFaint};
     default:
         return {};
     }

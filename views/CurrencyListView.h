@@ -4,16 +4,10 @@
 #include "views/ObjectListView.h"
 
 /// A currency with its latest rate.
-class CurrencyItem final : public ColumnItem {
+class CurrencyItem final : public ObjectItem<Currency> {
 public:
-    explicit CurrencyItem(Currency* currency) : currency_(currency) {}
-
-    Currency* object() const { return currency_; }
-    const void* key() const { return currency_; }
+    using ObjectItem::ObjectItem;
     Cell cell(int column) const override;
-
-private:
-    Currency* currency_;
 };
 
 /// The currencies in the order of the catalogue.

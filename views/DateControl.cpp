@@ -1,7 +1,7 @@
 #include "views/DateControl.h"
 
+#include "foundation/DateText.h"
 #include "foundation/Today.h"
-#include "views/DateText.h"
 
 #include <algorithm>
 
@@ -11,6 +11,7 @@ namespace {
 Date monthsFrom(const Date& date, int months)
 {
     const int month = 12 * date.getYear() + date.getMonth() - 1 + months;
+    // The first of the month is a day that every month has; the day follows once the length is known.
     Date result(1, static_cast<short>(month % 12 + 1), month / 12);
     result.setDay(std::min(date.getDay(), result.getMonthLength()));
     return result;
@@ -64,6 +65,7 @@ void DateControl::enter(const Date& date)
 {
     if (readDate(dateText(date)).isUndefined())
         return; // beyond the first or the last year
+                // As after typing: the colour is right, offers know of it, and the window is told last.
     setDate(date);
     TextModified();
     Invoke();

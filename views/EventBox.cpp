@@ -43,6 +43,7 @@ EventBox::EventBox(BRect frame) : BBox(frame, "")
                           {"btnUpdateCompanyEvent", "Update", 'CBEu'},
                           {"btnRemoveCompanyEvent", "Remove", 'CBEr'}});
     PageView::explain(*this, {{"companyEventType", "Events are notes: they change neither quotes nor holdings"}});
+    // What a new event starts with. `type_` is set by the last call, which also hides the fields of the other kind.
     setNumerator(1);
     setDivider(2);
     setType(SplitCompanyEvent::kType);
@@ -83,6 +84,7 @@ void EventBox::makeFields(BRect area)
     AddChild(textLabel_ = label);
     text_ = new BTextView({area.left + kDivider, top, area.right, area.bottom}, "txtCompanyEventText",
                           B_FOLLOW_LEFT | B_FOLLOW_TOP);
+    // It has no label of its own: that stands beside it.
     text_->SetAccessibleName("Text");
     AddChild(text_);
 }
@@ -90,6 +92,7 @@ void EventBox::makeFields(BRect area)
 void EventBox::setType(short type)
 {
     const bool isNote = type == NoteCompanyEvent::kType;
+    // Any code but that of a note counts as a split. After this, mark, type and visible fields agree.
     type_ = isNote ? NoteCompanyEvent::kType : SplitCompanyEvent::kType;
     menu_->Menu()->ItemAt(isNote ? 1 : 0)->SetMarked(true);
     for (BView* view : {static_cast<BView*>(title_), textLabel_, static_cast<BView*>(text_)})

@@ -13,11 +13,11 @@ Cell MarketItem::cell(int column) const
 {
     switch (column) {
     case kName:
-        return {textOf(market_->getName())};
+        return {textOf(object_->getName())};
     case kCurrency:
-        return {textOf(market_->getCurrencyRepresentation())};
+        return {textOf(object_->getCurrencyRepresentation())};
     case kCompanies:
-        return {countText(static_cast<int>(market_->getNbrCompanies()))};
+        return {countText(static_cast<int>(object_->getNbrCompanies()))};
     default:
         return {};
     }

@@ -4,16 +4,10 @@
 #include "views/ObjectListView.h"
 
 /// A market with its currency and the number of its companies.
-class MarketItem final : public ColumnItem {
+class MarketItem final : public ObjectItem<Market> {
 public:
-    explicit MarketItem(Market* market) : market_(market) {}
-
-    Market* object() const { return market_; }
-    const void* key() const { return market_; }
+    using ObjectItem::ObjectItem;
     Cell cell(int column) const override;
-
-private:
-    Market* market_;
 };
 
 /// Markets in the order of the catalogue.

@@ -20,6 +20,7 @@ Number limited(double number)
 
 void NumberControl::setNumber(float value)
 {
+    // A text that was marked as wrong is gone with this.
     SetText(exactText(value).c_str());
     mark();
 }

@@ -7,6 +7,21 @@
 #include <unordered_map>
 #include <vector>
 
+/// A row for an object of the model that is found again by its own address.
+template <class Object>
+class ObjectItem : public ColumnItem {
+public:
+    explicit ObjectItem(Object* object) : object_(object) {}
+
+    Object* object() const { return object_; }
+    const void* key() const { return object_; }
+    /// Leaves the row without object. It is not drawn any more.
+    void release() { object_ = nullptr; }
+
+protected:
+    Object* object_;
+};
+
 /// A list with a row for each of some objects of the model.
 ///
 /// `Row` is a `ColumnItem` made from an `Object*`, with two accessors that never look into the object: `object()`, and

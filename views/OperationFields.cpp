@@ -14,6 +14,7 @@ String OperationView::chosen(const BMenuField& field)
 
 void OperationView::choose(BMenuField& field, const String& label)
 {
+    // No item is marked in between, nor after an empty or unknown label.
     if (BMenuItem* former = field.Menu()->FindMarked())
         former->SetMarked(false);
     if (BMenuItem* item = label.hasText() ? field.Menu()->FindItem(label.getCharacterArray()) : nullptr)
@@ -22,6 +23,7 @@ void OperationView::choose(BMenuField& field, const String& label)
 
 void OperationView::show(OfferNumber& field, float value)
 {
+    // Shown, and not offered: later offers leave the number alone.
     field.setNumber(value);
     field.noteShown();
 }
@@ -41,6 +43,7 @@ void OperationView::offer(OfferNumber& field, std::optional<float> value)
 
 void OperationView::setDate(const Date& date)
 {
+    // Likewise: the date of a shown operation is no offer.
     date_->setDate(date);
     date_->noteShown();
 }

@@ -1,12 +1,12 @@
 #include "views/OperationListView.h"
 
+#include "foundation/DateText.h"
 #include "foundation/NumberText.h"
 #include "platform/View.h"
 #include "portfolio/Account.h"
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
-#include "views/DateText.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
 
@@ -78,6 +78,7 @@ std::string total(const Operation& operation)
 
 Cell OperationItem::cell(int column) const
 {
+    // Released: the row is blank until it is dropped.
     if (operation_ == nullptr)
         return {};
     const Operation& operation = *operation_;
@@ -113,6 +114,7 @@ void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
         owner->FillRect(frame);
         owner->SetHighColor(text);
     }
+    // The text has the colour again that the list has set.
     ColumnItem::DrawItem(owner, frame, complete);
 }
 

@@ -78,6 +78,7 @@ OperationView::OperationView(BRect frame, const char* name, BWindow*) : PageView
     prevision_->SetToolTip("Simulates the sales that the parameters ask for");
     makeList();
     makeFields();
+    // All fields show until a type is set.
     SetType(kTypes[0].type);
 }
 
@@ -181,6 +182,7 @@ void OperationView::Draw(BRect)
 
 void OperationView::ClearAllOperations()
 {
+    // In this order: what is selected is known only while the rows are there.
     operations_->remember();
     operations_->clear();
 }
@@ -189,6 +191,7 @@ void OperationView::ShowOperation(const Operation* operation)
 {
     if (operations_->indexOf(operation) < 0)
         return; // while the page has no date to value at, the list is not filled
+                // The window does not hear of it: the fields already show the operation and must stay.
     operations_->SetQuiet(true);
     operations_->select(operation);
     operations_->SetQuiet(false);
@@ -213,6 +216,7 @@ void OperationView::SetAccountsList(Account** accounts, int count)
 void OperationView::fillAccounts(BMenu& menu, Account** accounts, int count)
 {
     const auto* chosen = static_cast<const AccountMenuItem*>(menu.FindMarked());
+    // The account may be gone already: its address is only compared with those of the others.
     const Account* former = chosen != nullptr ? chosen->account() : nullptr;
     std::vector<BMenuItem*> items;
     BMenuItem* next = nullptr;
@@ -221,6 +225,7 @@ void OperationView::fillAccounts(BMenu& menu, Account** accounts, int count)
         if (accounts[i] == former)
             next = items.back();
     }
+    // The menu owns the new items and destroys the former ones, `chosen` among them.
     menu.ReplaceItems(items);
     if (next != nullptr)
         next->SetMarked(true);
@@ -241,6 +246,7 @@ void OperationView::setType(const String& type)
 
 void OperationView::SetType(const String& type)
 {
+    // The menu marks the type first; the fields follow what is marked, also for a text that is no type.
     setType(type);
     const int index = type_->Menu()->IndexOf(type_->Menu()->FindMarked());
     for (const TypedField& field : typedFields_) {

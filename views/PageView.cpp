@@ -67,6 +67,7 @@ void PageView::addButtons(BView* parent, BRect area, const std::vector<ButtonPla
         const float right = left + pitch - look::kGap;
         addButton(parent, {std::round(left), area.top, std::round(right), area.bottom}, button.name, button.label,
                   button.code);
+        // The next one begins where this one would end without rounding, so that the last ends at the edge.
         left += pitch;
     }
 }

@@ -134,6 +134,7 @@ void ParameterView::setParameter(Wallet::Parameter parameter, float value)
         std::snprintf(text, sizeof text, "%.2f %%", value * 100.0);
     else
         std::snprintf(text, sizeof text, "%.2f", static_cast<double>(value));
+    // This is not typing: no message is sent, and nothing is stored in the wallet.
     fields_[parameter]->SetText(text);
 }
 
@@ -141,6 +142,7 @@ float ParameterView::getParameter(Wallet::Parameter parameter) const
 {
     const Kind kind = kPlan[parameter].kind;
     const std::string token = firstToken(fields_[parameter]->Text(), kind == Kind::kRate);
+    // A whole number ends at the first character that is no digit, so "90.7" is 90.
     if (kind != Kind::kDays)
         return number(token, kind == Kind::kRate ? 100 : 1);
     constexpr long kShortest = std::numeric_limits<short>::min();

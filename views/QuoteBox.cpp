@@ -1,7 +1,7 @@
 #include "views/QuoteBox.h"
 
+#include "foundation/DateText.h"
 #include "foundation/NumberText.h"
-#include "views/DateText.h"
 #include "views/Look.h"
 #include "views/PageView.h"
 
@@ -9,7 +9,7 @@ using namespace look;
 
 Cell QuoteItem::cell(int column) const
 {
-    return {column == 0 ? dateText(quote_->getDate()) : exactText(quote_->getValue())};
+    return {column == 0 ? dateText(object_->getDate()) : exactText(object_->getValue())};
 }
 
 QuoteListView::QuoteListView(const char* name)

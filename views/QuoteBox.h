@@ -7,17 +7,10 @@
 #include "views/NumberControl.h"
 
 /// A day and the value of that day.
-class QuoteItem final : public ColumnItem {
+class QuoteItem final : public ObjectItem<Quote> {
 public:
-    explicit QuoteItem(Quote* quote) : quote_(quote) {}
-
-    Quote* object() const { return quote_; }
-    const void* key() const { return quote_; }
-    void release() { quote_ = nullptr; }
+    using ObjectItem::ObjectItem;
     Cell cell(int column) const override;
-
-private:
-    Quote* quote_;
 };
 
 /// The quotes of a company or the rates of a currency, by date; several can be selected.

@@ -1,7 +1,7 @@
 #include "views/ShareStateListView.h"
 
+#include "foundation/DateText.h"
 #include "foundation/NumberText.h"
-#include "views/DateText.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
 

@@ -123,7 +123,9 @@ void WalletView::makeChart()
     evolution_->setXDateBased(true);
     line_.setDateBased(true);
     line_.setColor(kSeries);
+    // Once and for all: from here on only the points change.
     evolution_->addGraphElement(&line_);
+    // The chart draws its own notice when it is empty; this one says why it is.
     const BRect reasonPlace(10, 30, 700, 50); // below the chart's own "No data"
     noEvolution_ = new BStringView(reasonPlace, "", "");
     evolution_->AddChild(noEvolution_);
@@ -132,6 +134,8 @@ void WalletView::makeChart()
 
 void WalletView::SetState(const State* state, const Totals& totals)
 {
+    // Before: the lists are empty or show states that are still alive. After: they show those of `state`, and what
+    // `ClearState` has kept in mind is selected.
     SetAccountStateList(state);
     shares_->clear();
     if (state != nullptr) {
@@ -145,6 +149,8 @@ void WalletView::SetState(const State* state, const Totals& totals)
 
 void WalletView::ClearState()
 {
+    // The rows look into states that are about to be destroyed, so they go first; what was selected is kept by account
+    // and share, which stay.
     accounts_->remember();
     shares_->remember();
     accounts_->clear();
@@ -168,6 +174,7 @@ void WalletView::showTotals(const Totals& totals)
     }
     const std::string symbol = textOf(totals.reference->getRepresentation());
     const bool hasRate = totals.reference->getNbrQuotes() > 0;
+    // Where the reference has no rate, all values are 0, which would look like a loss of everything.
     totalsBox_->SetLabel(hasRate ? "Totals" : ("Totals: " + symbol + " has no rate, so nothing has a value").c_str());
     const auto show = [&](BTextControl* field, float amount) {
         field->SetText((amountText(amount) + ' ' + symbol).c_str());
@@ -199,6 +206,7 @@ void WalletView::UpdateEvolution(const std::vector<EvolutionPoint>& points, cons
 
 void WalletView::ClearEvolution()
 {
+    // The chart keeps the line, which has no points now, and so shows that there is no data.
     line_.clearAll();
     evolution_->removeAllGraphPoints();
     evolution_->setXLegend(String());

@@ -1,5 +1,4 @@
 #include "chart/ChartLayout.h"
-#include "chart/ChartDays.h"
 #include "chart/ChartReadOut.h"
 #include "chart/ColumnReduction.h"
 #include "chart/DateTicks.h"
@@ -121,9 +120,9 @@ TEST(ColumnReductionTest, KeepsWhatCanBeSeenOfEachColumn)
 TEST(ChartTextTest, IsShortenedByWholeCharacters)
 {
     const std::string euros = "10 \xE2\x82\xAC\xE2\x82\xAC\xE2\x82\xAC";
-    EXPECT_EQ(fitText(euros, kFont, widthOf(euros)), euros);
-    EXPECT_EQ(fitText(euros, kFont, widthOf(euros) - 1), "10 \xE2\x82\xAC\xE2\x80\xA6");
-    EXPECT_EQ(fitText(euros, kFont, kCharacter), "");
+    EXPECT_EQ(fitText(euros, kFont.width, widthOf(euros)), euros);
+    EXPECT_EQ(fitText(euros, kFont.width, widthOf(euros) - 1), "10 \xE2\x82\xAC\xE2\x80\xA6");
+    EXPECT_EQ(fitText(euros, kFont.width, kCharacter), "");
 }
 
 TEST(ChartSeriesTest, LeavesOutPointsWithoutPlace)
@@ -139,7 +138,7 @@ TEST(ChartSeriesTest, LeavesOutPointsWithoutPlace)
     GraphLine tooShort;
     tooShort.addGraphPoint(new GraphPoint(1, 1));
     GraphElement* elements[] = {&tooShort, &dated};
-    const std::vector<ChartSeries> series = seriesOf(elements, 2, true);
+    const std::vector<ChartSeries> series = seriesOf(elements, true);
     ASSERT_EQ(series.size(), 1U);
     ASSERT_EQ(series[0].points.size(), 2U);
     EXPECT_EQ(series[0].points[0].x, 0);

@@ -2,6 +2,7 @@
 
 #include "chart/GraphLine.h"
 #include "chart/GraphView.h"
+#include "foundation/DateText.h"
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "market/Market.h"
@@ -12,7 +13,6 @@
 #include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"
 #include "valuation/State.h"
-#include "views/DateText.h"
 
 #include <QAbstractButton>
 #include <QLineEdit>

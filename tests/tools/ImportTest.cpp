@@ -1,8 +1,8 @@
+#include "foundation/DateText.h"
 #include "tests/support/Bytes.h"
 #include "tests/support/SmallPortfolio.h"
 #include "tests/support/ToolRun.h"
 #include "tools/CsvReader.h"
-#include "tools/DateText.h"
 #include "tools/Importer.h"
 
 #include <gmock/gmock.h>

@@ -2,8 +2,11 @@
 
 #include "foundation/OneToManyAssociation.h"
 
-class State;
+// The relations of a state: both ends of each.
+
 class AccountState;
+class ShareState;
+class State;
 
 /// The cash of each account in a state, in the wallet's order.
 class StateToAccountStates final : public OneToManyAssociation<StateToAccountStates, State, AccountState> {
@@ -16,4 +19,17 @@ public:
 class AccountStatesToState final : public ManyToOneAssociation<AccountStatesToState, AccountState, State> {
 public:
     static auto& list(auto& state) { return state.accountStates_; }
+};
+
+/// The holdings in a state, in the wallet's order.
+class StateToShareStates final : public OneToManyAssociation<StateToShareStates, State, ShareState> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& shareState) { return shareState.state_; }
+};
+
+/// The holding state's link to the state it is part of.
+class ShareStatesToState final : public ManyToOneAssociation<ShareStatesToState, ShareState, State> {
+public:
+    static auto& list(auto& state) { return state.shareStates_; }
 };

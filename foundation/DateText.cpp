@@ -1,0 +1,66 @@
+#include "foundation/DateText.h"
+
+#include <charconv>
+#include <limits>
+#include <utility>
+
+namespace {
+
+std::string_view trimmed(std::string_view text)
+{
+    const std::size_t begin = text.find_first_not_of(" \t");
+    if (begin == text.npos)
+        return {};
+    return text.substr(begin, text.find_last_not_of(" \t") - begin + 1);
+}
+
+/// The number that `text` is, of `shortest` to `longest` digits, up to the last year; -1 for anything else.
+short numberOf(std::string_view text, std::size_t shortest, std::size_t longest)
+{
+    if (text.size() < shortest || text.size() > longest || text.find_first_not_of("0123456789") != text.npos)
+        return -1;
+    short number = -1; // and so it stays for a number that is too large
+    std::from_chars(text.data(), text.data() + text.size(), number);
+    return number;
+}
+
+/// The three parts of `text` between the first two of `marks`; the last part is empty where there are fewer marks.
+struct Parts {
+    std::string_view first, second, third;
+
+    Parts(std::string_view text, std::string_view marks)
+    {
+        const std::size_t one = text.find_first_of(marks);
+        const std::size_t two = one != text.npos ? text.find_first_of(marks, one + 1) : one;
+        if (two == text.npos)
+            return;
+        first = text.substr(0, one);
+        second = text.substr(one + 1, two - one - 1);
+        third = text.substr(two + 1);
+    }
+};
+
+} // namespace
+
+std::string dateText(const Date& date)
+{
+    return date.isUndefined() ? std::string() : date.toString().getCharacterArray();
+}
+
+Date readDate(std::string_view text)
+{
+    const Parts parts(text, "/.-");
+    const auto number = [](std::string_view part) { return numberOf(trimmed(part), 1, part.npos); };
+    const Date date(number(parts.first), number(parts.second), number(parts.third));
+    return date.isValid() && date.getYear() > 0 ? date : Date();
+}
+
+std::optional<Date> parseDate(std::string_view text)
+{
+    const bool isIso = text.find('-') != text.npos;
+    Parts parts(text, isIso ? "-" : "/");
+    if (isIso)
+        std::swap(parts.first, parts.third);
+    const Date date(numberOf(parts.first, 1, 2), numberOf(parts.second, 1, 2), numberOf(parts.third, 4, 4));
+    return date.isValid() && date.getYear() >= 0 ? std::optional(date) : std::nullopt;
+}

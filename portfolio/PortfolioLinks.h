@@ -1,0 +1,132 @@
+#pragma once
+
+#include "foundation/OneToManyAssociation.h"
+
+// The relations of a portfolio: both ends of each.
+
+class Account;
+class AccountState;
+class Operation;
+class Share;
+class ShareOperation;
+class ShareState;
+class State;
+class TransferAccountOperation;
+class Wallet;
+
+int sortOperationByDate(const void* a, const void* b);
+
+/// A wallet's cash accounts.
+class WalletToAccounts final : public OneToManyAssociation<WalletToAccounts, Wallet, Account> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& account) { return account.wallet_; }
+};
+
+/// The account's link to its wallet.
+class AccountsToWallet final : public ManyToOneAssociation<AccountsToWallet, Account, Wallet> {
+public:
+    static auto& list(auto& wallet) { return wallet.accounts_; }
+};
+
+/// A wallet's holdings.
+class WalletToShares final : public OneToManyAssociation<WalletToShares, Wallet, Share> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& share) { return share.wallet_; }
+};
+
+/// The holding's link to its wallet.
+class SharesToWallet final : public ManyToOneAssociation<SharesToWallet, Share, Wallet> {
+public:
+    static auto& list(auto& wallet) { return wallet.shares_; }
+};
+
+/// The states computed for a wallet. States live a floor higher: the members are defined beside `State`.
+class WalletToStates final : public OneToManyAssociation<WalletToStates, Wallet, State> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    /// Destroys every state.
+    void deleteAll();
+    static auto& link(auto& state) { return state.wallet_; }
+};
+
+/// The state's link to its wallet.
+class StatesToWallet final : public ManyToOneAssociation<StatesToWallet, State, Wallet> {
+public:
+    static auto& list(auto& wallet) { return wallet.states_; }
+};
+
+/// Every operation on an account, by date.
+class AccountToOperations final : public OneToManyAssociation<AccountToOperations, Account, Operation, true> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& operation) { return operation.account_; }
+    static int compare(const void* a, const void* b) { return sortOperationByDate(a, b); }
+};
+
+/// The operation's link to its account.
+class OperationsToAccount final : public ManyToOneAssociation<OperationsToAccount, Operation, Account, true> {
+public:
+    static auto& list(auto& account) { return account.operations_; }
+};
+
+/// The transfers that an account receives, by date.
+class AccountToTransferOperations final
+    : public OneToManyAssociation<AccountToTransferOperations, Account, TransferAccountOperation, true> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& transfer) { return transfer.recipient_; }
+    static int compare(const void* a, const void* b) { return sortOperationByDate(a, b); }
+};
+
+/// The transfer's link to the account that receives it.
+class TransferOperationsToAccount final
+    : public ManyToOneAssociation<TransferOperationsToAccount, TransferAccountOperation, Account, true> {
+public:
+    static auto& list(auto& account) { return account.transfers_; }
+};
+
+/// The states computed for an account. They live a floor higher: the members are defined beside `AccountState`.
+class AccountToAccountStates final : public OneToManyAssociation<AccountToAccountStates, Account, AccountState> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    /// Destroys every state.
+    void deleteAll();
+    static auto& link(auto& state) { return state.account_; }
+};
+
+/// The state's link to its account.
+class AccountStatesToAccount final : public ManyToOneAssociation<AccountStatesToAccount, AccountState, Account> {
+public:
+    static auto& list(auto& account) { return account.states_; }
+};
+
+/// The buys and sells of a holding, by date.
+class ShareToShareOperations final : public OneToManyAssociation<ShareToShareOperations, Share, ShareOperation, true> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    static auto& link(auto& operation) { return operation.share_; }
+    static int compare(const void* a, const void* b) { return sortOperationByDate(a, b); }
+};
+
+/// The operation's link to its holding.
+class ShareOperationsToShare final : public ManyToOneAssociation<ShareOperationsToShare, ShareOperation, Share, true> {
+public:
+    static auto& list(auto& share) { return share.operations_; }
+};
+
+/// The states computed for a holding. They live a floor higher: the members are defined beside `ShareState`.
+class ShareToShareStates final : public OneToManyAssociation<ShareToShareStates, Share, ShareState> {
+public:
+    using OneToManyAssociation::OneToManyAssociation;
+    /// Destroys every state.
+    void deleteAll();
+    static auto& link(auto& state) { return state.share_; }
+};
+
+/// The state's link to its holding.
+class ShareStatesToShare final : public ManyToOneAssociation<ShareStatesToShare, ShareState, Share> {
+public:
+    static auto& list(auto& share) { return share.states_; }
+};
