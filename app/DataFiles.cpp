@@ -1,14 +1,14 @@
 #include "app/DataFiles.h"
 
-#include "app/DurableSave.h"
 #include "app/Holds.h"
-#include "foundation/InputFile.h"
 #include "foundation/Today.h"
 #include "platform/Entry.h"
 #include "platform/Message.h"
 #include "platform/Path.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
+#include "storage/DurableSave.h"
+#include "storage/InputFile.h"
 
 #include <stdexcept>
 

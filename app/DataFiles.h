@@ -1,8 +1,8 @@
 #pragma once
 
-#include "app/DataFolder.h"
 #include "foundation/String.h"
 #include "platform/FilePanel.h"
+#include "storage/DataFolder.h"
 
 #include <cstdio>
 #include <optional>

@@ -1,6 +1,6 @@
 #include "tools/CsvReader.h"
 
-#include "foundation/InputFile.h"
+#include "storage/InputFile.h"
 
 #include <algorithm>
 #include <cerrno>

@@ -1,9 +1,9 @@
 #include "tools/SampleQuotes.h"
 
-#include "foundation/AtomicFile.h"
 #include "market/Catalogue.h"
 #include "market/Company.h"
 #include "market/Market.h"
+#include "storage/AtomicFile.h"
 #include "tools/Noise.h"
 #include "tools/SampleMarket.h"
 

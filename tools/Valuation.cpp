@@ -1,9 +1,9 @@
 #include "tools/Valuation.h"
 
 #include "foundation/FieldIO.h"
-#include "foundation/InputFile.h"
 #include "portfolio/Account.h"
 #include "portfolio/TransferAccountOperation.h"
+#include "storage/InputFile.h"
 #include "tools/TextTable.h"
 #include "valuation/State.h"
 

@@ -1,5 +1,5 @@
-#include "foundation/AtomicFile.h"
 #include "market/Catalogue.h"
+#include "storage/AtomicFile.h"
 #include "tools/Importer.h"
 #include "tools/Program.h"
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "app/KeptVersions.h"
-#include "app/SaveLock.h"
+#include "storage/KeptVersions.h"
+#include "storage/SaveLock.h"
 
 #include <cstdio>
 #include <functional>

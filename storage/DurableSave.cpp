@@ -1,6 +1,6 @@
-#include "app/DurableSave.h"
+#include "storage/DurableSave.h"
 
-#include "foundation/AtomicFile.h"
+#include "storage/AtomicFile.h"
 
 #include <algorithm>
 #include <cerrno>

@@ -1,4 +1,4 @@
-#include "foundation/AtomicFile.h"
+#include "storage/AtomicFile.h"
 #include "tests/support/ToolRun.h"
 
 #include <gtest/gtest.h>

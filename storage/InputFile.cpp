@@ -1,4 +1,4 @@
-#include "foundation/InputFile.h"
+#include "storage/InputFile.h"
 
 #include <cerrno>
 #include <cstring>

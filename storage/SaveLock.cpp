@@ -1,7 +1,7 @@
-#include "app/SaveLock.h"
+#include "storage/SaveLock.h"
 
-#include "foundation/AtomicFile.h"
-#include "foundation/Folders.h"
+#include "storage/AtomicFile.h"
+#include "storage/Folders.h"
 
 #include <cerrno>
 #include <cstring>

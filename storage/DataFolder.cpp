@@ -1,7 +1,7 @@
-#include "app/DataFolder.h"
+#include "storage/DataFolder.h"
 
-#include "foundation/Folders.h"
-#include "foundation/InputFile.h"
+#include "storage/Folders.h"
+#include "storage/InputFile.h"
 
 #include <cstdlib>
 #include <pwd.h>

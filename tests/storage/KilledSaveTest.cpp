@@ -1,4 +1,4 @@
-#include "app/DurableSave.h"
+#include "storage/DurableSave.h"
 #include "tests/support/ToolRun.h"
 
 #include <algorithm>

@@ -1,7 +1,7 @@
-#include "app/KeptVersions.h"
+#include "storage/KeptVersions.h"
 
-#include "foundation/AtomicFile.h"
-#include "foundation/Folders.h"
+#include "storage/AtomicFile.h"
+#include "storage/Folders.h"
 
 #include <algorithm>
 #include <array>

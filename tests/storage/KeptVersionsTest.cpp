@@ -1,4 +1,4 @@
-#include "app/KeptVersions.h"
+#include "storage/KeptVersions.h"
 #include "tests/support/ToolRun.h"
 
 #include <gtest/gtest.h>

@@ -1,6 +1,6 @@
-#include "foundation/AtomicFile.h"
+#include "storage/AtomicFile.h"
 
-#include "foundation/Folders.h"
+#include "storage/Folders.h"
 
 #include <cerrno>
 #include <cstring>

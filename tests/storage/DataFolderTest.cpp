@@ -1,4 +1,4 @@
-#include "app/DataFolder.h"
+#include "storage/DataFolder.h"
 #include "tests/support/PlainUser.h"
 #include "tests/support/ToolRun.h"
 

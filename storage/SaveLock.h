@@ -1,6 +1,6 @@
 #pragma once
 
-#include "app/DataFolder.h"
+#include "storage/DataFolder.h"
 
 #include <chrono>
 #include <string>

@@ -1,4 +1,4 @@
-#include "foundation/Folders.h"
+#include "storage/Folders.h"
 
 #include <cerrno>
 #include <fcntl.h>
