@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdint>
+#include <span>
 #include <vector>
 
 /// The next number for `QuoteSeries::revision`: one that no series of the program has had. 0 is never given.
