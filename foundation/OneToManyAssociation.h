@@ -163,10 +163,14 @@ public:
     /// an element's other owners, who lose it, too, are left with the rest of theirs.
     void deleteAll()
     {
-        if (sorted)
+        if constexpr (sorted)
             turnRound();
-        while (count_ > 0)
+        while (count_ > 0) {
+            if constexpr (sorted)
+                if (!order_.isDisturbed) // an element's end has read the list, and so put it in order again
+                    turnRound();
             delete elements_[sorted ? count_ - 1 : 0];
+        }
     }
     /// Unlinks every element and leaves it alone otherwise; stops at one that will not be unlinked.
     void unlinkAll()
