@@ -7,11 +7,10 @@
 MessageView::MessageView(BRect frame, const char* name, PLWindow* window)
     : BStringView(frame, name, "MessageView", B_FOLLOW_ALL, B_WILL_DRAW | B_FRAME_EVENTS), window_(window)
 {
-    constexpr rgb_color kGrey = {216, 216, 216, 255};
     SetFont(be_bold_font);
     SetFontSize(24); // kept as it is; nothing is drawn at this size, messages are at 14
     SetPenSize(3);
-    SetLowColor(kGrey);
+    SetLowColor(kPanelGrey);
 }
 
 MessageView::~MessageView()

@@ -16,6 +16,9 @@ struct rgb_color {
 /// Leaves what lies beneath a view visible.
 constexpr rgb_color B_TRANSPARENT_COLOR = {119, 116, 119, 0};
 
+/// The ground of windows and of what stands in them.
+constexpr rgb_color kPanelGrey = {216, 216, 216, 255};
+
 /// What a shape is drawn with.
 enum pattern { B_SOLID_HIGH, B_SOLID_LOW };
 

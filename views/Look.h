@@ -5,7 +5,7 @@
 /// The measures and colours that all pages share, so that they look like one program. Lengths in pixels.
 namespace look {
 
-constexpr rgb_color kPanel = {216, 216, 216, 255};
+constexpr rgb_color kPanel = kPanelGrey;
 constexpr rgb_color kHeading = {196, 203, 212, 255};
 constexpr rgb_color kLine = {168, 168, 168, 255};
 constexpr rgb_color kText = {0, 0, 0, 255};

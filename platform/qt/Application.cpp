@@ -1,6 +1,7 @@
 #include "platform/Application.h"
 
 #include "platform/Font.h"
+#include "platform/GraphicsDefs.h"
 #include "platform/Message.h"
 #include "platform/Window.h"
 
@@ -17,8 +18,6 @@ BApplication* be_app = nullptr;
 
 namespace {
 
-constexpr int kPanelGrey = 216;
-
 // Qt keeps references to these.
 int argumentCount = 1;
 char programName[] = "pelorin";
@@ -26,7 +25,7 @@ char* arguments[] = {programName, nullptr};
 
 QPalette panelColors()
 {
-    const QColor panel(kPanelGrey, kPanelGrey, kPanelGrey);
+    const QColor panel(kPanelGrey.red, kPanelGrey.green, kPanelGrey.blue);
     QPalette palette(panel, panel);
     palette.setColor(QPalette::Base, Qt::white);
     palette.setColor(QPalette::AlternateBase, QColor(244, 246, 249));

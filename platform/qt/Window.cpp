@@ -22,11 +22,7 @@ std::vector<BWindow*>& windows()
 /// The view around a window's views, of the window's size.
 class RootView final : public BView {
 public:
-    explicit RootView(BRect frame) : BView(frame, "", B_FOLLOW_ALL, B_WILL_DRAW)
-    {
-        constexpr rgb_color kPanelGrey = {216, 216, 216, 255};
-        SetViewColor(kPanelGrey);
-    }
+    explicit RootView(BRect frame) : BView(frame, "", B_FOLLOW_ALL, B_WILL_DRAW) { SetViewColor(kPanelGrey); }
 };
 
 } // namespace
