@@ -224,6 +224,7 @@ PELORIN_BENCHMARK(BM_Files, load_market, kLarge, quotesOf(kLarge), doNothing, lo
 PELORIN_BENCHMARK(BM_Files, evolve_10_years, small(10), shareStatesOf(small(10)), load, evolve);
 PELORIN_BENCHMARK(BM_Files, evolve_20_years, small(20), shareStatesOf(small(20)), load, evolve);
 PELORIN_BENCHMARK(BM_Files, evolve_40_years, small(40), shareStatesOf(small(40)), load, evolve);
+PELORIN_BENCHMARK(BM_Files, evolve_again, small(20), shareStatesOf(small(20)), loadAndEvolve, evolve);
 PELORIN_BENCHMARK(BM_Files, replay, small(20), kReplays* small(20).holdings, load, replay);
 PELORIN_BENCHMARK(BM_Files, remove_10_years, small(10), shareStatesOf(small(10)), loadAndEvolve, removeStates);
 PELORIN_BENCHMARK(BM_Files, remove_20_years, small(20), shareStatesOf(small(20)), loadAndEvolve, removeStates);
