@@ -23,7 +23,7 @@ public:
 
     /// Asks whether what is here may go, and shows the open panel; while the window closes, without a question.
     void askForLoad();
-    /// The answer of the open panel: loads the file, and the portfolio goes in any case.
+    /// The answer of the open panel: loads the file. When it can be opened the portfolio goes, whichever kind it is.
     void load(BMessage* message);
     /// Saves to the file that is remembered, or shows the save panel.
     void saveOrAsk();

@@ -45,6 +45,11 @@ OperationEditor::OperationEditor(PLWindow& window, OperationView& page) : window
     });
 }
 
+OperationEditor::~OperationEditor()
+{
+    page_.SetTypingHook({}); // the page outlives this
+}
+
 Wallet& OperationEditor::wallet() const
 {
     return *window_.getWallet();

@@ -22,6 +22,9 @@ class OperationEditor {
 public:
     /// Both outlive this.
     OperationEditor(PLWindow& window, OperationView& page);
+    ~OperationEditor();
+    OperationEditor(const OperationEditor&) = delete;
+    OperationEditor& operator=(const OperationEditor&) = delete;
 
     void updateTotal();
     void add();

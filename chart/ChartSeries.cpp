@@ -47,9 +47,8 @@ ChartPoint chartPointOf(const GraphPoint& point, bool isDateBased)
 
 std::string legendOf(const GraphElement& element)
 {
-    if (element.getType() == GraphPoint::kType)
-        return {};
-    return std::string(static_cast<const GraphPolyElement&>(element).getLegend().bytes());
+    const auto* named = dynamic_cast<const GraphPolyElement*>(&element);
+    return named != nullptr ? std::string(named->getLegend().bytes()) : std::string();
 }
 
 bool hasPlace(const ChartPoint& point)

@@ -1,7 +1,6 @@
 #include "foundation/DateText.h"
 
 #include <charconv>
-#include <limits>
 #include <utility>
 
 namespace {
@@ -14,12 +13,12 @@ std::string_view trimmed(std::string_view text)
     return text.substr(begin, text.find_last_not_of(" \t") - begin + 1);
 }
 
-/// The number that `text` is, of `shortest` to `longest` digits, up to the last year; -1 for anything else.
+/// The number that `text` is, of `shortest` to `longest` digits; -1 for anything else, and for one above 32767.
 short numberOf(std::string_view text, std::size_t shortest, std::size_t longest)
 {
     if (text.size() < shortest || text.size() > longest || text.find_first_not_of("0123456789") != text.npos)
         return -1;
-    short number = -1; // and so it stays for a number that is too large
+    short number = -1; // as it stays for one that is too large
     std::from_chars(text.data(), text.data() + text.size(), number);
     return number;
 }

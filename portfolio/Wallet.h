@@ -95,7 +95,7 @@ public:
         kReinvestRate,
         kParameterCount
     };
-    /// Each by its number, as below by its name.
+    /// Each by its number, as below by its name. The period is given as a whole number of 16 bits.
     float getParameter(Parameter parameter) const { return parameters_[parameter]; }
     void setParameter(Parameter parameter, float value) { parameters_[parameter] = value; }
 

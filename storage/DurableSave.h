@@ -13,7 +13,8 @@
 /// The new contents go to a temporary file and to the disk; then the old file is kept, then replaced, under a lock, so
 /// that of several programs which save one file each finds in its place what the one before it has saved. Whatever
 /// fails, or cannot be looked at, leaves the old file as it was. A link at the path stays, and so do the file's
-/// permissions. A file that the user may not write to is not replaced, nor one in a folder where he may not make files.
+/// permissions. A file that the user may not write to is not replaced, nor one in a folder where
+/// the user may not make files.
 class DurableSave {
 public:
     enum class Outcome { kSaved, kOpenFailed, kWriteFailed };

@@ -65,7 +65,8 @@ void DateControl::enter(const Date& date)
 {
     if (readDate(dateText(date)).isUndefined())
         return; // beyond the first or the last year
-                // As after typing: the colour is right, offers know of it, and the window is told last.
+
+    // As after typing: the colour is right, offers know of it, and the window is told last.
     setDate(date);
     TextModified();
     Invoke();

@@ -191,7 +191,8 @@ void OperationView::ShowOperation(const Operation* operation)
 {
     if (operations_->indexOf(operation) < 0)
         return; // while the page has no date to value at, the list is not filled
-                // The window does not hear of it: the fields already show the operation and must stay.
+
+    // The window does not hear of it: the fields already show the operation and must stay.
     operations_->SetQuiet(true);
     operations_->select(operation);
     operations_->SetQuiet(false);

@@ -142,9 +142,9 @@ float ParameterView::getParameter(Wallet::Parameter parameter) const
 {
     const Kind kind = kPlan[parameter].kind;
     const std::string token = firstToken(fields_[parameter]->Text(), kind == Kind::kRate);
-    // A whole number ends at the first character that is no digit, so "90.7" is 90.
     if (kind != Kind::kDays)
         return number(token, kind == Kind::kRate ? 100 : 1);
+    // A whole number ends at the first character that is no digit, so "90.7" is 90.
     constexpr long kShortest = std::numeric_limits<short>::min();
     constexpr long kLongest = std::numeric_limits<short>::max();
     return static_cast<float>(std::clamp(std::strtol(token.c_str(), nullptr, 10), kShortest, kLongest));
