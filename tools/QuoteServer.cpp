@@ -60,8 +60,9 @@ void QuoteServer::proceed(const std::vector<pollfd>& ready)
 void QuoteServer::acceptClients()
 {
     // No more than half of those there is room for, so that each has had its turn before it can be one too many.
-    for (int i = 0; i < kMostClients / 2 && acceptClient();)
-        ++i;
+    int left = kMostClients / 2;
+    while (left > 0 && acceptClient())
+        --left;
 }
 
 /// @return false when nobody stands in line.
