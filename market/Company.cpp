@@ -1,9 +1,9 @@
 #include "market/Company.h"
 
-#include "foundation/FieldIO.h"
 #include "market/CompanyEvent.h"
 #include "market/Market.h"
 #include "market/NoteCompanyEvent.h"
+#include "market/RecordList.h"
 #include "market/SplitCompanyEvent.h"
 
 #include <memory>
@@ -66,18 +66,17 @@ int Company::rd(FILE* file)
 
 int Company::readEvents(FILE* file)
 {
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing) {
+    return readRecords(file, [&] {
         std::unique_ptr<CompanyEvent> event = makeEvent(freadshort(file));
         // Intended: the record behind an unknown type has no known length, so reading goes on right after the type.
         if (event == nullptr)
-            continue;
+            return 0;
         if (event->rd(file) != 0)
             return -1;
         // Only an event that was read whole is linked; the company owns it from here on.
         event.release()->setCompany(this);
-    }
-    return reachedEnd(file) ? -1 : 0;
+        return 0;
+    });
 }
 
 const String& Company::getCurrencyRepresentation() const
