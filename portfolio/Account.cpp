@@ -1,7 +1,6 @@
 #include "portfolio/Account.h"
 
-#include "foundation/FieldIO.h"
-#include "market/Currency.h"
+#include "market/RecordList.h"
 #include "portfolio/DepositAccountOperation.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
@@ -59,11 +58,7 @@ int Account::rd(FILE* file)
     if (name_.rd(file) != 0)
         return -1;
     defaultTransfer_ = freadchar(file) == 'Y';
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing)
-        if (readOperation(file) != 0)
-            return -1;
-    return reachedEnd(file) ? -1 : 0;
+    return readRecords(file, [&] { return readOperation(file); });
 }
 
 int Account::readOperation(FILE* file)
@@ -103,32 +98,20 @@ int Account::readTransferOperations(FILE* file)
     // The turns are good for one reading: the account keeps none of them from here on.
     const std::vector<std::uint32_t> turns = std::move(transferTurns_);
     transferTurns_.clear();
-    const auto count = static_cast<unsigned>(freadint(file));
-    for (unsigned i = 0; i < count && !reachedEnd(file); ++i) {
+    std::size_t next = 0;
+    return readRecords(file, [&] {
         auto transfer = std::make_unique<TransferAccountOperation>();
         // It stands behind the operations of its day now, and is given back the place that its letter had.
         transfer->setAccount(this);
-        if (i < turns.size())
-            operations_.setTurn(transfer.get(), turns[i]);
-        if (transfer->rd(file) != 0) {
-            // Intended: a transfer to an unknown account is not dropped, the person shall see that it is there.
-            if (!reachedEnd(file))
-                transfer.release();
-            return -1;
-        }
-        transfer.release(); // the account owns it
-    }
-    return reachedEnd(file) ? -1 : 0;
-}
-
-const String& Account::getCurrencyName() const
-{
-    return currency() != nullptr ? currency()->getName() : String::none();
-}
-
-const String& Account::getCurrencyRepresentation() const
-{
-    return currency() != nullptr ? currency()->getRepresentation() : String::none();
+        if (next < turns.size())
+            operations_.setTurn(transfer.get(), turns[next++]);
+        const int result = transfer->rd(file);
+        // The account owns it. Intended: a transfer to an unknown account is not dropped either, the person shall see
+        // that it is there.
+        if (result == 0 || !reachedEnd(file))
+            transfer.release();
+        return result;
+    });
 }
 
 int Account::getShare(const String& market, const String& abbreviation, Share** out) const

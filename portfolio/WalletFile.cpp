@@ -1,24 +1,10 @@
 // The portfolio file: how a wallet is written and read. docs/FILES.md has the layout.
 
-#include "foundation/FieldIO.h"
-#include "market/Company.h"
-#include "market/Currency.h"
-#include "portfolio/Account.h"
-#include "portfolio/Share.h"
+#include "market/RecordList.h"
 #include "portfolio/Wallet.h"
 #include "portfolio/WalletNames.h"
 
 #include <memory>
-
-int Wallet::wrt(FILE*) const
-{
-    return -1;
-}
-
-int Wallet::rd(FILE*)
-{
-    return -1;
-}
 
 int Wallet::wrt(FILE* file, const Date& stamp) const
 {
@@ -75,8 +61,7 @@ int Wallet::rd(FILE* file, Date* stamp)
 
 int Wallet::readShares(FILE* file)
 {
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing) {
+    return readRecords(file, [&] {
         String market;
         String abbreviation;
         if (market.rd(file) != 0 || abbreviation.rd(file) != 0)
@@ -87,14 +72,13 @@ int Wallet::readShares(FILE* file)
             return -1;
         }
         names_->add(new Share(this, company));
-    }
-    return reachedEnd(file) ? -1 : 0;
+        return 0;
+    });
 }
 
 int Wallet::readAccounts(FILE* file)
 {
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing) {
+    return readRecords(file, [&] {
         String currencyName;
         Currency* currency;
         if (currencyName.rd(file) != 0 || getCurrency(currencyName, &currency) != 0)
@@ -107,10 +91,8 @@ int Wallet::readAccounts(FILE* file)
         // An account cut short stays for the sake of the operations in it that are whole.
         if (result == 0 || account->getNbrOperations() > 0)
             names_->add(account.release());
-        if (result != 0)
-            return -1;
-    }
-    return reachedEnd(file) ? -1 : 0;
+        return result;
+    });
 }
 
 void Wallet::writeParameters(FILE* file) const
