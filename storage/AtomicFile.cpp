@@ -1,5 +1,6 @@
 #include "storage/AtomicFile.h"
 
+#include "storage/Descriptor.h"
 #include "storage/Folders.h"
 
 #include <cerrno>
@@ -9,7 +10,6 @@
 #include <string_view>
 #include <sys/file.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
 namespace {
 
@@ -124,15 +124,11 @@ bool isTemporary(std::string_view name)
 void removeUnlessLocked(const std::string& path)
 {
     constexpr int kFlags = O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC;
-    int descriptor = open(path.c_str(), O_RDONLY | kFlags);
-    if (descriptor < 0)
-        descriptor = open(path.c_str(), O_WRONLY | kFlags);
-    if (descriptor < 0)
-        return;
+    const int readable = open(path.c_str(), O_RDONLY | kFlags);
+    const Descriptor file(readable >= 0 ? readable : open(path.c_str(), O_WRONLY | kFlags));
     // Nobody writes what nobody has locked: its program has died.
-    if (flock(descriptor, LOCK_EX | LOCK_NB) == 0)
+    if (file.number >= 0 && flock(file.number, LOCK_EX | LOCK_NB) == 0)
         unlink(path.c_str());
-    close(descriptor);
 }
 
 } // namespace

@@ -1,10 +1,11 @@
 #include "storage/Folders.h"
 
+#include "storage/Descriptor.h"
+
 #include <cerrno>
 #include <fcntl.h>
 #include <filesystem>
 #include <sys/stat.h>
-#include <unistd.h>
 
 std::string folderOf(const std::string& path)
 {
@@ -33,9 +34,6 @@ std::error_code makeFolders(const std::string& path, mode_t mode)
 
 void syncFolder(const std::string& path)
 {
-    const int folder = open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-    if (folder < 0)
-        return;
-    (void)fsync(folder);
-    close(folder);
+    const Descriptor folder(open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    (void)fsync(folder.number);
 }

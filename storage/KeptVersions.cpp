@@ -1,6 +1,7 @@
 #include "storage/KeptVersions.h"
 
 #include "storage/AtomicFile.h"
+#include "storage/Descriptor.h"
 #include "storage/Folders.h"
 
 #include <algorithm>
@@ -14,7 +15,6 @@
 #include <stdexcept>
 #include <string_view>
 #include <sys/stat.h>
-#include <unistd.h>
 #include <utility>
 
 namespace {
@@ -22,20 +22,7 @@ namespace {
 namespace fs = std::filesystem;
 
 constexpr mode_t kPrivate = 0700;
-
-/// A file descriptor that is closed in the end.
-struct Descriptor {
-    explicit Descriptor(const std::string& path) : number(open(path.c_str(), O_RDONLY | O_NOFOLLOW | O_CLOEXEC)) {}
-    ~Descriptor()
-    {
-        if (number >= 0)
-            close(number);
-    }
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-
-    const int number;
-};
+constexpr int kToRead = O_RDONLY | O_NOFOLLOW | O_CLOEXEC;
 
 /// `name` or, if that leaves too little room for the time, its beginning and a number made of all of it.
 std::string stemFor(const std::string& name)
@@ -172,7 +159,7 @@ bool linkVersion(const std::string& path, const std::string& version)
     if (lstat(path.c_str(), &file) != 0 || file.st_nlink != 1 || link(path.c_str(), version.c_str()) != 0)
         return false;
     // Whoever wrote the file may not have brought it to the disk. One that may not be read is kept even so.
-    const Descriptor written(version);
+    const Descriptor written(open(version.c_str(), kToRead));
     if (written.number >= 0 ? fsync(written.number) == 0 || errno == EINVAL : errno == EACCES)
         return true;
     const int reason = errno;
@@ -202,7 +189,7 @@ bool copyContents(int from, int to)
 /// Throws AtomicFile's errors.
 void copyVersion(const std::string& path, const std::string& version)
 {
-    const Descriptor from(path);
+    const Descriptor from(open(path.c_str(), kToRead));
     struct stat status;
     if (from.number < 0 || fstat(from.number, &status) != 0)
         throw AtomicFile::OpenError(std::strerror(errno));

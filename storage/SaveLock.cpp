@@ -8,7 +8,6 @@
 #include <fcntl.h>
 #include <sys/file.h>
 #include <thread>
-#include <unistd.h>
 
 namespace {
 
@@ -46,25 +45,26 @@ bool isWithoutLocks(int reason)
            reason == EOPNOTSUPP;
 }
 
-} // namespace
-
-SaveLock::SaveLock(const std::string& path, const DataFolder& folder, Patience patience)
+/// Locks the folder of `path`, or what stands in for it. Throws a WriteError when that fails. @return its descriptor.
+int lockFor(const std::string& path, const DataFolder& folder, SaveLock::Patience patience)
 {
     const Clock::time_point end = Clock::now() + patience;
-    descriptor_ = lockOpened(open(folderOf(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC), end);
-    if (descriptor_ < 0 && isWithoutLocks(errno)) {
+    int descriptor = lockOpened(open(folderOf(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC), end);
+    if (descriptor < 0 && isWithoutLocks(errno)) {
         std::string error;
         const std::string file = folder.backups(&error) + "/.lock";
         if (!error.empty())
             failFor(path, error);
-        descriptor_ = lockOpened(open(file.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600), end);
+        descriptor = lockOpened(open(file.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600), end);
     }
-    if (descriptor_ < 0)
+    if (descriptor < 0)
         failFor(path, errno == ETIMEDOUT ? "another program is saving in its folder and does not come to an end"
                                          : std::string("its folder cannot be locked: ") + std::strerror(errno));
+    return descriptor;
 }
 
-SaveLock::~SaveLock()
-{
-    close(descriptor_);
-}
+} // namespace
+
+SaveLock::SaveLock(const std::string& path, const DataFolder& folder, Patience patience)
+    : descriptor_(lockFor(path, folder, patience))
+{}
