@@ -25,23 +25,19 @@ public:
     bool goToNextRow();
 
 private:
-    Outcome readMonth(int* month);
-    Outcome readDay(int* day);
-    Outcome readYear(int* year);
-    Outcome readPrice(float* price);
+    Outcome readInteger(std::string_view ends, int* number);
+    Outcome readPrice(std::size_t yearWidth, float* price);
     Outcome findEnd(std::size_t from, std::string_view ends);
     void skipBlanks() { place_ = firstNotOf(" \r\n\t/", place_); }
     std::string_view field() const { return text_.substr(place_, end_ - place_); }
-    int integer() const { return static_cast<int>(leadingInteger(field())); }
     std::size_t firstNotOf(std::string_view blanks, std::size_t from) const
     {
         return std::min(text_.find_first_not_of(blanks, from), text_.size());
     }
 
     std::string_view text_;
-    std::size_t place_ = 0;     // of the next field
-    std::size_t end_ = 0;       // of the field that was read last
-    std::size_t yearWidth_ = 0; // with the blanks behind the year
+    std::size_t place_ = 0; // of the next field
+    std::size_t end_ = 0;   // of the field that was read last
 };
 
 /// A row goes up to its price. One that a line feed interrupts is skipped: the next begins right behind that.
@@ -50,59 +46,40 @@ RowReader::Outcome RowReader::readRow(DatedPrice* row)
     if (place_ == text_.size())
         return Outcome::kTextEnds;
     int month = 0, day = 0, year = 0;
-    Outcome outcome = readMonth(&month);
+    Outcome outcome = readInteger("</ ", &month);
     if (outcome == Outcome::kTaken)
-        outcome = readDay(&day);
+        outcome = readInteger("/", &day);
+    const std::size_t yearPlace = place_;
     if (outcome == Outcome::kTaken)
-        outcome = readYear(&year);
-    if (outcome == Outcome::kTaken)
-        outcome = readPrice(&row->price);
-    if (outcome == Outcome::kTaken)
-        row->date = Date(static_cast<short>(day), static_cast<short>(month), year);
-    return outcome;
+        outcome = readInteger(" /\t", &year);
+    if (outcome != Outcome::kTaken)
+        return outcome;
+    // Behind the year only blanks are passed over: a slash would be the price's own beginning.
+    place_ = firstNotOf(" \t", end_);
+    row->date = Date(static_cast<short>(day), static_cast<short>(month), year);
+    return readPrice(place_ - yearPlace, &row->price);
 }
 
-RowReader::Outcome RowReader::readMonth(int* month)
+/// Takes a number that one of `ends` follows, and goes behind that; '<', where it is one of them, ends the table.
+RowReader::Outcome RowReader::readInteger(std::string_view ends, int* number)
 {
-    const Outcome outcome = findEnd(place_, "</ ");
+    const Outcome outcome = findEnd(place_, ends);
     if (outcome != Outcome::kTaken)
         return outcome;
     if (text_[end_] == '<')
         return Outcome::kTableEnds;
-    *month = integer();
+    *number = static_cast<int>(leadingInteger(field()));
     place_ = end_ + 1;
     return outcome;
 }
 
-RowReader::Outcome RowReader::readDay(int* day)
-{
-    const Outcome outcome = findEnd(place_, "/");
-    if (outcome != Outcome::kTaken)
-        return outcome;
-    *day = integer();
-    place_ = end_ + 1;
-    return outcome;
-}
-
-RowReader::Outcome RowReader::readYear(int* year)
-{
-    const Outcome outcome = findEnd(place_, " /\t");
-    if (outcome != Outcome::kTaken)
-        return outcome;
-    *year = integer();
-    const std::size_t price = firstNotOf(" \t", end_);
-    yearWidth_ = price - place_;
-    place_ = price;
-    return outcome;
-}
-
-/// The end is searched from as far behind the start as the year was wide, which lies in the next column. Intended: only
-/// the number in front counts.
-RowReader::Outcome RowReader::readPrice(float* price)
+/// The end is searched from as far behind the start as the year was wide, with the blanks behind it, which lies in the
+/// next column. Intended: only the number in front counts.
+RowReader::Outcome RowReader::readPrice(std::size_t yearWidth, float* price)
 {
     if (place_ == text_.size())
         return Outcome::kError;
-    const Outcome outcome = findEnd(place_ + yearWidth_, " /\t");
+    const Outcome outcome = findEnd(place_ + yearWidth, " /\t");
     if (outcome != Outcome::kTaken)
         return outcome;
     *price = static_cast<float>(leadingNumber(field()));

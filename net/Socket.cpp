@@ -68,11 +68,6 @@ int Socket::connectToName(const String& host, unsigned short port)
     return connectToAddress(port, deadline);
 }
 
-int Socket::serverOn(unsigned short port)
-{
-    return serverOn(port, in_addr{INADDR_ANY});
-}
-
 int Socket::serverOn(unsigned short port, in_addr local)
 {
     // Greater than zero, where connecting asks for not negative. Intended: descriptor 0 stays open.
@@ -177,11 +172,6 @@ int Socket::writeLine(char* text)
     return n > 0 && text[n - 1] == '\n' ? 0 : send("\r\n", 2);
 }
 
-int Socket::putCharacterArray(const char* bytes, int count)
-{
-    return send(bytes, static_cast<std::size_t>(count));
-}
-
 int Socket::getCharacterArray(char* bytes, int count)
 {
     return recv(descriptor_, bytes, static_cast<std::size_t>(count), 0) < 0 ? -1 : 0;
@@ -202,11 +192,6 @@ int Socket::receive(char* bytes, std::size_t count, Clock::time_point deadline, 
         if (errno != EINTR && errno != EAGAIN)
             return -1;
     }
-}
-
-int Socket::putChar(char c)
-{
-    return send(&c, 1);
 }
 
 int Socket::getChar(char* c)
