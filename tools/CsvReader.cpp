@@ -8,17 +8,12 @@
 #include <new>
 #include <stdexcept>
 
-CsvReader::CsvReader(const std::string& path) : path_(path), file_(gzdopen(openForReading(path), "rb"))
+CsvReader::CsvReader(const std::string& path) : path_(path), file_(gzdopen(openForReading(path), "rb"), gzclose)
 {
     if (file_ == nullptr)
         throw std::bad_alloc();
     constexpr unsigned kBuffer = 1U << 17; // bytes; the library's own 8 KiB make it slower
-    gzbuffer(file_, kBuffer);
-}
-
-CsvReader::~CsvReader()
-{
-    gzclose(file_);
+    gzbuffer(file_.get(), kBuffer);
 }
 
 bool CsvReader::next()
@@ -29,7 +24,7 @@ bool CsvReader::next()
             fields_.clear();
         // Spreadsheets write lines of mere separators.
         const auto hasText = [](const std::string& field) { return !field.empty(); };
-        if (fields_.empty() || std::any_of(fields_.begin(), fields_.end(), hasText))
+        if (fields_.empty() || std::ranges::any_of(fields_, hasText))
             return true;
     }
     return false;
@@ -38,13 +33,14 @@ bool CsvReader::next()
 /// Of a line that is too long, one byte more than may be is kept.
 bool CsvReader::readLine()
 {
+    const gzFile file = file_.get();
     text_.clear();
     int c;
-    while ((c = gzgetc(file_)) >= 0 && c != '\n')
+    while ((c = gzgetc(file)) >= 0 && c != '\n')
         if (text_.size() <= kLongestLine)
             text_ += static_cast<char>(c);
     int code = Z_OK;
-    const char* reason = gzerror(file_, &code);
+    const char* reason = gzerror(file, &code);
     if (c < 0 && code != Z_OK && code != Z_STREAM_END)
         throw std::runtime_error(code == Z_ERRNO ? path_ + ": cannot be read: " + std::strerror(errno) : reason);
     if (c < 0 && text_.empty())

@@ -29,7 +29,6 @@ const std::vector<TableForm::Headings> kRateHeadings = {
 };
 
 const TableForm kQuotes = {kQuoteHeadings, {Column::kDate, Column::kTicker, Column::kValue}, 3};
-const TableForm kQuotesOfOneTicker = {kQuoteHeadings, {Column::kDate, Column::kValue}, 2};
 const TableForm kRates = {kRateHeadings, {Column::kDate, Column::kCurrency, Column::kValue}, 3};
 const TableForm kListing = {kQuoteHeadings, {Column::kTicker, Column::kMarket, Column::kCurrency, Column::kName}, 1};
 
@@ -66,10 +65,7 @@ std::size_t addAll(Map& valuesByOwner, Date* latest)
 
 } // namespace
 
-const TableForm& quotesOfOneTicker()
-{
-    return kQuotesOfOneTicker;
-}
+const TableForm kQuotesOfOneTicker = {kQuoteHeadings, {Column::kDate, Column::kValue}, 2};
 
 Importer::Importer(const ImportOptions& options, Catalogue& catalogue, std::ostream& log)
     : options_(options), catalogue_(catalogue), log_(log)

@@ -54,7 +54,7 @@ Closes QuoteFolder::closesOf(std::string_view ticker) const
     if (!isFileName(ticker) || !std::filesystem::exists(file, error))
         return closes;
     try {
-        Table table(file, quotesOfOneTicker());
+        Table table(file, kQuotesOfOneTicker);
         table.forEach([&] { closes.insert_or_assign(table.date(), table.value(false)); }, log_);
     } catch (const std::runtime_error& reason) {
         // What stands before the damage is served all the same.

@@ -4,13 +4,21 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <cstring>
 #include <fcntl.h>
+#include <stdexcept>
+
+namespace {
+
+/// Where what is waited for stands in the list.
+enum Place : std::size_t { kListener, kSignals, kClients };
+
+} // namespace
 
 QuoteServer::QuoteServer(Socket& listener, const QuoteFolder& folder) : listener_(listener), folder_(folder)
 {
     // A client may be gone again before it is accepted; that must not become a wait for the next one.
-    int descriptor = -1;
-    listener.getDescriptor(&descriptor);
+    const int descriptor = listener.descriptor();
     fcntl(descriptor, F_SETFL, fcntl(descriptor, F_GETFL) | O_NONBLOCK);
     // The few that a socket lets stand in line fill up when many come at once; one more would try again in a second.
     listen(descriptor, kMostClients);
@@ -18,31 +26,34 @@ QuoteServer::QuoteServer(Socket& listener, const QuoteFolder& folder) : listener
 
 void QuoteServer::serve(const StopSignals& signals)
 {
-    for (std::vector<pollfd> all = waiting(); signals.waitFor(all, timeLeft()); all = waiting()) {
+    for (;;) {
+        std::vector<pollfd> all = waiting(signals);
+        if (poll(all.data(), all.size(), timeLeft()) < 0 && errno != EINTR)
+            throw std::runtime_error(std::strerror(errno));
+        if (all[kSignals].revents != 0)
+            return;
         proceed(all);
-        if (all.front().revents != 0)
+        if (all[kListener].revents != 0)
             acceptClients();
     }
 }
 
-/// The listener, and behind it the clients in their order.
-std::vector<pollfd> QuoteServer::waiting() const
+/// The listener and the signals, and behind them the clients in their order.
+std::vector<pollfd> QuoteServer::waiting(const StopSignals& signals) const
 {
-    int descriptor = -1;
-    listener_.getDescriptor(&descriptor);
-    std::vector<pollfd> all = {{descriptor, POLLIN, 0}};
+    std::vector<pollfd> all = {{listener_.descriptor(), POLLIN, 0}, {signals.descriptor(), POLLIN, 0}};
     for (const QuoteClient& client : clients_)
         all.push_back(client.waiting());
     return all;
 }
 
-/// Until the first client's time is over; none when there is no client.
-std::optional<std::chrono::milliseconds> QuoteServer::timeLeft() const
+/// The milliseconds until the first client's time is over; -1, which `poll` takes for ever, when there is no client.
+int QuoteServer::timeLeft() const
 {
     if (clients_.empty())
-        return std::nullopt;
+        return -1;
     const auto left = clients_.front().deadline() - Socket::Clock::now();
-    return std::max(std::chrono::ceil<std::chrono::milliseconds>(left), std::chrono::milliseconds(0));
+    return std::max(static_cast<int>(std::chrono::ceil<std::chrono::milliseconds>(left).count()), 0);
 }
 
 void QuoteServer::proceed(const std::vector<pollfd>& ready)
@@ -50,7 +61,7 @@ void QuoteServer::proceed(const std::vector<pollfd>& ready)
     std::vector<QuoteClient> staying;
     for (std::size_t i = 0; i < clients_.size(); ++i) {
         QuoteClient& client = clients_[i];
-        const bool stays = ready[i + 1].revents == 0 || client.proceed(folder_);
+        const bool stays = ready[kClients + i].revents == 0 || client.proceed(folder_);
         if (stays && Socket::Clock::now() < client.deadline())
             staying.push_back(std::move(client));
     }

@@ -2,7 +2,6 @@
 
 #include "tools/QuoteClient.h"
 
-#include <optional>
 #include <vector>
 
 class StopSignals;
@@ -22,8 +21,8 @@ public:
 private:
     static constexpr int kMostClients = 64;
 
-    std::vector<pollfd> waiting() const;
-    std::optional<std::chrono::milliseconds> timeLeft() const;
+    std::vector<pollfd> waiting(const StopSignals& signals) const;
+    int timeLeft() const;
     void proceed(const std::vector<pollfd>& ready);
     void acceptClients();
     bool acceptClient();

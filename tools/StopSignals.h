@@ -1,21 +1,16 @@
 #pragma once
 
-#include <chrono>
-#include <csignal>
-#include <optional>
-#include <poll.h>
-#include <span>
+#include "storage/Descriptor.h"
 
-/// Turns SIGINT and SIGTERM into a request to stop. One object for a process; the handlers stay when it is gone.
+/// Turns SIGINT and SIGTERM into a request to stop that can be waited for. One object for a process; the signals stay
+/// blocked when it is gone.
 class StopSignals {
 public:
     StopSignals();
 
-    /// Waits until one of the descriptors is ready, as `poll` does, or for `limit`, if any; another signal also ends
-    /// the wait, with none ready.
-    /// @return false when it is time to stop.
-    bool waitFor(std::span<pollfd> waiting, std::optional<std::chrono::milliseconds> limit) const;
+    /// From the first signal on there is something to read here, for `poll` to tell.
+    int descriptor() const { return descriptor_.number; }
 
 private:
-    sigset_t stopping_;
+    Descriptor descriptor_;
 };

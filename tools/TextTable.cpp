@@ -58,11 +58,6 @@ TextTable::TextTable(std::vector<Column> columns)
     rows_.push_back(std::move(headings));
 }
 
-void TextTable::addRow(std::vector<std::string> cells)
-{
-    rows_.push_back(std::move(cells));
-}
-
 std::string TextTable::toString() const
 {
     std::vector<int> widths(aligns_.size(), 0);
