@@ -167,8 +167,29 @@ private:
         const auto isBefore = [&day](const SeriesQuote* q) { return q->getPackedDate() < day; };
         return static_cast<std::size_t>(std::ranges::partition_point(all, isBefore) - all.begin());
     }
-    float realQuote(const PackedDate& day, std::size_t next) const;
-    float lineValue(const Date& d, bool isBefore) const;
+    /// `next` is `firstOnOrAfter(day)`.
+    float realQuote(const PackedDate& day, std::size_t next) const
+    {
+        const auto all = quotes();
+        if (next == all.size())
+            return all.empty() ? 0 : lineValue(day.date(), false);
+        if (all[next]->getPackedDate() == day)
+            return all[next]->getValue();
+        return next > 0 ? all[next - 1]->getValue() : lineValue(day.date(), true);
+    }
+    /// The value of day `d`, before the first quote or behind the last one, on the straight line through both.
+    float lineValue(const Date& d, bool isBefore) const
+    {
+        const SeriesQuote& first = *quotes().front();
+        const SeriesQuote& last = *quotes().back();
+        const int span = last.getDate() - first.getDate();
+        if (getNbrQuotes() == 1 || span == 0) // quotes of one and the same day have no direction
+            return isBefore ? first.getValue() : last.getValue();
+        const double rise = static_cast<double>(last.getValue()) - first.getValue();
+        if (isBefore)
+            return static_cast<float>(first.getValue() - static_cast<double>(first.getDate() - d) / span * rise);
+        return static_cast<float>(last.getValue() + static_cast<double>(d - last.getDate()) / span * rise);
+    }
     void fitTrend() const;
     void replaceWith(std::vector<LateQuote>& late);
 
@@ -178,33 +199,6 @@ private:
     mutable bool trendIsStale_ = false;
     std::uint64_t revision_ = nextRevision();
 };
-
-/// `next` is `firstOnOrAfter(day)`.
-template <class Owner, class SeriesQuote, class ManyEnd>
-float QuoteSeries<Owner, SeriesQuote, ManyEnd>::realQuote(const PackedDate& day, std::size_t next) const
-{
-    const auto all = quotes();
-    if (next == all.size())
-        return all.empty() ? 0 : lineValue(day.date(), false);
-    if (all[next]->getPackedDate() == day)
-        return all[next]->getValue();
-    return next > 0 ? all[next - 1]->getValue() : lineValue(day.date(), true);
-}
-
-/// The value of day `d`, before the first quote or behind the last one, on the straight line through both.
-template <class Owner, class SeriesQuote, class ManyEnd>
-float QuoteSeries<Owner, SeriesQuote, ManyEnd>::lineValue(const Date& d, bool isBefore) const
-{
-    const SeriesQuote& first = *quotes().front();
-    const SeriesQuote& last = *quotes().back();
-    const int span = last.getDate() - first.getDate();
-    if (getNbrQuotes() == 1 || span == 0) // quotes of one and the same day have no direction
-        return isBefore ? first.getValue() : last.getValue();
-    const double rise = static_cast<double>(last.getValue()) - first.getValue();
-    if (isBefore)
-        return static_cast<float>(first.getValue() - static_cast<double>(first.getDate() - d) / span * rise);
-    return static_cast<float>(last.getValue() + static_cast<double>(d - last.getDate()) / span * rise);
-}
 
 /// Ordinary least squares of value y against day number x, counted from the first quote:
 ///     slope = (mean(xy) - mean(x) mean(y)) / (mean(x^2) - mean(x)^2)

@@ -31,13 +31,6 @@ void ReceivedPage::endWithClose()
     }
 }
 
-/// It ends between two chunks only. A server that has closed without a word, or that sends zeros, adds nothing for
-/// ever.
-bool ReceivedPage::isFull() const
-{
-    return used_ == 0 && (text_.size() > limit_ || empty_ > limit_);
-}
-
 void ReceivedPage::endChunk()
 {
     empty_ += chunk_[0] == '\0' ? 1 : 0;

@@ -10,6 +10,7 @@
 #include <string_view>
 #include <sys/file.h>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace {
 
@@ -19,17 +20,12 @@ constexpr std::string_view kPrefix = ".pelorin-";
 constexpr std::string_view kSuffix = ".tmp";
 constexpr const char* kCannotOpen = "cannot be opened";
 constexpr const char* kCannotWrite = "cannot be written";
+constexpr const char* kIsKept = ": exists already and is left as it is";
 
 template <class Error>
 [[noreturn]] void failFor(const std::string& path, const char* what)
 {
     throw Error(path + ": " + what + ": " + std::strerror(errno));
-}
-
-template <class Error>
-[[noreturn]] void failForExisting(const std::string& path)
-{
-    throw Error(path + ": exists already and is left as it is");
 }
 
 /// Whether there is something at `path`. When that cannot be told, throws an Error for `shown` that says `what`: taken
@@ -143,7 +139,7 @@ void AtomicFile::check(const std::string& path, Existing existing)
         return;
     }
     if (existing == Existing::kKeep)
-        failForExisting<OpenError>(path);
+        throw OpenError(path + kIsKept);
     if (!isThere<OpenError>(path, 0, path, kCannotOpen, &status))
         return; // a link to a file that is yet to be made
     // Renaming would put a file in the place of a device or a pipe.
@@ -260,7 +256,7 @@ void AtomicFile::giveName()
         }
         struct stat status;
         if (lstat(target_.c_str(), &status) == 0)
-            failForExisting<WriteError>(path_);
+            throw WriteError(path_ + kIsKept);
         // a file system without links
     }
     if (rename(temporary_.c_str(), target_.c_str()) != 0)

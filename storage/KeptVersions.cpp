@@ -15,6 +15,7 @@
 #include <stdexcept>
 #include <string_view>
 #include <sys/stat.h>
+#include <unistd.h>
 #include <utility>
 
 namespace {
