@@ -1,7 +1,5 @@
 #include "tools/QuoteServer.h"
 
-#include "tools/StopSignals.h"
-
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
@@ -11,7 +9,7 @@
 namespace {
 
 /// Where what is waited for stands in the list.
-enum Place : std::size_t { kListener, kSignals, kClients };
+enum Place : std::size_t { kListener, kStop, kClients };
 
 } // namespace
 
@@ -24,13 +22,13 @@ QuoteServer::QuoteServer(Socket& listener, const QuoteFolder& folder) : listener
     listen(descriptor, kMostClients);
 }
 
-void QuoteServer::serve(const StopSignals& signals)
+void QuoteServer::serve(const Descriptor& stop)
 {
     for (;;) {
-        std::vector<pollfd> all = waiting(signals);
+        std::vector<pollfd> all = waiting(stop);
         if (poll(all.data(), all.size(), timeLeft()) < 0 && errno != EINTR)
             throw std::runtime_error(std::strerror(errno));
-        if (all[kSignals].revents != 0)
+        if (all[kStop].revents != 0)
             return;
         proceed(all);
         if (all[kListener].revents != 0)
@@ -38,10 +36,10 @@ void QuoteServer::serve(const StopSignals& signals)
     }
 }
 
-/// The listener and the signals, and behind them the clients in their order.
-std::vector<pollfd> QuoteServer::waiting(const StopSignals& signals) const
+/// The listener and `stop`, and behind them the clients in their order.
+std::vector<pollfd> QuoteServer::waiting(const Descriptor& stop) const
 {
-    std::vector<pollfd> all = {{listener_.descriptor(), POLLIN, 0}, {signals.descriptor(), POLLIN, 0}};
+    std::vector<pollfd> all = {{listener_.descriptor(), POLLIN, 0}, {stop.number, POLLIN, 0}};
     for (const QuoteClient& client : clients_)
         all.push_back(client.waiting());
     return all;

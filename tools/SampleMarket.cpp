@@ -17,38 +17,24 @@ namespace {
 constexpr int kWeeks = 261; // of five years
 constexpr double kDaysInYear = 261;
 
-struct CurrencyPlan {
+constexpr struct CurrencyPlan {
     const char* name;
     const char* symbol;
     double rate;       // in euros, on the first day
     double volatility; // of a day, a fraction
-};
-
-constexpr CurrencyPlan kCurrencies[] = {
+} kCurrencies[] = {
     {"Euro", "EUR", 1, 0},
     {"US Dollar", "USD", 0.9120, 0.0042},
     {"Pound Sterling", "GBP", 1.1640, 0.0035},
     {"Swiss Franc", "CHF", 1.0310, 0.0026},
 };
 
-struct MarketPlan {
+constexpr struct MarketPlan {
     const char* name;
     const char* symbol; // of its currency
-};
+} kMarkets[] = {{"NYSE", "USD"}, {"NASDAQ", "USD"}, {"Paris", "EUR"}, {"London", "GBP"}};
 
-constexpr MarketPlan kMarkets[] = {{"NYSE", "USD"}, {"NASDAQ", "USD"}, {"Paris", "EUR"}, {"London", "GBP"}};
-
-struct CompanyPlan {
-    const char* name;
-    const char* ticker;
-    const char* market;
-    double price;      // on the first day
-    double growth;     // of a year, a fraction, beside what the world does
-    double volatility; // of a day, a fraction
-    double beta;       // how much it follows the world
-};
-
-constexpr CompanyPlan kCompanies[] = {
+constexpr SampleCompany kCompanies[] = {
     {"Harrowmere Rail", "HWMR", "NYSE", 62.40, 0.07, 0.011, 0.9},
     {"Tannehurst Paper Mills", "TNHP", "NYSE", 28.15, -0.04, 0.015, 0.8},
     {"Ardenmoor Energy", "AMOE", "NYSE", 47.80, 0.02, 0.017, 0.7},
@@ -71,22 +57,18 @@ constexpr CompanyPlan kCompanies[] = {
     {"Marlstone Mining", "MRLM", "London", 33.10, 0.08, 0.022, 1.2},
 };
 
-struct SplitPlan {
+constexpr struct SplitPlan {
     const char* ticker;
     std::size_t day; // the first one on which the new shares are traded
     short newShares; // for each old one
-};
+} kSplits[] = {{"ZPHR", 702, 3}, {"NDWK", 958, 2}};
 
-constexpr SplitPlan kSplits[] = {{"ZPHR", 702, 3}, {"NDWK", 958, 2}};
-
-struct NotePlan {
+constexpr struct NotePlan {
     const char* ticker;
     std::size_t day;
     const char* title;
     const char* text;
-};
-
-constexpr NotePlan kNotes[] = {
+} kNotes[] = {
     {"QLLN", 61, "Coverage", "Sells to hospitals only; little debt. Worth watching."},
     {"CHLV", 133, "Order book", "Two ferries cancelled. Management expects a weak second half."},
     {"MDLB", 248, "Annual report", "Margins up again, Asia now a third of sales. Dividend 3.20."},
@@ -145,7 +127,7 @@ const SplitPlan* findSplit(const String& ticker)
     return found != std::end(kSplits) ? found : nullptr;
 }
 
-void addQuotes(Company* company, const CompanyPlan& plan, std::uint64_t seed, const std::vector<Date>& days,
+void addQuotes(Company* company, const SampleCompany& plan, std::uint64_t seed, const std::vector<Date>& days,
                const std::vector<double>& world)
 {
     constexpr double kCents = 100;
@@ -213,17 +195,23 @@ void fillSampleMarket(Catalogue& catalogue, const std::vector<Date>& days)
         market->setCurrency(catalogue.getCurrencyByRepresentation(plan.symbol));
     }
     const std::vector<double> world = worldReturns(days.size());
-    for (const CompanyPlan& plan : kCompanies) {
+    for (const SampleCompany& plan : kCompanies) {
         auto* company = new Company(findMarket(catalogue, plan.market), plan.name, plan.ticker);
         addQuotes(company, plan, ++seed, days, world);
         addNotes(company, days);
     }
 }
 
-std::vector<SampleTicker> sampleTickers()
+std::span<const SampleCompany> sampleCompanies()
 {
-    std::vector<SampleTicker> tickers;
-    for (const CompanyPlan& plan : kCompanies)
-        tickers.push_back({plan.ticker, static_cast<float>(plan.price), plan.volatility, tickers.size() + 1});
-    return tickers;
+    return kCompanies;
+}
+
+Company* findCompany(const Catalogue& catalogue, const String& ticker)
+{
+    Company* company = nullptr;
+    for (const Market* market : catalogue.getMarkets())
+        if (market->getCompany(ticker, &company) == 0)
+            break;
+    return company;
 }

@@ -6,9 +6,7 @@
 #include <stdexcept>
 #include <sys/signalfd.h>
 
-namespace {
-
-int openSignals()
+Descriptor stopSignals()
 {
     sigset_t stopping;
     sigemptyset(&stopping);
@@ -19,9 +17,5 @@ int openSignals()
     const int descriptor = signalfd(-1, &stopping, SFD_CLOEXEC);
     if (descriptor < 0)
         throw std::runtime_error(std::strerror(errno));
-    return descriptor;
+    return Descriptor(descriptor);
 }
-
-} // namespace
-
-StopSignals::StopSignals() : descriptor_(openSignals()) {}

@@ -2,15 +2,6 @@
 
 #include "storage/Descriptor.h"
 
-/// Turns SIGINT and SIGTERM into a request to stop that can be waited for. One object for a process; the signals stay
-/// blocked when it is gone.
-class StopSignals {
-public:
-    StopSignals();
-
-    /// From the first signal on there is something to read here, for `poll` to tell.
-    int descriptor() const { return descriptor_.number; }
-
-private:
-    Descriptor descriptor_;
-};
+/// Turns SIGINT and SIGTERM, for the rest of the program's life, into a request to stop that can be waited for: from
+/// the first one on there is something to read at the descriptor, for `poll` to tell. It is for one caller.
+Descriptor stopSignals();
