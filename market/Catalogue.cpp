@@ -16,6 +16,8 @@ constexpr int kMostReferences = 100;
 void expressIn(const Currency& newReference, const Currency& currency)
 {
     // Dividing by 1 would change nothing but mark the trend as out of date.
+    // Each rate goes by the new reference's rate of the same day. The value changes in place: no day does, so that the
+    // series keeps its order.
     for (CurrencyQuote* quote : currency.quotes())
         if (const double rate = newReference.getRealQuote(quote->getDate()); rate != 1)
             quote->setValue(static_cast<float>(quote->getValue() / rate));
@@ -28,6 +30,8 @@ int Catalogue::rd(FILE* file)
     String reference;
     if (reference.rd(file) != 0)
         return -1;
+    // A file without a reference has the undefined name here, and none of its currencies becomes the reference. One
+    // that the catalogue has from before stays.
     int references = 0;
     return readRecords(file, [&] { return readCurrency(file, reference, &references); });
 }
@@ -55,6 +59,7 @@ int Catalogue::wrt(FILE* file, const Date& stamp) const
     // Without a reference the undefined name is written; a reader then sets none.
     const String reference = reference_ != nullptr ? reference_->getRepresentation() : String();
     reference.wrt(file);
+    // The records look at their own writes only; what a full buffer has failed to write is remembered by the file.
     return writeRecords(file, currencies_, stamp) == 0 && std::ferror(file) == 0 ? 0 : -1;
 }
 
@@ -93,6 +98,7 @@ void Catalogue::clear()
 
 Currency* Catalogue::getCurrencyByRepresentation(const String& representation) const
 {
+    // A symbol without text equals no other, so that it finds nothing.
     const auto found = std::ranges::find(currencies_, representation, &Currency::getRepresentation);
     return found != currencies_.end() ? *found : nullptr;
 }

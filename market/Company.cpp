@@ -22,6 +22,7 @@ std::unique_ptr<CompanyEvent> makeEvent(unsigned short type)
 
 } // namespace
 
+// The lists only keep the address of the company, so it does not matter that it is not whole yet.
 Company::Company() : QuoteSeries(this), shares_(this), events_(this) {}
 
 Company::Company(Market* market, const String& name, const String& abbreviation) : Company()
@@ -43,6 +44,7 @@ Company::~Company()
 
 int Company::wrt(FILE* file) const
 {
+    // The quotes come before the events: a file that was cut short loses the events first.
     name_.wrt(file);
     abbreviation_.wrt(file);
     if (writeQuotes(file) != 0)
@@ -87,5 +89,6 @@ const String& Company::getCurrencyRepresentation() const
 
 int Company::setMarket(Market* market)
 {
+    // The former market's list lets go first. Whoever owned the company through it does so no more.
     return market_.set(this, market);
 }

@@ -24,6 +24,7 @@ Currency::~Currency()
 
 int Currency::wrt(FILE* file, const Date& stamp) const
 {
+    // Only the last line asks whether the writes have come about: a field that fails leaves its mark on the file.
     stamp.wrt(file);
     name_.wrt(file);
     representation_.wrt(file);
@@ -34,6 +35,7 @@ int Currency::rd(FILE* file, Date* stamp)
 {
     Date date;
     date.rd(file);
+    // A date that is cut short needs no check of its own, since the name behind it cannot be read then.
     if (stamp != nullptr)
         *stamp = date;
     // The rates come last: a record that ends before them leaves a currency with names and markets.

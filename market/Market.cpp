@@ -23,6 +23,7 @@ Market::~Market()
 
 int Market::wrt(FILE* file) const
 {
+    // The currency is not named: the market's record lies within the currency's.
     name_.wrt(file);
     return writeRecords(file, companies());
 }

@@ -4,6 +4,7 @@
 
 int Quote::wrt(FILE* file) const
 {
+    // In one piece: files have millions of these records.
     unsigned char bytes[kFileSize];
     getDate().encode(bytes);
     encodeFloat(bytes + Date::kFileSize, value_);

@@ -35,6 +35,8 @@ private:
         return std::min(text_.find_first_not_of(blanks, from), text_.size());
     }
 
+    // At the beginning of a row `place_` is that of the month. When a field has ended a row early, it is where the next
+    // row begins; when there is no end to be found, nobody reads on.
     std::string_view text_;
     std::size_t place_ = 0; // of the next field
     std::size_t end_ = 0;   // of the field that was read last
@@ -43,8 +45,10 @@ private:
 /// A row goes up to its price. One that a line feed interrupts is skipped: the next begins right behind that.
 RowReader::Outcome RowReader::readRow(DatedPrice* row)
 {
+    // The only place where a text may end without being an error.
     if (place_ == text_.size())
         return Outcome::kTextEnds;
+    // Each field is read only when those before it have been.
     int month = 0, day = 0, year = 0;
     Outcome outcome = readInteger("</ ", &month);
     if (outcome == Outcome::kTaken)
@@ -91,6 +95,7 @@ RowReader::Outcome RowReader::readPrice(std::size_t yearWidth, float* price)
 RowReader::Outcome RowReader::findEnd(std::size_t from, std::string_view ends)
 {
     end_ = from;
+    // `from` may lie behind the end of the text, where a price was looked for too far on.
     while (end_ < text_.size() && text_[end_] != '\n' && ends.find(text_[end_]) == ends.npos)
         ++end_;
     if (end_ >= text_.size())
@@ -116,6 +121,7 @@ public:
     bool accepts(float price)
     {
         constexpr double kDrop = 3, kRise = 2;
+        // In double: the limits are exclusive, and a float would round them onto a price.
         const double previous = previous_;
         if (previous != 0 && !(price > previous / kDrop && price < previous * kRise))
             return false;
@@ -138,10 +144,12 @@ RowReader::Outcome readTable(std::string_view page, std::vector<DatedPrice>* row
     GlitchFilter filter;
     for (DatedPrice row{};;) {
         const RowReader::Outcome outcome = reader.readRow(&row);
+        // It stands at the next row already, and `goToNextRow` would pass over that.
         if (outcome == RowReader::Outcome::kSkipped)
             continue;
         if (outcome != RowReader::Outcome::kTaken)
             return outcome;
+        // The filter last: a price that does not count must not become the one that others are compared to.
         if (row.date.getMonth() != 0 && isPrice(row.price) && filter.accepts(row.price))
             rows->push_back(row);
         if (!reader.goToNextRow())

@@ -41,6 +41,7 @@ Account::~Account()
 int Account::wrt(FILE* file) const
 {
     name_.wrt(file);
+    // The wallet has written the currency's name in front of this: a reader needs it before the account is made.
     fwritechar(file, defaultTransfer_ ? 'Y' : 'N');
     fwriteint(file, static_cast<int>(getNbrOperations()));
     for (const Operation* operation : operations()) {
@@ -70,6 +71,7 @@ int Account::readOperation(FILE* file)
         transferTurns_.push_back(operations_.reserveTurn());
         return 0;
     }
+    // Every other letter counts as a trade: "B" and "S" differ in a flag that the record has, too.
     std::unique_ptr<Operation> operation;
     if (letter == kLetters[Operation::kDeposit])
         operation = std::make_unique<DepositAccountOperation>();
@@ -86,6 +88,7 @@ int Account::readOperation(FILE* file)
 
 int Account::writeTransferOperations(FILE* file) const
 {
+    // The same order as that of the letters, so that each body finds the turn of its letter again.
     fwriteint(file, static_cast<int>(std::ranges::count_if(operations(), isTransfer)));
     for (const Operation* operation : operations())
         if (isTransfer(operation) && operation->wrt(file) != 0)

@@ -25,6 +25,7 @@ void Wallet::setCatalogue(const Catalogue& catalogue)
 
 int Wallet::getCurrency(const String& name, Currency** out) const
 {
+    // While a file is read its index answers, here and below: these lists would be gone through for every record.
     if (names_ != nullptr)
         return names_->getCurrency(name, out);
     const auto found = std::ranges::find(currencies_, name, &Currency::getName);
@@ -67,6 +68,7 @@ Account* Wallet::getAccountByName(const String& name) const
 
 Account* Wallet::findDefaultTransferAccount(const String& currencyRepresentation) const
 {
+    // The one that is flagged comes before all others, wherever it stands.
     Account* first = nullptr;
     for (Account* account : accounts()) {
         const Currency* currency = account->currency();

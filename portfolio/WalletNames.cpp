@@ -12,6 +12,7 @@ const String kNoMarket("");
 
 std::size_t WalletNames::KeyHash::operator()(const Key& key) const
 {
+    // Multiplied, so that a market and a ticker of the same name do not cancel out.
     const std::hash<std::string_view> hash;
     return hash(key.first) * 31 + hash(key.second);
 }
@@ -36,6 +37,7 @@ WalletNames::WalletNames(const std::vector<Market*>& markets, const std::vector<
 
 void WalletNames::add(Share* share)
 {
+    // Later holdings of the same company are not found: the first one gets all trades, as in a search from the front.
     const Company* company = share->company();
     if (company != nullptr && company->market() != nullptr)
         shares_.try_emplace(keyOf(*company->market(), *company), share);
@@ -50,6 +52,8 @@ template <class T>
 int WalletNames::find(const Map<T>& map, const String& market, const String& name, T** out)
 {
     const bool canMatch = market.hasText() && name.hasText();
+    // The views live as long as this call, which is all that a search needs; the keys in the map refer to names that
+    // stay.
     const auto found = canMatch ? map.find({market.comparedBytes(), name.comparedBytes()}) : map.end();
     // The wallet reports the name that was looked for last without success as the reason of a failed read.
     *out = found != map.end() ? found->second : nullptr;

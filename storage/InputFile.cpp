@@ -40,6 +40,7 @@ int openForReading(const std::string& path)
 
 InputFile::InputFile(const std::string& path) : path_(path), stream_(fdopen(openForReading(path), "rb"), std::fclose)
 {
+    // The file is open by now: all that can be missing is the memory for a stream.
     if (stream_ == nullptr)
         throw std::bad_alloc();
 }

@@ -86,6 +86,7 @@ bool takeNumber(std::size_t fewest, std::size_t most, std::string_view* text, st
 bool readPlace(std::string_view text, Version* version)
 {
     auto& [serial, year, month, day, hour, minute, second, number] = version->place;
+    // The forms: "2026-11-21 10.53.04", the same with "-002" behind it, and with " (57)" behind it.
     const bool isNegative = take('-', &text); // whatever a clock may say
     if (!takeNumber(1, 10, &text, &year))
         return false;
@@ -136,6 +137,8 @@ struct Shelf {
 /// Removes a version that a killed save has linked but not replaced: it still is the file itself.
 void removeLinkTo(const struct stat& file, const Shelf& shelf, std::vector<Version>* versions)
 {
+    // A killed save leaves the file with two names, of which one is a version's. A file with a single name has none
+    // here.
     if (file.st_nlink == 1)
         return;
     std::erase_if(*versions, [&](const Version& version) {
@@ -173,6 +176,7 @@ bool copyContents(int from, int to)
 {
     constexpr std::size_t kClone = std::size_t{1} << 30;
     // Shares the blocks where the file system can. What it did not do, for whatever reason, is done by hand.
+    // Each call goes on where the last one has ended, and so does `read` below: both move the place in the file.
     while (copy_file_range(from, nullptr, to, nullptr, kClone, 0) > 0) {
     }
     char block[1 << 16];
@@ -199,6 +203,7 @@ void copyVersion(const std::string& path, const std::string& version)
     (void)fchmod(to, status.st_mode & 0777);
     if (!copyContents(from.number, to))
         throw AtomicFile::WriteError(std::strerror(errno));
+    // So that file managers show when the version was saved, and not when it was copied.
     const timespec times[] = {status.st_atim, status.st_mtim};
     (void)futimens(to, times);
     copy.commit();
@@ -246,6 +251,7 @@ std::string KeptVersions::keep(const std::string& path, std::time_t now) const
     std::vector<Version> versions = shelf.versions(&reason);
     if (reason)
         failFor(path, shelf.folder + ": cannot be read: " + reason.message());
+    // `versions` is sorted, so the last one has the highest number.
     const std::int64_t serial = versions.empty() ? 1 : std::min(versions.back().place.front() + 1, kLastSerial);
     removeLinkTo(file, shelf, &versions);
     removeOldest(shelf, versions); // of saves that were killed before they could prune

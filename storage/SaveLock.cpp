@@ -25,6 +25,7 @@ int lockOpened(int descriptor, Clock::time_point end)
     constexpr std::chrono::milliseconds kPause(2);
     if (descriptor < 0)
         return -1;
+    // Asked again and again, because a lock that is waited for has no time limit.
     while (flock(descriptor, LOCK_EX | LOCK_NB) != 0) {
         const int reason = errno;
         if (reason == EINTR || (reason == EWOULDBLOCK && Clock::now() < end)) {
@@ -48,9 +49,11 @@ bool isWithoutLocks(int reason)
 /// Locks the folder of `path`, or what stands in for it. Throws a WriteError when that fails. @return its descriptor.
 int lockFor(const std::string& path, const DataFolder& folder, SaveLock::Patience patience)
 {
+    // One patience for both attempts.
     const Clock::time_point end = Clock::now() + patience;
     int descriptor = lockOpened(open(folderOf(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC), end);
     if (descriptor < 0 && isWithoutLocks(errno)) {
+        // Who may not look into the folder, and who saves where locks are unknown, meet at one file of the data folder.
         std::string error;
         const std::string file = folder.backups(&error) + "/.lock";
         if (!error.empty())

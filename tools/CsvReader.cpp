@@ -33,6 +33,7 @@ bool CsvReader::next()
 /// Of a line that is too long, one byte more than may be is kept.
 bool CsvReader::readLine()
 {
+    // Afterwards `text_` is the line without its end, and `line_` its number.
     const gzFile file = file_.get();
     text_.clear();
     int c;
@@ -43,6 +44,7 @@ bool CsvReader::readLine()
     const char* reason = gzerror(file, &code);
     if (c < 0 && code != Z_OK && code != Z_STREAM_END)
         throw std::runtime_error(code == Z_ERRNO ? path_ + ": cannot be read: " + std::strerror(errno) : reason);
+    // A last line without a line end counts; nothing behind the last line end is no line.
     if (c < 0 && text_.empty())
         return false;
     constexpr const char* kByteOrderMark = "\xEF\xBB\xBF";
@@ -51,6 +53,7 @@ bool CsvReader::readLine()
         text_.erase(0, std::strlen(kByteOrderMark));
     if (text_.ends_with('\r'))
         text_.pop_back();
+    // Once, for the whole file: a later line that has another separator is one with a single field.
     if (separator_ == '\0' && !text_.empty())
         guessSeparator();
     return true;
@@ -59,6 +62,7 @@ bool CsvReader::readLine()
 /// Commas also stand within numbers, and semicolons within names: the rarest separator on the line wins.
 void CsvReader::guessSeparator()
 {
+    // What stands in quotes is text, and no sign of a separator.
     std::string bare;
     bool quoted = false;
     for (const char c : text_) {
@@ -95,6 +99,7 @@ bool CsvReader::split()
 /// Takes the text between the quotes at `*at`, which goes behind them. @return false when the field does not end there.
 bool CsvReader::takeQuoted(std::size_t* at, std::string* field) const
 {
+    // `*at` stands on the opening quote. A quote within the text is written twice, which the inner step passes over.
     for (++*at; *at < text_.size(); ++*at) {
         if (text_[*at] == '"' && text_[++*at] != '"') // two stand for one
             return *at == text_.size() || text_[*at] == separator_;

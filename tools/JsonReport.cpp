@@ -40,6 +40,7 @@ public:
     void addList(const char* key, Items&& items, const Describe& describe)
     {
         put(beginMember(key) + "[");
+        // The line of an item is ended by what follows it: only then is it known whether a comma belongs there.
         bool isFirst = true;
         for (const auto& item : items) {
             put((isFirst ? "\n    " : ",\n    ") + dump(describe(item)));
@@ -160,6 +161,7 @@ void writeJsonReport(const Valuation& valuation, FILE* out)
     report.add("firstOperationDate", day(state.getFirstOperationDate()));
     report.addList("accounts", state.accountStates(), describeAccount);
     report.addList("shares", state.shareStates(), describeHolding);
+    // A view, and no list: a portfolio may have millions of operations.
     const auto operations = valuation.wallet().accounts() | std::views::transform(&Account::operations);
     report.addList("operations", operations | std::views::join, describeOperation);
     if (valuation.hasEvolution())

@@ -39,11 +39,13 @@ bool QuoteClient::receive(const QuoteFolder& folder)
         return count < 0 && isOnlyNotReady();
     const std::string_view come(bytes, static_cast<std::size_t>(count));
     const std::size_t end = come.find_first_of(std::string_view("\n\0", 2));
+    // What comes behind the line end is lost: a client has one request.
     request_ += come.substr(0, end);
     if (request_.size() > kLongestRequest)
         return false;
     if (end == come.npos)
         return true;
+    // A page is never empty, so from here on the client is one that takes its page.
     page_ = folder.answer(request_);
     return send();
 }

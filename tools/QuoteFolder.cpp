@@ -39,6 +39,7 @@ std::string QuoteFolder::answer(std::string_view request) const
     const std::string_view path = between(line, "GET ", "").value_or("");
     const auto latest = between(path, QuoteServers::kLatestPath, "");
     const auto history = between(path, QuoteServers::kHistoryPath, QuoteServers::kHistoryPathEnd);
+    // An empty ticker, as that of a request of neither kind, has no file.
     const Closes closes = closesOf(latest.value_or(history.value_or("")));
     if (closes.empty())
         return noQuotesPage();

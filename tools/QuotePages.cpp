@@ -20,6 +20,7 @@ Fraction fractionOf(float close, float whole)
         if (whole + numerator / denominator == close)
             return {numerator, denominator};
     }
+    // As a last resort the digits of the float themselves over a power of two: exact, if hard to read.
     int exponent = 0;
     constexpr int kBits = std::numeric_limits<float>::digits;
     const float mantissa = std::frexp(rest, &exponent);
@@ -78,6 +79,7 @@ std::string latestQuotePage(float close)
 std::string historyPage(const Closes& closes)
 {
     std::string page = "<html><body><pre>\n<b>Date Close Open High Low Volume (00s)</b>\n";
+    // Strictly behind that day, which may be one that its month does not have.
     for (auto close = closes.upper_bound(threeMonthsBefore(closes.rbegin()->first)); close != closes.end(); ++close)
         page += rowOf(close->first, close->second);
     return page + "</pre></body></html>\n";

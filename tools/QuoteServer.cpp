@@ -30,6 +30,7 @@ void QuoteServer::serve(const Descriptor& stop)
             throw std::runtime_error(std::strerror(errno));
         if (all[kStop].revents != 0)
             return;
+        // The clients first: those who come now would shift the places that `all` was made for.
         proceed(all);
         if (all[kListener].revents != 0)
             acceptClients();
@@ -59,6 +60,7 @@ void QuoteServer::proceed(const std::vector<pollfd>& ready)
     std::vector<QuoteClient> staying;
     for (std::size_t i = 0; i < clients_.size(); ++i) {
         QuoteClient& client = clients_[i];
+        // Whom nothing has come from is only asked for the time; one that is ready may have come to its end.
         const bool stays = ready[kClients + i].revents == 0 || client.proceed(folder_);
         if (stays && Socket::Clock::now() < client.deadline())
             staying.push_back(std::move(client));
@@ -77,6 +79,8 @@ void QuoteServer::acceptClients()
 /// @return false when nobody stands in line.
 bool QuoteServer::acceptClient()
 {
+    // Without a free descriptor nobody can be accepted, and the listener would stay ready for ever. So the oldest
+    // client goes, and the next turn of the loop has its descriptor.
     Socket* accepted = nullptr;
     const bool isThere = listener_.acceptConnection(&accepted) == 0;
     if (isThere)

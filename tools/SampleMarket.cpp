@@ -14,6 +14,8 @@
 
 namespace {
 
+// The sample is a small story: each random walk has a seed of its own, so that a change to one company leaves the
+// prices of all others as they are. Days are places in the list of weekdays, so that the story moves with its last day.
 constexpr int kWeeks = 261; // of five years
 constexpr double kDaysInYear = 261;
 
@@ -90,6 +92,7 @@ double rounded(double value, double unitsOfOne)
 /// What all companies have in common on a day: a steady rise, but for one slump and its recovery.
 double worldDrift(std::size_t day)
 {
+    // Days of the sample. The recovery makes up for the slump and a little more.
     constexpr std::size_t kSlump = 430;
     constexpr std::size_t kTurn = 475;
     constexpr std::size_t kRecovered = 610;
@@ -116,6 +119,7 @@ void addRates(Currency* currency, const CurrencyPlan& plan, std::uint64_t seed, 
     double rate = plan.rate;
     for (const Date& day : days) {
         new CurrencyQuote(currency, day, static_cast<float>(rounded(rate, kRateUnits)));
+        // The walk itself is not rounded, or small moves would be lost. The pull keeps a rate near to what people know.
         rate += kPull * (plan.rate - rate) + plan.volatility * rate * noise.next();
     }
 }
@@ -181,11 +185,14 @@ std::vector<Date> sampleDays(const Date& last)
 
 void fillSampleMarket(Catalogue& catalogue, const std::vector<Date>& days)
 {
+    // Counts through currencies and companies alike. So a new currency would change all prices, and with them what the
+    // sample's trades come to; a new company goes to the end of its table.
     std::uint64_t seed = 1000;
     for (const CurrencyPlan& plan : kCurrencies) {
         Currency* reference = catalogue.getReferenceCurrency();
         auto* currency = new Currency(plan.name, plan.symbol, reference);
         catalogue.addCurrency(currency);
+        // Of the first one: it is its own reference, and those behind it are made with it.
         if (reference == nullptr)
             catalogue.setReferenceCurrency(currency);
         addRates(currency, plan, ++seed, days);
@@ -194,6 +201,7 @@ void fillSampleMarket(Catalogue& catalogue, const std::vector<Date>& days)
         auto* market = new Market(plan.name);
         market->setCurrency(catalogue.getCurrencyByRepresentation(plan.symbol));
     }
+    // All companies see the same world, each as far as its beta goes.
     const std::vector<double> world = worldReturns(days.size());
     for (const SampleCompany& plan : kCompanies) {
         auto* company = new Company(findMarket(catalogue, plan.market), plan.name, plan.ticker);

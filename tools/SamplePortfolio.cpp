@@ -75,6 +75,8 @@ constexpr struct TradePlan {
     {1271, kNewYork, "AMOE", 4000}, {1288, kParis, "CHLV", 4500},   {1296, kNewYork, "ZPHR", 3000},
 };
 
+/// Carries out the plans, each kind in the order of its table. Deposits and transfers may come before the trades that
+/// they pay for are made: the accounts sort their operations by day, and no balance is kept here.
 class Portfolio {
 public:
     Portfolio(Wallet& wallet, const Catalogue& catalogue, const std::vector<Date>& days)
@@ -113,6 +115,8 @@ public:
         const bool buy = plan.amount > 0;
         const int quantity =
             buy ? static_cast<int>(static_cast<double>(plan.amount) / quote) : holding.quantity * -plan.amount / 100;
+        // What is held is known here only: quantities are computed from the operations, which would take a valuation
+        // each.
         holding.quantity += buy ? quantity : -quantity;
         const float cost = buy ? wallet_.getBuyCost() : wallet_.getSellCost();
         auto* trade = new ShareOperation(day, holding.share, buy, quantity, quote, false, cost);
@@ -135,6 +139,7 @@ private:
     Holding& find(const char* ticker)
     {
         Holding& holding = holdings_[ticker];
+        // A place that was just made has no company; afterwards each ticker has one holding in the wallet.
         if (holding.company != nullptr)
             return holding;
         holding.company = findCompany(catalogue_, ticker);

@@ -20,10 +20,13 @@ constexpr int kDays = 100;
 float nextPrice(float former, double volatility, std::uint64_t seed, const Date& day)
 {
     constexpr double kCents = 100;
+    // The move depends on the day and the company only, and not on how many moves were made before: tables that are
+    // written later move likewise on the same days.
     const int number = day - Date(1, 1, 2000);
     Noise noise(seed << 32 ^ static_cast<std::uint32_t>(number));
     const double move = noise.next() * volatility;
     const double price = std::round(static_cast<double>(former) * (1 + move) * kCents) / kCents;
+    // A price that stands still would be no news, and one of 0 no price.
     if (price <= 0 || static_cast<float>(price) == former)
         return static_cast<float>(static_cast<double>(former) + 1 / kCents);
     return static_cast<float>(price);
@@ -42,6 +45,8 @@ std::string tableOf(const Company& company, const SampleCompany& plan, std::uint
     std::string table = "Date,Close\n";
     Date day = last;
     day.moveBy(-kDays);
+    // The walk begins with the price before the first day. A company without quotes begins where the sample began; so
+    // does one whose line has run below 0.
     float price = company.getRealQuote(day);
     if (!(price > 0))
         price = static_cast<float>(plan.price);
@@ -67,6 +72,7 @@ void writeSampleQuotes(const std::filesystem::path& folder, const Catalogue& cat
         throw std::runtime_error(folder.string() + ": cannot be made: " + error.message());
     std::uint64_t seed = 0;
     for (const SampleCompany& plan : sampleCompanies()) {
+        // Also for a company that is not there, so that the others keep theirs.
         ++seed;
         const Company* company = findCompany(catalogue, plan.ticker);
         if (company == nullptr)

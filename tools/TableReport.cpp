@@ -64,6 +64,8 @@ void takeTransfers(const Account& account, std::vector<AutomaticLine>* lines)
     }
 }
 
+/// Writes each part as text. What cannot be told, because there is no reference currency or none of an amount's symbol,
+/// is an empty cell; a part without rows is left out with its headings.
 class Report {
 public:
     explicit Report(const Valuation& valuation)
@@ -100,6 +102,7 @@ private:
             table.addRow({"Profit", amountText(totals.profit), referenceSymbol_});
             table.addRow({"Annual Revenu", amountText(totals.annualRevenue * 100.0), "%"});
         }
+        // The state gives a day after all others where there is no operation.
         const Date first = valuation_.state().getFirstOperationDate();
         table.addRow({"First operation", first == State::afterAllOperations() ? "none" : dateText(first), ""});
         return table.toString();
@@ -178,6 +181,7 @@ private:
         return table.isEmpty() ? "" : '\n' + table.toString();
     }
 
+    /// An empty heading stands above a column that has nothing in it.
     std::string valueHeading() const { return reference_ != nullptr ? "Value in " + referenceSymbol_ : std::string(); }
 
     const Valuation& valuation_;

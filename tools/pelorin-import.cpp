@@ -73,10 +73,13 @@ void run(const CLI::App& app, Arguments& arguments)
     if (!arguments.ratesAre.empty())
         arguments.import.ratesAreUnits = arguments.ratesAre == kUnits;
     const auto existing = arguments.force ? AtomicFile::Existing::kReplace : AtomicFile::Existing::kKeep;
+    // Before anything is read: the tables may take minutes, and the writing would fail only then.
     AtomicFile::check(arguments.output, existing);
 
     Catalogue catalogue;
     Importer importer(arguments.import, catalogue, std::cerr);
+    // In this order whatever that of the options: listings say where the tickers of the quotes belong, and currencies
+    // stand in the file in the order of their first mention.
     for (const std::string& path : arguments.listings)
         importer.addListing(path);
     for (const std::string& path : arguments.rates)

@@ -65,6 +65,7 @@ void listenOn(Socket& server, const Arguments& arguments)
 void run(const Arguments& arguments)
 {
     const QuoteFolder folder(arguments.folder, std::cerr);
+    // Before the address is told: whoever reads it may send a signal at once.
     const Descriptor stop = stopSignals();
     Socket server;
     listenOn(server, arguments);

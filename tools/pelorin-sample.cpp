@@ -109,6 +109,7 @@ void run(const Arguments& arguments)
     const std::filesystem::path folder = dataFolder(arguments);
     const std::filesystem::path market = folder / "Companies" / "Sample";
     const std::filesystem::path portfolio = folder / "PortoFolios" / "Sample";
+    // Each file by itself: an owner who has removed one of them gets it back, and keeps the other as it is.
     const bool isMarketNew = writeSample(market, catalogue, last);
     const bool isPortfolioNew = writeSample(portfolio, wallet, last);
     if (!arguments.quiet && (!arguments.onlyNews || isMarketNew || isPortfolioNew)) {

@@ -52,6 +52,7 @@ void describe(CLI::App& app, Arguments& arguments)
 
 void checkOutput()
 {
+    // A report on a full disk is no report, so that a script must be told.
     if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0)
         throw std::runtime_error(std::string("standard output: ") + std::strerror(errno));
 }
