@@ -49,8 +49,8 @@ public:
     std::span<Market* const> markets() const { return markets_.all(); }
 
 private:
-    friend class AccountsToCurrency;
-    friend class MarketsToCurrency;
+    friend struct AccountsToCurrency;
+    friend struct MarketsToCurrency;
     int readMarkets(FILE* file);
 
     String name_;

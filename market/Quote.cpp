@@ -27,15 +27,3 @@ void Quote::decode(const unsigned char* bytes)
     date_.decode(bytes);
     value_ = decodeFloat(bytes + Date::kFileSize);
 }
-
-void Quote::setDate(const Date& date)
-{
-    date_ = date;
-    notifyChange();
-}
-
-void Quote::setValue(float value)
-{
-    value_ = value;
-    notifyChange();
-}

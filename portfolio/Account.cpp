@@ -40,8 +40,8 @@ Account::~Account()
 
 int Account::wrt(FILE* file) const
 {
-    name_.wrt(file);
     // The wallet has written the currency's name in front of this: a reader needs it before the account is made.
+    name_.wrt(file);
     fwritechar(file, defaultTransfer_ ? 'Y' : 'N');
     fwriteint(file, static_cast<int>(getNbrOperations()));
     for (const Operation* operation : operations()) {

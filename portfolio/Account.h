@@ -81,9 +81,9 @@ public:
     Account* getAccountByName(const String& name) const;
 
 private:
-    friend class AccountStatesToAccount;
-    friend class OperationsToAccount;
-    friend class TransferOperationsToAccount;
+    friend struct AccountStatesToAccount;
+    friend struct OperationsToAccount;
+    friend struct TransferOperationsToAccount;
     friend class CurrencyToAccounts;
     friend class WalletToAccounts;
 

@@ -68,8 +68,8 @@ public:
     void removeAutomaticShareOperations();
 
 private:
-    friend class ShareOperationsToShare;
-    friend class ShareStatesToShare;
+    friend struct ShareOperationsToShare;
+    friend struct ShareStatesToShare;
     friend class CompanyToShares;
     friend class WalletToShares;
 

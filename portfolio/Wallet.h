@@ -124,9 +124,9 @@ public:
     void setReinvestRate(float rate) { parameters_[kReinvestRate] = rate; }
 
 private:
-    friend class AccountsToWallet;
-    friend class SharesToWallet;
-    friend class StatesToWallet;
+    friend struct AccountsToWallet;
+    friend struct SharesToWallet;
+    friend struct StatesToWallet;
     int readShares(FILE* file);
     int readAccounts(FILE* file);
     void readParameters(FILE* file);
