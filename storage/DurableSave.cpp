@@ -17,18 +17,13 @@ namespace {
 /// A file that grows past the user's limit is to be a failed write, not the end of the program.
 class SizeSignalIgnored {
 public:
-    SizeSignalIgnored()
-    {
-        struct sigaction ignore {};
-        ignore.sa_handler = SIG_IGN;
-        sigaction(SIGXFSZ, &ignore, &former_);
-    }
-    ~SizeSignalIgnored() { sigaction(SIGXFSZ, &former_, nullptr); }
+    SizeSignalIgnored() = default;
+    ~SizeSignalIgnored() { std::signal(SIGXFSZ, former_); }
     SizeSignalIgnored(const SizeSignalIgnored&) = delete;
     SizeSignalIgnored& operator=(const SizeSignalIgnored&) = delete;
 
 private:
-    struct sigaction former_ {};
+    void (*former_)(int) = std::signal(SIGXFSZ, SIG_IGN);
 };
 
 [[noreturn]] void failWriting(const std::string& path)

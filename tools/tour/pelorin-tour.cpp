@@ -65,7 +65,7 @@ void inNewWindow(const DataFolder& folder, const std::string& pictures, const st
     handle_pending_messages();
     TourHand hand(*window, pictures);
     tour(hand);
-    // The next tour has a window of its own, and would be in the way of this one.
+    // It stays the application's. The next tour has a window of its own.
     window->Hide();
 }
 
