@@ -1,10 +1,11 @@
 #include "market/Catalogue.h"
 
-#include "foundation/FieldIO.h"
 #include "market/Currency.h"
 #include "market/Market.h"
+#include "market/RecordList.h"
 
 #include <algorithm>
+#include <memory>
 
 namespace {
 
@@ -15,6 +16,8 @@ constexpr int kMostReferences = 100;
 void expressIn(const Currency& newReference, const Currency& currency)
 {
     // Dividing by 1 would change nothing but mark the trend as out of date.
+    // Each rate goes by the new reference's rate of the same day. The value changes in place: no day does, so that the
+    // series keeps its order.
     for (CurrencyQuote* quote : currency.quotes())
         if (const double rate = newReference.getRealQuote(quote->getDate()); rate != 1)
             quote->setValue(static_cast<float>(quote->getValue() / rate));
@@ -22,37 +25,33 @@ void expressIn(const Currency& newReference, const Currency& currency)
 
 } // namespace
 
-Catalogue::Catalogue() = default;
-
-Catalogue::~Catalogue()
-{
-    clear();
-}
-
 int Catalogue::rd(FILE* file)
 {
     String reference;
     if (reference.rd(file) != 0)
         return -1;
+    // A file without a reference has the undefined name here, and none of its currencies becomes the reference. One
+    // that the catalogue has from before stays.
     int references = 0;
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing) {
-        auto currency = std::make_unique<Currency>();
-        const int result = currency->rd(file, nullptr);
-        // A currency cut short stays for the sake of what is whole in it.
-        if (result != 0 && currency->getNbrMarkets() + currency->getNbrQuotes() == 0)
-            return -1;
-        // From here on the catalogue owns the currency, whatever happens to the rest of the file.
-        Currency* added = currency.release();
-        addCurrency(added);
-        const bool isReference = !reference.isUndefined() && added->getRepresentation() == reference;
-        // The first one becomes the reference of what was read before it; a further one divides all of that anew.
-        if (isReference && references++ < kMostReferences)
-            rebaseOn(added);
-        if (result != 0 || references > kMostReferences)
-            return -1;
-    }
-    return reachedEnd(file) ? -1 : 0;
+    return readRecords(file, [&] { return readCurrency(file, reference, &references); });
+}
+
+/// Reads one currency of a file whose reference has the symbol `reference`; `*references` counts those that have it.
+int Catalogue::readCurrency(FILE* file, const String& reference, int* references)
+{
+    auto currency = std::make_unique<Currency>();
+    const int result = currency->rd(file, nullptr);
+    // A currency cut short stays for the sake of what is whole in it.
+    if (result != 0 && currency->getNbrMarkets() + currency->getNbrQuotes() == 0)
+        return -1;
+    // From here on the catalogue owns the currency, whatever happens to the rest of the file.
+    Currency* added = currency.release();
+    addCurrency(added);
+    const bool isReference = !reference.isUndefined() && added->getRepresentation() == reference;
+    // The first one becomes the reference of what was read before it; a further one divides all of that anew.
+    if (isReference && (*references)++ < kMostReferences)
+        rebaseOn(added);
+    return *references > kMostReferences ? -1 : result;
 }
 
 int Catalogue::wrt(FILE* file, const Date& stamp) const
@@ -60,21 +59,13 @@ int Catalogue::wrt(FILE* file, const Date& stamp) const
     // Without a reference the undefined name is written; a reader then sets none.
     const String reference = reference_ != nullptr ? reference_->getRepresentation() : String();
     reference.wrt(file);
-    fwriteint(file, static_cast<int>(currencies_.size()));
-    for (const Currency* currency : currencies_)
-        if (currency->wrt(file, stamp) != 0)
-            return -1;
-    return std::ferror(file) == 0 ? 0 : -1;
-}
-
-void Catalogue::addCurrency(Currency* currency)
-{
-    currencies_.push_back(currency);
+    // The records look at their own writes only; what a full buffer has failed to write is remembered by the file.
+    return writeRecords(file, currencies_, stamp) == 0 && std::ferror(file) == 0 ? 0 : -1;
 }
 
 void Catalogue::removeCurrency(Currency* currency)
 {
-    const auto place = std::find(currencies_.begin(), currencies_.end(), currency);
+    const auto place = std::ranges::find(currencies_, currency);
     if (place == currencies_.end())
         return;
     // The last currency fills the gap; the list holds `currency` no more, though others may still refer to it.
@@ -111,17 +102,11 @@ void Catalogue::clear()
     reference_ = nullptr;
 }
 
-unsigned Catalogue::getNbrCurrencies() const
-{
-    return static_cast<unsigned>(currencies_.size());
-}
-
 Currency* Catalogue::getCurrencyByRepresentation(const String& representation) const
 {
-    for (Currency* currency : currencies_)
-        if (currency->getRepresentation() == representation)
-            return currency;
-    return nullptr;
+    // A symbol without text equals no other, so that it finds nothing.
+    const auto found = std::ranges::find(currencies_, representation, &Currency::getRepresentation);
+    return found != currencies_.end() ? *found : nullptr;
 }
 
 std::vector<Market*> Catalogue::getMarkets() const

@@ -4,7 +4,6 @@
 #include "foundation/String.h"
 
 #include <cstdio>
-#include <memory>
 #include <vector>
 
 class Currency;
@@ -16,8 +15,8 @@ class Market;
 /// Owns the currencies.
 class Catalogue {
 public:
-    Catalogue();
-    ~Catalogue();
+    Catalogue() = default;
+    ~Catalogue() { clear(); }
     Catalogue(const Catalogue&) = delete;
     Catalogue& operator=(const Catalogue&) = delete;
 
@@ -29,7 +28,7 @@ public:
     int wrt(FILE* file, const Date& stamp) const;
 
     /// Takes ownership of `currency`.
-    void addCurrency(Currency* currency);
+    void addCurrency(Currency* currency) { currencies_.push_back(currency); }
     /// Takes `currency` out and gives it back to the caller; the last currency moves into its place. When it was the
     /// reference, the currency then first becomes that, by `rebaseOn`. No other currency goes on storing it as its own
     /// reference.
@@ -39,7 +38,7 @@ public:
     void dropLastCurrency();
     /// Destroys all currencies; there is no reference any more.
     void clear();
-    unsigned getNbrCurrencies() const;
+    unsigned getNbrCurrencies() const { return static_cast<unsigned>(currencies_.size()); }
     /// The list itself, in order of addition; valid until the next change.
     const std::vector<Currency*>& getCurrencies() const { return currencies_; }
     /// The first currency with this symbol, null when there is none.
@@ -56,6 +55,8 @@ public:
     void rebaseOn(Currency* newReference);
 
 private:
+    int readCurrency(FILE* file, const String& reference, int* references);
+
     std::vector<Currency*> currencies_; // owned
     Currency* reference_ = nullptr;     // one of them
 };

@@ -1,9 +1,9 @@
 #include "market/Company.h"
 
-#include "foundation/FieldIO.h"
 #include "market/CompanyEvent.h"
 #include "market/Market.h"
 #include "market/NoteCompanyEvent.h"
+#include "market/RecordList.h"
 #include "market/SplitCompanyEvent.h"
 
 #include <memory>
@@ -22,6 +22,7 @@ std::unique_ptr<CompanyEvent> makeEvent(unsigned short type)
 
 } // namespace
 
+// The lists only keep the address of the company, so it does not matter that it is not whole yet.
 Company::Company() : QuoteSeries(this), shares_(this), events_(this) {}
 
 Company::Company(Market* market, const String& name, const String& abbreviation) : Company()
@@ -43,6 +44,7 @@ Company::~Company()
 
 int Company::wrt(FILE* file) const
 {
+    // The quotes come before the events: a file that was cut short loses the events first.
     name_.wrt(file);
     abbreviation_.wrt(file);
     return writeQuotes(file) == 0 ? writeEvents(file) : -1;
@@ -69,18 +71,17 @@ int Company::rd(FILE* file)
 
 int Company::readEvents(FILE* file)
 {
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing) {
+    return readRecords(file, [&] {
         std::unique_ptr<CompanyEvent> event = makeEvent(freadshort(file));
         // Intended: the record behind an unknown type has no known length, so reading goes on right after the type.
         if (event == nullptr)
-            continue;
+            return 0;
         if (event->rd(file) != 0)
             return -1;
         // Only an event that was read whole is linked; the company owns it from here on.
         event.release()->setCompany(this);
-    }
-    return reachedEnd(file) ? -1 : 0;
+        return 0;
+    });
 }
 
 const String& Company::getCurrencyRepresentation() const
@@ -91,5 +92,6 @@ const String& Company::getCurrencyRepresentation() const
 
 int Company::setMarket(Market* market)
 {
+    // The former market's list lets go first. Whoever owned the company through it does so no more.
     return market_.set(this, market);
 }

@@ -59,8 +59,8 @@ public:
     int setInternetLastThreeMonthsQuote();
 
 private:
-    friend class CompanyEventsToCompany;
-    friend class SharesToCompany;
+    friend struct CompanyEventsToCompany;
+    friend struct SharesToCompany;
     friend class MarketToCompanies;
 
     String name_;

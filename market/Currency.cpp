@@ -1,7 +1,7 @@
 #include "market/Currency.h"
 
-#include "foundation/FieldIO.h"
 #include "market/Market.h"
+#include "market/RecordList.h"
 
 #include <memory>
 
@@ -22,32 +22,20 @@ Currency::~Currency()
     markets_.deleteAll();
 }
 
-int Currency::wrt(FILE*) const
-{
-    return -1;
-}
-
-int Currency::rd(FILE*)
-{
-    return -1;
-}
-
 int Currency::wrt(FILE* file, const Date& stamp) const
 {
+    // Only the last line asks whether the writes have come about: a field that fails leaves its mark on the file.
     stamp.wrt(file);
     name_.wrt(file);
     representation_.wrt(file);
-    fwriteint(file, static_cast<int>(getNbrMarkets()));
-    for (const Market* market : markets())
-        if (market->wrt(file) != 0)
-            return -1;
-    return writeQuotes(file) == 0 && std::ferror(file) == 0 ? 0 : -1;
+    return writeRecords(file, markets()) == 0 && writeQuotes(file) == 0 && std::ferror(file) == 0 ? 0 : -1;
 }
 
 int Currency::rd(FILE* file, Date* stamp)
 {
     Date date;
     date.rd(file);
+    // A date that is cut short needs no check of its own, since the name behind it cannot be read then.
     if (stamp != nullptr)
         *stamp = date;
     // The rates come last: a record that ends before them leaves a currency with names and markets.
@@ -58,17 +46,14 @@ int Currency::rd(FILE* file, Date* stamp)
 
 int Currency::readMarkets(FILE* file)
 {
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing) {
+    return readRecords(file, [&] {
         auto market = std::make_unique<Market>();
         const int result = market->rd(file);
         // A market cut short stays for the sake of the companies in it that are whole.
         if (result == 0 || market->getNbrCompanies() > 0)
             market.release()->setCurrency(this);
-        if (result != 0)
-            return -1;
-    }
-    return reachedEnd(file) ? -1 : 0;
+        return result;
+    });
 }
 
 int Currency::setReferenceCurrency(Currency* reference)

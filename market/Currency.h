@@ -18,8 +18,8 @@ public:
     virtual ~Currency();
 
     /// Currencies have dated records only; these two do nothing and return -1.
-    int wrt(FILE* file) const override;
-    int rd(FILE* file) override;
+    int wrt(FILE*) const override { return -1; }
+    int rd(FILE*) override { return -1; }
     /// Writes the record of the currency with its markets and rates. @return 0; -1 when a write failed.
     int wrt(FILE* file, const Date& stamp) const;
     /// Adds the markets and rates of the next record. `*stamp` becomes the date in it; `stamp` may be null.
@@ -51,8 +51,8 @@ public:
     std::span<Market* const> markets() const { return markets_.all(); }
 
 private:
-    friend class AccountsToCurrency;
-    friend class MarketsToCurrency;
+    friend struct AccountsToCurrency;
+    friend struct MarketsToCurrency;
     int readMarkets(FILE* file);
 
     String name_;

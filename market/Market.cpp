@@ -1,9 +1,10 @@
 #include "market/Market.h"
 
-#include "foundation/FieldIO.h"
 #include "market/Company.h"
 #include "market/Currency.h"
+#include "market/RecordList.h"
 
+#include <algorithm>
 #include <memory>
 
 Market::Market() : companies_(this) {}
@@ -22,29 +23,23 @@ Market::~Market()
 
 int Market::wrt(FILE* file) const
 {
+    // The currency is not named: the market's record lies within the currency's.
     name_.wrt(file);
-    fwriteint(file, static_cast<int>(getNbrCompanies()));
-    for (const Company* company : companies())
-        if (company->wrt(file) != 0)
-            return -1;
-    return 0;
+    return writeRecords(file, companies());
 }
 
 int Market::rd(FILE* file)
 {
     if (name_.rd(file) != 0)
         return -1;
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing) {
+    return readRecords(file, [&] {
         auto company = std::make_unique<Company>();
         const int result = company->rd(file);
         // A company cut short stays for the sake of what is whole in it.
         if (result == 0 || company->getNbrQuotes() + company->getNbrEvents() > 0)
             company.release()->setMarket(this);
-        if (result != 0)
-            return -1;
-    }
-    return reachedEnd(file) ? -1 : 0;
+        return result;
+    });
 }
 
 const String& Market::getCurrencyRepresentation() const
@@ -56,13 +51,10 @@ const String& Market::getCurrencyRepresentation() const
 int Market::getCompany(const String& abbreviation, Company** out) const
 {
     // Several companies may have one ticker: the first one counts, in the order of the list.
-    for (Company* company : companies())
-        if (company->getAbbreviation() == abbreviation) {
-            *out = company;
-            return 0;
-        }
-    *out = nullptr;
-    return -1;
+    const auto all = companies();
+    const auto found = std::ranges::find(all, abbreviation, &Company::getAbbreviation);
+    *out = found != all.end() ? *found : nullptr;
+    return *out != nullptr ? 0 : -1;
 }
 
 int Market::setCurrency(Currency* currency)

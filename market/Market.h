@@ -41,7 +41,7 @@ public:
     int setInternetLastThreeMonthsQuote(Company* company) const;
 
 private:
-    friend class CompaniesToMarket;
+    friend struct CompaniesToMarket;
     friend class CurrencyToMarkets;
 
     String name_;

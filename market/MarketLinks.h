@@ -22,8 +22,7 @@ public:
 };
 
 /// The company's link to its market.
-class CompaniesToMarket final : public ManyToOneAssociation<CompaniesToMarket, Company, Market> {
-public:
+struct CompaniesToMarket final : ManyToOneAssociation<CompaniesToMarket, Company, Market> {
     static auto& list(auto& market) { return market.companies_; }
 };
 
@@ -35,8 +34,7 @@ public:
 };
 
 /// The event's link to its company.
-class CompanyEventsToCompany final : public ManyToOneAssociation<CompanyEventsToCompany, CompanyEvent, Company> {
-public:
+struct CompanyEventsToCompany final : ManyToOneAssociation<CompanyEventsToCompany, CompanyEvent, Company> {
     static auto& list(auto& company) { return company.events_; }
 };
 
@@ -49,8 +47,7 @@ public:
 };
 
 /// The quote's link to its company.
-class QuotesToCompany final : public ManyToOneAssociation<QuotesToCompany, CompanyQuote, Company, true> {
-public:
+struct QuotesToCompany final : ManyToOneAssociation<QuotesToCompany, CompanyQuote, Company, true> {
     // By way of the series, where a quote of the same day is replaced and the trend follows.
     static int enter(auto& company, CompanyQuote* quote) { return company.addQuote(quote); }
     static int leave(auto& company, CompanyQuote* quote) { return company.removeQuote(quote); }
@@ -66,8 +63,7 @@ public:
 };
 
 /// The holding's link to its company.
-class SharesToCompany final : public ManyToOneAssociation<SharesToCompany, Share, Company> {
-public:
+struct SharesToCompany final : ManyToOneAssociation<SharesToCompany, Share, Company> {
     static auto& list(auto& company) { return company.shares_; }
 };
 
@@ -81,8 +77,7 @@ public:
 };
 
 /// The account's link to its currency.
-class AccountsToCurrency final : public ManyToOneAssociation<AccountsToCurrency, Account, Currency> {
-public:
+struct AccountsToCurrency final : ManyToOneAssociation<AccountsToCurrency, Account, Currency> {
     static auto& list(auto& currency) { return currency.accounts_; }
 };
 
@@ -94,8 +89,7 @@ public:
 };
 
 /// The market's link to its currency.
-class MarketsToCurrency final : public ManyToOneAssociation<MarketsToCurrency, Market, Currency> {
-public:
+struct MarketsToCurrency final : ManyToOneAssociation<MarketsToCurrency, Market, Currency> {
     static auto& list(auto& currency) { return currency.markets_; }
 };
 
@@ -108,8 +102,7 @@ public:
 };
 
 /// The rate's link to its currency.
-class QuotesToCurrency final : public ManyToOneAssociation<QuotesToCurrency, CurrencyQuote, Currency, true> {
-public:
+struct QuotesToCurrency final : ManyToOneAssociation<QuotesToCurrency, CurrencyQuote, Currency, true> {
     // By way of the series, where a quote of the same day is replaced and the trend follows.
     static int enter(auto& currency, CurrencyQuote* quote) { return currency.addQuote(quote); }
     static int leave(auto& currency, CurrencyQuote* quote) { return currency.removeQuote(quote); }

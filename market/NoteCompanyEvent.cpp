@@ -13,6 +13,8 @@ int NoteCompanyEvent::wrt(FILE* file) const
 
 int NoteCompanyEvent::rd(FILE* file)
 {
+    // An event is read before it is linked: setting its date moves it in no list yet. A date that is cut short shows
+    // when the title cannot be read.
     Date date;
     date.rd(file);
     setDate(date);

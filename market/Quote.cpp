@@ -4,6 +4,7 @@
 
 int Quote::wrt(FILE* file) const
 {
+    // In one piece: files have millions of these records.
     unsigned char bytes[kFileSize];
     encode(bytes);
     return std::fwrite(bytes, sizeof bytes, 1, file) == 1 ? 0 : -1;
@@ -30,16 +31,4 @@ void Quote::encode(unsigned char* bytes) const
 {
     getDate().encode(bytes);
     encodeFloat(bytes + Date::kFileSize, value_);
-}
-
-void Quote::setDate(const Date& date)
-{
-    date_ = date;
-    notifyChange();
-}
-
-void Quote::setValue(float value)
-{
-    value_ = value;
-    notifyChange();
 }

@@ -23,9 +23,17 @@ public:
     Date getDate() const { return date_.date(); }
     /// The same, to compare.
     const PackedDate& getPackedDate() const { return date_; }
-    void setDate(const Date& date);
+    void setDate(const Date& date)
+    {
+        date_ = date;
+        notifyChange();
+    }
     float getValue() const { return value_; }
-    void setValue(float value);
+    void setValue(float value)
+    {
+        value_ = value;
+        notifyChange();
+    }
     unsigned getVolume() const { return volume_; }
     void setVolume(unsigned volume) { volume_ = volume; }
 

@@ -1,10 +1,9 @@
 #pragma once
 
-#include "foundation/FieldIO.h"
 #include "foundation/PackedDate.h"
+#include "market/RecordList.h"
 
 #include <algorithm>
-#include <cmath>
 #include <cstdint>
 #include <span>
 #include <string>
@@ -70,7 +69,7 @@ public:
     /// and the last quote. A single quote holds for ever; without quotes 0.
     ///
     /// Between two quotes the value is a step, not a slope. Intended: a portfolio is worth the last known price.
-    float getRealQuote(const Date& d) const;
+    float getRealQuote(const Date& d) const { return realQuote(d, firstOnOrAfter(d)); }
 
     /// Gives the real quotes of one day after the other, and searches only for a day that goes back.
     class Walk {
@@ -104,10 +103,22 @@ public:
     Date getFirstQuote() const { return quotes_.getNbr() > 0 ? quotes_.at(0)->getDate() : Date(); }
     Date getLastQuote() const { return quotes_.getNbr() > 0 ? quotes_.at(quotes_.getNbr() - 1)->getDate() : Date(); }
     /// Date of the latest quote on or before `d`; the undefined date when there is none.
-    Date getLastQuoteUpTo(const Date& d) const;
+    Date getLastQuoteUpTo(const Date& d) const
+    {
+        if (findQuote(d) != nullptr)
+            return d;
+        const std::size_t next = firstOnOrAfter(d);
+        return next > 0 ? quotes()[next - 1]->getDate() : Date();
+    }
     /// Largest and smallest value; 0 without quotes.
-    float getHighestQuote() const;
-    float getLowestQuote() const;
+    float getHighestQuote() const
+    {
+        return getNbrQuotes() > 0 ? (*std::ranges::max_element(quotes(), {}, &SeriesQuote::getValue))->getValue() : 0;
+    }
+    float getLowestQuote() const
+    {
+        return getNbrQuotes() > 0 ? (*std::ranges::min_element(quotes(), {}, &SeriesQuote::getValue))->getValue() : 0;
+    }
 
     /// Another number after every change of the quotes, their days or their values, and never that of another series,
     /// be it gone or of another kind: who has seen this number before has seen these quotes.
@@ -137,7 +148,7 @@ protected:
 
     void deleteQuotes() { quotes_.deleteAll(); }
     /// File: count (i32), then the quotes by date. @return 0; -1 when a write failed.
-    int writeQuotes(FILE* file) const;
+    int writeQuotes(FILE* file) const { return writeRecords(file, quotes()); }
     /// Reads a count and as many quotes as there are up to it. @return 0; -1 when the file ended before the last.
     int readQuotes(FILE* file);
 
@@ -148,10 +159,44 @@ private:
         std::uint32_t turn;
     };
 
-    SeriesQuote* findQuote(const Date& d) const;
-    std::size_t firstOnOrAfter(const PackedDate& day) const;
-    float realQuote(const PackedDate& day, std::size_t next) const;
-    float lineValue(const Date& d, bool isBefore) const;
+    SeriesQuote* findQuote(const Date& d) const
+    {
+        const PackedDate day = d;
+        const std::size_t next = firstOnOrAfter(day);
+        return next < getNbrQuotes() && quotes()[next]->getPackedDate() == day ? quotes()[next] : nullptr;
+    }
+    std::size_t firstOnOrAfter(const PackedDate& day) const
+    {
+        const auto all = quotes();
+        // Most often asked for: the place of a new quote, or a day after the last one.
+        if (all.empty() || all.back()->getPackedDate() < day)
+            return all.size();
+        const auto isBefore = [&day](const SeriesQuote* q) { return q->getPackedDate() < day; };
+        return static_cast<std::size_t>(std::ranges::partition_point(all, isBefore) - all.begin());
+    }
+    /// `next` is `firstOnOrAfter(day)`.
+    float realQuote(const PackedDate& day, std::size_t next) const
+    {
+        const auto all = quotes();
+        if (next == all.size())
+            return all.empty() ? 0 : lineValue(day.date(), false);
+        if (all[next]->getPackedDate() == day)
+            return all[next]->getValue();
+        return next > 0 ? all[next - 1]->getValue() : lineValue(day.date(), true);
+    }
+    /// The value of day `d`, before the first quote or behind the last one, on the straight line through both.
+    float lineValue(const Date& d, bool isBefore) const
+    {
+        const SeriesQuote& first = *quotes().front();
+        const SeriesQuote& last = *quotes().back();
+        const int span = last.getDate() - first.getDate();
+        if (getNbrQuotes() == 1 || span == 0) // quotes of one and the same day have no direction
+            return isBefore ? first.getValue() : last.getValue();
+        const double rise = static_cast<double>(last.getValue()) - first.getValue();
+        if (isBefore)
+            return static_cast<float>(first.getValue() - static_cast<double>(first.getDate() - d) / span * rise);
+        return static_cast<float>(last.getValue() + static_cast<double>(d - last.getDate()) / span * rise);
+    }
     void fitTrend() const;
     void replaceWith(std::vector<LateQuote>& late);
 
@@ -161,86 +206,6 @@ private:
     mutable bool trendIsStale_ = false;
     std::uint64_t revision_ = nextRevision();
 };
-
-template <class Owner, class SeriesQuote, class ManyEnd>
-std::size_t QuoteSeries<Owner, SeriesQuote, ManyEnd>::firstOnOrAfter(const PackedDate& day) const
-{
-    const auto all = quotes();
-    if (all.empty() || all.back()->getPackedDate() < day) // most often asked: a new quote, or a day after the last one
-        return all.size();
-    const auto isBefore = [&day](const SeriesQuote* q) { return q->getPackedDate() < day; };
-    return static_cast<std::size_t>(std::ranges::partition_point(all, isBefore) - all.begin());
-}
-
-template <class Owner, class SeriesQuote, class ManyEnd>
-Date QuoteSeries<Owner, SeriesQuote, ManyEnd>::getLastQuoteUpTo(const Date& d) const
-{
-    if (findQuote(d) != nullptr)
-        return d;
-    const std::size_t next = firstOnOrAfter(d);
-    return next > 0 ? quotes()[next - 1]->getDate() : Date();
-}
-
-template <class Owner, class SeriesQuote, class ManyEnd>
-SeriesQuote* QuoteSeries<Owner, SeriesQuote, ManyEnd>::findQuote(const Date& d) const
-{
-    const PackedDate day = d;
-    const std::size_t next = firstOnOrAfter(day);
-    return next < getNbrQuotes() && quotes()[next]->getPackedDate() == day ? quotes()[next] : nullptr;
-}
-
-template <class Owner, class SeriesQuote, class ManyEnd>
-float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getRealQuote(const Date& d) const
-{
-    return realQuote(d, firstOnOrAfter(d));
-}
-
-/// `next` is `firstOnOrAfter(day)`.
-template <class Owner, class SeriesQuote, class ManyEnd>
-float QuoteSeries<Owner, SeriesQuote, ManyEnd>::realQuote(const PackedDate& day, std::size_t next) const
-{
-    const auto all = quotes();
-    if (next == all.size())
-        return all.empty() ? 0 : lineValue(day.date(), false);
-    if (all[next]->getPackedDate() == day)
-        return all[next]->getValue();
-    return next > 0 ? all[next - 1]->getValue() : lineValue(day.date(), true);
-}
-
-/// The value of day `d`, before the first quote or behind the last one, on the straight line through both.
-template <class Owner, class SeriesQuote, class ManyEnd>
-float QuoteSeries<Owner, SeriesQuote, ManyEnd>::lineValue(const Date& d, bool isBefore) const
-{
-    const SeriesQuote& first = *quotes().front();
-    const SeriesQuote& last = *quotes().back();
-    const int span = last.getDate() - first.getDate();
-    if (getNbrQuotes() == 1 || span == 0) // quotes of one and the same day have no direction
-        return isBefore ? first.getValue() : last.getValue();
-    const double rise = static_cast<double>(last.getValue()) - first.getValue();
-    if (isBefore)
-        return static_cast<float>(first.getValue() - static_cast<double>(first.getDate() - d) / span * rise);
-    return static_cast<float>(last.getValue() + static_cast<double>(d - last.getDate()) / span * rise);
-}
-
-template <class Owner, class SeriesQuote, class ManyEnd>
-float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getHighestQuote() const
-{
-    float highest = getNbrQuotes() > 0 ? getQuote(0)->getValue() : 0;
-    for (const SeriesQuote* quote : quotes())
-        if (quote->getValue() > highest)
-            highest = quote->getValue();
-    return highest;
-}
-
-template <class Owner, class SeriesQuote, class ManyEnd>
-float QuoteSeries<Owner, SeriesQuote, ManyEnd>::getLowestQuote() const
-{
-    float lowest = getNbrQuotes() > 0 ? getQuote(0)->getValue() : 0;
-    for (const SeriesQuote* quote : quotes())
-        if (quote->getValue() < lowest)
-            lowest = quote->getValue();
-    return lowest;
-}
 
 /// Ordinary least squares of value y against day number x, counted from the first quote:
 ///     slope = (mean(xy) - mean(x) mean(y)) / (mean(x^2) - mean(x)^2)
@@ -272,16 +237,6 @@ void QuoteSeries<Owner, SeriesQuote, ManyEnd>::fitTrend() const
         return;
     intercept_ = static_cast<float>((meanY * meanXX - meanX * meanXY) / variance);
     slope_ = static_cast<float>((meanXY - meanX * meanY) / variance);
-}
-
-template <class Owner, class SeriesQuote, class ManyEnd>
-int QuoteSeries<Owner, SeriesQuote, ManyEnd>::writeQuotes(FILE* file) const
-{
-    fwriteint(file, static_cast<int>(getNbrQuotes()));
-    for (const SeriesQuote* quote : quotes())
-        if (quote->wrt(file) != 0)
-            return -1;
-    return 0;
 }
 
 template <class Owner, class SeriesQuote, class ManyEnd>

@@ -9,6 +9,7 @@ SplitCompanyEvent::SplitCompanyEvent(Company* company, const Date& date, short n
 int SplitCompanyEvent::wrt(FILE* file) const
 {
     getDate().wrt(file);
+    // A write that fails leaves its mark on the file, which the currency around all this looks at.
     fwriteshort(file, static_cast<unsigned short>(numerator_));
     fwriteshort(file, static_cast<unsigned short>(divider_));
     return 0;

@@ -23,6 +23,7 @@ Answer search(const std::string& host)
     hostent entry{};
     hostent* found = nullptr;
     int error = 0;
+    // Names and addresses are put into `room`, to which `entry` refers from then on; ERANGE says that they do not fit.
     constexpr std::size_t kUsual = 1024;
     std::vector<char> room(kUsual);
     while (gethostbyname_r(host.c_str(), &entry, room.data(), room.size(), &found, &error) == ERANGE)
@@ -30,6 +31,7 @@ Answer search(const std::string& host)
     if (found == nullptr || found->h_length < 1)
         return {};
     Answer answer{true, std::nullopt};
+    // A host may be known without an address: that is an answer, too, and leaves the caller's as it was.
     if (const char* address = found->h_addr_list[0])
         std::memcpy(&answer.first.emplace(), address,
                     std::min(sizeof(in_addr), static_cast<std::size_t>(found->h_length)));
@@ -40,6 +42,8 @@ Answer search(const std::string& host)
 /// is left to itself when the time is over; it owns all that it touches.
 Answer searchUntil(std::chrono::steady_clock::time_point deadline, const char* host)
 {
+    // The name is copied into the task, and the answer lives in what task and future share: neither end refers to this
+    // call.
     std::packaged_task<Answer()> task([name = std::string(host)] { return search(name); });
     std::future<Answer> answer = task.get_future();
     try {

@@ -17,6 +17,7 @@ constexpr std::size_t kPageLimit = 5000; // characters
 std::string_view takeToken(std::string_view* text)
 {
     constexpr std::string_view kDelimiters = " <sup>/b";
+    // Afterwards `*text` begins with the delimiter behind the token; it is empty when the token may go on.
     text->remove_prefix(std::min(text->find_first_not_of(kDelimiters), text->size()));
     const std::string_view token = text->substr(0, text->find_first_of(kDelimiters));
     text->remove_prefix(token.size());
@@ -51,11 +52,15 @@ Cut cutPrice(std::string_view page, float* price)
     *price = singleOf(takeToken(&rest));
     if (rest.empty())
         return Cut::kNone;
+    // `rest` begins right behind the whole number. With "</b>" there the price is likely to be whole, but "112 <sup>"
+    // may be cut anywhere: its numerator has not come.
     const bool isClosed = beginsWithClosingTag(rest);
     const std::string_view numerator = takeToken(&rest);
     if (numerator.starts_with('t')) // "</td>"
         return Cut::kCertain;
+    // Any two tokens are taken for the fraction; what is no number counts as 0.
     const float denominator = singleOf(takeToken(&rest));
+    // The page ends in or right behind the denominator, of which digits may be missing.
     if (rest.empty())
         return isClosed && singleOf(numerator) == 0 ? Cut::kLikely : Cut::kNone;
     if (denominator != 0)
@@ -88,6 +93,7 @@ int Company::getInternetLastQuote(const String& host, const String& path, float*
     Socket socket;
     if (connectToQuotes(&socket, host) != 0)
         return -1;
+    // The server is there: from here on a failure leaves 0, and not the value of an earlier call.
     *value = 0;
     String request(path);
     request += getAbbreviation();

@@ -18,6 +18,8 @@ std::size_t endOfMarker(std::string_view page, std::string_view marker)
 
 double leadingNumber(std::string_view text)
 {
+    // The program's own locale may have a comma for the mark, and cannot be changed for a moment: other threads would
+    // see that. This one is made once, and kept.
     static const locale_t plain = newlocale(LC_ALL_MASK, "C", nullptr);
     return strtod_l(std::string(text).c_str(), nullptr, plain);
 }

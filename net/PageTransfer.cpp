@@ -6,6 +6,7 @@
 
 int connectToQuotes(Socket* socket, const String& host)
 {
+    // Before it connects, since that counts as a wait, too.
     socket->setTimeLimit(quoteServers().limit);
     return socket->connectToName(host, quoteServers().port);
 }
@@ -21,6 +22,7 @@ int requestPage(Socket* socket, const String& path, const IsEnough& isEnough, Re
     char bytes[256];
     std::size_t known = 0; // characters that were not enough
     while (const std::size_t room = std::min(page->room(), sizeof bytes)) {
+        // Two limits: a server may be silent for one, and send for ten, however often a byte comes.
         const auto deadline = std::min(end, Socket::Clock::now() + quoteServers().limit);
         std::size_t count = 0;
         const int result = socket->receive(bytes, room, deadline, &count);
@@ -35,6 +37,7 @@ int requestPage(Socket* socket, const String& path, const IsEnough& isEnough, Re
             page->endWithClose();
             return 0;
         }
+        // `isEnough` is asked again only when there is more text. Bytes that a zero byte hides make none.
         page->add({bytes, count});
         if (page->text().size() > known && isEnough(page->text()))
             return 0;

@@ -25,84 +25,65 @@ public:
     bool goToNextRow();
 
 private:
-    Outcome readMonth(int* month);
-    Outcome readDay(int* day);
-    Outcome readYear(int* year);
-    Outcome readPrice(float* price);
+    Outcome readInteger(std::string_view ends, int* number);
+    Outcome readPrice(std::size_t yearWidth, float* price);
     Outcome findEnd(std::size_t from, std::string_view ends);
     void skipBlanks() { place_ = firstNotOf(" \r\n\t/", place_); }
     std::string_view field() const { return text_.substr(place_, end_ - place_); }
-    int integer() const { return static_cast<int>(leadingInteger(field())); }
     std::size_t firstNotOf(std::string_view blanks, std::size_t from) const
     {
         return std::min(text_.find_first_not_of(blanks, from), text_.size());
     }
 
+    // At the beginning of a row `place_` is that of the month. When a field has ended a row early, it is where the next
+    // row begins; when there is no end to be found, nobody reads on.
     std::string_view text_;
-    std::size_t place_ = 0;     // of the next field
-    std::size_t end_ = 0;       // of the field that was read last
-    std::size_t yearWidth_ = 0; // with the blanks behind the year
+    std::size_t place_ = 0; // of the next field
+    std::size_t end_ = 0;   // of the field that was read last
 };
 
 /// A row goes up to its price. One that a line feed interrupts is skipped: the next begins right behind that.
 RowReader::Outcome RowReader::readRow(DatedPrice* row)
 {
+    // The only place where a text may end without being an error.
     if (place_ == text_.size())
         return Outcome::kTextEnds;
+    // Each field is read only when those before it have been.
     int month = 0, day = 0, year = 0;
-    Outcome outcome = readMonth(&month);
+    Outcome outcome = readInteger("</ ", &month);
     if (outcome == Outcome::kTaken)
-        outcome = readDay(&day);
+        outcome = readInteger("/", &day);
+    const std::size_t yearPlace = place_;
     if (outcome == Outcome::kTaken)
-        outcome = readYear(&year);
-    if (outcome == Outcome::kTaken)
-        outcome = readPrice(&row->price);
-    if (outcome == Outcome::kTaken)
-        row->date = Date(static_cast<short>(day), static_cast<short>(month), year);
-    return outcome;
+        outcome = readInteger(" /\t", &year);
+    if (outcome != Outcome::kTaken)
+        return outcome;
+    // Behind the year only blanks are passed over: a slash would be the price's own beginning.
+    place_ = firstNotOf(" \t", end_);
+    row->date = Date(static_cast<short>(day), static_cast<short>(month), year);
+    return readPrice(place_ - yearPlace, &row->price);
 }
 
-RowReader::Outcome RowReader::readMonth(int* month)
+/// Takes a number that one of `ends` follows, and goes behind that; '<', where it is one of them, ends the table.
+RowReader::Outcome RowReader::readInteger(std::string_view ends, int* number)
 {
-    const Outcome outcome = findEnd(place_, "</ ");
+    const Outcome outcome = findEnd(place_, ends);
     if (outcome != Outcome::kTaken)
         return outcome;
     if (text_[end_] == '<')
         return Outcome::kTableEnds;
-    *month = integer();
+    *number = static_cast<int>(leadingInteger(field()));
     place_ = end_ + 1;
     return outcome;
 }
 
-RowReader::Outcome RowReader::readDay(int* day)
-{
-    const Outcome outcome = findEnd(place_, "/");
-    if (outcome != Outcome::kTaken)
-        return outcome;
-    *day = integer();
-    place_ = end_ + 1;
-    return outcome;
-}
-
-RowReader::Outcome RowReader::readYear(int* year)
-{
-    const Outcome outcome = findEnd(place_, " /\t");
-    if (outcome != Outcome::kTaken)
-        return outcome;
-    *year = integer();
-    const std::size_t price = firstNotOf(" \t", end_);
-    yearWidth_ = price - place_;
-    place_ = price;
-    return outcome;
-}
-
-/// The end is searched from as far behind the start as the year was wide, which lies in the next column. Intended: only
-/// the number in front counts.
-RowReader::Outcome RowReader::readPrice(float* price)
+/// The end is searched from as far behind the start as the year was wide, with the blanks behind it, which lies in the
+/// next column. Intended: only the number in front counts.
+RowReader::Outcome RowReader::readPrice(std::size_t yearWidth, float* price)
 {
     if (place_ == text_.size())
         return Outcome::kError;
-    const Outcome outcome = findEnd(place_ + yearWidth_, " /\t");
+    const Outcome outcome = findEnd(place_ + yearWidth, " /\t");
     if (outcome != Outcome::kTaken)
         return outcome;
     *price = static_cast<float>(leadingNumber(field()));
@@ -114,6 +95,7 @@ RowReader::Outcome RowReader::readPrice(float* price)
 RowReader::Outcome RowReader::findEnd(std::size_t from, std::string_view ends)
 {
     end_ = from;
+    // `from` may lie behind the end of the text, where a price was looked for too far on.
     while (end_ < text_.size() && text_[end_] != '\n' && ends.find(text_[end_]) == ends.npos)
         ++end_;
     if (end_ >= text_.size())
@@ -139,6 +121,7 @@ public:
     bool accepts(float price)
     {
         constexpr double kDrop = 3, kRise = 2;
+        // In double: the limits are exclusive, and a float would round them onto a price.
         const double previous = previous_;
         if (previous != 0 && !(price > previous / kDrop && price < previous * kRise))
             return false;
@@ -161,10 +144,12 @@ RowReader::Outcome readTable(std::string_view page, std::vector<DatedPrice>* row
     GlitchFilter filter;
     for (DatedPrice row{};;) {
         const RowReader::Outcome outcome = reader.readRow(&row);
+        // It stands at the next row already, and `goToNextRow` would pass over that.
         if (outcome == RowReader::Outcome::kSkipped)
             continue;
         if (outcome != RowReader::Outcome::kTaken)
             return outcome;
+        // The filter last: a price that does not count must not become the one that others are compared to.
         if (row.date.getMonth() != 0 && isPrice(row.price) && filter.accepts(row.price))
             rows->push_back(row);
         if (!reader.goToNextRow())

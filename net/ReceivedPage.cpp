@@ -2,6 +2,7 @@
 
 void ReceivedPage::add(std::string_view bytes)
 {
+    // `chunk_` takes every byte, hidden ones too: what is not overwritten is repeated when the connection ends.
     for (const char c : bytes) {
         chunk_[used_++] = c;
         hides_ = hides_ || c == '\0';
@@ -10,6 +11,7 @@ void ReceivedPage::add(std::string_view bytes)
         if (used_ == kChunk)
             endChunk();
     }
+    // All of the text is from the server as long as bytes come.
     received_ = text_.size();
 }
 
@@ -17,6 +19,8 @@ void ReceivedPage::endWithBreak()
 {
     if (used_ == 0)
         return;
+    // Behind `used_` stands what is left of the chunk before, up to its first zero byte. `received_` stays in front of
+    // it.
     if (!hides_)
         text_ += chunk_ + used_;
     endChunk();
@@ -25,17 +29,11 @@ void ReceivedPage::endWithBreak()
 void ReceivedPage::endWithClose()
 {
     endWithBreak();
+    // Each round adds the same text. A chunk that begins with a zero adds none, and is counted instead.
     while (!isFull()) {
         text_ += chunk_;
         endChunk();
     }
-}
-
-/// It ends between two chunks only. A server that has closed without a word, or that sends zeros, adds nothing for
-/// ever.
-bool ReceivedPage::isFull() const
-{
-    return used_ == 0 && (text_.size() > limit_ || empty_ > limit_);
 }
 
 void ReceivedPage::endChunk()

@@ -32,7 +32,9 @@ public:
 private:
     static constexpr std::size_t kChunk = 256;
 
-    bool isFull() const;
+    /// It ends between two chunks only. A server that has closed without a word, or that sends zeros, adds nothing for
+    /// ever.
+    bool isFull() const { return used_ == 0 && (text_.size() > limit_ || empty_ > limit_); }
     void endChunk();
 
     std::size_t limit_;

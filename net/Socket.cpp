@@ -34,6 +34,9 @@ int waitToReceive(int descriptor, Socket::Clock::time_point deadline)
 
 } // namespace
 
+// A socket is in one of three states. Without a descriptor it can become a client or a server. With one it transfers,
+// and accepts when `isServer_` is set. Closed, it keeps the number of its descriptor and so counts as open, though the
+// number may belong to somebody else by now: an object serves one connection, and goes.
 char Socket::SOCKETString[8];
 short Socket::SOCKETCounter;
 
@@ -54,6 +57,7 @@ int Socket::connectTo(const String& address, unsigned short port)
 {
     // From here on nothing of a former connection is left, though its descriptor may be lost where closing failed.
     closePrevious();
+    // A text that is no dotted address becomes 255.255.255.255, to which no connection can be made.
     address_ = {};
     address_.sin_addr.s_addr = inet_addr(address.getCharacterArray());
     return connectToAddress(port, connectDeadline());
@@ -63,14 +67,10 @@ int Socket::connectToName(const String& host, unsigned short port)
 {
     closePrevious();
     const auto deadline = connectDeadline();
+    // The address is found before there is a descriptor: a host that is not there leaves the object as it was.
     if (lookUpHost(host.getCharacterArray(), deadline, &address_.sin_addr) != 0)
         return -1;
     return connectToAddress(port, deadline);
-}
-
-int Socket::serverOn(unsigned short port)
-{
-    return serverOn(port, in_addr{INADDR_ANY});
 }
 
 int Socket::serverOn(unsigned short port, in_addr local)
@@ -78,6 +78,7 @@ int Socket::serverOn(unsigned short port, in_addr local)
     // Greater than zero, where connecting asks for not negative. Intended: descriptor 0 stays open.
     if (descriptor_ > 0 && closeConnection() != 0)
         return -1;
+    // A failure behind this leaves a descriptor that does not listen; the destructor closes it.
     if (open() != 0)
         return -1;
     // Else a server that is started again would have to wait until the connections of the former one are forgotten.
@@ -167,6 +168,8 @@ int Socket::writeLine(char* text)
 {
     if (!canTransferLines())
         return -1;
+    // Of what the text ends with, CR LF stays. A CR alone and an LF alone are cut off, in this order: so "\n\r" loses
+    // both. What is left gets CR LF behind it.
     std::size_t n = std::strlen(text);
     if (n > 0 && text[n - 1] == '\r')
         text[--n] = '\0';
@@ -175,11 +178,6 @@ int Socket::writeLine(char* text)
     if (n > 0 && send(text, n) != 0)
         return -1;
     return n > 0 && text[n - 1] == '\n' ? 0 : send("\r\n", 2);
-}
-
-int Socket::putCharacterArray(const char* bytes, int count)
-{
-    return send(bytes, static_cast<std::size_t>(count));
 }
 
 int Socket::getCharacterArray(char* bytes, int count)
@@ -193,6 +191,7 @@ int Socket::receive(char* bytes, std::size_t count, Clock::time_point deadline, 
         const int ready = waitToReceive(descriptor_, deadline);
         if (ready == 0)
             return kTimedOut;
+        // Never blocks: what `poll` has announced may be gone when the system finds it damaged.
         const ssize_t n = ready > 0 ? recv(descriptor_, bytes, count, MSG_DONTWAIT) : ready;
         if (n >= 0) {
             *received = static_cast<std::size_t>(n);
@@ -202,11 +201,6 @@ int Socket::receive(char* bytes, std::size_t count, Clock::time_point deadline, 
         if (errno != EINTR && errno != EAGAIN)
             return -1;
     }
-}
-
-int Socket::putChar(char c)
-{
-    return send(&c, 1);
 }
 
 int Socket::getChar(char* c)
@@ -285,6 +279,7 @@ int Socket::readBefore(Clock::time_point deadline, char* c) const
     const int ready = waitToReceive(descriptor_, deadline);
     if (ready == 0)
         return kTimedOut;
+    // A byte at a time, since nothing behind the line may be taken from the socket.
     const int received = ready > 0 ? sgetc(c, descriptor_) : ready;
     if (received < 0 && errno == EINTR)
         return kTimedOut;
@@ -300,6 +295,7 @@ int Socket::readValue(void* value, short size)
 {
     if (recv(descriptor_, SOCKETString, static_cast<std::size_t>(size), 0) < 0)
         return -1;
+    // Fewer bytes than `size` leave what an earlier transfer has put behind them. Nobody is told.
     auto* bytes = static_cast<char*>(value);
     for (SOCKETCounter = 0; SOCKETCounter < size; ++SOCKETCounter)
         bytes[SOCKETCounter] = SOCKETString[SOCKETCounter];

@@ -37,7 +37,7 @@ public:
     int connectToName(const String& host, unsigned short port);
 
     /// Listens on all local addresses, or on one. Port 0 lets the system choose; `getLocalPort` tells the choice.
-    int serverOn(unsigned short port);
+    int serverOn(unsigned short port) { return serverOn(port, in_addr{INADDR_ANY}); }
     int serverOn(unsigned short port, in_addr local);
     /// Waits for a client. The caller owns `*connection`.
     int acceptConnection(Socket** connection);
@@ -59,13 +59,13 @@ public:
 
     /// One send, one receive of up to `count` bytes. A receive at the end of the connection succeeds without touching
     /// `bytes`; nobody learns how many came.
-    int putCharacterArray(const char* bytes, int count);
+    int putCharacterArray(const char* bytes, int count) { return send(bytes, static_cast<std::size_t>(count)); }
     int getCharacterArray(char* bytes, int count);
     /// Receives what comes first, up to `count` bytes; `*received` is their number, and 0 at the end of the connection.
     /// A signal does not end the wait.
     /// @return 0; `kTimedOut` when nothing has come until the deadline, and -1.
     int receive(char* bytes, std::size_t count, Clock::time_point deadline, std::size_t* received);
-    int putChar(char c);
+    int putChar(char c) { return send(&c, 1); }
     int getChar(char* c);
 
     // Numbers, in the byte order of this machine. A read that gets too few bytes fills up with those of an earlier
@@ -86,6 +86,8 @@ public:
 
     /// @return -1 when there is none, leaving `*descriptor` alone.
     int getDescriptor(int* descriptor) const;
+    /// The same; -1 when there is none.
+    int descriptor() const { return descriptor_; }
     int getLocalPort(unsigned short* port) const;
 
 private:

@@ -1,7 +1,6 @@
 #include "portfolio/Account.h"
 
-#include "foundation/FieldIO.h"
-#include "market/Currency.h"
+#include "market/RecordList.h"
 #include "portfolio/DepositAccountOperation.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
@@ -41,6 +40,7 @@ Account::~Account()
 
 int Account::wrt(FILE* file) const
 {
+    // The wallet has written the currency's name in front of this: a reader needs it before the account is made.
     name_.wrt(file);
     fwritechar(file, defaultTransfer_ ? 'Y' : 'N');
     fwriteint(file, static_cast<int>(getNbrOperations()));
@@ -59,11 +59,7 @@ int Account::rd(FILE* file)
     if (name_.rd(file) != 0)
         return -1;
     defaultTransfer_ = freadchar(file) == 'Y';
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing)
-        if (readOperation(file) != 0)
-            return -1;
-    return reachedEnd(file) ? -1 : 0;
+    return readRecords(file, [&] { return readOperation(file); });
 }
 
 int Account::readOperation(FILE* file)
@@ -75,6 +71,7 @@ int Account::readOperation(FILE* file)
         transferTurns_.push_back(operations_.reserveTurn());
         return 0;
     }
+    // Every other letter counts as a trade: "B" and "S" differ in a flag that the record has, too.
     std::unique_ptr<Operation> operation;
     if (letter == kLetters[Operation::kDeposit])
         operation = std::make_unique<DepositAccountOperation>();
@@ -91,6 +88,7 @@ int Account::readOperation(FILE* file)
 
 int Account::writeTransferOperations(FILE* file) const
 {
+    // The same order as that of the letters, so that each body finds the turn of its letter again.
     fwriteint(file, static_cast<int>(std::ranges::count_if(operations(), isTransfer)));
     for (const Operation* operation : operations())
         if (isTransfer(operation) && operation->wrt(file) != 0)
@@ -103,32 +101,20 @@ int Account::readTransferOperations(FILE* file)
     // The turns are good for one reading: the account keeps none of them from here on.
     const std::vector<std::uint32_t> turns = std::move(transferTurns_);
     transferTurns_.clear();
-    const auto count = static_cast<unsigned>(freadint(file));
-    for (unsigned i = 0; i < count && !reachedEnd(file); ++i) {
+    std::size_t next = 0;
+    return readRecords(file, [&] {
         auto transfer = std::make_unique<TransferAccountOperation>();
         // It stands behind the operations of its day now, and is given back the place that its letter had.
         transfer->setAccount(this);
-        if (i < turns.size())
-            operations_.setTurn(transfer.get(), turns[i]);
-        if (transfer->rd(file) != 0) {
-            // Intended: a transfer to an unknown account is not dropped, the person shall see that it is there.
-            if (!reachedEnd(file))
-                transfer.release();
-            return -1;
-        }
-        transfer.release(); // the account owns it
-    }
-    return reachedEnd(file) ? -1 : 0;
-}
-
-const String& Account::getCurrencyName() const
-{
-    return currency() != nullptr ? currency()->getName() : String::none();
-}
-
-const String& Account::getCurrencyRepresentation() const
-{
-    return currency() != nullptr ? currency()->getRepresentation() : String::none();
+        if (next < turns.size())
+            operations_.setTurn(transfer.get(), turns[next++]);
+        const int result = transfer->rd(file);
+        // The account owns it. Intended: a transfer to an unknown account is not dropped either, the person shall see
+        // that it is there.
+        if (result == 0 || !reachedEnd(file))
+            transfer.release();
+        return result;
+    });
 }
 
 int Account::getShare(const String& market, const String& abbreviation, Share** out) const

@@ -9,8 +9,6 @@
 #include <cstdint>
 #include <vector>
 
-class Share;
-
 /// A cash account in one currency. Its balance at a day is computed by an `AccountState`.
 ///
 /// Owns its operations and its states; destroying it also destroys the transfers it receives, wherever they came from.
@@ -46,8 +44,11 @@ public:
     Currency* currency() const { return currency_.partner(); }
     int setCurrency(Currency* currency) { return currency_.set(this, currency); }
     /// Of its currency; Strings without text when it has none.
-    const String& getCurrencyName() const;
-    const String& getCurrencyRepresentation() const;
+    const String& getCurrencyName() const { return currency() != nullptr ? currency()->getName() : String::none(); }
+    const String& getCurrencyRepresentation() const
+    {
+        return currency() != nullptr ? currency()->getRepresentation() : String::none();
+    }
 
     int addOperation(Operation* operation) { return operations_.add(operation); }
     int removeOperation(Operation* operation) { return operations_.remove(operation); }
@@ -80,9 +81,9 @@ public:
     Account* getAccountByName(const String& name) const;
 
 private:
-    friend class AccountStatesToAccount;
-    friend class OperationsToAccount;
-    friend class TransferOperationsToAccount;
+    friend struct AccountStatesToAccount;
+    friend struct OperationsToAccount;
+    friend struct TransferOperationsToAccount;
     friend class CurrencyToAccounts;
     friend class WalletToAccounts;
 

@@ -11,6 +11,8 @@ int DepositAccountOperation::wrt(FILE* file) const
 int DepositAccountOperation::rd(FILE* file)
 {
     setAmount(freadfloat(file));
+    // The account lists the deposit already. From here on it stands in its place by date, also when that was cut short:
+    // then the reader destroys it.
     Date date;
     date.rd(file);
     setDate(date);

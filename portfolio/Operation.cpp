@@ -36,6 +36,7 @@ Account* Operation::getAccountByName(const String& name) const
 int sortOperationByDate(const void* a, const void* b)
 {
     // The arrays hold pointers to one of the operation classes; each begins with its Operation.
+    // `qsort` knows no types: what it hands over are places, from which the pointers are copied.
     const Operation* left;
     const Operation* right;
     std::memcpy(&left, a, sizeof left);

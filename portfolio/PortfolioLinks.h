@@ -24,8 +24,7 @@ public:
 };
 
 /// The account's link to its wallet.
-class AccountsToWallet final : public ManyToOneAssociation<AccountsToWallet, Account, Wallet> {
-public:
+struct AccountsToWallet final : ManyToOneAssociation<AccountsToWallet, Account, Wallet> {
     static auto& list(auto& wallet) { return wallet.accounts_; }
 };
 
@@ -37,8 +36,7 @@ public:
 };
 
 /// The holding's link to its wallet.
-class SharesToWallet final : public ManyToOneAssociation<SharesToWallet, Share, Wallet> {
-public:
+struct SharesToWallet final : ManyToOneAssociation<SharesToWallet, Share, Wallet> {
     static auto& list(auto& wallet) { return wallet.shares_; }
 };
 
@@ -52,8 +50,7 @@ public:
 };
 
 /// The state's link to its wallet.
-class StatesToWallet final : public ManyToOneAssociation<StatesToWallet, State, Wallet> {
-public:
+struct StatesToWallet final : ManyToOneAssociation<StatesToWallet, State, Wallet> {
     static auto& list(auto& wallet) { return wallet.states_; }
 };
 
@@ -66,8 +63,7 @@ public:
 };
 
 /// The operation's link to its account.
-class OperationsToAccount final : public ManyToOneAssociation<OperationsToAccount, Operation, Account, true> {
-public:
+struct OperationsToAccount final : ManyToOneAssociation<OperationsToAccount, Operation, Account, true> {
     static auto& list(auto& account) { return account.operations_; }
 };
 
@@ -81,9 +77,8 @@ public:
 };
 
 /// The transfer's link to the account that receives it.
-class TransferOperationsToAccount final
-    : public ManyToOneAssociation<TransferOperationsToAccount, TransferAccountOperation, Account, true> {
-public:
+struct TransferOperationsToAccount final
+    : ManyToOneAssociation<TransferOperationsToAccount, TransferAccountOperation, Account, true> {
     static auto& list(auto& account) { return account.transfers_; }
 };
 
@@ -97,8 +92,7 @@ public:
 };
 
 /// The state's link to its account.
-class AccountStatesToAccount final : public ManyToOneAssociation<AccountStatesToAccount, AccountState, Account> {
-public:
+struct AccountStatesToAccount final : ManyToOneAssociation<AccountStatesToAccount, AccountState, Account> {
     static auto& list(auto& account) { return account.states_; }
 };
 
@@ -111,8 +105,7 @@ public:
 };
 
 /// The operation's link to its holding.
-class ShareOperationsToShare final : public ManyToOneAssociation<ShareOperationsToShare, ShareOperation, Share, true> {
-public:
+struct ShareOperationsToShare final : ManyToOneAssociation<ShareOperationsToShare, ShareOperation, Share, true> {
     static auto& list(auto& share) { return share.operations_; }
 };
 
@@ -126,7 +119,6 @@ public:
 };
 
 /// The state's link to its holding.
-class ShareStatesToShare final : public ManyToOneAssociation<ShareStatesToShare, ShareState, Share> {
-public:
+struct ShareStatesToShare final : ManyToOneAssociation<ShareStatesToShare, ShareState, Share> {
     static auto& list(auto& share) { return share.states_; }
 };

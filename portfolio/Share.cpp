@@ -26,41 +26,16 @@ Share::~Share()
     setCompany(nullptr);
 }
 
-int Share::wrt(FILE*) const
-{
-    return 0;
-}
-
-int Share::rd(FILE*)
-{
-    return 0;
-}
-
 const String& Share::getMarketName() const
 {
     const Market* market = company() != nullptr ? company()->market() : nullptr;
     return market != nullptr ? market->getName() : String::none();
 }
 
-const String& Share::getCompanyAbbreviation() const
-{
-    return company() != nullptr ? company()->getAbbreviation() : String::none();
-}
-
-const String& Share::getCompanyName() const
-{
-    return company() != nullptr ? company()->getName() : String::none();
-}
-
 int Share::getQuote(const Date& date, float* out) const
 {
     *out = company() != nullptr ? company()->getRealQuote(date) : 0;
     return company() != nullptr ? 0 : -1;
-}
-
-float Share::getPrevisionQuote(const Date& date) const
-{
-    return company() != nullptr ? company()->getPrevisionQuote(date) : 0;
 }
 
 void Share::removeAutomaticShareOperations()

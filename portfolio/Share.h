@@ -18,8 +18,8 @@ public:
     virtual ~Share();
 
     /// A holding has no record of its own: the wallet writes its names. Both do nothing and return 0.
-    int wrt(FILE* file) const override;
-    int rd(FILE* file) override;
+    int wrt(FILE*) const override { return 0; }
+    int rd(FILE*) override { return 0; }
 
     int getWallet(Wallet** out) const { return wallet_.get(out); }
     /// The same; null when there is none.
@@ -50,20 +50,26 @@ public:
 
     /// Names of the company and its market; Strings without text where the link is missing.
     const String& getMarketName() const;
-    const String& getCompanyAbbreviation() const;
-    const String& getCompanyName() const;
+    const String& getCompanyAbbreviation() const
+    {
+        return company() != nullptr ? company()->getAbbreviation() : String::none();
+    }
+    const String& getCompanyName() const { return company() != nullptr ? company()->getName() : String::none(); }
 
     /// The company's price for any day, 0 without a company. @return 0; -1 without a company.
     int getQuote(const Date& date, float* out) const;
     /// The company's trend on that day, 0 without a company.
-    float getPrevisionQuote(const Date& date) const;
+    float getPrevisionQuote(const Date& date) const
+    {
+        return company() != nullptr ? company()->getPrevisionQuote(date) : 0;
+    }
 
     /// Destroys the automatic operations of this holding.
     void removeAutomaticShareOperations();
 
 private:
-    friend class ShareOperationsToShare;
-    friend class ShareStatesToShare;
+    friend struct ShareOperationsToShare;
+    friend struct ShareStatesToShare;
     friend class CompanyToShares;
     friend class WalletToShares;
 

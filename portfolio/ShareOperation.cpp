@@ -19,6 +19,7 @@ ShareOperation::~ShareOperation()
 
 int ShareOperation::wrt(FILE* file) const
 {
+    // There would be no names that a reader could find the holding by.
     if (share() == nullptr)
         return -1;
     fwritechar(file, buy_ ? 'Y' : 'N');
@@ -40,6 +41,7 @@ int ShareOperation::rd(FILE* file)
     if (market.rd(file) != 0 || abbreviation.rd(file) != 0)
         return -1;
     Share* held;
+    // The account is linked before the record is read, and its wallet has read all holdings before any account.
     if (account() == nullptr || account()->getShare(market, abbreviation, &held) != 0)
         return -1;
     // The holding lists the operation from here on. Its date, which follows, puts it in its place there.

@@ -17,6 +17,7 @@ TransferAccountOperation::~TransferAccountOperation()
 
 int TransferAccountOperation::wrt(FILE* file) const
 {
+    // A transfer without recipient has the undefined name, which no account has: a reader takes it for unknown again.
     const String name = recipient() != nullptr ? recipient()->getName() : String();
     name.wrt(file);
     fwritefloat(file, getAmount());
@@ -32,6 +33,7 @@ int TransferAccountOperation::rd(FILE* file)
     String name;
     if (name.rd(file) != 0)
         return -1;
+    // By way of the sender, which the transfer has been given before: its wallet has read all accounts by now.
     Account* named = getAccountByName(name);
     if (named == nullptr)
         return -1;
@@ -50,6 +52,7 @@ int TransferAccountOperation::rd(FILE* file)
 
 float TransferAccountOperation::getTotalCost() const
 {
+    // In double, and rounded once at the end.
     return static_cast<float>(static_cast<double>(getAmount()) * rateCost_ + cost_);
 }
 

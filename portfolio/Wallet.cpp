@@ -1,12 +1,6 @@
 #include "portfolio/Wallet.h"
 
 #include "market/Catalogue.h"
-#include "market/Company.h"
-#include "market/Currency.h"
-#include "market/Market.h"
-#include "portfolio/Account.h"
-#include "portfolio/Operation.h"
-#include "portfolio/Share.h"
 #include "portfolio/WalletNames.h"
 
 #include <algorithm>
@@ -22,16 +16,6 @@ Wallet::~Wallet()
     shares_.deleteAll();
 }
 
-void Wallet::setCurrencies(int count, Currency** currencies)
-{
-    currencies_.assign(currencies, currencies + count);
-}
-
-void Wallet::setMarkets(int count, Market** markets)
-{
-    markets_.assign(markets, markets + count);
-}
-
 void Wallet::setCatalogue(const Catalogue& catalogue)
 {
     // Copies: what is added to the catalogue later is not known here until the next call.
@@ -41,15 +25,12 @@ void Wallet::setCatalogue(const Catalogue& catalogue)
 
 int Wallet::getCurrency(const String& name, Currency** out) const
 {
+    // While a file is read its index answers, here and below: these lists would be gone through for every record.
     if (names_ != nullptr)
         return names_->getCurrency(name, out);
-    for (Currency* currency : currencies_)
-        if (currency->getName() == name) {
-            *out = currency;
-            return 0;
-        }
-    *out = nullptr;
-    return -1;
+    const auto found = std::ranges::find(currencies_, name, &Currency::getName);
+    *out = found != currencies_.end() ? *found : nullptr;
+    return *out != nullptr ? 0 : -1;
 }
 
 int Wallet::getCompany(const String& market, const String& abbreviation, Company** out) const
@@ -80,14 +61,14 @@ Account* Wallet::getAccountByName(const String& name) const
 {
     if (names_ != nullptr)
         return names_->getAccount(name);
-    for (Account* account : accounts())
-        if (account->getName() == name)
-            return account;
-    return nullptr;
+    const auto all = accounts();
+    const auto found = std::ranges::find(all, name, &Account::getName);
+    return found != all.end() ? *found : nullptr;
 }
 
 Account* Wallet::findDefaultTransferAccount(const String& currencyRepresentation) const
 {
+    // The one that is flagged comes before all others, wherever it stands.
     Account* first = nullptr;
     for (Account* account : accounts()) {
         const Currency* currency = account->currency();

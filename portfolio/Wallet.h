@@ -11,9 +11,6 @@
 #include <vector>
 
 class Catalogue;
-class Company;
-class Currency;
-class Market;
 class WalletNames;
 
 /// The portfolio: cash accounts, holdings, the states computed for it, and the ten trading parameters.
@@ -26,8 +23,8 @@ public:
     virtual ~Wallet();
 
     /// Wallets have dated records only; these two do nothing and return -1.
-    int wrt(FILE* file) const override;
-    int rd(FILE* file) override;
+    int wrt(FILE*) const override { return -1; }
+    int rd(FILE*) override { return -1; }
     /// @return 0; -1, with the file incomplete, when an account has no currency name or a write failed.
     int wrt(FILE* file, const Date& stamp) const;
     /// Replaces the content by the file's. Markets and currencies have been set before. `*stamp` becomes the date at
@@ -62,8 +59,8 @@ public:
     void removeAllStates() { states_.deleteAll(); }
 
     /// Keep copies of the pointers; what they point to is never freed here.
-    void setCurrencies(int count, Currency** currencies);
-    void setMarkets(int count, Market** markets);
+    void setCurrencies(int count, Currency** currencies) { currencies_.assign(currencies, currencies + count); }
+    void setMarkets(int count, Market** markets) { markets_.assign(markets, markets + count); }
     /// Both of them at once, as they are in the catalogue now.
     void setCatalogue(const Catalogue& catalogue);
 
@@ -127,9 +124,9 @@ public:
     void setReinvestRate(float rate) { parameters_[kReinvestRate] = rate; }
 
 private:
-    friend class AccountsToWallet;
-    friend class SharesToWallet;
-    friend class StatesToWallet;
+    friend struct AccountsToWallet;
+    friend struct SharesToWallet;
+    friend struct StatesToWallet;
     int readShares(FILE* file);
     int readAccounts(FILE* file);
     void readParameters(FILE* file);

@@ -1,28 +1,16 @@
 // The portfolio file: how a wallet is written and read. docs/FILES.md has the layout.
 
-#include "foundation/FieldIO.h"
-#include "market/Company.h"
-#include "market/Currency.h"
-#include "portfolio/Account.h"
-#include "portfolio/Share.h"
+#include "market/RecordList.h"
 #include "portfolio/Wallet.h"
 #include "portfolio/WalletNames.h"
 
 #include <memory>
 
-int Wallet::wrt(FILE*) const
-{
-    return -1;
-}
-
-int Wallet::rd(FILE*)
-{
-    return -1;
-}
-
 int Wallet::wrt(FILE* file, const Date& stamp) const
 {
     stamp.wrt(file);
+    // What names something comes behind what it names: the trades of the accounts behind the holdings, the transfers
+    // behind all accounts.
     fwriteint(file, static_cast<int>(getNbrShares()));
     for (const Share* share : shares()) {
         share->getMarketName().wrt(file);
@@ -37,6 +25,7 @@ int Wallet::wrt(FILE* file, const Date& stamp) const
         if (account->wrt(file) != 0)
             return -1;
     }
+    // In the order of the accounts, from which a reader knows whose block is whose.
     for (const Account* account : accounts())
         if (account->writeTransferOperations(file) != 0)
             return -1;
@@ -75,28 +64,29 @@ int Wallet::rd(FILE* file, Date* stamp)
 
 int Wallet::readShares(FILE* file)
 {
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing) {
+    return readRecords(file, [&] {
         String market;
         String abbreviation;
         if (market.rd(file) != 0 || abbreviation.rd(file) != 0)
             return -1;
         Company* company;
+        // A portfolio without one of its holdings would have other balances, so it is not opened at all.
         if (getCompany(market, abbreviation, &company) != 0) {
             std::puts("Error getting a company -> the portofolio doesn't match the company descriptions...");
             return -1;
         }
+        // The wallet owns the holding. Trades find it in the index from here on.
         names_->add(new Share(this, company));
-    }
-    return reachedEnd(file) ? -1 : 0;
+        return 0;
+    });
 }
 
 int Wallet::readAccounts(FILE* file)
 {
-    auto missing = static_cast<unsigned>(freadint(file));
-    for (; missing > 0 && !reachedEnd(file); --missing) {
+    return readRecords(file, [&] {
         String currencyName;
         Currency* currency;
+        // Of a name that is not known the index keeps note, for the message to the user.
         if (currencyName.rd(file) != 0 || getCurrency(currencyName, &currency) != 0)
             return -1;
         auto account = std::make_unique<Account>();
@@ -106,15 +96,16 @@ int Wallet::readAccounts(FILE* file)
         const int result = account->rd(file);
         // An account cut short stays for the sake of the operations in it that are whole.
         if (result == 0 || account->getNbrOperations() > 0)
+            // The account is the wallet's since `setWallet`. What is not kept destroys itself, and so leaves wallet and
+            // currency.
             names_->add(account.release());
-        if (result != 0)
-            return -1;
-    }
-    return reachedEnd(file) ? -1 : 0;
+        return result;
+    });
 }
 
 void Wallet::writeParameters(FILE* file) const
 {
+    // All are floats but the period, which has 16 bits in the file.
     for (int i = 0; i < kParameterCount; ++i)
         if (i == kInvestementPeriod)
             fwriteshort(file, static_cast<unsigned short>(getInvestementPeriod()));

@@ -1,55 +1,64 @@
 #include "portfolio/WalletNames.h"
 
-#include "market/Company.h"
-#include "market/Currency.h"
-#include "market/Market.h"
 #include "portfolio/Account.h"
 #include "portfolio/Share.h"
 
-std::size_t WalletNames::PairHash::operator()(const Pair& pair) const
+namespace {
+
+/// Where what has a name, but no market, is looked for.
+const String kNoMarket("");
+
+} // namespace
+
+std::size_t WalletNames::KeyHash::operator()(const Key& key) const
 {
+    // Multiplied, so that a market and a ticker of the same name do not cancel out.
     const std::hash<std::string_view> hash;
-    return hash(pair.first) * 31 + hash(pair.second);
+    return hash(key.first) * 31 + hash(key.second);
 }
 
-WalletNames::Pair WalletNames::pairOf(const Market& market, const Company& company)
+WalletNames::Key WalletNames::keyOf(const Market& market, const Company& company)
 {
     return {market.getName().comparedBytes(), company.getAbbreviation().comparedBytes()};
 }
 
 WalletNames::WalletNames(const std::vector<Market*>& markets, const std::vector<Currency*>& currencies)
 {
-    // `try_emplace` keeps what is there: of equal names the first counts, as in a search from the front.
+    // `try_emplace` keeps what is there: of equal names the first counts, as in a search from the front. What has no
+    // text is left out, because it equals no name, its own included; an empty text is a name like any other.
     for (Currency* currency : currencies)
         if (currency->getName().hasText())
-            currencies_.try_emplace(currency->getName().comparedBytes(), currency);
+            currencies_.try_emplace(Key("", currency->getName().comparedBytes()), currency);
     for (const Market* market : markets)
         for (Company* company : market->companies())
             if (market->getName().hasText() && company->getAbbreviation().hasText())
-                companies_.try_emplace(pairOf(*market, *company), company);
+                companies_.try_emplace(keyOf(*market, *company), company);
 }
 
 void WalletNames::add(Share* share)
 {
+    // Later holdings of the same company are not found: the first one gets all trades, as in a search from the front.
     const Company* company = share->company();
     if (company != nullptr && company->market() != nullptr)
-        shares_.try_emplace(pairOf(*company->market(), *company), share);
+        shares_.try_emplace(keyOf(*company->market(), *company), share);
 }
 
 void WalletNames::add(Account* account)
 {
-    accounts_.try_emplace(account->getName().comparedBytes(), account);
+    accounts_.try_emplace(Key("", account->getName().comparedBytes()), account);
 }
 
 template <class T>
-int WalletNames::find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out)
+int WalletNames::find(const Map<T>& map, const String& market, const String& name, T** out)
 {
-    const bool canMatch = market.hasText() && abbreviation.hasText();
-    const auto found = canMatch ? map.find({market.comparedBytes(), abbreviation.comparedBytes()}) : map.end();
+    const bool canMatch = market.hasText() && name.hasText();
+    // The views live as long as this call, which is all that a search needs; the keys in the map refer to names that
+    // stay.
+    const auto found = canMatch ? map.find({market.comparedBytes(), name.comparedBytes()}) : map.end();
     // The wallet reports the name that was looked for last without success as the reason of a failed read.
     *out = found != map.end() ? found->second : nullptr;
     if (*out == nullptr)
-        unknown_ = abbreviation;
+        unknown_ = name;
     return *out != nullptr ? 0 : -1;
 }
 
@@ -63,22 +72,14 @@ int WalletNames::getShare(const String& market, const String& abbreviation, Shar
     return find(shares_, market, abbreviation, out);
 }
 
-template <class T>
-T* WalletNames::find(const Map<T>& map, const String& name)
-{
-    const auto found = name.hasText() ? map.find(name.comparedBytes()) : map.end();
-    return found != map.end() ? found->second : nullptr;
-}
-
 int WalletNames::getCurrency(const String& name, Currency** out)
 {
-    *out = find(currencies_, name);
-    if (*out == nullptr)
-        unknown_ = name;
-    return *out != nullptr ? 0 : -1;
+    return find(currencies_, kNoMarket, name, out);
 }
 
-Account* WalletNames::getAccount(const String& name) const
+Account* WalletNames::getAccount(const String& name)
 {
-    return find(accounts_, name);
+    Account* account = nullptr;
+    find(accounts_, kNoMarket, name, &account);
+    return account;
 }

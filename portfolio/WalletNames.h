@@ -30,29 +30,26 @@ public:
     int getCompany(const String& market, const String& abbreviation, Company** out);
     int getShare(const String& market, const String& abbreviation, Share** out);
     /// Null when there is none.
-    Account* getAccount(const String& name) const;
+    Account* getAccount(const String& name);
 
-    /// The ticker or currency name that a look-up did not find last; undefined when all were found.
+    /// The ticker or name that a look-up did not find last; undefined when all were found.
     const String& getUnknown() const { return unknown_; }
 
 private:
-    using Pair = std::pair<std::string_view, std::string_view>;
-    struct PairHash {
-        std::size_t operator()(const Pair& pair) const;
+    /// Market and ticker; of what stands in no market only the name.
+    using Key = std::pair<std::string_view, std::string_view>;
+    struct KeyHash {
+        std::size_t operator()(const Key& key) const;
     };
     template <class T>
-    using PairMap = std::unordered_map<Pair, T*, PairHash>;
-    template <class T>
-    using Map = std::unordered_map<std::string_view, T*>;
+    using Map = std::unordered_map<Key, T*, KeyHash>;
 
-    static Pair pairOf(const Market& market, const Company& company);
+    static Key keyOf(const Market& market, const Company& company);
     template <class T>
-    int find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out);
-    template <class T>
-    static T* find(const Map<T>& map, const String& name);
+    int find(const Map<T>& map, const String& market, const String& name, T** out);
 
-    PairMap<Company> companies_;
-    PairMap<Share> shares_;
+    Map<Company> companies_;
+    Map<Share> shares_;
     Map<Currency> currencies_;
     Map<Account> accounts_;
     String unknown_;

@@ -1,5 +1,6 @@
 #include "storage/AtomicFile.h"
 
+#include "storage/Descriptor.h"
 #include "storage/Folders.h"
 
 #include <cerrno>
@@ -15,21 +16,19 @@ namespace {
 
 namespace fs = std::filesystem;
 
+// The life of an AtomicFile: `create` makes the temporary file, empty and locked; the owner writes to `stream_`;
+// `flush` brings the bytes to the disk and sets `flushed_`; `commit` renames. Up to the rename the file at `target_` is
+// untouched, and the destructor removes the temporary one.
 constexpr std::string_view kPrefix = ".pelorin-";
 constexpr std::string_view kSuffix = ".tmp";
 constexpr const char* kCannotOpen = "cannot be opened";
 constexpr const char* kCannotWrite = "cannot be written";
+constexpr const char* kIsKept = ": exists already and is left as it is";
 
 template <class Error>
 [[noreturn]] void failFor(const std::string& path, const char* what)
 {
     throw Error(path + ": " + what + ": " + std::strerror(errno));
-}
-
-template <class Error>
-[[noreturn]] void failForExisting(const std::string& path)
-{
-    throw Error(path + ": exists already and is left as it is");
 }
 
 /// Whether there is something at `path`. When that cannot be told, throws an Error for `shown` that says `what`: taken
@@ -59,12 +58,14 @@ std::string withoutLinks(const std::string& path)
     std::error_code error;
     fs::path target = path;
     for (int links = 0; !error && isLink(target, path); ++links) {
+        // A link's text counts from the folder that the link is in; an absolute one replaces all of it.
         target = target.parent_path() / fs::read_symlink(target, error);
         if (links == kMaxLinks)
             error = std::make_error_code(std::errc::too_many_symbolic_link_levels);
     }
     fs::path folder;
     if (!error)
+        // The last name is kept as it is: there need not be a file of it.
         folder = fs::canonical(folderOf(target), error);
     if (error) {
         errno = error.value();
@@ -76,6 +77,7 @@ std::string withoutLinks(const std::string& path)
 /// Locks a temporary file that was just created. @return false when it was taken for a left-over before it was locked.
 bool lockCreated(int descriptor)
 {
+    // Another program may have seen the file between its making and this lock, and hold the lock while it removes it.
     while (flock(descriptor, LOCK_EX) != 0 && errno == EINTR) {
     }
     struct stat status;
@@ -97,6 +99,7 @@ int createIn(const std::string& folder, mode_t mode, std::string* name)
             return -1;
         if (descriptor >= 0 && lockCreated(descriptor))
             return descriptor;
+        // Made, but taken for a left-over: it has no name any more. The next number is tried.
         if (descriptor >= 0)
             close(descriptor);
     }
@@ -124,15 +127,12 @@ bool isTemporary(std::string_view name)
 void removeUnlessLocked(const std::string& path)
 {
     constexpr int kFlags = O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC;
-    int descriptor = open(path.c_str(), O_RDONLY | kFlags);
-    if (descriptor < 0)
-        descriptor = open(path.c_str(), O_WRONLY | kFlags);
-    if (descriptor < 0)
-        return;
+    // The permissions of a left-over may be any: it may allow reading, or only writing.
+    const int readable = open(path.c_str(), O_RDONLY | kFlags);
+    const Descriptor file(readable >= 0 ? readable : open(path.c_str(), O_WRONLY | kFlags));
     // Nobody writes what nobody has locked: its program has died.
-    if (flock(descriptor, LOCK_EX | LOCK_NB) == 0)
+    if (file.number >= 0 && flock(file.number, LOCK_EX | LOCK_NB) == 0)
         unlink(path.c_str());
-    close(descriptor);
 }
 
 } // namespace
@@ -147,7 +147,8 @@ void AtomicFile::check(const std::string& path, Existing existing)
         return;
     }
     if (existing == Existing::kKeep)
-        failForExisting<OpenError>(path);
+        throw OpenError(path + kIsKept);
+    // The link itself was looked at above; from here on it is the file behind it that counts.
     if (!isThere<OpenError>(path, 0, path, kCannotOpen, &status))
         return; // a link to a file that is yet to be made
     // Renaming would put a file in the place of a device or a pipe.
@@ -161,6 +162,7 @@ void AtomicFile::check(const std::string& path, Existing existing)
 void AtomicFile::removeLeftOvers(const std::string& folder)
 {
     std::error_code error;
+    // An error ends the search and is nobody's failure: left-overs take room, and no more.
     for (fs::directory_iterator entry(folder, error); !error && entry != fs::directory_iterator();
          entry.increment(error)) {
         if (isTemporary(entry->path().filename().string()))
@@ -192,12 +194,14 @@ void AtomicFile::create()
     // Until it has the permissions of the file that it replaces, its contents are for nobody else.
     struct stat status;
     const bool isOld = isThere<OpenError>(target_, AT_SYMLINK_NOFOLLOW, path_, kCannotOpen, &status);
+    // A file of a new name gets the permissions that the user's mask leaves.
     const mode_t mode = isOld ? 0600 : 0666;
     const int descriptor = createIn(folder, mode, &temporary_);
     if (descriptor < 0) {
         temporary_.clear();
         failFor<OpenError>(path_, "cannot be created");
     }
+    // The stream closes the descriptor from here on, and with it gives back the lock.
     stream_ = fdopen(descriptor, "wb");
     if (stream_ == nullptr) {
         const int reason = errno;
@@ -215,6 +219,7 @@ void AtomicFile::flush()
         errno = EIO;
     // Until here the file is for its writer alone, if it replaces another one.
     keepPermissions();
+    // A write that failed is remembered by the stream. Only what all three let pass is on the disk.
     if (std::ferror(stream_) != 0 || std::fflush(stream_) != 0 || fsync(fileno(stream_)) != 0)
         fail(kCannotWrite);
     // The content is on the disk; only the name is still that of the temporary file.
@@ -245,6 +250,8 @@ void AtomicFile::keepPermissions() const
     struct stat former;
     if (existing_ != Existing::kReplace || !isThere<WriteError>(target_, 0, path_, kCannotWrite, &former))
         return;
+    // Only the administrator can give a file away, but a user may set the group to another one of his own. Whatever of
+    // this is refused does not fail the save.
     constexpr auto kSameOwner = static_cast<uid_t>(-1);
     const int file = fileno(stream_);
     mode_t mode = former.st_mode & 0777;
@@ -264,7 +271,7 @@ void AtomicFile::giveName()
         }
         struct stat status;
         if (lstat(target_.c_str(), &status) == 0)
-            failForExisting<WriteError>(path_);
+            throw WriteError(path_ + kIsKept);
         // a file system without links
     }
     if (rename(temporary_.c_str(), target_.c_str()) != 0)

@@ -55,6 +55,7 @@ bool readDocumentsLine(std::string_view line, std::string* value)
         return false;
     line = line.substr(1, end - 1);
     value->clear();
+    // The file is made for a shell, in which a backslash makes the next character an ordinary one.
     for (std::size_t i = 0; i < line.size(); ++i) {
         if (line[i] == '\\' && i + 1 < line.size())
             ++i;
@@ -85,6 +86,7 @@ std::string configuredDocuments(const std::string& home)
     std::string value;
     for (std::string line; std::getline(file, line);)
         readDocumentsLine(line, &value);
+    // The only variable that may stand there; any other relative path is none.
     constexpr std::string_view kHome = "$HOME";
     if (value == kHome || value.starts_with(std::string(kHome) + '/'))
         return home + value.substr(kHome.size());
@@ -114,10 +116,13 @@ std::string DataFolder::need(const char* subfolder, unsigned mode, std::string* 
 {
     const std::string path = path_ + subfolder;
     error->clear();
+    // "/Companies" of the whole machine would be meant otherwise.
     if (path_.empty()) {
         *error = "There is no home folder to keep files in.";
         return path;
     }
+    // The data folder by itself first: it is open to whom the user's mask allows, even when `mode` is for the user
+    // alone.
     std::error_code reason = makeFolders(path_);
     if (!reason)
         reason = makeFolders(path, mode);

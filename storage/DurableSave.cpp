@@ -17,18 +17,13 @@ namespace {
 /// A file that grows past the user's limit is to be a failed write, not the end of the program.
 class SizeSignalIgnored {
 public:
-    SizeSignalIgnored()
-    {
-        struct sigaction ignore {};
-        ignore.sa_handler = SIG_IGN;
-        sigaction(SIGXFSZ, &ignore, &former_);
-    }
-    ~SizeSignalIgnored() { sigaction(SIGXFSZ, &former_, nullptr); }
+    SizeSignalIgnored() = default;
+    ~SizeSignalIgnored() { std::signal(SIGXFSZ, former_); }
     SizeSignalIgnored(const SizeSignalIgnored&) = delete;
     SizeSignalIgnored& operator=(const SizeSignalIgnored&) = delete;
 
 private:
-    struct sigaction former_ {};
+    void (*former_)(int) = std::signal(SIGXFSZ, SIG_IGN);
 };
 
 [[noreturn]] void failWriting(const std::string& path)
@@ -40,6 +35,7 @@ private:
 /// Lets `write` write; throws a WriteError when it fails.
 void fill(FILE* stream, const std::string& path, const DurableSave::Writer& write)
 {
+    // `write` tells only that it has failed. The reason is the one that its last call has left, if any.
     errno = 0;
     if (write(stream) != 0 || std::ferror(stream) != 0)
         failWriting(path);
@@ -85,6 +81,7 @@ DurableSave::Result failed(DurableSave::Outcome outcome, std::string reason)
 
 DurableSave::Result DurableSave::save(const std::string& path, const Writer& write) const
 {
+    // For as long as the save lasts, and for the device as well.
     const SizeSignalIgnored ignored;
     try {
         if (isDevice(path))
@@ -106,15 +103,19 @@ void DurableSave::replace(const std::string& path, const Writer& write) const
     // The old file is kept only when it is sure to be replaced, and as late as possible.
     file.flush();
     const SaveLock lock(file.target(), folder_, patience_);
+    // Asked under the lock: another program may have made the file since this save began.
     if (!file.replaces()) {
         file.commit();
         return;
     }
+    // Before: the old file has its name and nobody else saves here. After `keep` it has a second name, in Backups,
+    // which survives the commit.
     const KeptVersions versions(folder_);
     const std::string version = versions.keep(file.target());
     try {
         file.commit();
     } catch (const AtomicFile::WriteError&) {
+        // The old file still has its name, and would be kept twice.
         versions.forget(version);
         throw;
     }

@@ -1,5 +1,7 @@
 #include "storage/Folders.h"
 
+#include "storage/Descriptor.h"
+
 #include <cerrno>
 #include <fcntl.h>
 #include <filesystem>
@@ -17,6 +19,7 @@ std::error_code makeFolders(const std::string& path, mode_t mode)
     struct stat status;
     if (stat(path.c_str(), &status) == 0)
         return S_ISDIR(status.st_mode) ? std::error_code() : std::make_error_code(std::errc::not_a_directory);
+    // Nothing of this name can be seen. The folders above are made first, each with its entry on the disk.
     const std::string above = folderOf(path);
     if (errno == ENOENT && above != path)
         if (const std::error_code error = makeFolders(above, mode))
@@ -33,9 +36,7 @@ std::error_code makeFolders(const std::string& path, mode_t mode)
 
 void syncFolder(const std::string& path)
 {
-    const int folder = open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-    if (folder < 0)
-        return;
-    (void)fsync(folder);
-    close(folder);
+    // Where it cannot be opened there is nothing to bring to the disk: the call below fails, and nobody minds.
+    const Descriptor folder(open(path.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    (void)fsync(folder.number);
 }

@@ -38,13 +38,9 @@ int openForReading(const std::string& path)
     throw std::runtime_error(path + ": " + oddity);
 }
 
-InputFile::InputFile(const std::string& path) : path_(path), stream_(fdopen(openForReading(path), "rb"))
+InputFile::InputFile(const std::string& path) : path_(path), stream_(fdopen(openForReading(path), "rb"), std::fclose)
 {
+    // The file is open by now: all that can be missing is the memory for a stream.
     if (stream_ == nullptr)
         throw std::bad_alloc();
-}
-
-InputFile::~InputFile()
-{
-    std::fclose(stream_);
 }

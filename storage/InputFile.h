@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdio>
+#include <memory>
 #include <string>
 
 /// Opens a file that a person has named. Only ordinary files, and links to them, are opened: reading anything else, a
@@ -13,14 +14,11 @@ int openForReading(const std::string& path);
 class InputFile {
 public:
     explicit InputFile(const std::string& path);
-    ~InputFile();
-    InputFile(const InputFile&) = delete;
-    InputFile& operator=(const InputFile&) = delete;
 
     const std::string& path() const { return path_; }
-    FILE* stream() const { return stream_; }
+    FILE* stream() const { return stream_.get(); }
 
 private:
     std::string path_;
-    FILE* stream_;
+    std::unique_ptr<FILE, int (*)(FILE*)> stream_;
 };

@@ -1,6 +1,7 @@
 #include "storage/KeptVersions.h"
 
 #include "storage/AtomicFile.h"
+#include "storage/Descriptor.h"
 #include "storage/Folders.h"
 
 #include <algorithm>
@@ -22,20 +23,7 @@ namespace {
 namespace fs = std::filesystem;
 
 constexpr mode_t kPrivate = 0700;
-
-/// A file descriptor that is closed in the end.
-struct Descriptor {
-    explicit Descriptor(const std::string& path) : number(open(path.c_str(), O_RDONLY | O_NOFOLLOW | O_CLOEXEC)) {}
-    ~Descriptor()
-    {
-        if (number >= 0)
-            close(number);
-    }
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-
-    const int number;
-};
+constexpr int kToRead = O_RDONLY | O_NOFOLLOW | O_CLOEXEC;
 
 /// `name` or, if that leaves too little room for the time, its beginning and a number made of all of it.
 std::string stemFor(const std::string& name)
@@ -98,6 +86,7 @@ bool takeNumber(std::size_t fewest, std::size_t most, std::string_view* text, st
 bool readPlace(std::string_view text, Version* version)
 {
     auto& [serial, year, month, day, hour, minute, second, number] = version->place;
+    // The forms: "2026-11-21 10.53.04", the same with "-002" behind it, and with " (57)" behind it.
     const bool isNegative = take('-', &text); // whatever a clock may say
     if (!takeNumber(1, 10, &text, &year))
         return false;
@@ -148,6 +137,8 @@ struct Shelf {
 /// Removes a version that a killed save has linked but not replaced: it still is the file itself.
 void removeLinkTo(const struct stat& file, const Shelf& shelf, std::vector<Version>* versions)
 {
+    // A killed save leaves the file with two names, of which one is a version's. A file with a single name has none
+    // here.
     if (file.st_nlink == 1)
         return;
     std::erase_if(*versions, [&](const Version& version) {
@@ -172,7 +163,7 @@ bool linkVersion(const std::string& path, const std::string& version)
     if (lstat(path.c_str(), &file) != 0 || file.st_nlink != 1 || link(path.c_str(), version.c_str()) != 0)
         return false;
     // Whoever wrote the file may not have brought it to the disk. One that may not be read is kept even so.
-    const Descriptor written(version);
+    const Descriptor written(open(version.c_str(), kToRead));
     if (written.number >= 0 ? fsync(written.number) == 0 || errno == EINVAL : errno == EACCES)
         return true;
     const int reason = errno;
@@ -185,6 +176,7 @@ bool copyContents(int from, int to)
 {
     constexpr std::size_t kClone = std::size_t{1} << 30;
     // Shares the blocks where the file system can. What it did not do, for whatever reason, is done by hand.
+    // Each call goes on where the last one has ended, and so does `read` below: both move the place in the file.
     while (copy_file_range(from, nullptr, to, nullptr, kClone, 0) > 0) {
     }
     char block[1 << 16];
@@ -202,7 +194,7 @@ bool copyContents(int from, int to)
 /// Throws AtomicFile's errors.
 void copyVersion(const std::string& path, const std::string& version)
 {
-    const Descriptor from(path);
+    const Descriptor from(open(path.c_str(), kToRead));
     struct stat status;
     if (from.number < 0 || fstat(from.number, &status) != 0)
         throw AtomicFile::OpenError(std::strerror(errno));
@@ -211,6 +203,7 @@ void copyVersion(const std::string& path, const std::string& version)
     (void)fchmod(to, status.st_mode & 0777);
     if (!copyContents(from.number, to))
         throw AtomicFile::WriteError(std::strerror(errno));
+    // So that file managers show when the version was saved, and not when it was copied.
     const timespec times[] = {status.st_atim, status.st_mtim};
     (void)futimens(to, times);
     copy.commit();
@@ -258,6 +251,7 @@ std::string KeptVersions::keep(const std::string& path, std::time_t now) const
     std::vector<Version> versions = shelf.versions(&reason);
     if (reason)
         failFor(path, shelf.folder + ": cannot be read: " + reason.message());
+    // `versions` is sorted, so the last one has the highest number.
     const std::int64_t serial = versions.empty() ? 1 : std::min(versions.back().place.front() + 1, kLastSerial);
     removeLinkTo(file, shelf, &versions);
     removeOldest(shelf, versions); // of saves that were killed before they could prune

@@ -8,7 +8,6 @@
 #include <fcntl.h>
 #include <sys/file.h>
 #include <thread>
-#include <unistd.h>
 
 namespace {
 
@@ -26,6 +25,7 @@ int lockOpened(int descriptor, Clock::time_point end)
     constexpr std::chrono::milliseconds kPause(2);
     if (descriptor < 0)
         return -1;
+    // Asked again and again, because a lock that is waited for has no time limit.
     while (flock(descriptor, LOCK_EX | LOCK_NB) != 0) {
         const int reason = errno;
         if (reason == EINTR || (reason == EWOULDBLOCK && Clock::now() < end)) {
@@ -46,25 +46,28 @@ bool isWithoutLocks(int reason)
            reason == EOPNOTSUPP;
 }
 
-} // namespace
-
-SaveLock::SaveLock(const std::string& path, const DataFolder& folder, Patience patience)
+/// Locks the folder of `path`, or what stands in for it. Throws a WriteError when that fails. @return its descriptor.
+int lockFor(const std::string& path, const DataFolder& folder, SaveLock::Patience patience)
 {
+    // One patience for both attempts.
     const Clock::time_point end = Clock::now() + patience;
-    descriptor_ = lockOpened(open(folderOf(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC), end);
-    if (descriptor_ < 0 && isWithoutLocks(errno)) {
+    int descriptor = lockOpened(open(folderOf(path).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC), end);
+    if (descriptor < 0 && isWithoutLocks(errno)) {
+        // Who may not look into the folder, and who saves where locks are unknown, meet at one file of the data folder.
         std::string error;
         const std::string file = folder.backups(&error) + "/.lock";
         if (!error.empty())
             failFor(path, error);
-        descriptor_ = lockOpened(open(file.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600), end);
+        descriptor = lockOpened(open(file.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0600), end);
     }
-    if (descriptor_ < 0)
+    if (descriptor < 0)
         failFor(path, errno == ETIMEDOUT ? "another program is saving in its folder and does not come to an end"
                                          : std::string("its folder cannot be locked: ") + std::strerror(errno));
+    return descriptor;
 }
 
-SaveLock::~SaveLock()
-{
-    close(descriptor_);
-}
+} // namespace
+
+SaveLock::SaveLock(const std::string& path, const DataFolder& folder, Patience patience)
+    : descriptor_(lockFor(path, folder, patience))
+{}

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "storage/DataFolder.h"
+#include "storage/Descriptor.h"
 
 #include <chrono>
 #include <string>
@@ -19,10 +20,7 @@ public:
     /// Locks for a save of the file at `path` (absolute, no links). Throws an AtomicFile::WriteError when another
     /// program holds the lock for longer than `patience`, or when there can be no lock.
     SaveLock(const std::string& path, const DataFolder& folder, Patience patience);
-    ~SaveLock();
-    SaveLock(const SaveLock&) = delete;
-    SaveLock& operator=(const SaveLock&) = delete;
 
 private:
-    int descriptor_;
+    Descriptor descriptor_;
 };

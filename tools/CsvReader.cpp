@@ -8,17 +8,12 @@
 #include <new>
 #include <stdexcept>
 
-CsvReader::CsvReader(const std::string& path) : path_(path), file_(gzdopen(openForReading(path), "rb"))
+CsvReader::CsvReader(const std::string& path) : path_(path), file_(gzdopen(openForReading(path), "rb"), gzclose)
 {
     if (file_ == nullptr)
         throw std::bad_alloc();
     constexpr unsigned kBuffer = 1U << 17; // bytes; the library's own 8 KiB make it slower
-    gzbuffer(file_, kBuffer);
-}
-
-CsvReader::~CsvReader()
-{
-    gzclose(file_);
+    gzbuffer(file_.get(), kBuffer);
 }
 
 bool CsvReader::next()
@@ -29,7 +24,7 @@ bool CsvReader::next()
             fields_.clear();
         // Spreadsheets write lines of mere separators.
         const auto hasText = [](const std::string& field) { return !field.empty(); };
-        if (fields_.empty() || std::any_of(fields_.begin(), fields_.end(), hasText))
+        if (fields_.empty() || std::ranges::any_of(fields_, hasText))
             return true;
     }
     return false;
@@ -38,15 +33,18 @@ bool CsvReader::next()
 /// Of a line that is too long, one byte more than may be is kept.
 bool CsvReader::readLine()
 {
+    // Afterwards `text_` is the line without its end, and `line_` its number.
+    const gzFile file = file_.get();
     text_.clear();
     int c;
-    while ((c = gzgetc(file_)) >= 0 && c != '\n')
+    while ((c = gzgetc(file)) >= 0 && c != '\n')
         if (text_.size() <= kLongestLine)
             text_ += static_cast<char>(c);
     int code = Z_OK;
-    const char* reason = gzerror(file_, &code);
+    const char* reason = gzerror(file, &code);
     if (c < 0 && code != Z_OK && code != Z_STREAM_END)
         throw std::runtime_error(code == Z_ERRNO ? path_ + ": cannot be read: " + std::strerror(errno) : reason);
+    // A last line without a line end counts; nothing behind the last line end is no line.
     if (c < 0 && text_.empty())
         return false;
     constexpr const char* kByteOrderMark = "\xEF\xBB\xBF";
@@ -55,6 +53,7 @@ bool CsvReader::readLine()
         text_.erase(0, std::strlen(kByteOrderMark));
     if (text_.ends_with('\r'))
         text_.pop_back();
+    // Once, for the whole file: a later line that has another separator is one with a single field.
     if (separator_ == '\0' && !text_.empty())
         guessSeparator();
     return true;
@@ -63,6 +62,7 @@ bool CsvReader::readLine()
 /// Commas also stand within numbers, and semicolons within names: the rarest separator on the line wins.
 void CsvReader::guessSeparator()
 {
+    // What stands in quotes is text, and no sign of a separator.
     std::string bare;
     bool quoted = false;
     for (const char c : text_) {
@@ -99,6 +99,7 @@ bool CsvReader::split()
 /// Takes the text between the quotes at `*at`, which goes behind them. @return false when the field does not end there.
 bool CsvReader::takeQuoted(std::size_t* at, std::string* field) const
 {
+    // `*at` stands on the opening quote. A quote within the text is written twice, which the inner step passes over.
     for (++*at; *at < text_.size(); ++*at) {
         if (text_[*at] == '"' && text_[++*at] != '"') // two stand for one
             return *at == text_.size() || text_[*at] == separator_;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <memory>
 #include <string>
 #include <vector>
 #include <zlib.h>
@@ -12,9 +13,6 @@
 class CsvReader {
 public:
     explicit CsvReader(const std::string& path);
-    ~CsvReader();
-    CsvReader(const CsvReader&) = delete;
-    CsvReader& operator=(const CsvReader&) = delete;
 
     /// Goes to the next line that has a text in any field. @return false at the end of the file.
     bool next();
@@ -35,7 +33,7 @@ private:
     bool takeQuoted(std::size_t* at, std::string* field) const;
 
     std::string path_;
-    gzFile file_;
+    std::unique_ptr<gzFile_s, int (*)(gzFile)> file_;
     char separator_ = '\0'; // not known yet
     unsigned long line_ = 0;
     std::string text_; // of the line

@@ -28,8 +28,9 @@ const std::vector<TableForm::Headings> kRateHeadings = {
     {Column::kValue, {"unitsper*", "valuein*", "rate", "exchangerate", "value", "quote", "price"}},
 };
 
+// Of each: the headings, the columns of a table without a header line, and how many of these must be there. A listing
+// needs the ticker only, since all else in it may be left open.
 const TableForm kQuotes = {kQuoteHeadings, {Column::kDate, Column::kTicker, Column::kValue}, 3};
-const TableForm kQuotesOfOneTicker = {kQuoteHeadings, {Column::kDate, Column::kValue}, 2};
 const TableForm kRates = {kRateHeadings, {Column::kDate, Column::kCurrency, Column::kValue}, 3};
 const TableForm kListing = {kQuoteHeadings, {Column::kTicker, Column::kMarket, Column::kCurrency, Column::kName}, 1};
 
@@ -66,15 +67,13 @@ std::size_t addAll(Map& valuesByOwner, Date* latest)
 
 } // namespace
 
-const TableForm& quotesOfOneTicker()
-{
-    return kQuotesOfOneTicker;
-}
+const TableForm kQuotesOfOneTicker = {kQuoteHeadings, {Column::kDate, Column::kValue}, 2};
 
 Importer::Importer(const ImportOptions& options, Catalogue& catalogue, std::ostream& log)
     : options_(options), catalogue_(catalogue), log_(log)
 {
     // The reference exists from here on, so that every other currency is made with it.
+    // `findCurrency` adds it to the catalogue, as the first one: the file lists the reference before all others.
     catalogue.setReferenceCurrency(findCurrency(options_.reference));
 }
 
@@ -94,6 +93,7 @@ void Importer::addRates(const std::string& path)
 void Importer::addQuotes(const std::string& path)
 {
     Table table(path, options_.tickerFromName ? kQuotesOfOneTicker : kQuotes);
+    // A table that has a ticker column goes by it, whatever its file is called.
     const std::string tickerOfFile = table.has(Column::kTicker) ? std::string() : tickerOf(path);
     counts_.skipped += table.forEach([&] { takeQuote(table, tickerOfFile); }, log_);
 }
@@ -109,6 +109,8 @@ bool Importer::areUnits(const Table& rates, const std::string& path) const
         if (currency != "reference" && currency != Table::headingOf(options_.reference))
             throw std::runtime_error(path + ": its rates refer to " + shown(currency) + ", not to the reference " +
                                      options_.reference);
+        // The heading names the reference, so it can be trusted; an option that says the opposite is a mistake of the
+        // user's.
         const bool units = prefix == "unitsper";
         if (options_.ratesAreUnits.value_or(units) != units)
             throw std::runtime_error(path + ": its heading " + shown(heading) + " contradicts the option --rates-are");
@@ -124,6 +126,7 @@ void Importer::takeListed(const Table& row)
         throw UnusableRow("has no ticker");
     Listed listed{std::string(row.cell(Column::kMarket)), std::string(row.cell(Column::kCurrency)),
                   std::string(row.cell(Column::kName))};
+    // Settles the market's currency before the quotes come, or throws when an earlier line has settled another one.
     if (!listed.currency.empty())
         findMarket(listed.market, listed.currency);
     listing_[ticker] = std::move(listed);
@@ -136,6 +139,7 @@ void Importer::takeRate(Table& row, bool units)
         throw UnusableRow("has no currency");
     const Date date = row.date();
     const float rate = row.value(units);
+    // 1 is what `giveReferenceItsRates` gives the reference, so such a line is taken like any other.
     // All else is relative to it: a file that gives it another rate means another reference.
     if (symbol == options_.reference && rate != 1)
         throw UnusableRow("gives the reference currency a rate that is not 1");
@@ -159,6 +163,7 @@ void Importer::takeQuote(Table& row, const std::string& tickerOfFile)
 
 void Importer::addValue(Values& values, const Date& date, float value)
 {
+    // Nothing is in the series yet: `finish` moves the values there. So the later of two lines can simply win here.
     const std::size_t before = values.size();
     values.insert_or_assign(values.end(), date, value); // most tables are in date order
     counts_.replaced += values.size() == before;
@@ -172,6 +177,7 @@ Importer::CompanyValues* Importer::findCompany(const Table& row, const std::stri
     (key += row.cell(Column::kMarket)) += kMark;
     key += row.cell(Column::kCurrency);
     const auto known = rows_.find(key);
+    // The pointer stays good: a map that grows moves no entry.
     return known != rows_.end() ? known->second : rows_[key] = placeCompany(row, ticker);
 }
 
@@ -185,8 +191,11 @@ Importer::CompanyValues* Importer::placeCompany(const Table& row, const std::str
     if (marketName.empty())
         marketName = listed.market;
     std::string currency(row.cell(Column::kCurrency));
+    // The listing's currency is that of the listing's market. A row that names another market has to be told of its
+    // currency by itself, or takes the one that the market already has.
     if (currency.empty() && marketName == listed.market)
         currency = listed.currency;
+    // Throws for a row that contradicts what is known of the market. Nothing has been made for the row by then.
     Market* market = findMarket(marketName, currency);
     Company*& company = companies_[{market, ticker.c_str()}];
     if (company == nullptr)
@@ -235,6 +244,7 @@ Date Importer::finish()
     tellDoubts();
     counts_.companies = quotes_.size();
     counts_.currencies = catalogue_.getNbrCurrencies();
+    // The reference has a rate on every day of a rate, so its last one is the latest of all rates.
     Date latest = rates_[catalogue_.getReferenceCurrency()].rbegin()->first;
     counts_.rates = addAll<CurrencyQuote>(rates_, &latest);
     counts_.quotes = addAll<CompanyQuote>(quotes_, &latest);

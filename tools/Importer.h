@@ -17,7 +17,7 @@ class Currency;
 class Market;
 
 /// The form of a table of one ticker's closing prices: date, close.
-const TableForm& quotesOfOneTicker();
+extern const TableForm kQuotesOfOneTicker;
 
 /// What the tables leave open.
 struct ImportOptions {

@@ -13,6 +13,7 @@
 #include "valuation/State.h"
 
 #include <nlohmann/json.hpp>
+#include <ranges>
 
 namespace {
 
@@ -34,17 +35,19 @@ public:
     explicit ObjectWriter(FILE* out) : out_(out) { put("{"); }
 
     void add(const char* key, const Json& value) { put(beginMember(key) + dump(value)); }
-    void beginList(const char* key)
+    /// `describe` makes a value of each of `items`.
+    template <class Items, class Describe>
+    void addList(const char* key, Items&& items, const Describe& describe)
     {
         put(beginMember(key) + "[");
-        isFirstItem_ = true;
+        // The line of an item is ended by what follows it: only then is it known whether a comma belongs there.
+        bool isFirst = true;
+        for (const auto& item : items) {
+            put((isFirst ? "\n    " : ",\n    ") + dump(describe(item)));
+            isFirst = false;
+        }
+        put(isFirst ? "]" : "\n  ]");
     }
-    void addItem(const Json& item)
-    {
-        put((isFirstItem_ ? "\n    " : ",\n    ") + dump(item));
-        isFirstItem_ = false;
-    }
-    void endList() { put(isFirstItem_ ? "]" : "\n  ]"); }
     void end() { put("\n}\n"); }
 
 private:
@@ -58,7 +61,6 @@ private:
 
     FILE* out_;
     bool isFirstMember_ = true;
-    bool isFirstItem_ = true;
 };
 
 std::string text(const String& text)
@@ -83,34 +85,26 @@ void addTotals(const Valuation& valuation, ObjectWriter& report)
     report.add("annualRevenue", known(totals.annualRevenue));
 }
 
-void addAccounts(const State& state, ObjectWriter& report)
+Json describeAccount(const AccountState* cash)
 {
-    report.beginList("accounts");
-    for (const AccountState* cash : state.accountStates()) {
-        const Account* account = cash->account();
-        report.addItem({{"name", text(cash->getAccountName())},
-                        {"currency", text(cash->getCurrencyRepresentation())},
-                        {"cash", cash->getCash()},
-                        {"defaultTransfer", account != nullptr && account->isDefaultTransferAccount()}});
-    }
-    report.endList();
+    const Account* account = cash->account();
+    return {{"name", text(cash->getAccountName())},
+            {"currency", text(cash->getCurrencyRepresentation())},
+            {"cash", cash->getCash()},
+            {"defaultTransfer", account != nullptr && account->isDefaultTransferAccount()}};
 }
 
-void addShares(const State& state, ObjectWriter& report)
+Json describeHolding(const ShareState* holding)
 {
-    report.beginList("shares");
-    for (const ShareState* holding : state.shareStates()) {
-        const Share* share = holding->share();
-        report.addItem({{"market", share != nullptr ? text(share->getMarketName()) : ""},
-                        {"ticker", text(holding->getCompanyAbbreviation())},
-                        {"name", text(holding->getCompanyName())},
-                        {"quantity", holding->getQuantity()},
-                        {"buyQuote", holding->getBuyQuote()},
-                        {"quote", holding->getQuote()},
-                        {"endDate", day(holding->getEndDate())},
-                        {"currency", text(holding->getCurrencyRepresentation())}});
-    }
-    report.endList();
+    const Share* share = holding->share();
+    return {{"market", share != nullptr ? text(share->getMarketName()) : ""},
+            {"ticker", text(holding->getCompanyAbbreviation())},
+            {"name", text(holding->getCompanyName())},
+            {"quantity", holding->getQuantity()},
+            {"buyQuote", holding->getBuyQuote()},
+            {"quote", holding->getQuote()},
+            {"endDate", day(holding->getEndDate())},
+            {"currency", text(holding->getCurrencyRepresentation())}};
 }
 
 Json describe(const TransferAccountOperation& transfer)
@@ -134,29 +128,26 @@ Json describe(const ShareOperation& trade)
             {"operationCost", trade.getOperationCost()}};
 }
 
-Json describe(const Account& account, const Operation& operation)
+/// An operation that an account lists.
+Json describeOperation(const Operation* operation)
 {
     constexpr const char* kTypes[] = {"", "deposit", "transfer", "buy", "sell"}; // by type code
-    Json json = {{"account", text(account.getName())},
-                 {"type", kTypes[operation.getType()]},
-                 {"date", day(operation.getDate())},
-                 {"automatic", operation.isAutomatic()}};
-    if (const auto* deposit = dynamic_cast<const DepositAccountOperation*>(&operation))
+    Json json = {{"account", text(operation->account()->getName())},
+                 {"type", kTypes[operation->getType()]},
+                 {"date", day(operation->getDate())},
+                 {"automatic", operation->isAutomatic()}};
+    if (const auto* deposit = dynamic_cast<const DepositAccountOperation*>(operation))
         json["amount"] = deposit->getAmount();
-    else if (const auto* transfer = dynamic_cast<const TransferAccountOperation*>(&operation))
+    else if (const auto* transfer = dynamic_cast<const TransferAccountOperation*>(operation))
         json.update(describe(*transfer));
-    else if (const auto* trade = dynamic_cast<const ShareOperation*>(&operation))
+    else if (const auto* trade = dynamic_cast<const ShareOperation*>(operation))
         json.update(describe(*trade));
     return json;
 }
 
-void addOperations(const Wallet& wallet, ObjectWriter& report)
+Json describePoint(const EvolutionPoint& point)
 {
-    report.beginList("operations");
-    for (const Account* account : wallet.accounts())
-        for (const Operation* operation : account->operations())
-            report.addItem(describe(*account, *operation));
-    report.endList();
+    return {{"date", day(point.date)}, {"totalValue", point.totalValue}};
 }
 
 } // namespace
@@ -168,14 +159,12 @@ void writeJsonReport(const Valuation& valuation, FILE* out)
     report.add("date", day(state.getDate()));
     addTotals(valuation, report);
     report.add("firstOperationDate", day(state.getFirstOperationDate()));
-    addAccounts(state, report);
-    addShares(state, report);
-    addOperations(valuation.wallet(), report);
-    if (valuation.hasEvolution()) {
-        report.beginList("evolution");
-        for (const EvolutionPoint& point : valuation.evolution())
-            report.addItem({{"date", day(point.date)}, {"totalValue", point.totalValue}});
-        report.endList();
-    }
+    report.addList("accounts", state.accountStates(), describeAccount);
+    report.addList("shares", state.shareStates(), describeHolding);
+    // A view, and no list: a portfolio may have millions of operations.
+    const auto operations = valuation.wallet().accounts() | std::views::transform(&Account::operations);
+    report.addList("operations", operations | std::views::join, describeOperation);
+    if (valuation.hasEvolution())
+        report.addList("evolution", valuation.evolution(), describePoint);
     report.end();
 }

@@ -1,7 +1,6 @@
 #include "tools/Program.h"
 
 #include "foundation/DateText.h"
-#include "foundation/Today.h"
 
 #include <clocale>
 #include <csignal>
@@ -23,6 +22,7 @@ int runProgram(CLI::App& app, int argc, char** argv, const std::function<void()>
         run();
         return 0;
     } catch (const CLI::ParseError& error) {
+        // The help and the version come as errors as well, of the code 0.
         return app.exit(error) == 0 ? 0 : kBadArguments;
     } catch (const std::exception& error) {
         std::cerr << app.get_name() << ": " << error.what() << '\n';
@@ -30,18 +30,21 @@ int runProgram(CLI::App& app, int argc, char** argv, const std::function<void()>
     }
 }
 
-std::string checkDateArgument(const std::string& text)
+void addDate(CLI::App& app, Date& date, const std::string& purpose)
 {
-    const bool isDate = text.find('/') != std::string::npos && parseDate(text);
-    return isDate ? std::string() : "is not a date DD/MM/YYYY: " + text;
+    const auto check = [](const std::string& text) {
+        const bool isDate = text.find('/') != std::string::npos && parseDate(text);
+        return isDate ? std::string() : "is not a date DD/MM/YYYY: " + text;
+    };
+    // Runs when the check has passed, so there is a date. Without the option `date` stays what the caller has put
+    // there.
+    const auto take = [&date](const std::string& text) { date = *parseDate(text); };
+    app.add_option_function<std::string>("--date", take, purpose)->type_name("DD/MM/YYYY")->check(check);
 }
 
-Date dateArgument(const std::string& text)
+CLI::Option* addText(CLI::App& app, const std::string& name, std::string& text, const std::string& type,
+                     const std::string& purpose)
 {
-    return text.empty() ? today() : *parseDate(text);
-}
-
-std::string checkNotEmpty(const std::string& text)
-{
-    return text.empty() ? "must not be empty" : std::string();
+    const auto check = [](const std::string& given) { return given.empty() ? "must not be empty" : std::string(); };
+    return app.add_option(name, text, purpose)->type_name(type)->check(check);
 }

@@ -11,12 +11,12 @@
 /// @return the exit status: 0; 1 when `run` failed, 2 for bad arguments.
 int runProgram(CLI::App& app, int argc, char** argv, const std::function<void()>& run);
 
+/// Adds the option `--date`, which sets `date`.
+///
 /// The dates of a command line are DD/MM/YYYY, the form that the program shows and takes everywhere else; not the ISO
 /// form that tables may have.
-/// @return what is wrong with `text`; empty when it is a date.
-std::string checkDateArgument(const std::string& text);
-/// The date of a text that `checkDateArgument` has passed; today, local time, for an empty one.
-Date dateArgument(const std::string& text);
+void addDate(CLI::App& app, Date& date, const std::string& purpose);
 
-/// What is wrong with an argument that must have a text; empty when nothing is.
-std::string checkNotEmpty(const std::string& text);
+/// Adds an option whose text must not be empty; `type` is what the help calls it.
+CLI::Option* addText(CLI::App& app, const std::string& name, std::string& text, const std::string& type,
+                     const std::string& purpose);

@@ -9,13 +9,6 @@ namespace {
 
 constexpr std::size_t kLongestRequest = 4096;
 
-int descriptorOf(const Socket& socket)
-{
-    int descriptor = -1;
-    socket.getDescriptor(&descriptor);
-    return descriptor;
-}
-
 bool isOnlyNotReady()
 {
     return errno == EAGAIN || errno == EINTR;
@@ -29,7 +22,7 @@ QuoteClient::QuoteClient(std::unique_ptr<Socket> connection)
 
 pollfd QuoteClient::waiting() const
 {
-    return {descriptorOf(*connection_), static_cast<short>(page_.empty() ? POLLIN : POLLOUT), 0};
+    return {connection_->descriptor(), static_cast<short>(page_.empty() ? POLLIN : POLLOUT), 0};
 }
 
 bool QuoteClient::proceed(const QuoteFolder& folder)
@@ -41,16 +34,18 @@ bool QuoteClient::proceed(const QuoteFolder& folder)
 bool QuoteClient::receive(const QuoteFolder& folder)
 {
     char bytes[kLongestRequest];
-    const ssize_t count = recv(descriptorOf(*connection_), bytes, sizeof bytes, MSG_DONTWAIT);
+    const ssize_t count = recv(connection_->descriptor(), bytes, sizeof bytes, MSG_DONTWAIT);
     if (count <= 0)
         return count < 0 && isOnlyNotReady();
     const std::string_view come(bytes, static_cast<std::size_t>(count));
     const std::size_t end = come.find_first_of(std::string_view("\n\0", 2));
+    // What comes behind the line end is lost: a client has one request.
     request_ += come.substr(0, end);
     if (request_.size() > kLongestRequest)
         return false;
     if (end == come.npos)
         return true;
+    // A page is never empty, so from here on the client is one that takes its page.
     page_ = folder.answer(request_);
     return send();
 }
@@ -58,7 +53,7 @@ bool QuoteClient::receive(const QuoteFolder& folder)
 bool QuoteClient::send()
 {
     const ssize_t count =
-        ::send(descriptorOf(*connection_), page_.data() + sent_, page_.size() - sent_, MSG_DONTWAIT | MSG_NOSIGNAL);
+        ::send(connection_->descriptor(), page_.data() + sent_, page_.size() - sent_, MSG_DONTWAIT | MSG_NOSIGNAL);
     if (count < 0)
         return isOnlyNotReady();
     sent_ += static_cast<std::size_t>(count);

@@ -39,6 +39,7 @@ std::string QuoteFolder::answer(std::string_view request) const
     const std::string_view path = between(line, "GET ", "").value_or("");
     const auto latest = between(path, QuoteServers::kLatestPath, "");
     const auto history = between(path, QuoteServers::kHistoryPath, QuoteServers::kHistoryPathEnd);
+    // An empty ticker, as that of a request of neither kind, has no file.
     const Closes closes = closesOf(latest.value_or(history.value_or("")));
     if (closes.empty())
         return noQuotesPage();
@@ -54,7 +55,7 @@ Closes QuoteFolder::closesOf(std::string_view ticker) const
     if (!isFileName(ticker) || !std::filesystem::exists(file, error))
         return closes;
     try {
-        Table table(file, quotesOfOneTicker());
+        Table table(file, kQuotesOfOneTicker);
         table.forEach([&] { closes.insert_or_assign(table.date(), table.value(false)); }, log_);
     } catch (const std::runtime_error& reason) {
         // What stands before the damage is served all the same.

@@ -1,6 +1,5 @@
 #include "tools/QuotePages.h"
 
-#include <charconv>
 #include <cmath>
 #include <cstdio>
 #include <limits>
@@ -21,27 +20,24 @@ Fraction fractionOf(float close, float whole)
         if (whole + numerator / denominator == close)
             return {numerator, denominator};
     }
+    // As a last resort the digits of the float themselves over a power of two: exact, if hard to read.
     int exponent = 0;
     constexpr int kBits = std::numeric_limits<float>::digits;
     const float mantissa = std::frexp(rest, &exponent);
     return {std::ldexp(mantissa, kBits), std::ldexp(1.F, kBits - exponent)};
 }
 
+/// A number of the page's fractions, which is whole.
 std::string integerText(float number)
 {
-    char text[std::numeric_limits<float>::max_exponent10 + 2];
-    return {text, static_cast<std::size_t>(std::snprintf(text, sizeof text, "%.0f", static_cast<double>(number)))};
+    return shortestText(number, std::chars_format::fixed);
 }
 
-/// The shortest text that reads back to `price`.
 std::string priceText(float price)
 {
     constexpr float kSmallest = 1e-4F, kLargest = 1e9F; // outside, the power of ten is shorter than zeros
     const bool plain = price >= kSmallest && price < kLargest;
-    const auto format = plain ? std::chars_format::fixed : std::chars_format::general;
-    char text[32];
-    char* const end = std::to_chars(text, text + sizeof text, price, format).ptr;
-    return {text, end};
+    return shortestText(price, plain ? std::chars_format::fixed : std::chars_format::general);
 }
 
 std::string cellText(float close)
@@ -83,6 +79,7 @@ std::string latestQuotePage(float close)
 std::string historyPage(const Closes& closes)
 {
     std::string page = "<html><body><pre>\n<b>Date Close Open High Low Volume (00s)</b>\n";
+    // Strictly behind that day, which may be one that its month does not have.
     for (auto close = closes.upper_bound(threeMonthsBefore(closes.rbegin()->first)); close != closes.end(); ++close)
         page += rowOf(close->first, close->second);
     return page + "</pre></body></html>\n";
@@ -91,4 +88,10 @@ std::string historyPage(const Closes& closes)
 std::string noQuotesPage()
 {
     return "<html><body>There are no quotes of this ticker.</body></html>\n";
+}
+
+std::string shortestText(float price, std::chars_format format)
+{
+    char text[64]; // as long as any float without an exponent
+    return {text, std::to_chars(text, text + sizeof text, price, format).ptr};
 }

@@ -2,6 +2,7 @@
 
 #include "foundation/Date.h"
 
+#include <charconv>
 #include <map>
 #include <string>
 
@@ -19,3 +20,6 @@ std::string historyPage(const Closes& closes);
 
 /// Says that there is no such ticker; has none of the places where the fetches look for prices.
 std::string noQuotesPage();
+
+/// The shortest text that reads back to `price`.
+std::string shortestText(float price, std::chars_format format);

@@ -1,48 +1,58 @@
 #include "tools/QuoteServer.h"
 
-#include "tools/StopSignals.h"
-
 #include <algorithm>
 #include <cerrno>
+#include <cstring>
 #include <fcntl.h>
+#include <stdexcept>
+
+namespace {
+
+/// Where what is waited for stands in the list.
+enum Place : std::size_t { kListener, kStop, kClients };
+
+} // namespace
 
 QuoteServer::QuoteServer(Socket& listener, const QuoteFolder& folder) : listener_(listener), folder_(folder)
 {
     // A client may be gone again before it is accepted; that must not become a wait for the next one.
-    int descriptor = -1;
-    listener.getDescriptor(&descriptor);
+    const int descriptor = listener.descriptor();
     fcntl(descriptor, F_SETFL, fcntl(descriptor, F_GETFL) | O_NONBLOCK);
     // The few that a socket lets stand in line fill up when many come at once; one more would try again in a second.
     listen(descriptor, kMostClients);
 }
 
-void QuoteServer::serve(const StopSignals& signals)
+void QuoteServer::serve(const Descriptor& stop)
 {
-    for (std::vector<pollfd> all = waiting(); signals.waitFor(all, timeLeft()); all = waiting()) {
+    for (;;) {
+        std::vector<pollfd> all = waiting(stop);
+        if (poll(all.data(), all.size(), timeLeft()) < 0 && errno != EINTR)
+            throw std::runtime_error(std::strerror(errno));
+        if (all[kStop].revents != 0)
+            return;
+        // The clients first: those who come now would shift the places that `all` was made for.
         proceed(all);
-        if (all.front().revents != 0)
+        if (all[kListener].revents != 0)
             acceptClients();
     }
 }
 
-/// The listener, and behind it the clients in their order.
-std::vector<pollfd> QuoteServer::waiting() const
+/// The listener and `stop`, and behind them the clients in their order.
+std::vector<pollfd> QuoteServer::waiting(const Descriptor& stop) const
 {
-    int descriptor = -1;
-    listener_.getDescriptor(&descriptor);
-    std::vector<pollfd> all = {{descriptor, POLLIN, 0}};
+    std::vector<pollfd> all = {{listener_.descriptor(), POLLIN, 0}, {stop.number, POLLIN, 0}};
     for (const QuoteClient& client : clients_)
         all.push_back(client.waiting());
     return all;
 }
 
-/// Until the first client's time is over; none when there is no client.
-std::optional<std::chrono::milliseconds> QuoteServer::timeLeft() const
+/// The milliseconds until the first client's time is over; -1, which `poll` takes for ever, when there is no client.
+int QuoteServer::timeLeft() const
 {
     if (clients_.empty())
-        return std::nullopt;
+        return -1;
     const auto left = clients_.front().deadline() - Socket::Clock::now();
-    return std::max(std::chrono::ceil<std::chrono::milliseconds>(left), std::chrono::milliseconds(0));
+    return std::max(static_cast<int>(std::chrono::ceil<std::chrono::milliseconds>(left).count()), 0);
 }
 
 void QuoteServer::proceed(const std::vector<pollfd>& ready)
@@ -50,7 +60,8 @@ void QuoteServer::proceed(const std::vector<pollfd>& ready)
     std::vector<QuoteClient> staying;
     for (std::size_t i = 0; i < clients_.size(); ++i) {
         QuoteClient& client = clients_[i];
-        const bool stays = ready[i + 1].revents == 0 || client.proceed(folder_);
+        // Whom nothing has come from is only asked for the time; one that is ready may have come to its end.
+        const bool stays = ready[kClients + i].revents == 0 || client.proceed(folder_);
         if (stays && Socket::Clock::now() < client.deadline())
             staying.push_back(std::move(client));
     }
@@ -68,6 +79,8 @@ void QuoteServer::acceptClients()
 /// @return false when nobody stands in line.
 bool QuoteServer::acceptClient()
 {
+    // Without a free descriptor nobody can be accepted, and the listener would stay ready for ever. So the oldest
+    // client goes, and the next turn of the loop has its descriptor.
     Socket* accepted = nullptr;
     const bool isThere = listener_.acceptConnection(&accepted) == 0;
     if (isThere)

@@ -1,11 +1,9 @@
 #pragma once
 
+#include "storage/Descriptor.h"
 #include "tools/QuoteClient.h"
 
-#include <optional>
 #include <vector>
-
-class StopSignals;
 
 /// Answers quote requests out of a folder, those of several clients at once, on one thread.
 ///
@@ -16,14 +14,14 @@ public:
     /// `listener` listens already; it and `folder` outlive the server.
     QuoteServer(Socket& listener, const QuoteFolder& folder);
 
-    /// Serves until it is time to stop.
-    void serve(const StopSignals& signals);
+    /// Serves until there is something to read at `stop`.
+    void serve(const Descriptor& stop);
 
 private:
     static constexpr int kMostClients = 64;
 
-    std::vector<pollfd> waiting() const;
-    std::optional<std::chrono::milliseconds> timeLeft() const;
+    std::vector<pollfd> waiting(const Descriptor& stop) const;
+    int timeLeft() const;
     void proceed(const std::vector<pollfd>& ready);
     void acceptClients();
     bool acceptClient();

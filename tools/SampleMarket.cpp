@@ -14,41 +14,29 @@
 
 namespace {
 
+// The sample is a small story: each random walk has a seed of its own, so that a change to one company leaves the
+// prices of all others as they are. Days are places in the list of weekdays, so that the story moves with its last day.
 constexpr int kWeeks = 261; // of five years
 constexpr double kDaysInYear = 261;
 
-struct CurrencyPlan {
+constexpr struct CurrencyPlan {
     const char* name;
     const char* symbol;
     double rate;       // in euros, on the first day
     double volatility; // of a day, a fraction
-};
-
-constexpr CurrencyPlan kCurrencies[] = {
+} kCurrencies[] = {
     {"Euro", "EUR", 1, 0},
     {"US Dollar", "USD", 0.9120, 0.0042},
     {"Pound Sterling", "GBP", 1.1640, 0.0035},
     {"Swiss Franc", "CHF", 1.0310, 0.0026},
 };
 
-struct MarketPlan {
+constexpr struct MarketPlan {
     const char* name;
     const char* symbol; // of its currency
-};
+} kMarkets[] = {{"NYSE", "USD"}, {"NASDAQ", "USD"}, {"Paris", "EUR"}, {"London", "GBP"}};
 
-constexpr MarketPlan kMarkets[] = {{"NYSE", "USD"}, {"NASDAQ", "USD"}, {"Paris", "EUR"}, {"London", "GBP"}};
-
-struct CompanyPlan {
-    const char* name;
-    const char* ticker;
-    const char* market;
-    double price;      // on the first day
-    double growth;     // of a year, a fraction, beside what the world does
-    double volatility; // of a day, a fraction
-    double beta;       // how much it follows the world
-};
-
-constexpr CompanyPlan kCompanies[] = {
+constexpr SampleCompany kCompanies[] = {
     {"Harrowmere Rail", "HWMR", "NYSE", 62.40, 0.07, 0.011, 0.9},
     {"Tannehurst Paper Mills", "TNHP", "NYSE", 28.15, -0.04, 0.015, 0.8},
     {"Ardenmoor Energy", "AMOE", "NYSE", 47.80, 0.02, 0.017, 0.7},
@@ -71,22 +59,18 @@ constexpr CompanyPlan kCompanies[] = {
     {"Marlstone Mining", "MRLM", "London", 33.10, 0.08, 0.022, 1.2},
 };
 
-struct SplitPlan {
+constexpr struct SplitPlan {
     const char* ticker;
     std::size_t day; // the first one on which the new shares are traded
     short newShares; // for each old one
-};
+} kSplits[] = {{"ZPHR", 702, 3}, {"NDWK", 958, 2}};
 
-constexpr SplitPlan kSplits[] = {{"ZPHR", 702, 3}, {"NDWK", 958, 2}};
-
-struct NotePlan {
+constexpr struct NotePlan {
     const char* ticker;
     std::size_t day;
     const char* title;
     const char* text;
-};
-
-constexpr NotePlan kNotes[] = {
+} kNotes[] = {
     {"QLLN", 61, "Coverage", "Sells to hospitals only; little debt. Worth watching."},
     {"CHLV", 133, "Order book", "Two ferries cancelled. Management expects a weak second half."},
     {"MDLB", 248, "Annual report", "Margins up again, Asia now a third of sales. Dividend 3.20."},
@@ -108,6 +92,7 @@ double rounded(double value, double unitsOfOne)
 /// What all companies have in common on a day: a steady rise, but for one slump and its recovery.
 double worldDrift(std::size_t day)
 {
+    // Days of the sample. The recovery makes up for the slump and a little more.
     constexpr std::size_t kSlump = 430;
     constexpr std::size_t kTurn = 475;
     constexpr std::size_t kRecovered = 610;
@@ -134,6 +119,7 @@ void addRates(Currency* currency, const CurrencyPlan& plan, std::uint64_t seed, 
     double rate = plan.rate;
     for (const Date& day : days) {
         new CurrencyQuote(currency, day, static_cast<float>(rounded(rate, kRateUnits)));
+        // The walk itself is not rounded, or small moves would be lost. The pull keeps a rate near to what people know.
         rate += kPull * (plan.rate - rate) + plan.volatility * rate * noise.next();
     }
 }
@@ -145,7 +131,7 @@ const SplitPlan* findSplit(const String& ticker)
     return found != std::end(kSplits) ? found : nullptr;
 }
 
-void addQuotes(Company* company, const CompanyPlan& plan, std::uint64_t seed, const std::vector<Date>& days,
+void addQuotes(Company* company, const SampleCompany& plan, std::uint64_t seed, const std::vector<Date>& days,
                const std::vector<double>& world)
 {
     constexpr double kCents = 100;
@@ -199,11 +185,14 @@ std::vector<Date> sampleDays(const Date& last)
 
 void fillSampleMarket(Catalogue& catalogue, const std::vector<Date>& days)
 {
+    // Counts through currencies and companies alike. So a new currency would change all prices, and with them what the
+    // sample's trades come to; a new company goes to the end of its table.
     std::uint64_t seed = 1000;
     for (const CurrencyPlan& plan : kCurrencies) {
         Currency* reference = catalogue.getReferenceCurrency();
         auto* currency = new Currency(plan.name, plan.symbol, reference);
         catalogue.addCurrency(currency);
+        // Of the first one: it is its own reference, and those behind it are made with it.
         if (reference == nullptr)
             catalogue.setReferenceCurrency(currency);
         addRates(currency, plan, ++seed, days);
@@ -212,18 +201,25 @@ void fillSampleMarket(Catalogue& catalogue, const std::vector<Date>& days)
         auto* market = new Market(plan.name);
         market->setCurrency(catalogue.getCurrencyByRepresentation(plan.symbol));
     }
+    // All companies see the same world, each as far as its beta goes.
     const std::vector<double> world = worldReturns(days.size());
-    for (const CompanyPlan& plan : kCompanies) {
+    for (const SampleCompany& plan : kCompanies) {
         auto* company = new Company(findMarket(catalogue, plan.market), plan.name, plan.ticker);
         addQuotes(company, plan, ++seed, days, world);
         addNotes(company, days);
     }
 }
 
-std::vector<SampleTicker> sampleTickers()
+std::span<const SampleCompany> sampleCompanies()
 {
-    std::vector<SampleTicker> tickers;
-    for (const CompanyPlan& plan : kCompanies)
-        tickers.push_back({plan.ticker, static_cast<float>(plan.price), plan.volatility, tickers.size() + 1});
-    return tickers;
+    return kCompanies;
+}
+
+Company* findCompany(const Catalogue& catalogue, const String& ticker)
+{
+    Company* company = nullptr;
+    for (const Market* market : catalogue.getMarkets())
+        if (market->getCompany(ticker, &company) == 0)
+            break;
+    return company;
 }

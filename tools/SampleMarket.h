@@ -2,10 +2,11 @@
 
 #include "foundation/Date.h"
 
-#include <cstdint>
+#include <span>
 #include <vector>
 
 class Catalogue;
+class Company;
 
 bool isWeekday(const Date& day);
 
@@ -17,12 +18,18 @@ std::vector<Date> sampleDays(const Date& last);
 /// Quotes and rates depend on a day's place in `days` only.
 void fillSampleMarket(Catalogue& catalogue, const std::vector<Date>& days);
 
-struct SampleTicker {
+struct SampleCompany {
     const char* name;
-    float firstPrice;
-    double volatility;  // of a day, a fraction
-    std::uint64_t seed; // of the company's prices
+    const char* ticker;
+    const char* market;
+    double price;      // on the first day
+    double growth;     // of a year, a fraction, beside what the world does
+    double volatility; // of a day, a fraction
+    double beta;       // how much it follows the world
 };
 
-/// Those of all companies of the made-up world.
-std::vector<SampleTicker> sampleTickers();
+/// Those of the made-up world.
+std::span<const SampleCompany> sampleCompanies();
+
+/// The first company with this ticker, whatever its market; null when the catalogue has none.
+Company* findCompany(const Catalogue& catalogue, const String& ticker);

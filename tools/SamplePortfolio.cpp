@@ -3,13 +3,13 @@
 #include "market/Catalogue.h"
 #include "market/Company.h"
 #include "market/Currency.h"
-#include "market/Market.h"
 #include "portfolio/Account.h"
 #include "portfolio/DepositAccountOperation.h"
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
 #include "portfolio/Wallet.h"
+#include "tools/SampleMarket.h"
 
 #include <string_view>
 #include <unordered_map>
@@ -21,36 +21,29 @@ constexpr const char* kParis = "Paris broker";
 constexpr const char* kNewYork = "New York broker";
 constexpr const char* kLondon = "London broker";
 
-struct AccountPlan {
+constexpr struct AccountPlan {
     const char* name;
     const char* symbol;
     bool isDefaultTransfer;
-};
+} kAccounts[] = {{kSavings, "EUR", true}, {kParis, "EUR", false}, {kNewYork, "USD", false}, {kLondon, "GBP", false}};
 
-constexpr AccountPlan kAccounts[] = {
-    {kSavings, "EUR", true}, {kParis, "EUR", false}, {kNewYork, "USD", false}, {kLondon, "GBP", false}};
-
-struct DepositPlan {
+constexpr struct DepositPlan {
     std::size_t day;
     const char* account;
     float amount;
-};
-
-constexpr DepositPlan kDeposits[] = {
+} kDeposits[] = {
     {0, kSavings, 40000},  {131, kSavings, 5000}, {262, kSavings, 5000}, {393, kSavings, 5000},  {524, kSavings, 6000},
     {655, kSavings, 6000}, {786, kSavings, 6000}, {917, kSavings, 6000}, {1048, kSavings, 7000}, {1179, kSavings, 7000},
 };
 
-struct TransferPlan {
+constexpr struct TransferPlan {
     std::size_t day;
     const char* from;
     const char* to;
     float amount;
     float rateCost; // what the exchange takes
     float cost;
-};
-
-constexpr TransferPlan kTransfers[] = {
+} kTransfers[] = {
     {2, kSavings, kParis, 14000, 0, 0},           {3, kSavings, kNewYork, 18000, 0.002F, 12},
     {134, kSavings, kLondon, 8000, 0.002F, 12},   {396, kSavings, kParis, 5000, 0, 0},
     {527, kSavings, kNewYork, 12000, 0.002F, 12}, {700, kNewYork, kSavings, 5000, 0.002F, 15},
@@ -58,14 +51,12 @@ constexpr TransferPlan kTransfers[] = {
     {1100, kLondon, kSavings, 2500, 0.002F, 10},  {1182, kSavings, kNewYork, 9000, 0.002F, 12},
 };
 
-struct TradePlan {
+constexpr struct TradePlan {
     std::size_t day;
     const char* account;
     const char* ticker;
     int amount; // to buy for about that much; a percentage of the holding to sell when it is negative
-};
-
-constexpr TradePlan kTrades[] = {
+} kTrades[] = {
     {6, kParis, "VMBC", 4000},      {6, kNewYork, "QLLN", 5000},    {12, kNewYork, "NDWK", 5000},
     {34, kParis, "EARM", 4000},     {41, kNewYork, "OSDR", 4000},   {66, kNewYork, "LXRO", 4000},
     {90, kParis, "BVQY", 3500},     {138, kLondon, "WTCB", 2500},   {150, kLondon, "MRLM", 2000},
@@ -84,6 +75,8 @@ constexpr TradePlan kTrades[] = {
     {1271, kNewYork, "AMOE", 4000}, {1288, kParis, "CHLV", 4500},   {1296, kNewYork, "ZPHR", 3000},
 };
 
+/// Carries out the plans, each kind in the order of its table. Deposits and transfers may come before the trades that
+/// they pay for are made: the accounts sort their operations by day, and no balance is kept here.
 class Portfolio {
 public:
     Portfolio(Wallet& wallet, const Catalogue& catalogue, const std::vector<Date>& days)
@@ -122,6 +115,8 @@ public:
         const bool buy = plan.amount > 0;
         const int quantity =
             buy ? static_cast<int>(static_cast<double>(plan.amount) / quote) : holding.quantity * -plan.amount / 100;
+        // What is held is known here only: quantities are computed from the operations, which would take a valuation
+        // each.
         holding.quantity += buy ? quantity : -quantity;
         const float cost = buy ? wallet_.getBuyCost() : wallet_.getSellCost();
         auto* trade = new ShareOperation(day, holding.share, buy, quantity, quote, false, cost);
@@ -144,9 +139,11 @@ private:
     Holding& find(const char* ticker)
     {
         Holding& holding = holdings_[ticker];
-        for (const Market* market : catalogue_.getMarkets())
-            if (holding.company == nullptr && market->getCompany(ticker, &holding.company) == 0)
-                holding.share = new Share(&wallet_, holding.company); // owned by the wallet
+        // A place that was just made has no company; afterwards each ticker has one holding in the wallet.
+        if (holding.company != nullptr)
+            return holding;
+        holding.company = findCompany(catalogue_, ticker);
+        holding.share = new Share(&wallet_, holding.company); // owned by the wallet
         return holding;
     }
 

@@ -2,12 +2,11 @@
 
 #include "market/Catalogue.h"
 #include "market/Company.h"
-#include "market/Market.h"
 #include "storage/AtomicFile.h"
 #include "tools/Noise.h"
+#include "tools/QuotePages.h"
 #include "tools/SampleMarket.h"
 
-#include <charconv>
 #include <cmath>
 #include <cstdio>
 #include <stdexcept>
@@ -17,25 +16,17 @@ namespace {
 
 constexpr int kDays = 100;
 
-/// Null when the market file's owner has removed it.
-const Company* findCompany(const Catalogue& catalogue, const String& ticker)
-{
-    for (const Market* market : catalogue.getMarkets()) {
-        Company* company;
-        if (market->getCompany(ticker, &company) == 0)
-            return company;
-    }
-    return nullptr;
-}
-
 /// A day's price after `former`, in cents: another one, and above 0.
-float nextPrice(float former, const SampleTicker& ticker, const Date& day)
+float nextPrice(float former, double volatility, std::uint64_t seed, const Date& day)
 {
     constexpr double kCents = 100;
+    // The move depends on the day and the company only, and not on how many moves were made before: tables that are
+    // written later move likewise on the same days.
     const int number = day - Date(1, 1, 2000);
-    Noise noise(ticker.seed << 32 ^ static_cast<std::uint32_t>(number));
-    const double move = noise.next() * ticker.volatility;
+    Noise noise(seed << 32 ^ static_cast<std::uint32_t>(number));
+    const double move = noise.next() * volatility;
     const double price = std::round(static_cast<double>(former) * (1 + move) * kCents) / kCents;
+    // A price that stands still would be no news, and one of 0 no price.
     if (price <= 0 || static_cast<float>(price) == former)
         return static_cast<float>(static_cast<double>(former) + 1 / kCents);
     return static_cast<float>(price);
@@ -43,27 +34,29 @@ float nextPrice(float former, const SampleTicker& ticker, const Date& day)
 
 std::string rowOf(const Date& day, float price)
 {
-    char date[32], digits[64]; // as long as any float without an exponent
+    char date[32];
     std::snprintf(date, sizeof date, "%04d-%02d-%02d,", day.getYear(), day.getMonth(), day.getDay());
-    char* const end = std::to_chars(digits, digits + sizeof digits, price, std::chars_format::fixed).ptr;
-    return date + std::string(digits, end) + '\n';
+    return date + shortestText(price, std::chars_format::fixed) + '\n';
 }
 
-std::string tableOf(const Company& company, const SampleTicker& ticker, const Date& last)
+/// `seed` is that of the company's prices.
+std::string tableOf(const Company& company, const SampleCompany& plan, std::uint64_t seed, const Date& last)
 {
     std::string table = "Date,Close\n";
     Date day = last;
     day.moveBy(-kDays);
+    // The walk begins with the price before the first day. A company without quotes begins where the sample began; so
+    // does one whose line has run below 0.
     float price = company.getRealQuote(day);
     if (!(price > 0))
-        price = ticker.firstPrice;
+        price = static_cast<float>(plan.price);
     while (day < last) {
         day = day.getNext();
         if (day != last && !isWeekday(day))
             continue;
         CompanyQuote* quote = nullptr;
         const bool isKnown = day != last && company.getQuote(day, &quote) == 0 && quote->getValue() > 0;
-        price = isKnown ? quote->getValue() : nextPrice(price, ticker, day);
+        price = isKnown ? quote->getValue() : nextPrice(price, plan.volatility, seed, day);
         table += rowOf(day, price);
     }
     return table;
@@ -77,12 +70,15 @@ void writeSampleQuotes(const std::filesystem::path& folder, const Catalogue& cat
     std::filesystem::create_directories(folder, error);
     if (error)
         throw std::runtime_error(folder.string() + ": cannot be made: " + error.message());
-    for (const SampleTicker& ticker : sampleTickers()) {
-        const Company* company = findCompany(catalogue, ticker.name);
+    std::uint64_t seed = 0;
+    for (const SampleCompany& plan : sampleCompanies()) {
+        // Also for a company that is not there, so that the others keep theirs.
+        ++seed;
+        const Company* company = findCompany(catalogue, plan.ticker);
         if (company == nullptr)
-            continue;
-        const std::string table = tableOf(*company, ticker, last);
-        AtomicFile file(folder / (std::string(ticker.name) + ".csv"), AtomicFile::Existing::kReplace);
+            continue; // the market file's owner has removed it
+        const std::string table = tableOf(*company, plan, seed, last);
+        AtomicFile file(folder / (std::string(plan.ticker) + ".csv"), AtomicFile::Existing::kReplace);
         if (std::fwrite(table.data(), 1, table.size(), file.stream()) != table.size())
             file.fail("cannot be written");
         file.commit();

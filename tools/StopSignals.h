@@ -1,21 +1,7 @@
 #pragma once
 
-#include <chrono>
-#include <csignal>
-#include <optional>
-#include <poll.h>
-#include <span>
+#include "storage/Descriptor.h"
 
-/// Turns SIGINT and SIGTERM into a request to stop. One object for a process; the handlers stay when it is gone.
-class StopSignals {
-public:
-    StopSignals();
-
-    /// Waits until one of the descriptors is ready, as `poll` does, or for `limit`, if any; another signal also ends
-    /// the wait, with none ready.
-    /// @return false when it is time to stop.
-    bool waitFor(std::span<pollfd> waiting, std::optional<std::chrono::milliseconds> limit) const;
-
-private:
-    sigset_t stopping_;
-};
+/// Turns SIGINT and SIGTERM, for the rest of the program's life, into a request to stop that can be waited for: from
+/// the first one on there is something to read at the descriptor, for `poll` to tell. It is for one caller.
+Descriptor stopSignals();

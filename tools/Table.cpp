@@ -43,9 +43,12 @@ std::string shown(std::string_view text)
     return '"' + printable(text) + '"';
 }
 
+// The reader is always one record ahead: `more_` says whether `reader_.fields()` is a row that nobody has taken yet.
+// The constructor reads the first record to see whether it is a header, `forEach` takes the rows from there on.
 Table::Table(const std::string& path, const TableForm& form) : path_(path), reader_(path), more_(reader_.next())
 {
     const bool header = takeHeader(form);
+    // What looked like headings by accident is forgotten again: the columns are where the plain form has them.
     if (!header) {
         places_.fill(kNowhere);
         valueHeading_.clear();
@@ -66,6 +69,7 @@ Table::Table(const std::string& path, const TableForm& form) : path_(path), read
 bool Table::takeHeader(const TableForm& form)
 {
     places_.fill(kNowhere);
+    // From here on `places_` has no column but those that the loops find.
     std::vector<std::string> present;
     for (const std::string& field : reader_.fields())
         present.push_back(headingOf(field));
@@ -98,6 +102,8 @@ std::string Table::headingOf(std::string_view text)
 std::size_t Table::forEach(const std::function<void()>& take, std::ostream& log)
 {
     std::size_t rejected = 0;
+    // A row that throws leaves the table as it was: the next one is read as if this one had never been there. Other
+    // errors are the file's, and end the reading.
     for (; more_; more_ = reader_.next())
         try {
             checkFit();
@@ -113,6 +119,7 @@ std::size_t Table::forEach(const std::function<void()>& take, std::ostream& log)
 
 void Table::checkFit() const
 {
+    // The reader gives no fields for a line that it could not cut; an empty line never comes here.
     if (reader_.fields().empty())
         throw UnusableRow("has a quote that is not closed, or is too long");
     for (std::size_t i = mostFields_; i < reader_.fields().size(); ++i)
@@ -142,6 +149,7 @@ float Table::value(bool inverted)
     const char mark = place != text.npos ? text[place] : decimalMark_;
     const bool isAllowed =
         mark == decimalMark_ || (decimalMark_ == '\0' && (mark == '.' || reader_.separator() != ','));
+    // The mark is judged above, so the number can be read with a point from here on.
     std::replace(text.begin(), text.end(), ',', '.');
     const double number = isAllowed ? numberOf(text) : 0;
     const double value = inverted && number != 0 ? 1 / number : number;
@@ -150,6 +158,7 @@ float Table::value(bool inverted)
         decimalMark_ = mark;
         return static_cast<float>(value);
     }
+    // The mark stays as it was: a number that is refused settles nothing.
     const char expected = decimalMark_ == '\0' ? '.' : decimalMark_;
     throw UnusableRow(shown(cell(Column::kValue)) + " is no positive number with decimal '" + expected + "'");
 }

@@ -15,9 +15,7 @@
 #include "valuation/State.h"
 
 #include <algorithm>
-#include <cmath>
 #include <cstdio>
-#include <cstdlib>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -66,6 +64,8 @@ void takeTransfers(const Account& account, std::vector<AutomaticLine>* lines)
     }
 }
 
+/// Writes each part as text. What cannot be told, because there is no reference currency or none of an amount's symbol,
+/// is an empty cell; a part without rows is left out with its headings.
 class Report {
 public:
     explicit Report(const Valuation& valuation)
@@ -84,13 +84,104 @@ public:
     }
 
 private:
-    std::string header() const;
-    std::string totals() const;
-    std::string accounts() const;
-    std::string holdings() const;
-    std::string automaticOperations() const;
-    std::string evolution() const;
-    std::string inReference(double amount, const String& symbol) const;
+    std::string header() const
+    {
+        const std::string day = "Portfolio on " + dateText(valuation_.state().getDate());
+        if (reference_ == nullptr)
+            return day + ", without totals: the market file has no reference currency\n";
+        return day + ", in " + plain(reference_->getName()) + " (" + referenceSymbol_ + ")\n";
+    }
+
+    std::string totals() const
+    {
+        const Totals totals = valuation_.totals();
+        TextTable table({{""}, {"", kRight}, {""}});
+        if (totals.isKnown) {
+            table.addRow({"Total Deposit", amountText(totals.totalDeposit), referenceSymbol_});
+            table.addRow({"Total Value", amountText(totals.totalValue), referenceSymbol_});
+            table.addRow({"Profit", amountText(totals.profit), referenceSymbol_});
+            table.addRow({"Annual Revenu", amountText(totals.annualRevenue * 100.0), "%"});
+        }
+        // The state gives a day after all others where there is no operation.
+        const Date first = valuation_.state().getFirstOperationDate();
+        table.addRow({"First operation", first == State::afterAllOperations() ? "none" : dateText(first), ""});
+        return table.toString();
+    }
+
+    /// An amount in the currency of that symbol, in the reference currency; empty when that has no answer.
+    std::string inReference(double amount, const String& symbol) const
+    {
+        const auto currency = bySymbol_.find(symbol.comparedBytes());
+        if (reference_ == nullptr || currency == bySymbol_.end())
+            return {};
+        const Date& day = valuation_.state().getDate();
+        return amountText(amount * currency->second->getRealQuote(day) / reference_->getRealQuote(day));
+    }
+
+    std::string accounts() const
+    {
+        TextTable table({{"Account"}, {"Cash", kRight}, {""}, {valueHeading(), kRight}, {""}});
+        for (const AccountState* state : valuation_.state().accountStates()) {
+            const String& symbol = state->getCurrencyRepresentation();
+            const Account* account = state->account();
+            const bool isDefault = account != nullptr && account->isDefaultTransferAccount();
+            table.addRow({plain(state->getAccountName()), amountText(state->getCash()), plain(symbol),
+                          inReference(state->getCash(), symbol), isDefault ? "default transfer account" : ""});
+        }
+        return table.isEmpty() ? "" : '\n' + table.toString();
+    }
+
+    std::string holdings() const
+    {
+        TextTable table({{"Holding"},
+                         {"Ticker"},
+                         {"Market"},
+                         {"Quantity", kRight},
+                         {"Bought at", kRight},
+                         {"Quote", kRight},
+                         {""},
+                         {"Gain", kRight},
+                         {valueHeading(), kRight},
+                         {"End date"}});
+        for (const ShareState* state : valuation_.state().shareStates()) {
+            const Share* share = state->share();
+            const String& symbol = state->getCurrencyRepresentation();
+            const bool isHeld = state->isHeld();
+            table.addRow({plain(state->getCompanyName()), plain(state->getCompanyAbbreviation()),
+                          share != nullptr ? plain(share->getMarketName()) : "", countText(state->getQuantity()),
+                          isHeld ? amountText(state->getBuyQuote()) : "", amountText(state->getQuote()), plain(symbol),
+                          isHeld ? changeText(state->gain()) : "", isHeld ? inReference(state->worth(), symbol) : "",
+                          isHeld ? dateText(state->getEndDate()) : ""});
+        }
+        return table.isEmpty() ? "" : '\n' + table.toString();
+    }
+
+    /// What the search for automatic sales came to: the sales, and the transfers of their gains.
+    std::string automaticOperations() const
+    {
+        std::vector<AutomaticLine> lines;
+        for (const Share* share : valuation_.wallet().shares())
+            takeSales(*share, &lines);
+        for (const Account* account : valuation_.wallet().accounts())
+            takeTransfers(*account, &lines);
+        const auto isEarlier = [](const AutomaticLine& a, const AutomaticLine& b) { return a.date < b.date; };
+        std::stable_sort(lines.begin(), lines.end(), isEarlier);
+
+        TextTable table({{"Automatic"}, {""}, {"", kRight}, {""}});
+        for (const AutomaticLine& line : lines)
+            table.addRow({dateText(line.date), line.type, line.amount, line.text});
+        return table.isEmpty() ? "" : '\n' + table.toString();
+    }
+
+    std::string evolution() const
+    {
+        TextTable table({{"Day"}, {valueHeading(), kRight}});
+        for (const EvolutionPoint& point : valuation_.evolution())
+            table.addRow({dateText(point.date), amountText(point.totalValue)});
+        return table.isEmpty() ? "" : '\n' + table.toString();
+    }
+
+    /// An empty heading stands above a column that has nothing in it.
     std::string valueHeading() const { return reference_ != nullptr ? "Value in " + referenceSymbol_ : std::string(); }
 
     const Valuation& valuation_;
@@ -98,102 +189,6 @@ private:
     std::string referenceSymbol_;
     std::unordered_map<std::string_view, const Currency*> bySymbol_; // the first of each symbol
 };
-
-std::string Report::header() const
-{
-    const std::string day = "Portfolio on " + dateText(valuation_.state().getDate());
-    if (reference_ == nullptr)
-        return day + ", without totals: the market file has no reference currency\n";
-    return day + ", in " + plain(reference_->getName()) + " (" + referenceSymbol_ + ")\n";
-}
-
-std::string Report::totals() const
-{
-    const Totals totals = valuation_.totals();
-    TextTable table({{""}, {"", kRight}, {""}});
-    if (totals.isKnown) {
-        table.addRow({"Total Deposit", amountText(totals.totalDeposit), referenceSymbol_});
-        table.addRow({"Total Value", amountText(totals.totalValue), referenceSymbol_});
-        table.addRow({"Profit", amountText(totals.profit), referenceSymbol_});
-        table.addRow({"Annual Revenu", amountText(totals.annualRevenue * 100.0), "%"});
-    }
-    const Date first = valuation_.state().getFirstOperationDate();
-    table.addRow({"First operation", first == State::afterAllOperations() ? "none" : dateText(first), ""});
-    return table.toString();
-}
-
-/// An amount in the currency of that symbol, in the reference currency; empty when that has no answer.
-std::string Report::inReference(double amount, const String& symbol) const
-{
-    const auto currency = bySymbol_.find(symbol.comparedBytes());
-    if (reference_ == nullptr || currency == bySymbol_.end())
-        return {};
-    const Date& day = valuation_.state().getDate();
-    return amountText(amount * currency->second->getRealQuote(day) / reference_->getRealQuote(day));
-}
-
-std::string Report::accounts() const
-{
-    TextTable table({{"Account"}, {"Cash", kRight}, {""}, {valueHeading(), kRight}, {""}});
-    for (const AccountState* state : valuation_.state().accountStates()) {
-        const String& symbol = state->getCurrencyRepresentation();
-        const Account* account = state->account();
-        const bool isDefault = account != nullptr && account->isDefaultTransferAccount();
-        table.addRow({plain(state->getAccountName()), amountText(state->getCash()), plain(symbol),
-                      inReference(state->getCash(), symbol), isDefault ? "default transfer account" : ""});
-    }
-    return table.isEmpty() ? "" : '\n' + table.toString();
-}
-
-std::string Report::holdings() const
-{
-    TextTable table({{"Holding"},
-                     {"Ticker"},
-                     {"Market"},
-                     {"Quantity", kRight},
-                     {"Bought at", kRight},
-                     {"Quote", kRight},
-                     {""},
-                     {"Gain", kRight},
-                     {valueHeading(), kRight},
-                     {"End date"}});
-    for (const ShareState* state : valuation_.state().shareStates()) {
-        const Share* share = state->share();
-        const String& symbol = state->getCurrencyRepresentation();
-        const bool isHeld = state->isHeld();
-        table.addRow({plain(state->getCompanyName()), plain(state->getCompanyAbbreviation()),
-                      share != nullptr ? plain(share->getMarketName()) : "", countText(state->getQuantity()),
-                      isHeld ? amountText(state->getBuyQuote()) : "", amountText(state->getQuote()), plain(symbol),
-                      isHeld ? changeText(state->gain()) : "", isHeld ? inReference(state->worth(), symbol) : "",
-                      isHeld ? dateText(state->getEndDate()) : ""});
-    }
-    return table.isEmpty() ? "" : '\n' + table.toString();
-}
-
-/// What the search for automatic sales came to: the sales, and the transfers of their gains.
-std::string Report::automaticOperations() const
-{
-    std::vector<AutomaticLine> lines;
-    for (const Share* share : valuation_.wallet().shares())
-        takeSales(*share, &lines);
-    for (const Account* account : valuation_.wallet().accounts())
-        takeTransfers(*account, &lines);
-    const auto isEarlier = [](const AutomaticLine& a, const AutomaticLine& b) { return a.date < b.date; };
-    std::stable_sort(lines.begin(), lines.end(), isEarlier);
-
-    TextTable table({{"Automatic"}, {""}, {"", kRight}, {""}});
-    for (const AutomaticLine& line : lines)
-        table.addRow({dateText(line.date), line.type, line.amount, line.text});
-    return table.isEmpty() ? "" : '\n' + table.toString();
-}
-
-std::string Report::evolution() const
-{
-    TextTable table({{"Day"}, {valueHeading(), kRight}});
-    for (const EvolutionPoint& point : valuation_.evolution())
-        table.addRow({dateText(point.date), amountText(point.totalValue)});
-    return table.isEmpty() ? "" : '\n' + table.toString();
-}
 
 } // namespace
 

@@ -14,6 +14,7 @@ int takeCharacter(std::string_view& text, std::string_view* character)
 {
     std::mbstate_t state{};
     wchar_t code = 0;
+    // In the state of a new text each time: UTF-8 has no shifts, and a broken character must not spoil the next one.
     const std::size_t length = std::mbrtowc(&code, text.data(), text.size(), &state);
     const bool isCharacter = length > 0 && length <= text.size(); // errors are larger than any size
     *character = text.substr(0, isCharacter ? length : 1);
@@ -58,13 +59,9 @@ TextTable::TextTable(std::vector<Column> columns)
     rows_.push_back(std::move(headings));
 }
 
-void TextTable::addRow(std::vector<std::string> cells)
-{
-    rows_.push_back(std::move(cells));
-}
-
 std::string TextTable::toString() const
 {
+    // Two passes, since the widest cell may be in the last row.
     std::vector<int> widths(aligns_.size(), 0);
     for (const auto& row : rows_)
         for (std::size_t i = 0; i < row.size(); ++i)

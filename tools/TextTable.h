@@ -2,6 +2,7 @@
 
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 /// `bytes` as one line of UTF-8 for a terminal: what is no printable character of UTF-8 becomes '?', and what would
@@ -19,7 +20,7 @@ public:
 
     explicit TextTable(std::vector<Column> columns);
     /// One cell for each column, printable.
-    void addRow(std::vector<std::string> cells);
+    void addRow(std::vector<std::string> cells) { rows_.push_back(std::move(cells)); }
     bool isEmpty() const { return rows_.size() == 1; }
     /// The headings and the rows, a line each, without blanks at their ends.
     std::string toString() const;

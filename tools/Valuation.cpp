@@ -22,6 +22,8 @@ namespace {
 /// For a file whose reading has failed: by itself, at its end, or else for `otherwise`.
 [[noreturn]] void failReading(const InputFile& file, const char* kind, const std::string& otherwise)
 {
+    // The order matters: an error of the disk also counts as an end. Only when there was neither is it the contents
+    // that the reader has refused.
     if (std::ferror(file.stream()) != 0)
         failFor(file.path(), std::string("cannot be read: ") + std::strerror(errno));
     if (reachedEnd(file.stream()))
@@ -58,6 +60,8 @@ void Valuation::readPortfolio()
     const InputFile file(portfolioPath_);
     if (wallet_.rd(file.stream(), nullptr) == 0)
         return;
+    // A transfer that leads nowhere puts what follows out of place, so that the failure lies there and not where it
+    // showed.
     if (!doubt().empty())
         throw std::runtime_error(doubt());
     failReading(file, "portfolio",
@@ -69,6 +73,8 @@ void Valuation::compute(const Date& date, bool previsions, bool evolution)
 {
     hasEvolution_ = evolution;
     EvolutionOutcome outcome = EvolutionOutcome::kBuilt;
+    // The wallet owns the states and has destroyed those of an earlier computation: `state_` is good until the next
+    // one.
     state_ = refreshStates(wallet_, date, previsions, evolution ? &outcome : nullptr);
     checkOutcome(outcome);
     // Of an earlier computation.

@@ -51,20 +51,14 @@ void describe(CLI::App& app, Arguments& arguments)
     app.add_option("--rates", arguments.rates, "Tables of exchange rates")->type_name("FILE");
     app.add_option("--listing", arguments.listings, "Tables that tell market, currency and name of tickers")
         ->type_name("FILE");
-    app.add_option("--reference", import.reference,
-                   "Currency that the rates refer to; without it EUR, or when there are no rates the --currency")
-        ->type_name("SYMBOL")
-        ->check(checkNotEmpty);
+    addText(app, "--reference", import.reference, "SYMBOL",
+            "Currency that the rates refer to; without it EUR, or when there are no rates the --currency");
     app.add_option("--rates-are", arguments.ratesAre, "How the rates are meant; see below")
         ->check(CLI::IsMember({kUnits, kValues}));
-    app.add_option("--currency", import.currency, "Currency of the markets that no table tells it of")
-        ->capture_default_str()
-        ->type_name("SYMBOL")
-        ->check(checkNotEmpty);
-    app.add_option("--market", import.market, "Market of the tickers that no table tells it of")
-        ->capture_default_str()
-        ->type_name("NAME")
-        ->check(checkNotEmpty);
+    addText(app, "--currency", import.currency, "SYMBOL", "Currency of the markets that no table tells it of")
+        ->capture_default_str();
+    addText(app, "--market", import.market, "NAME", "Market of the tickers that no table tells it of")
+        ->capture_default_str();
     app.add_flag("--ticker-from-name", import.tickerFromName,
                  "The quotes are of one ticker a file, which the file's name tells (AAPL.csv: date,close)");
     app.add_flag("--force", arguments.force, "Replace OUTPUT when it exists");
@@ -79,10 +73,13 @@ void run(const CLI::App& app, Arguments& arguments)
     if (!arguments.ratesAre.empty())
         arguments.import.ratesAreUnits = arguments.ratesAre == kUnits;
     const auto existing = arguments.force ? AtomicFile::Existing::kReplace : AtomicFile::Existing::kKeep;
+    // Before anything is read: the tables may take minutes, and the writing would fail only then.
     AtomicFile::check(arguments.output, existing);
 
     Catalogue catalogue;
     Importer importer(arguments.import, catalogue, std::cerr);
+    // In this order whatever that of the options: listings say where the tickers of the quotes belong, and currencies
+    // stand in the file in the order of their first mention.
     for (const std::string& path : arguments.listings)
         importer.addListing(path);
     for (const std::string& path : arguments.rates)

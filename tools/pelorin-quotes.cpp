@@ -39,7 +39,7 @@ struct Arguments {
 void describe(CLI::App& app, Arguments& arguments)
 {
     app.footer(kTables);
-    app.add_option("FOLDER", arguments.folder, "Folder of the tables")->required()->check(checkNotEmpty);
+    addText(app, "FOLDER", arguments.folder, "TEXT", "Folder of the tables")->required();
     app.add_option("--port", arguments.port, "TCP port to listen on; 0 lets the system choose one")
         ->type_name("N")
         ->check(CLI::Range(0U, kHighestPort))
@@ -65,10 +65,11 @@ void listenOn(Socket& server, const Arguments& arguments)
 void run(const Arguments& arguments)
 {
     const QuoteFolder folder(arguments.folder, std::cerr);
-    const StopSignals signals;
+    // Before the address is told: whoever reads it may send a signal at once.
+    const Descriptor stop = stopSignals();
     Socket server;
     listenOn(server, arguments);
-    QuoteServer(server, folder).serve(signals);
+    QuoteServer(server, folder).serve(stop);
 }
 
 } // namespace

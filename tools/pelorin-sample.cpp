@@ -1,3 +1,4 @@
+#include "foundation/Today.h"
 #include "market/Catalogue.h"
 #include "portfolio/Wallet.h"
 #include "storage/AtomicFile.h"
@@ -30,7 +31,7 @@ Exit status: 0, 1 when a file cannot be read or written, 2 for bad arguments.)";
 
 struct Arguments {
     std::string folder;
-    std::string date;
+    Date date = today();
     std::string quotes;
     bool quiet = false;
     bool onlyNews = false;
@@ -39,15 +40,11 @@ struct Arguments {
 void describe(CLI::App& app, Arguments& arguments)
 {
     app.footer(kOutput);
-    app.add_option("FOLDER", arguments.folder,
-                   "Data folder, made when it is missing; without it the one that Pelorin keeps your files in")
-        ->check(checkNotEmpty);
-    app.add_option("--date", arguments.date, "Day up to which there are quotes and rates; without it today")
-        ->type_name("DD/MM/YYYY")
-        ->check(checkDateArgument);
-    app.add_option("--quotes", arguments.quotes, "Folder of tables TICKER.csv to write; made when it is missing")
-        ->type_name("FOLDER")
-        ->check(checkNotEmpty);
+    addText(app, "FOLDER", arguments.folder, "TEXT",
+            "Data folder, made when it is missing; without it the one that Pelorin keeps your files in");
+    addDate(app, arguments.date, "Day up to which there are quotes and rates; without it today");
+    addText(app, "--quotes", arguments.quotes, "FOLDER",
+            "Folder of tables TICKER.csv to write; made when it is missing");
     app.add_flag("--quiet", arguments.quiet, "Do not tell what was written");
     app.add_flag("--only-news", arguments.onlyNews, "Do not tell of the two files when both are there already");
 }
@@ -102,7 +99,7 @@ void writeQuotes(const std::string& folder, const std::string& marketFile, const
 
 void run(const Arguments& arguments)
 {
-    const Date last = dateArgument(arguments.date);
+    const Date& last = arguments.date;
     const std::vector<Date> days = sampleDays(last);
     Catalogue catalogue;
     Wallet wallet;
@@ -112,6 +109,7 @@ void run(const Arguments& arguments)
     const std::filesystem::path folder = dataFolder(arguments);
     const std::filesystem::path market = folder / "Companies" / "Sample";
     const std::filesystem::path portfolio = folder / "PortoFolios" / "Sample";
+    // Each file by itself: an owner who has removed one of them gets it back, and keeps the other as it is.
     const bool isMarketNew = writeSample(market, catalogue, last);
     const bool isPortfolioNew = writeSample(portfolio, wallet, last);
     if (!arguments.quiet && (!arguments.onlyNews || isMarketNew || isPortfolioNew)) {

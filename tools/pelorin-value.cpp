@@ -1,3 +1,4 @@
+#include "foundation/Today.h"
 #include "tools/Program.h"
 #include "tools/Reports.h"
 #include "tools/Valuation.h"
@@ -31,7 +32,7 @@ Exit status: 0, 1 when a file cannot be read or the result not be written, 2 for
 struct Arguments {
     std::string market;
     std::string portfolio;
-    std::string date;
+    Date date = today();
     bool previsions = false;
     bool evolution = false;
     bool json = false;
@@ -42,9 +43,7 @@ void describe(CLI::App& app, Arguments& arguments)
     app.footer(kOutput);
     app.add_option("MARKET_FILE", arguments.market, "Currencies, markets and companies with their quotes")->required();
     app.add_option("PORTFOLIO_FILE", arguments.portfolio, "Accounts and holdings with their operations")->required();
-    app.add_option("--date", arguments.date, "Day to value the portfolio on; without it today")
-        ->type_name("DD/MM/YYYY")
-        ->check(checkDateArgument);
+    addDate(app, arguments.date, "Day to value the portfolio on; without it today");
     app.add_flag("--previsions", arguments.previsions, "Search the automatic sales that the trend lines suggest");
     app.add_flag("--evolution", arguments.evolution,
                  "Also give the total value of every day since the first operation");
@@ -53,15 +52,15 @@ void describe(CLI::App& app, Arguments& arguments)
 
 void checkOutput()
 {
+    // A report on a full disk is no report, so that a script must be told.
     if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0)
         throw std::runtime_error(std::string("standard output: ") + std::strerror(errno));
 }
 
 void run(const Arguments& arguments)
 {
-    const Date date = dateArgument(arguments.date);
     Valuation valuation(arguments.market, arguments.portfolio);
-    valuation.compute(date, arguments.previsions, arguments.evolution);
+    valuation.compute(arguments.date, arguments.previsions, arguments.evolution);
     if (arguments.json)
         writeJsonReport(valuation, stdout);
     else

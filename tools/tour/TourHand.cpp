@@ -26,6 +26,7 @@ BTabView& tabsOf(const BWindow& window)
 template <class View>
 View& TourHand::find(const char* name)
 {
+    // On other pages there are controls of the same name.
     const BTabView& tabs = tabsOf(window_);
     auto* view = dynamic_cast<View*>(tabs.TabAt(tabs.Selection())->View()->FindView(name));
     if (view == nullptr)
@@ -41,6 +42,7 @@ void TourHand::turnTo(int32 page)
 
 void TourHand::type(const std::vector<std::pair<const char*, const char*>>& fields)
 {
+    // As a person leaves a field: the text changes, and then the field says so.
     for (const auto& [name, text] : fields) {
         auto& field = find<BTextControl>(name);
         field.SetText(text);
@@ -85,6 +87,7 @@ void TourHand::select(const char* list, int32 first, int32 last)
 
 void TourHand::picture(const char* name, BRect part)
 {
+    // What the last step has set going is to be seen on the picture.
     handle_pending_messages();
     const std::string path = pictures_ + '/' + name + ".png";
     if (save_screenshot(window_, part, path.c_str()) != B_OK)

@@ -7,7 +7,6 @@
 #include <utility>
 #include <vector>
 
-class BView;
 class BWindow;
 
 /// Works the window by the names of its controls, as a person does by mouse and keyboard, and takes pictures of it.

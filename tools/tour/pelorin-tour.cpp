@@ -41,6 +41,7 @@ void tourPages(TourHand& hand)
     hand.turnTo(2);
     hand.press("btnLoadPortoFolio");
     hand.tick("cbxComputeEvolution", true);
+    // The rows that have something to show in the sample.
     const Stop stops[] = {
         {0, "company", {{"lstMarkets", 0}, {"lstCompanies", 0}}},
         {1, "currency", {{"lstCurrencies", 1}}},
@@ -64,6 +65,7 @@ void inNewWindow(const DataFolder& folder, const std::string& pictures, const st
     handle_pending_messages();
     TourHand hand(*window, pictures);
     tour(hand);
+    // It stays the application's. The next tour has a window of its own.
     window->Hide();
 }
 
