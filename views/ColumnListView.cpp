@@ -1,8 +1,9 @@
 #include "views/ColumnListView.h"
 
-#include "views/ColumnItem.h"
+#include "chart/ChartText.h"
 #include "views/Look.h"
 
+#include <algorithm>
 #include <cmath>
 #include <utility>
 
@@ -13,21 +14,19 @@ constexpr float kPadding = 4; // from the sides of a column to its text
 /// The titles above the columns of a list.
 class ColumnHeading final : public BView {
 public:
-    ColumnHeading(BRect frame, std::vector<ListColumn> columns);
+    ColumnHeading(BRect frame, std::vector<ListColumn> columns)
+        : BView(frame, "", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW), columns_(std::move(columns))
+    {
+        SetViewColor(look::kHeading);
+        SetFont(be_bold_font, B_FONT_FAMILY_AND_STYLE);
+        SetFontSize(11);
+    }
 
     void Draw(BRect updateRect) override;
 
 private:
     std::vector<ListColumn> columns_;
 };
-
-ColumnHeading::ColumnHeading(BRect frame, std::vector<ListColumn> columns)
-    : BView(frame, "", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW), columns_(std::move(columns))
-{
-    SetViewColor(look::kHeading);
-    SetFont(be_bold_font, B_FONT_FAMILY_AND_STYLE);
-    SetFontSize(11);
-}
 
 void ColumnHeading::Draw(BRect)
 {
@@ -69,19 +68,48 @@ float baseLine(const BView& view, BRect line)
     return std::round(line.top + (line.Height() + height.ascent - height.descent) / 2);
 }
 
-ColumnListView::ColumnListView(BRect frame, const char* name, list_view_type type, std::vector<ListColumn> columns)
-    : BListView(frame, name, type), columns_(std::move(columns))
+std::string ColumnItem::Text() const
+{
+    std::string line;
+    for (std::size_t i = 0; i < columns_; ++i) {
+        std::string text = cell(i).text;
+        // A name from a file may hold anything, and would tear the row apart where it is copied to.
+        std::ranges::replace_if(
+            text, [](char c) { return c == '\t' || c == '\n' || c == '\r'; }, ' ');
+        line += (i > 0 ? "\t" : "") + text;
+    }
+    return line;
+}
+
+void ColumnItem::DrawItem(BView* owner, BRect frame, bool)
+{
+    const rgb_color ground = owner->HighColor(); // that of a selected row's text, where the row is selected
+    const float base = baseLine(*owner, frame);
+    const TextWidth widthOf = [owner](const std::string& text) { return owner->StringWidth(text.c_str()); };
+    float left = frame.left;
+    std::size_t i = 0;
+    for (const ListColumn& column : static_cast<const ColumnListView&>(*owner).columns_) {
+        const Cell shown = cell(i++);
+        // On a selected row the text takes the colour that can be read on the selection.
+        owner->SetHighColor(ground == look::kText ? shown.color : ground);
+        column.drawText(*owner, fitText(shown.text, widthOf, column.textWidth()), left, base);
+        left += column.width;
+    }
+}
+
+ColumnListView::ColumnListView(const char* name, list_view_type type, std::vector<ListColumn> columns)
+    : BListView({}, name, type), columns_(std::move(columns))
 {
     SetRowHeight(look::kListRow);
 }
 
-ColumnListView::~ColumnListView()
-{
-    destroyRows();
-}
-
 void ColumnListView::addTo(BView* parent, BRect area, const char* title)
 {
+    float remaining = area.Width() - look::kScrollBar;
+    for (const ListColumn& column : columns_)
+        remaining -= column.width;
+    for (ListColumn& column : columns_)
+        column.width = column.width == kRemainingWidth ? remaining : column.width;
     const float top = area.top + look::kHeadingHeight;
     parent->AddChild(new ColumnHeading({area.left, area.top, area.right, top}, columns_));
     MoveTo(area.left, top);
@@ -93,21 +121,15 @@ void ColumnListView::addTo(BView* parent, BRect area, const char* title)
 
 void ColumnListView::addRow(ColumnItem* row, int32 index)
 {
-    row->columns_ = CountColumns();
+    row->columns_ = columns_.size();
     AddItem(row, index);
 }
 
 void ColumnListView::addRows(const std::vector<ColumnItem*>& rows)
 {
     for (ColumnItem* row : rows)
-        row->columns_ = CountColumns();
+        row->columns_ = columns_.size();
     AddItems({rows.begin(), rows.end()});
-}
-
-void ColumnListView::destroyRow(int32 index)
-{
-    // The list does not know the row any more when it dies.
-    delete RemoveItem(index);
 }
 
 void ColumnListView::destroyRows()

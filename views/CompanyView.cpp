@@ -42,7 +42,7 @@ void CompanyView::makeMarkets(BRect frame)
     const float bottom = frame.Height() - kBoxSide;
     const float buttonTop = bottom - kButtonHeight;
     const float fieldTop = buttonTop - kGap - kFieldHeight;
-    markets_ = new MarketListView("lstMarkets", right - kBoxSide - kScrollBar - MarketListView::kOtherWidth);
+    markets_ = new MarketListView("lstMarkets");
     markets_->addTo(box, {kBoxSide, kBoxTop, right, fieldTop - kGap}, "Markets");
     markets_->SetSelectionMessage(new BMessage('MSel'));
     constexpr float kCurrencyWidth = 112;

@@ -73,7 +73,7 @@ void CurrencyView::makeMarkets(BRect frame)
 {
     BBox* box = addBox(this, frame, "Markets");
     const float width = frame.Width() - 2 * kBoxSide;
-    markets_ = new MarketListView("lstMarkets", width - kScrollBar - MarketListView::kOtherWidth);
+    markets_ = new MarketListView("lstMarkets");
     markets_->addTo(box, {kBoxSide, kBoxTop, kBoxSide + width, frame.Height() - kBoxSide}, "Markets");
 }
 

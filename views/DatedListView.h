@@ -6,14 +6,13 @@
 #include <algorithm>
 #include <vector>
 
-/// A list of objects with a date, in its order. `Row` is as in `ObjectListView`, with a `release` that lets go of the
-/// object.
+/// A list of objects with a date, in its order; several can be selected.
 ///
 /// The rows look at the dates of their objects, so an object's row is taken out before it is destroyed.
-template <class Object, class Row>
-class DatedListView : public ObjectListView<Object, Row> {
+template <class Object>
+class DatedListView : public ObjectListView<Object> {
 public:
-    using ObjectListView<Object, Row>::ObjectListView;
+    explicit DatedListView(const char* name) : ObjectListView<Object>(name, B_MULTIPLE_SELECTION_LIST) {}
 
     /// Shows these objects, given in any order, and no others. When they are what is shown already, nothing but the
     /// drawing is done.

@@ -6,7 +6,6 @@
 #include "platform/MenuItem.h"
 #include "platform/PopUpMenu.h"
 #include "platform/StringView.h"
-#include "views/CompanyEventListView.h"
 #include "views/Look.h"
 
 using namespace look;

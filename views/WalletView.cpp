@@ -9,10 +9,8 @@
 #include "valuation/Evolution.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
-#include "views/AccountStateListView.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
-#include "views/ShareStateListView.h"
 
 namespace {
 

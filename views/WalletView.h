@@ -6,13 +6,11 @@
 #include "platform/CheckBox.h"
 #include "views/DateControl.h"
 #include "views/PageView.h"
+#include "views/StateLists.h"
 
-class AccountState;
 class BStringView;
-class AccountStateListView;
 class Currency;
 class GraphView;
-class ShareStateListView;
 class State;
 enum class EvolutionOutcome;
 struct EvolutionPoint;
