@@ -30,6 +30,7 @@ private:
 
 void ColumnHeading::Draw(BRect)
 {
+    // The heading is as wide as the list with its scroll bar, the columns are not.
     const BRect bounds = Bounds();
     const float base = baseLine(*this, bounds);
     float left = 0;
@@ -38,6 +39,7 @@ void ColumnHeading::Draw(BRect)
         column.drawText(*this, column.title, left, base);
         left += column.width;
         SetHighColor(look::kLine);
+        // Behind the last column there is the scroll bar of the list, and no line.
         if (left < bounds.right - look::kScrollBar)
             FillRect({left - 1, 3, left, bounds.bottom - 3});
     }
@@ -56,6 +58,7 @@ void ListColumn::drawText(BView& view, const std::string& text, float left, floa
 {
     const float room = textWidth() - view.StringWidth(text.c_str());
     const float indent = align == B_ALIGN_RIGHT ? room : align == B_ALIGN_CENTER ? room / 2 : 0;
+    // Letters are sharp on whole pixels.
     view.DrawString(text.c_str(), {std::round(left + kPadding + indent), base});
 }
 
@@ -84,6 +87,7 @@ std::string ColumnItem::Text() const
 void ColumnItem::DrawItem(BView* owner, BRect frame, bool)
 {
     const rgb_color ground = owner->HighColor(); // that of a selected row's text, where the row is selected
+    // The same for all cells, so that they stand on one line whatever their texts.
     const float base = baseLine(*owner, frame);
     const TextWidth widthOf = [owner](const std::string& text) { return owner->StringWidth(text.c_str()); };
     float left = frame.left;
@@ -105,6 +109,7 @@ ColumnListView::ColumnListView(const char* name, list_view_type type, std::vecto
 
 void ColumnListView::addTo(BView* parent, BRect area, const char* title)
 {
+    // A page tells how much room a list has, so the width that is left is known only now.
     float remaining = area.Width() - look::kScrollBar;
     for (const ListColumn& column : columns_)
         remaining -= column.width;
@@ -121,6 +126,7 @@ void ColumnListView::addTo(BView* parent, BRect area, const char* title)
 
 void ColumnListView::addRow(ColumnItem* row, int32 index)
 {
+    // A row is asked for its text also by assistive tools, which do not say for which list.
     row->columns_ = columns_.size();
     AddItem(row, index);
 }

@@ -98,6 +98,7 @@ const std::vector<ColumnOf<OperationItem>> OperationItem::kColumns = {
 void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
 {
     if (isAutomatic_ && !IsSelected()) {
+        // A selected row keeps the ground that the list has painted.
         const rgb_color text = owner->HighColor();
         owner->SetHighColor(look::kGenerated);
         owner->FillRect(frame);

@@ -24,6 +24,7 @@ QuoteBox::QuoteBox(BRect frame, const char* title, const Codes& codes) : BBox(fr
     top += kRow;
     value_ = PageView::addTypedNumber(this, {kLeft, top, right, top + kFieldHeight}, "txtQuoteValue", "Value",
                                       codes.value, kDivider);
+    // Fields and buttons are told apart by a wider gap.
     top += kRow + kGap;
     PageView::addButtons(this, {kLeft, top, right, top + kButtonHeight},
                          {{"btnAddQuote", "Add", codes.add},

@@ -43,6 +43,7 @@ Cell name(const ShareState& state, const String& text)
 
 Cell quantity(const Item& item)
 {
+    // More was sold than bought: a mistake among the operations.
     const int quantity = item.object()->getQuantity();
     return {countText(quantity), quantity < 0 ? look::kLoss : look::kText};
 }
@@ -77,6 +78,7 @@ Cell value(const Item& item)
 Cell gain(const Item& item)
 {
     const ShareState& state = *item.object();
+    // Without a buy quote there is nothing to compare with.
     if (!item.basis().isKnown || state.getBuyQuote() == 0 || !state.isHeld())
         return {};
     return {changeText(state.gain()), state.gain() < 0 ? look::kLoss : look::kGain};
