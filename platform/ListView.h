@@ -23,7 +23,6 @@ enum list_view_type { B_SINGLE_SELECTION_LIST, B_MULTIPLE_SELECTION_LIST };
 class BListView : public BView, public BInvoker {
 public:
     BListView(BRect frame, const char* name, list_view_type type);
-    ~BListView() override;
 
     bool AddItem(BListItem* item, int32 index);
     /// Puts all of them behind the last row at once.

@@ -11,6 +11,8 @@
 #include <QLineEdit>
 #include <QTreeView>
 
+#include <filesystem>
+
 BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const entry_ref* start, uint32,
                        BMessage* message, bool modal)
     : mode_(mode), target_(target != nullptr ? *target : BMessenger()),

@@ -11,25 +11,9 @@
 #include <algorithm>
 #include <utility>
 
-namespace {
-
 // What is selected is known in three places: the list widget knows it by row numbers, which it moves along when rows
 // come and go; each item knows it of itself, so that taking a row out need not ask; and `selection_` holds the numbers,
 // gathered when they are asked for. Between calls of the functions here all three agree, or `selectionStale_` is set.
-
-/// Changes of rows take the selection along; Qt need not tell of that.
-class Silence {
-public:
-    explicit Silence(ListWidget& widget) : widget_(widget) { widget_.setSilent(true); }
-    ~Silence() { widget_.setSilent(false); }
-    Silence(const Silence&) = delete;
-    Silence& operator=(const Silence&) = delete;
-
-private:
-    ListWidget& widget_;
-};
-
-} // namespace
 
 BListView::BListView(BRect frame, const char* name, list_view_type type)
     : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW | B_FRAME_EVENTS | B_NAVIGABLE,
@@ -38,12 +22,6 @@ BListView::BListView(BRect frame, const char* name, list_view_type type)
     SetAccessibleName(name);
     listWidget().setSelectionMode(type == B_SINGLE_SELECTION_LIST ? QAbstractItemView::SingleSelection
                                                                   : QAbstractItemView::ExtendedSelection);
-}
-
-BListView::~BListView()
-{
-    // The subclass, which would hear of changes, is gone already.
-    listWidget().setSilent(true);
 }
 
 ListWidget& BListView::listWidget() const
@@ -57,7 +35,7 @@ bool BListView::AddItem(BListItem* item, int32 index)
         return false;
     // From begin to end the widget must not be asked for rows: it has been told of a change that `items_` does not show
     // yet.
-    const Silence silence(listWidget());
+    const auto silence = listWidget().silence();
     listWidget().rows().beginInsert(index, index);
     items_.insert(items_.begin() + index, item);
     firstUnnumbered_ = std::min(firstUnnumbered_, index);
@@ -71,7 +49,7 @@ void BListView::AddItems(const std::vector<BListItem*>& items)
 {
     if (items.empty())
         return;
-    const Silence silence(listWidget());
+    const auto silence = listWidget().silence();
     const int first = CountItems();
     listWidget().rows().beginInsert(first, first + static_cast<int>(items.size()) - 1);
     items_.insert(items_.end(), items.begin(), items.end());
@@ -85,7 +63,7 @@ BListItem* BListView::RemoveItem(int32 index)
     BListItem* item = ItemAt(index);
     if (item == nullptr)
         return nullptr;
-    const Silence silence(listWidget());
+    const auto silence = listWidget().silence();
     // From here to the end of the removal rows and numbers differ, as in `AddItem`.
     listWidget().rows().beginRemove(index, index);
     items_.erase(items_.begin() + index);
@@ -107,7 +85,7 @@ BListItem* BListView::RemoveItem(int32 index)
 
 void BListView::MakeEmpty()
 {
-    const Silence silence(listWidget());
+    const auto silence = listWidget().silence();
     // The reset takes the selection with it, without a message.
     listWidget().rows().beginReset();
     for (BListItem* item : items_) {
