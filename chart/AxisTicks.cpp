@@ -22,6 +22,7 @@ double roundStep(double minStep)
 std::vector<AxisTick> numberTicks(const ChartRange& range, double minStep)
 {
     const double step = roundStep(minStep);
+    // A bound that is a multiple of the step but for rounding counts as one.
     const double first = std::ceil(range.min / step - 1e-9);
     const double last = std::floor(range.max / step + 1e-9);
     const ValueFormat format = ValueFormat::forStep(step, std::max(std::abs(range.min), std::abs(range.max)));
@@ -48,6 +49,7 @@ std::vector<AxisTick> levelNumberTicks(const ChartRange& range, double pixelsPer
 
 bool areLabelsApart(const std::vector<AxisTick>& ticks, double pixelsPerUnit, const TextWidth& width, float gap)
 {
+    // Where the label before ends, with the gap.
     double end = -std::numeric_limits<double>::infinity();
     for (const AxisTick& tick : ticks) {
         const double middle = tick.value * pixelsPerUnit;

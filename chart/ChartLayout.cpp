@@ -1,6 +1,5 @@
 #include "chart/ChartLayout.h"
 
-#include "chart/ChartMarks.h"
 #include "chart/DateTicks.h"
 
 #include <cmath>
@@ -20,6 +19,9 @@ constexpr float kSmallestPlot = 40; // in either direction
 constexpr float kKeyShare = 0.3F;   // of the height, at most
 
 /// The steps of a layout, in their order. Each narrows the plot, beginning with the bounds.
+///
+/// `out_` fills from step to step, and each relies on what stands there: its plot begins as the bounds and only ever
+/// becomes smaller. A chart that proves too small for axes drops all of it and begins again with a bare one.
 class Layouter {
 public:
     explicit Layouter(const ChartContents& contents) : in_(contents) {}
@@ -32,6 +34,7 @@ public:
         if (!isLargeEnough())
             return bareChart();
         placeValueAxis();
+        // The axis has taken room from the width.
         if (!isLargeEnough())
             return bareChart();
         // The top, the bottom and the left side of the plot are settled; the x axis may still move its sides inwards.
@@ -115,6 +118,7 @@ private:
         float width = -kEntryGap;
         for (const ChartSeries* series : named)
             width += entryWidth(series->name) + kEntryGap;
+        // Beside the legend where all of it has room in one row; otherwise below, in as many rows as it takes.
         if (left + width <= rightEnd())
             return placeKeyRows(named, rightEnd() - width, top);
         return placeKeyRows(named, in_.bounds.left + kMargin, below > top ? below + kLegendGap / 2 : top);
@@ -127,10 +131,12 @@ private:
         for (const ChartSeries* series : named) {
             const std::string name =
                 fitText(series->name, in_.legendFont.width, rightEnd() - left - kSampleWidth - kSampleGap);
+            // An entry that is alone in its row and still too long has been cut above.
             if (x > left && x + entryWidth(name) > rightEnd()) {
                 x = left;
                 top += height;
             }
+            // The key never takes the room of the plot: what is left of it is dropped.
             if (name.empty() || top + height > in_.bounds.top + in_.bounds.Height() * kKeyShare)
                 break;
             out_.key.push_back({series->shape, series->color, series->penSize,
@@ -162,6 +168,7 @@ private:
         return bare;
     }
 
+    /// Where the data goes: within the plot, so that neither a line nor the numbers of its extremes touch an axis.
     BRect dataArea() const
     {
         const float inset = marksInset(in_, out_.plot);
@@ -172,6 +179,7 @@ private:
     void placeValueAxis()
     {
         const ChartScale scale(x_, y_, dataArea());
+        // The axis is as long as the plot, beyond the lowest and the highest value.
         ChartRange shown{scale.y(out_.plot.bottom), scale.y(out_.plot.top)};
         if (values_.min >= 0) // no labels below 0 where nothing can be
             shown.min = std::max(shown.min, 0.0);
@@ -205,6 +213,7 @@ private:
             return;
         // A grid line stands only where its value is written.
         out_.rows.push_back(y);
+        // Placed from left to right when the left side is settled.
         valueLabels_.push_back({tick.label, top});
     }
 
@@ -221,6 +230,7 @@ private:
         constexpr int kTries = 3; // other sides may mean other labels
         std::vector<AxisTick> ticks;
         for (int i = 0; i < kTries; ++i) {
+            // Sides that have moved mean another scale, and with it other ticks.
             out_.scale = ChartScale(x_, y_, dataArea());
             ticks = xTicks(out_.scale);
             if (!widenMargins(ticks))
@@ -232,6 +242,7 @@ private:
         for (const AxisTick& tick : ticks) {
             const float x = out_.scale.pixelX(tick.value);
             const ChartText text = textAt(tick.label, in_.labelFont, x - in_.labelFont.width(tick.label) / 2, top);
+            // Where the sides could not move far enough, the grid line goes with its label.
             if (text.box.left < in_.bounds.left || text.box.right > in_.bounds.right)
                 continue;
             out_.columns.push_back(x);
@@ -274,6 +285,7 @@ private:
         const std::string legend = fitText(in_.yLegend, font.width, out_.plot.right - in_.bounds.left - kMargin);
         if (legend.empty())
             return;
+        // Below the labels of the axis, in the room that `placeFooter` has kept.
         const float top = out_.plot.bottom + kLabelGap + std::ceil(in_.labelFont.height());
         out_.legends.push_back(textAt(legend, font, out_.plot.right - font.width(legend), top + kLegendGap / 2));
     }

@@ -1,5 +1,4 @@
-#include "chart/ChartMarks.h"
-
+#include "chart/ChartLayout.h"
 #include "chart/ValueFormat.h"
 
 #include <cmath>
@@ -45,6 +44,7 @@ ChartText labelAt(const std::string& text, const ChartFont& font, float middle, 
 {
     const float width = font.width(text);
     const float furthest = plot.right - kEdgeGap - width;
+    // The plot is narrower than the label.
     if (furthest < plot.left + kEdgeGap)
         return {};
     return textAt(text, font, std::clamp(middle - width / 2, plot.left + kEdgeGap, furthest), top);
@@ -70,6 +70,7 @@ std::vector<ChartMark> placeMarks(const ChartContents& contents, const BRect& pl
     const ChartFont& font = contents.labelFont;
     std::vector<ChartMark> marks;
     const auto add = [&](const Extreme& extreme, float gap) {
+        // The disc stands in any case, its number only where the plot is high enough.
         const BPoint where = scale.pixel(extreme.point);
         ChartMark mark{where, extreme.series->color, {}};
         if (hasRoom(contents, plot))

@@ -9,12 +9,6 @@ namespace {
 constexpr float kTickLength = 4;
 constexpr float kMarkRadius = 3;
 
-/// Alpha 0 covers as 255 does: elements have it from the start.
-bool isOpaque(rgb_color color)
-{
-    return color.alpha == 0 || color.alpha == 255;
-}
-
 rgb_color opaque(rgb_color color)
 {
     return {color.red, color.green, color.blue, 255};
@@ -24,6 +18,7 @@ rgb_color opaque(rgb_color color)
 rgb_color ink(rgb_color background, double share)
 {
     constexpr double kHalfBright = 128;
+    // How bright an eye finds it: green counts most, blue least.
     const double brightness = 0.299 * background.red + 0.587 * background.green + 0.114 * background.blue;
     const double target = brightness < kHalfBright ? 255 : 0;
     const auto mix = [&](std::uint8_t component) {
@@ -48,6 +43,7 @@ ChartPainter::ChartPainter(BView& view, rgb_color background)
 
 void ChartPainter::fillBackground()
 {
+    // The low colour is used for this only.
     view_.SetLowColor(background_);
     view_.FillRect(view_.Bounds(), B_SOLID_LOW);
 }
@@ -76,6 +72,7 @@ void ChartPainter::drawChart(const ChartLayout& layout, const std::vector<ChartS
         fillDisc(layout.scale.pixel(one.points.front()), discRadius(one.penSize), one.color);
     });
     for (const ChartMark& mark : layout.marks)
+        // Above all lines, since they are about the values themselves. The texts come last: nothing covers them.
         drawMark(mark);
     for (const ChartText& label : layout.labels)
         drawText(label, label_);
@@ -125,6 +122,7 @@ void ChartPainter::drawAxes(const ChartLayout& layout)
     const BRect& plot = layout.plot;
     view_.SetPenSize(1);
     view_.BeginLineArray(static_cast<int32>(layout.columns.size() + layout.rows.size() + layout.zero.size() + 2));
+    // The two axes, the line of value 0, and a stroke outwards at each labelled value.
     view_.AddLine({plot.left, plot.top}, {plot.left, plot.bottom}, axis_);
     view_.AddLine({plot.left, plot.bottom}, {plot.right, plot.bottom}, axis_);
     for (const float y : layout.zero)
@@ -138,6 +136,7 @@ void ChartPainter::drawAxes(const ChartLayout& layout)
 
 void ChartPainter::drawPolygon(const ChartSeries& series, const ChartScale& scale)
 {
+    // An outline has as many points as it has days. Of those in one column of pixels the extremes are enough.
     const std::vector<BPoint> corners = reduceByColumn(series.points, scale);
     setAreaColor(series.color);
     // The drawing mode is B_OP_ALPHA for a translucent polygon, and B_OP_COPY again after it.
@@ -147,6 +146,7 @@ void ChartPainter::drawPolygon(const ChartSeries& series, const ChartScale& scal
 
 void ChartPainter::drawLine(const ChartSeries& series, const ChartScale& scale)
 {
+    // The same for the line, so that drawing ten thousand days costs as much as drawing what is seen of them.
     const std::vector<BPoint> points = reduceByColumn(series.points, scale);
     if (points.size() == 1) { // the others have no place, or the same
         fillDisc(points.front(), discRadius(series.penSize), series.color);
@@ -218,6 +218,7 @@ void ChartPainter::fillDisc(BPoint center, float radius, rgb_color color)
 
 void ChartPainter::setAreaColor(rgb_color color)
 {
-    view_.SetDrawingMode(isOpaque(color) ? B_OP_COPY : B_OP_ALPHA);
+    // Alpha 0 covers as 255 does: elements have it from the start.
+    view_.SetDrawingMode(color.alpha == 0 || color.alpha == 255 ? B_OP_COPY : B_OP_ALPHA);
     view_.SetHighColor(color);
 }

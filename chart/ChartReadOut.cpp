@@ -37,6 +37,7 @@ std::string textOf(const GraphPoint& point, const GraphElement& owner, bool isDa
 ChartReadOut layOutReadOut(const GraphPoint& point, bool isDateBased, const ChartScale& scale, const ChartFont& font,
                            const BRect& bounds)
 {
+    // A point on a line speaks for the line: it has that one's name and colour.
     const GraphPolyElement* line = point.polyElement();
     const GraphElement& owner = line != nullptr ? *line : static_cast<const GraphElement&>(point);
     const std::string text = fitText(textOf(point, owner, isDateBased), font.width, bounds.Width() - 2 * kPadding);
@@ -50,6 +51,7 @@ ChartReadOut layOutReadOut(const GraphPoint& point, bool isDateBased, const Char
     float top = where.y - kDistance - height;
     if (top < bounds.top)
         top = where.y + kDistance;
+    // On a chart smaller than the box the box begins at the left and ends at the bottom.
     left = std::floor(std::max(left, bounds.left));
     top = std::floor(std::min(top, bounds.bottom - height));
     return {where,

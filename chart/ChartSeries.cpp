@@ -12,9 +12,7 @@ namespace {
 
 ChartSeries::Shape shapeOf(const GraphElement& element)
 {
-    if (element.getType() == GraphLine::kType)
-        return ChartSeries::Shape::kLine;
-    return element.getType() == GraphPolygon::kType ? ChartSeries::Shape::kPolygon : ChartSeries::Shape::kPoint;
+    return static_cast<ChartSeries::Shape>(element.getType());
 }
 
 } // namespace
@@ -31,8 +29,10 @@ std::vector<ChartSeries> seriesOf(std::span<GraphElement* const> elements, bool 
         const auto points = pointsOf(*element, single);
         series.points.reserve(points.size());
         for (const GraphPoint* point : points)
+            // Such a point leaves no gap: the line goes from its neighbour to its neighbour.
             if (const ChartPoint place = chartPointOf(*point, isDateBased); hasPlace(place))
                 series.points.push_back(place);
+        // What shows nothing has no place in the key, either.
         if (!series.points.empty())
             all.push_back(std::move(series));
     }
@@ -66,6 +66,7 @@ std::span<GraphPoint* const> pointsOf(GraphElement& element, GraphPoint*& single
     case ChartSeries::Shape::kPoint:
         break;
     }
+    // A single point is in no array that could be pointed to, so the caller lends the room for one.
     single = &static_cast<GraphPoint&>(element);
     return {&single, 1};
 }

@@ -12,7 +12,7 @@ class GraphPoint;
 
 /// What one element of a chart shows, in numbers.
 struct ChartSeries {
-    enum class Shape { kLine, kPolygon, kPoint };
+    enum class Shape : short { kLine = 1, kPolygon = 2, kPoint = 3 }; // by `GraphElement::getType`
 
     Shape shape = Shape::kLine;
     rgb_color color;

@@ -22,6 +22,7 @@ public:
     std::size_t moveTo(std::size_t end, std::vector<BPoint>& pixels) const
     {
         std::size_t previous = first_;
+        // In the order of the line. One point may be first, lowest and last at once, and then stays once.
         pixels[end++] = pixels[first_];
         for (const std::size_t i : {std::min(lowest_, highest_), std::max(lowest_, highest_), last_}) {
             if (i != previous)

@@ -8,7 +8,12 @@
 
 namespace {
 
-using Unit = DateStep::Unit;
+/// What a calendar axis goes by: every so many days, weeks, months or years.
+enum class Unit { kDay, kWeek, kMonth, kYear };
+struct DateStep {
+    Unit unit;
+    int count;
+};
 
 constexpr int kMonths = 12;
 
@@ -20,6 +25,7 @@ const Date& firstDay()
 
 double daysOf(DateStep step)
 {
+    // On average: it tells only which steps are worth trying.
     constexpr double kDays[] = {1, 7, 30.44, 365.25};
     return kDays[static_cast<int>(step.unit)] * step.count;
 }
@@ -45,6 +51,7 @@ std::int64_t roundUp(std::int64_t value, std::int64_t step)
 
 std::vector<AxisTick> ticksByDays(const ChartRange& range, DateStep step)
 {
+    // Weeks are counted from 3 January 2000, so that the same Mondays are labelled in every chart.
     constexpr std::int64_t kFirstMonday = 2;
     const bool isWeek = step.unit == Unit::kWeek;
     const std::int64_t days = isWeek ? 7 * step.count : step.count;
@@ -69,24 +76,24 @@ std::vector<AxisTick> ticksByMonths(const ChartRange& range, DateStep step)
         const double day = dayNumber(date);
         if (!(day <= range.max)) // or it is not a number: too far away
             return ticks;
+        // The month that the range begins in has its first day before, as a rule.
         if (day >= range.min)
             ticks.push_back({day, label(date, step.unit)});
     }
 }
 
-/// The step after `step`: some that divide weeks, months and years well, then 1, 2 and 5 times a power of ten years.
-DateStep coarser(DateStep step)
+/// The steps from the finest on, by number: some that divide weeks, months and years well, then 2, 5 and 10 times a
+/// power of ten years.
+DateStep stepAt(std::size_t i)
 {
     constexpr DateStep kSteps[] = {{Unit::kDay, 1},   {Unit::kDay, 2},   {Unit::kWeek, 1},
                                    {Unit::kWeek, 2},  {Unit::kMonth, 1}, {Unit::kMonth, 2},
                                    {Unit::kMonth, 3}, {Unit::kMonth, 6}, {Unit::kYear, 1}};
-    for (std::size_t i = 0; i + 1 < std::size(kSteps); ++i)
-        if (kSteps[i].unit == step.unit && kSteps[i].count == step.count)
-            return kSteps[i + 1];
-    int leading = step.count;
-    while (leading >= 10)
-        leading /= 10;
-    return {Unit::kYear, leading == 2 ? step.count / 2 * 5 : step.count * 2};
+    constexpr int kYears[] = {2, 5, 10};
+    if (i < std::size(kSteps))
+        return kSteps[i];
+    i -= std::size(kSteps);
+    return {Unit::kYear, kYears[i % 3] * static_cast<int>(std::pow(10, i / 3))};
 }
 
 /// The ends of the range, or only the first day when there is no room for both.
@@ -106,6 +113,7 @@ std::vector<AxisTick> endTicks(const ChartRange& range, double pixelsPerDay, con
 double dayNumber(const Date& date)
 {
     constexpr int kLimit = std::numeric_limits<int>::max(); // where `Date` cuts differences
+    // A difference that `Date` has cut is no number of days any more, so it counts as none.
     const int days = date.isValid() ? date - firstDay() : kLimit;
     return days > -kLimit && days < kLimit ? days : std::numeric_limits<double>::quiet_NaN();
 }
@@ -117,23 +125,20 @@ Date dateOfDay(double day)
     return date.moveBy(static_cast<std::int64_t>(std::floor(std::clamp(day, -kLimit, kLimit))));
 }
 
-std::vector<AxisTick> dateTicks(const ChartRange& range, DateStep step)
-{
-    return step.unit == Unit::kDay || step.unit == Unit::kWeek ? ticksByDays(range, step) : ticksByMonths(range, step);
-}
-
 std::vector<AxisTick> levelDateTicks(const ChartRange& range, double pixelsPerDay, const TextWidth& width, float gap)
 {
+    // No label is narrower than one digit.
     const double narrowest = static_cast<double>(width("0") + gap);
-    DateStep step{Unit::kDay, 1};
     std::vector<AxisTick> ticks;
-    for (;; step = coarser(step)) {
+    for (std::size_t i = 0;; ++i) {
+        const DateStep step = stepAt(i);
         // Labels of that step would overlap whatever they are: no ticks are made for it.
         if (daysOf(step) * pixelsPerDay < narrowest)
             continue;
-        ticks = dateTicks(range, step);
+        ticks = step.unit < Unit::kMonth ? ticksByDays(range, step) : ticksByMonths(range, step);
         if (areLabelsApart(ticks, pixelsPerDay, width, gap))
             break;
     }
+    // A single tick would tell the day and not the length of what is shown.
     return ticks.size() > 1 ? ticks : endTicks(range, pixelsPerDay, width, gap);
 }

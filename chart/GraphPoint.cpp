@@ -10,27 +10,9 @@ GraphPoint::~GraphPoint()
     setGraphPolyElement(nullptr);
 }
 
-void GraphPoint::setX(float x)
-{
-    x_ = x;
-    notifyChange();
-}
-
-void GraphPoint::setDateX(const Date& date)
-{
-    // The line sorts its points again before the next read.
-    dateX_ = date;
-    notifyChange();
-}
-
-void GraphPoint::setY(float y)
-{
-    y_ = y;
-    notifyChange();
-}
-
 void GraphPoint::notifyChange()
 {
+    // The line sorts its points before the next read; a polygon and a point that stands alone keep no order.
     if (GraphPolyElement* element = polyElement_.partner())
         element->graphPointChanged();
 }
@@ -43,6 +25,7 @@ int sortPointsByX(const void* a, const void* b)
         return 0;
     if (first.isDateBased())
         return first.getDateX() > second.getDateX() ? 1 : first.getDateX() < second.getDateX() ? -1 : 0;
+    // A number that is none is neither above nor below any other, and would leave the order open.
     if (std::isnan(first.getX()) || std::isnan(second.getX()))
         return static_cast<int>(std::isnan(first.getX())) - static_cast<int>(std::isnan(second.getX()));
     return first.getX() > second.getX() ? 1 : first.getX() < second.getX() ? -1 : 0;

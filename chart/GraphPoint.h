@@ -12,17 +12,19 @@ public:
 
     GraphPoint() = default;
     GraphPoint(float x, float y) : x_(x), y_(y) {}
+    /// Goes by the date.
+    GraphPoint(const Date& x, float y) : y_(y), dateX_(x) { setDateBased(true); }
     ~GraphPoint() override;
 
     short getType() const override { return kType; }
     bool isUndefined() const override { return false; }
 
     float getX() const { return x_; }
-    void setX(float x);
+    void setX(float x) { change(x_, x); }
     Date getDateX() const { return dateX_.date(); }
-    void setDateX(const Date& date);
+    void setDateX(const Date& date) { change(dateX_, PackedDate(date)); }
     float getY() const { return y_; }
-    void setY(float y);
+    void setY(float y) { change(y_, y); }
 
     int setGraphPolyElement(GraphPolyElement* element);
     /// @return 0; -1 and a null `*out` when the point belongs to no line or polygon.
@@ -33,6 +35,13 @@ public:
 private:
     friend class GraphLineToGraphPoints;
     friend class GraphPolygonToGraphPoints;
+    /// The line that the point is on sorts its points again before the next read.
+    template <class Coordinate>
+    void change(Coordinate& coordinate, Coordinate value)
+    {
+        coordinate = value;
+        notifyChange();
+    }
     void notifyChange();
 
     float x_ = 0;

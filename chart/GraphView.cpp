@@ -29,6 +29,7 @@ constexpr uint32 kPictureFile = 'GSav';
 ChartFont fontOf(short size)
 {
     BFont font = *be_plain_font;
+    // A size of 0 or less has no font; the smallest one is used.
     font.SetSize(std::max<short>(size, 1));
     font_height height;
     font.GetHeight(&height);
@@ -64,6 +65,7 @@ void GraphView::Draw(BRect)
 {
     ChartPainter painter(*this, backgroundColor_);
     painter.fillBackground();
+    // The elements are read anew for each drawing: they do not tell of their changes.
     const ChartContents contents = readContents();
     if (contents.series.empty()) {
         scale_.reset(); // there is nothing that the pointer could be near to
@@ -95,6 +97,7 @@ void GraphView::MouseMoved(BPoint where, bool inside)
 
 void GraphView::MenuRequested(BPoint where)
 {
+    // Made for each time; the program waits here until it has gone.
     BPopUpMenu menu("chartMenu");
     menu.AddItem(new BMenuItem("Save as PNG...", nullptr));
     if (menu.Go(ConvertToScreen(where)) != nullptr)
@@ -130,11 +133,13 @@ void GraphView::savePicture(const BMessage& answer)
 {
     entry_ref folder;
     const char* name;
+    // Not an answer of the panel.
     if (answer.FindRef("directory", &folder) != B_OK || answer.FindString("name", &name) != B_OK)
         return;
     BPath path;
     BEntry(&folder).GetPath(&path);
     path.Append(name);
+    // The chart as it was drawn last, without frame and read-out.
     if (save_picture(*this, path.Path()) != B_OK)
         (new BAlert("Save as PNG", (std::string("The picture could not be written to ") + path.Path()).c_str(), "OK"))
             ->Go();

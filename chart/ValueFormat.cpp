@@ -32,9 +32,11 @@ int usualDecimals(double magnitude)
 
 ValueFormat ValueFormat::forStep(double step, double magnitude)
 {
+    // As many decimals as the step itself has.
     const int decimals = std::max(0, -exponent(step));
     if (decimals <= kMostDecimals && magnitude >= kSmallest && magnitude < kGreatest)
         return {decimals, false};
+    // As many digits as tell the largest value from its neighbour.
     return {std::clamp(exponent(std::max(magnitude, step)) - exponent(step), 0, kMostFactorDecimals), true};
 }
 
@@ -45,21 +47,23 @@ ValueFormat ValueFormat::forValues(const ChartRange& range)
     const double magnitude = std::max(std::abs(range.min), std::abs(range.max));
     if (magnitude == 0)
         return {0, false};
+    // Fine enough for the value itself and, where the values lie close together, for what they differ by.
     double step = magnitude / kPartsOfValue;
     if (range.length() > 0)
         step = std::min(step, range.length() / kPartsOfRange);
     ValueFormat format = forStep(step, magnitude);
-    if (!format.isScientific_)
-        format.decimals_ = std::max(format.decimals_, usualDecimals(magnitude));
+    if (!format.isScientific)
+        format.decimals = std::max(format.decimals, usualDecimals(magnitude));
     return format;
 }
 
 std::string ValueFormat::operator()(double value) const
 {
     char text[64];
-    if (isScientific_ && value != 0)
-        std::snprintf(text, sizeof text, "%.*e", decimals_, value);
+    // 0 has no power of ten.
+    if (isScientific && value != 0)
+        std::snprintf(text, sizeof text, "%.*e", decimals, value);
     else
-        std::snprintf(text, sizeof text, "%.*f", isScientific_ ? 0 : decimals_, value);
+        std::snprintf(text, sizeof text, "%.*f", isScientific ? 0 : decimals, value);
     return text;
 }

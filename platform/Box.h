@@ -7,7 +7,7 @@
 /// A frame with a title around a group of controls, which are its children.
 class BBox : public BView {
 public:
-    BBox(BRect frame, const char* name, uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW);
+    BBox(BRect frame, const char* name);
 
     void SetLabel(const char* label);
     const char* Label() const { return label_.c_str(); }

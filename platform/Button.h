@@ -5,8 +5,7 @@
 /// A push button. The space bar and Enter press it, too.
 class BButton : public BControl {
 public:
-    BButton(BRect frame, const char* name, const char* label, BMessage* message,
-            uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
+    BButton(BRect frame, const char* name, const char* label, BMessage* message);
 
     void SetLabel(const char* label) override;
 };

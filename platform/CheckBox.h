@@ -5,8 +5,7 @@
 /// A box that is on or off: its `Value`.
 class BCheckBox : public BControl {
 public:
-    BCheckBox(BRect frame, const char* name, const char* label, BMessage* message,
-              uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
+    BCheckBox(BRect frame, const char* name, const char* label, BMessage* message);
 
     /// Sends no message; only a person does.
     void SetValue(int32 value) override;

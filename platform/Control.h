@@ -16,13 +16,15 @@ public:
     void SetEnabled(bool enabled);
     bool IsEnabled() const;
 
-    /// The target is the window, unless another one was set.
-    void AttachedToWindow() override;
-
 protected:
     /// Owns `message`; `widget` is what shows the control, and `label` is what assistive tools call it.
-    BControl(BRect frame, const char* name, const char* label, BMessage* message, uint32 resizingMode, uint32 flags,
-             QWidget* widget);
+    BControl(BRect frame, const char* name, const char* label, BMessage* message, QWidget* widget,
+             uint32 flags = B_WILL_DRAW | B_NAVIGABLE)
+        : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, flags, widget), BInvoker(message),
+          label_(label != nullptr ? label : "")
+    {
+        SetAccessibleName(Label());
+    }
 
 private:
     std::string label_;

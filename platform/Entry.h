@@ -1,10 +1,8 @@
 #pragma once
 
-#include "platform/SupportDefs.h"
+#include "platform/Path.h"
 
 #include <string>
-
-class BPath;
 
 /// A file or folder by the folder it lies in and its name there. It need not exist.
 struct entry_ref {
@@ -12,16 +10,18 @@ struct entry_ref {
     std::string name;
 };
 
-/// A place in the file system, from a reference or a path.
+/// A place in the file system.
 class BEntry {
 public:
-    explicit BEntry(const entry_ref* ref);
-    explicit BEntry(const char* path);
+    explicit BEntry(const entry_ref* ref) : path_(std::filesystem::path(ref->directory) / ref->name) {}
 
-    /// `B_NO_INIT` when the entry stands for no place; the same below.
-    status_t GetPath(BPath* path) const;
-    status_t GetRef(entry_ref* ref) const;
+    /// @return `B_NO_INIT` when the entry stands for no place.
+    status_t GetPath(BPath* path) const
+    {
+        path->SetTo(path_.string());
+        return path_.empty() ? B_NO_INIT : B_OK;
+    }
 
 private:
-    std::string path_;
+    std::filesystem::path path_;
 };

@@ -11,7 +11,6 @@ enum : uint32 { B_FONT_FAMILY_AND_STYLE = 1, B_FONT_SIZE = 2, B_FONT_ALL = 0xfff
 struct font_height {
     float ascent = 0;
     float descent = 0;
-    float leading = 0;
 };
 
 /// One of the desktop's fonts, at a size in pixels.

@@ -21,7 +21,7 @@ public:
     virtual BLooper* Looper() const { return nullptr; }
     /// Called for each message, in the order of their sending, while its looper is locked; `message` is there as long
     /// as the call. Here, where nobody understood it, it ends.
-    virtual void MessageReceived(BMessage* message);
+    virtual void MessageReceived(BMessage* /*message*/) {}
 
     /// A number that no other handler has or had: a handler that has died is not mistaken for a new one at its place.
     std::uint64_t token() const { return token_; }

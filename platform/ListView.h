@@ -3,7 +3,6 @@
 #include "platform/Invoker.h"
 #include "platform/View.h"
 
-#include <memory>
 #include <string>
 #include <vector>
 
@@ -15,26 +14,21 @@ enum list_view_type { B_SINGLE_SELECTION_LIST, B_MULTIPLE_SELECTION_LIST };
 /// Rows below one another, which draw themselves; scrolls by itself, without a view around it as in the kits, and makes
 /// no widget per row.
 ///
-/// A change of the selection, by hand or by a call, sends the selection message; a double click or Enter sends the
-/// invocation message, the one that the invoker holds. Rows that are taken out leave the selection silently. All rows
-/// have the same height.
+/// A change of the selection, by hand or by a call, sends the list's message, which the kits call the selection
+/// message; there is none for a double click. Rows that are taken out leave the selection silently. All rows have the
+/// same height.
 ///
 /// Does not own its items, unlike everything else here: who takes a row out gets it back. What is left in the list when
 /// it dies is the subclass's to destroy.
 class BListView : public BView, public BInvoker {
 public:
-    BListView(BRect frame, const char* name, list_view_type type = B_SINGLE_SELECTION_LIST,
-              uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP,
-              uint32 flags = B_WILL_DRAW | B_FRAME_EVENTS | B_NAVIGABLE);
-    ~BListView() override;
+    BListView(BRect frame, const char* name, list_view_type type);
 
-    bool AddItem(BListItem* item) { return AddItem(item, CountItems()); }
     bool AddItem(BListItem* item, int32 index);
     /// Puts all of them behind the last row at once.
     void AddItems(const std::vector<BListItem*>& items);
     /// Null out of range.
     BListItem* RemoveItem(int32 index);
-    bool RemoveItem(BListItem* item) { return RemoveItem(IndexOf(item)) != nullptr; }
     void MakeEmpty();
     int32 CountItems() const { return static_cast<int32>(items_.size()); }
     /// Null out of range.
@@ -65,19 +59,17 @@ public:
     void SetTopRow(int32 index);
 
     /// Owns `message`; null sends none.
-    void SetSelectionMessage(BMessage* message) { selectionMessage_.reset(message); }
+    void SetSelectionMessage(BMessage* message) { SetMessage(message); }
     /// As long as `quiet` is set, changes of the selection send nothing.
     void SetQuiet(bool quiet) { quiet_ = quiet; }
 
     /// Height of each row, in pixels.
     float RowHeight() const { return rowHeight_; }
     void SetRowHeight(float height) { rowHeight_ = height; }
-    void AttachedToWindow() override;
 
     /// For the platform's own use.
     void drawRow(QPainter& painter, BRect frame, int32 index);
     void selectionChangedByWidget(const std::vector<int32>& on, const std::vector<int32>& off);
-    void invokedByWidget();
 
 private:
     ListWidget& listWidget() const;
@@ -87,7 +79,6 @@ private:
     mutable std::vector<int32> selection_; // indices, ascending, when it is up to date
     mutable bool selectionStale_ = false;
     mutable int32 firstUnnumbered_ = 0; // rows from here on do not know their index
-    std::unique_ptr<BMessage> selectionMessage_;
     bool quiet_ = false;
     float rowHeight_ = 18;
 };

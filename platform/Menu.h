@@ -1,19 +1,17 @@
 #pragma once
 
-#include "platform/SupportDefs.h"
+#include "platform/MenuItem.h"
 
 #include <functional>
 #include <memory>
 #include <string>
 #include <vector>
 
-class BMenuItem;
-
 /// A list of choices, of which one is marked at a time. Owns its items.
 class BMenu {
 public:
-    explicit BMenu(const char* name);
-    virtual ~BMenu();
+    explicit BMenu(const char* name) : name_(name) {}
+    virtual ~BMenu() = default;
     BMenu(const BMenu&) = delete;
     BMenu& operator=(const BMenu&) = delete;
 
@@ -27,8 +25,15 @@ public:
     BMenuItem* ItemAt(int32 index) const;
     /// The first item of that label; null when there is none.
     BMenuItem* FindItem(const char* label) const;
-    BMenuItem* FindMarked() const;
-    int32 IndexOf(const BMenuItem* item) const;
+    BMenuItem* FindMarked() const
+    {
+        return ItemAt(find([](const BMenuItem& item) { return item.IsMarked(); }));
+    }
+    /// Negative when it is not here.
+    int32 IndexOf(const BMenuItem* item) const
+    {
+        return find([=](const BMenuItem& other) { return &other == item; });
+    }
 
     /// For the platform's own use: told of every change, so that what shows the menu can follow.
     void setObserver(std::function<void()> observer) { observer_ = std::move(observer); }
@@ -37,6 +42,8 @@ private:
     friend class BMenuItem;
     void mark(BMenuItem* item, bool marked);
     void changed() const;
+    /// The index of the first item that `isIt`; negative when there is none.
+    int32 find(const std::function<bool(const BMenuItem&)>& isIt) const;
 
     std::string name_;
     std::vector<std::unique_ptr<BMenuItem>> items_;

@@ -12,8 +12,7 @@ class QLabel;
 class BMenuField : public BView {
 public:
     /// Takes ownership of `menu`.
-    BMenuField(BRect frame, const char* name, const char* label, BMenu* menu,
-               uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
+    BMenuField(BRect frame, const char* name, const char* label, BMenu* menu);
     ~BMenuField() override;
 
     BMenu* Menu() const { return menu_.get(); }

@@ -5,6 +5,8 @@
 
 #include <map>
 #include <string>
+#include <type_traits>
+#include <utility>
 #include <variant>
 
 /// Codes that the platform sends of itself. Codes are four characters, the first one in the highest byte.
@@ -27,18 +29,32 @@ public:
     status_t AddString(const char* name, const char* value) { return add(name, std::string(value)); }
     status_t AddRef(const char* name, const entry_ref* ref) { return add(name, *ref); }
 
-    status_t FindInt32(const char* name, int32* value) const;
+    status_t FindInt32(const char* name, int32* value) const { return find<int32>(name, value); }
     /// The text belongs to the message.
-    status_t FindString(const char* name, const char** value) const;
-    status_t FindRef(const char* name, entry_ref* ref) const;
+    status_t FindString(const char* name, const char** value) const { return find<std::string>(name, value); }
+    status_t FindRef(const char* name, entry_ref* ref) const { return find<entry_ref>(name, ref); }
 
 private:
     using Value = std::variant<int32, std::string, entry_ref>;
 
-    status_t add(const char* name, Value value);
-    /// Null when there is no value of that name, or one of another type.
-    template <class T>
-    const T* held(const char* name) const;
+    status_t add(const char* name, Value value)
+    {
+        values_.emplace(name, std::move(value));
+        return B_OK;
+    }
+    template <class T, class Out>
+    status_t find(const char* name, Out* out) const
+    {
+        const auto found = values_.find(name);
+        const T* held = found != values_.end() ? std::get_if<T>(&found->second) : nullptr;
+        if (held == nullptr)
+            return B_NAME_NOT_FOUND;
+        if constexpr (std::is_same_v<T, std::string>)
+            *out = held->c_str();
+        else
+            *out = *held;
+        return B_OK;
+    }
 
     std::map<std::string, Value, std::less<>> values_;
 };

@@ -2,17 +2,23 @@
 
 #include "platform/SupportDefs.h"
 
+#include <filesystem>
 #include <string>
 
 /// The text of a path.
 class BPath {
 public:
-    /// @return `B_BAD_VALUE` for an empty path; the object then stands for none.
-    status_t SetTo(const char* path);
+    void SetTo(const std::string& path) { path_ = path; }
     /// Null without a path.
     const char* Path() const { return path_.empty() ? nullptr : path_.c_str(); }
-    /// Adds a name behind a slash.
-    status_t Append(const char* leaf);
+    /// Adds a name behind a slash. @return `B_BAD_VALUE` without a path or a name.
+    status_t Append(const char* leaf)
+    {
+        if (path_.empty() || leaf == nullptr || *leaf == '\0')
+            return B_BAD_VALUE;
+        path_ = (std::filesystem::path(path_) / leaf).string();
+        return B_OK;
+    }
 
 private:
     std::string path_;

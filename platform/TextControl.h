@@ -14,9 +14,7 @@ class QLineEdit;
 /// Sends its message when Enter is pressed, and when the keyboard leaves a text that was changed by hand.
 class BTextControl : public BControl {
 public:
-    BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message,
-                 uint32 resizingMode = B_FOLLOW_LEFT | B_FOLLOW_TOP, uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
-
+    BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message);
     ~BTextControl() override;
 
     /// The text belongs to the control and is valid until it changes. As long as nobody has changed it, it is what it
@@ -28,7 +26,6 @@ public:
     /// Where the field begins, in pixels from the left; 0 leaves no room for the label.
     void SetDivider(float x);
     void SetAlignment(alignment label, alignment text);
-    void SetLabel(const char* label) override;
 
     // What the kits do not have.
     /// Whether the text can be changed by hand; it can be selected in either case.

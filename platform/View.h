@@ -16,6 +16,16 @@ class QPainter;
 class QPixmap;
 class QWidget;
 
+/// What a view draws with.
+struct DrawingState {
+    rgb_color high{0, 0, 0, 255};
+    rgb_color low{255, 255, 255, 255};
+    rgb_color view{255, 255, 255, 255}; // the ground
+    float penSize = 1;
+    drawing_mode mode = B_OP_COPY;
+    BFont font;
+};
+
 /// A rectangular part of a window that draws itself and answers to mouse and keyboard.
 ///
 /// What a view draws goes into a picture of its own, so drawing is allowed at any time and stays until the next `Draw`;
@@ -73,15 +83,15 @@ public:
 
     // Drawing state.
     void SetViewColor(rgb_color color);
-    void SetHighColor(rgb_color color);
-    rgb_color HighColor() const;
-    void SetLowColor(rgb_color color);
-    void SetPenSize(float size);
-    void SetDrawingMode(drawing_mode mode);
+    void SetHighColor(rgb_color color) { state_.high = color; }
+    rgb_color HighColor() const { return state_.high; }
+    void SetLowColor(rgb_color color) { state_.low = color; }
+    void SetPenSize(float size) { state_.penSize = size; }
+    void SetDrawingMode(drawing_mode mode) { state_.mode = mode; }
     virtual void SetFont(const BFont* font, uint32 mask = B_FONT_ALL);
     void SetFontSize(float size);
-    void GetFont(BFont* font) const;
-    float StringWidth(const char* text) const;
+    void GetFont(BFont* font) const { *font = state_.font; }
+    float StringWidth(const char* text) const { return state_.font.StringWidth(text); }
 
     // Drawing. Upright and level lines are sharp, others smooth, on screens of any resolution.
     void FillRect(BRect rect, pattern p = B_SOLID_HIGH);
@@ -93,7 +103,6 @@ public:
     void AddLine(BPoint from, BPoint to, rgb_color color);
     void EndLineArray();
     void FillPolygon(const BPoint* points, int32 count, pattern p = B_SOLID_HIGH);
-    void FillTriangle(BPoint a, BPoint b, BPoint c, pattern p = B_SOLID_HIGH);
     /// Angles in degrees, counter-clockwise from the right.
     void FillArc(BPoint center, float xRadius, float yRadius, float startAngle, float arcAngle,
                  pattern p = B_SOLID_HIGH);
@@ -136,5 +145,6 @@ private:
     bool hidden_ = false;
     std::vector<BView*> children_; // owned
     QWidget* widget_;              // owned
+    DrawingState state_;
     std::unique_ptr<Canvas> canvas_;
 };

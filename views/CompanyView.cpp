@@ -42,7 +42,7 @@ void CompanyView::makeMarkets(BRect frame)
     const float bottom = frame.Height() - kBoxSide;
     const float buttonTop = bottom - kButtonHeight;
     const float fieldTop = buttonTop - kGap - kFieldHeight;
-    markets_ = new MarketListView("lstMarkets", right - kBoxSide - kScrollBar - MarketListView::kOtherWidth);
+    markets_ = new MarketListView("lstMarkets");
     markets_->addTo(box, {kBoxSide, kBoxTop, right, fieldTop - kGap}, "Markets");
     markets_->SetSelectionMessage(new BMessage('MSel'));
     constexpr float kCurrencyWidth = 112;
@@ -61,6 +61,7 @@ void CompanyView::makeCompanies(BRect frame)
     BBox* box = addBox(this, frame, "Companies");
     const float right = frame.Width() - kBoxSide;
     const float bottom = frame.Height() - kBoxSide;
+    // The widths of the list's columns.
     constexpr float kListEnd = kBoxSide + 66 + 176 + kScrollBar;
     companies_ = new CompanyListView("lstCompanies");
     companies_->addTo(box, {kBoxSide, kBoxTop, kListEnd, bottom}, "Companies");
@@ -136,6 +137,7 @@ void CompanyView::DeleteMarket(Market* market)
 
 void CompanyView::SetMarketList(const std::vector<Market*>& markets)
 {
+    // What is selected stays so where it is still there; no message is sent, so the fields keep what is typed in them.
     markets_->setAll(markets);
     // The market whose companies were shown may be gone, and another one at its address.
     SetCompanyList(nullptr);
@@ -154,6 +156,7 @@ void CompanyView::setDiffWithAverage(float difference)
 void CompanyView::AddCompany(Company* company, bool selected)
 {
     markets_->InvalidateItems(); // they count their companies
+    // A company without market would otherwise be taken for one of a page that shows none.
     const Market* market = company->market();
     if (market == nullptr || market != shownMarket_)
         return;
@@ -191,6 +194,7 @@ void CompanyView::SetCompanyList(Market* market)
     std::vector<Company*> companies;
     if (market != nullptr)
         companies.assign(market->companies().begin(), market->companies().end());
+    // Here, too, a company that was selected stays so.
     companies_->setAll(companies);
     // Quotes and events stay only when the company that they are of is selected here still.
     const Company* selected = GetSelectedCompany();

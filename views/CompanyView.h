@@ -1,10 +1,8 @@
 #pragma once
 
 #include "platform/TextControl.h"
-#include "views/CompanyEventListView.h"
-#include "views/CompanyListView.h"
 #include "views/EventBox.h"
-#include "views/MarketListView.h"
+#include "views/MarketDataLists.h"
 #include "views/SeriesPage.h"
 
 #include <optional>

@@ -35,6 +35,7 @@ void CurrencyView::makeCurrencies(BRect frame)
     BBox* box = addBox(this, frame, "Currencies");
     const float right = frame.Width() - kBoxSide;
     const float bottom = frame.Height() - kBoxSide;
+    // The widths of the list's columns.
     constexpr float kListEnd = kBoxSide + 150 + 62 + 96 + 82 + kScrollBar;
     currencies_ = new CurrencyListView("lstCurrencies");
     currencies_->addTo(box, {kBoxSide, kBoxTop, kListEnd, bottom}, "Currencies");
@@ -73,7 +74,7 @@ void CurrencyView::makeMarkets(BRect frame)
 {
     BBox* box = addBox(this, frame, "Markets");
     const float width = frame.Width() - 2 * kBoxSide;
-    markets_ = new MarketListView("lstMarkets", width - kScrollBar - MarketListView::kOtherWidth);
+    markets_ = new MarketListView("lstMarkets");
     markets_->addTo(box, {kBoxSide, kBoxTop, kBoxSide + width, frame.Height() - kBoxSide}, "Markets");
 }
 
@@ -115,6 +116,7 @@ void CurrencyView::DeleteCurrency(Currency* currency)
 
 void CurrencyView::SetMarketList(Currency* currency)
 {
+    // Unlike quotes, markets are few: the list is filled anew in any case, and keeps what is selected.
     marketsOf_ = currency;
     std::vector<Market*> markets;
     if (currency != nullptr)
@@ -131,6 +133,7 @@ void CurrencyView::AddMarket(Market* market)
 
 void CurrencyView::fillChart(QuoteChart& chart, const Currency& currency) const
 {
+    // Rates are shown in the reference currency, whose name the page has in its field.
     const std::string reference = textOf(referenceName_->Text());
     chart.showSeries(currency, textOf(currency.getRepresentation()), reference.empty() ? "???" : reference, false);
 }

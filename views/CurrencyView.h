@@ -1,8 +1,7 @@
 #pragma once
 
 #include "platform/TextControl.h"
-#include "views/CurrencyListView.h"
-#include "views/MarketListView.h"
+#include "views/MarketDataLists.h"
 #include "views/SeriesPage.h"
 
 /// The page of currencies, with the markets and rates of the selected currency.

@@ -1,6 +1,5 @@
 #include "views/DateControl.h"
 
-#include "foundation/DateText.h"
 #include "foundation/Today.h"
 
 #include <algorithm>
@@ -25,40 +24,24 @@ void DateControl::setDate(const Date& date)
     mark();
 }
 
-Date DateControl::getDate() const
-{
-    return readDate(Text());
-}
-
-void DateControl::TextModified()
-{
-    mark();
-}
-
 void DateControl::KeyDown(const char* bytes, int32)
 {
     Date date = getDate();
+    // A text that is no date stays as it is: nobody wants it replaced by a key that slipped.
     if (date.isUndefined()) {
         if (*Text() == '\0')
             enter(today());
         return;
     }
-    switch (*bytes) {
-    case B_UP_ARROW:
-        enter(date.moveBy(1));
-        break;
-    case B_DOWN_ARROW:
-        enter(date.moveBy(-1));
-        break;
-    case B_PAGE_UP:
-        enter(monthsFrom(date, 1));
-        break;
-    case B_PAGE_DOWN:
-        enter(monthsFrom(date, -1));
-        break;
-    default:
-        break;
-    }
+    constexpr struct {
+        char key;
+        int days;
+        int months;
+    } kMoves[] = {{B_UP_ARROW, 1, 0}, {B_DOWN_ARROW, -1, 0}, {B_PAGE_UP, 0, 1}, {B_PAGE_DOWN, 0, -1}};
+    // All other keys are for the text, and have gone there.
+    for (const auto& move : kMoves)
+        if (move.key == *bytes)
+            return enter(move.months != 0 ? monthsFrom(date, move.months) : date.moveBy(move.days));
 }
 
 void DateControl::enter(const Date& date)

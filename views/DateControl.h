@@ -1,6 +1,6 @@
 #pragma once
 
-#include "foundation/Date.h"
+#include "foundation/DateText.h"
 #include "platform/TextControl.h"
 
 /// A field for a date. A text that is none shows by its colour until it is mended. The keys Up and Down go a day on and
@@ -11,9 +11,9 @@ public:
 
     void setDate(const Date& date);
     /// Undefined while the text is no date.
-    Date getDate() const;
+    Date getDate() const { return readDate(Text()); }
 
-    void TextModified() override;
+    void TextModified() override { mark(); }
     void KeyDown(const char* bytes, int32 numBytes) override;
 
 private:

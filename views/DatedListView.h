@@ -4,16 +4,16 @@
 #include "views/ObjectListView.h"
 
 #include <algorithm>
+#include <ranges>
 #include <vector>
 
-/// A list of objects with a date, in its order. `Row` is as in `ObjectListView`, with a `release` that lets go of the
-/// object.
+/// A list of objects with a date, in its order; several can be selected.
 ///
 /// The rows look at the dates of their objects, so an object's row is taken out before it is destroyed.
-template <class Object, class Row>
-class DatedListView : public ObjectListView<Object, Row> {
+template <class Object>
+class DatedListView : public ObjectListView<Object> {
 public:
-    using ObjectListView<Object, Row>::ObjectListView;
+    explicit DatedListView(const char* name) : ObjectListView<Object>(name, B_MULTIPLE_SELECTION_LIST) {}
 
     /// Shows these objects, given in any order, and no others. When they are what is shown already, nothing but the
     /// drawing is done.
@@ -64,10 +64,8 @@ public:
 private:
     bool isShown(const std::vector<Object*>& objects) const
     {
-        bool isSame = static_cast<int32>(objects.size()) == this->CountItems();
-        for (int32 i = 0; isSame && i < this->CountItems(); ++i)
-            isSame = this->objectAt(i) == objects[static_cast<std::size_t>(i)];
-        return isSame;
+        const auto objectAt = [this](int32 i) { return this->objectAt(i); };
+        return std::ranges::equal(objects, std::views::iota(0, this->CountItems()), {}, {}, objectAt);
     }
 
     Date dateAt(int32 index) const { return this->objectAt(index)->getDate(); }
@@ -75,14 +73,9 @@ private:
     /// The first row from `begin` on, and before `end`, whose date is later; `end` when there is none.
     int32 placeFor(const Date& date, int32 begin, int32 end) const
     {
-        while (begin < end) {
-            const int32 middle = begin + (end - begin) / 2;
-            if (dateAt(middle) > date)
-                end = middle;
-            else
-                begin = middle + 1;
-        }
-        return begin;
+        const auto dateOfRow = [this](int32 i) { return dateAt(i); };
+        const auto rows = std::views::iota(begin, end);
+        return begin + static_cast<int32>(std::ranges::upper_bound(rows, date, {}, dateOfRow) - rows.begin());
     }
 
     /// Where the row at `index` belongs among the others, now that it has this date.

@@ -6,7 +6,6 @@
 #include "platform/MenuItem.h"
 #include "platform/PopUpMenu.h"
 #include "platform/StringView.h"
-#include "views/CompanyEventListView.h"
 #include "views/Look.h"
 
 using namespace look;
@@ -35,6 +34,7 @@ EventBox::EventBox(BRect frame) : BBox(frame, "")
     list_->addTo(this, {kBoxSide, kBoxTop, right, kListEnd}, "Events");
     list_->SetSelectionMessage(new BMessage('CEse'));
 
+    // Four rows of the list; what is below it is left to the fields.
     const float top = kListEnd + kMargin;
     const float buttonTop = bottom - kButtonHeight;
     makeFields({kBoxSide, top, right, buttonTop - kMargin});
@@ -80,6 +80,7 @@ void EventBox::makeFields(BRect area)
                                 'CTEt', kDivider);
     top += kRow;
     auto* label = new BStringView({area.left, top, area.left + kDivider - kGap, top + kFieldHeight}, "", "Text");
+    // It hides with the note's text, so it is kept.
     label->SetAlignment(B_ALIGN_RIGHT);
     AddChild(textLabel_ = label);
     text_ = new BTextView({area.left + kDivider, top, area.right, area.bottom}, "txtCompanyEventText",

@@ -5,12 +5,12 @@
 #include "platform/Box.h"
 #include "platform/TextView.h"
 #include "views/DateControl.h"
+#include "views/MarketDataLists.h"
 #include "views/ModelText.h"
 #include "views/NumberControl.h"
 #include "views/PageView.h"
 
 class BMenuField;
-class CompanyEventListView;
 
 /// A company's events with the fields and buttons to add, change and remove them. Of the fields, those of the chosen
 /// kind show.

@@ -1,6 +1,5 @@
 #pragma once
 
-#include "views/ColumnItem.h"
 #include "views/ColumnListView.h"
 #include "views/ListPlaces.h"
 
@@ -9,31 +8,37 @@
 #include <unordered_map>
 #include <vector>
 
-/// A row for an object of the model that is found again by its own address.
+/// A row for an object of the model that is found again by its own address. `kColumns` is defined for each class of
+/// objects that a list shows.
 template <class Object>
-class ObjectItem : public ColumnItem {
+class ObjectItem final : public ColumnItem {
 public:
+    static const std::vector<ColumnOf<Object>> kColumns;
+
     explicit ObjectItem(Object* object) : object_(object) {}
 
     Object* object() const { return object_; }
     const void* key() const { return object_; }
     /// Leaves the row without object. It is not drawn any more.
     void release() { object_ = nullptr; }
+    Cell cell(std::size_t column) const override { return kColumns[column].cell(*object_); }
 
-protected:
+private:
     Object* object_;
 };
 
 /// A list with a row for each of some objects of the model.
 ///
-/// `Row` is a `ColumnItem` made from an `Object*`, with two accessors that never look into the object: `object()`, and
-/// `key()`, the address of what the row stands for, by which a selection is found again after the list was filled anew
-/// (null for rows that shall not be found again). The list never looks into objects by itself, but showing a row does:
-/// who destroys an object takes its row out before.
-template <class Object, class Row>
+/// `Row` is a `ColumnItem` made from an `Object*`, with its columns in `kColumns`, and with two accessors that never
+/// look into the object: `object()`, and `key()`, the address of what the row stands for, by which a selection is found
+/// again after the list was filled anew (null for rows that shall not be found again). The list never looks into
+/// objects by itself, but showing a row does: who destroys an object takes its row out before.
+template <class Object, class Row = ObjectItem<Object>>
 class ObjectListView : public ColumnListView {
 public:
-    using ColumnListView::ColumnListView;
+    explicit ObjectListView(const char* name, list_view_type type = B_SINGLE_SELECTION_LIST)
+        : ColumnListView(name, type, {Row::kColumns.begin(), Row::kColumns.end()})
+    {}
 
     /// Puts a row behind the others, or before row `index`.
     void add(Object* object) { add(object, CountItems()); }

@@ -8,6 +8,7 @@
 
 String OperationView::chosen(const BMenuField& field)
 {
+    // The commands know an account by its name.
     const BMenuItem* item = field.Menu()->FindMarked();
     return item != nullptr ? String(item->Label()) : String();
 }
@@ -50,11 +51,13 @@ void OperationView::setDate(const Date& date)
 
 void OperationView::setTotal(float total)
 {
+    // Thousands separators are welcome here: nobody types in this field, and nothing reads it.
     total_->SetText(amountText(total).c_str());
 }
 
 void OperationView::SetTypingHook(const std::function<void()>& hook)
 {
+    // Also for the accounts in the menus, whose items look at this very member.
     typingHook_ = hook;
     date_->setTypingHook(hook);
     marketName_->setTypingHook(hook);
@@ -66,6 +69,7 @@ void OperationView::offerDate(const Date& date)
     if (!date_->isOpen())
         return;
     date_->setDate(date);
+    // From here on another offer may take its place, until a person types.
     date_->noteOffer();
 }
 
@@ -77,6 +81,7 @@ void OperationView::renewShareCost(float cost)
 
 void OperationView::offerTransferQuotes(std::optional<float> from, std::optional<float> to)
 {
+    // Each for itself: one of the two may have been typed.
     offer(*transferFromQuote_, from);
     offer(*transferToQuote_, to);
 }

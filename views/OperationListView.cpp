@@ -12,8 +12,6 @@
 
 namespace {
 
-enum Column { kDate, kAccount, kType, kWhat, kQuantity, kPrice, kCost, kTotal, kAutomatic };
-
 constexpr const char* kTypeNames[] = {"?", "Deposit", "Transfer", "Buy", "Sell"}; // by type code
 
 bool isTrade(const Operation& operation)
@@ -31,14 +29,16 @@ const TransferAccountOperation& asTransfer(const Operation& operation)
     return static_cast<const TransferAccountOperation&>(operation);
 }
 
-std::string accountName(const Operation& operation)
+Cell accountName(const OperationItem& item)
 {
-    return operation.account() != nullptr ? textOf(operation.account()->getName()) : std::string();
+    const Account* account = item.object()->account();
+    return {account != nullptr ? textOf(account->getName()) : ""};
 }
 
 /// Ticker and company, or the account that receives a transfer.
-Cell what(const Operation& operation)
+Cell what(const OperationItem& item)
 {
+    const Operation& operation = *item.object();
     if (isTrade(operation)) {
         const Share* share = asTrade(operation).share();
         if (share == nullptr)
@@ -60,55 +60,45 @@ float price(const Operation& operation)
                               : static_cast<const AccountOperation&>(operation).getAmount();
 }
 
-std::string cost(const Operation& operation)
+Cell quantity(const OperationItem& item)
 {
+    return {isTrade(*item.object()) ? countText(asTrade(*item.object()).getQuantity()) : ""};
+}
+
+Cell cost(const OperationItem& item)
+{
+    const Operation& operation = *item.object();
     if (isTrade(operation))
-        return amountText(asTrade(operation).getOperationCost());
-    return operation.getType() == Operation::kTransfer ? amountText(asTransfer(operation).getTotalCost()) : "";
+        return {amountText(asTrade(operation).getOperationCost())};
+    return {operation.getType() == Operation::kTransfer ? amountText(asTransfer(operation).getTotalCost()) : ""};
 }
 
 /// What is traded or moved, before costs, in the account's currency.
-std::string total(const Operation& operation)
+Cell total(const OperationItem& item)
 {
+    const Operation& operation = *item.object();
     const double quantity = isTrade(operation) ? asTrade(operation).getQuantity() : 1;
-    return amountText(quantity * price(operation)) + ' ' + textOf(operation.getCurrencyRepresentation());
+    return {amountText(quantity * price(operation)) + ' ' + textOf(operation.getCurrencyRepresentation())};
 }
 
 } // namespace
 
-Cell OperationItem::cell(int column) const
-{
-    // Released: the row is blank until it is dropped.
-    if (operation_ == nullptr)
-        return {};
-    const Operation& operation = *operation_;
-    switch (column) {
-    case kDate:
-        return {dateText(operation.getDate())};
-    case kAccount:
-        return {accountName(operation)};
-    case kType:
-        return {kTypeNames[operation.getType()]};
-    case kWhat:
-        return what(operation);
-    case kQuantity:
-        return {isTrade(operation) ? countText(asTrade(operation).getQuantity()) : ""};
-    case kPrice:
-        return {amountText(price(operation))};
-    case kCost:
-        return {cost(operation)};
-    case kTotal:
-        return {total(operation)};
-    case kAutomatic:
-        return {isAutomatic_ ? "\u2713" : ""};
-    default:
-        return {};
-    }
-}
+const std::vector<ColumnOf<OperationItem>> OperationItem::kColumns = {
+    {{"Date", 78}, [](const OperationItem& i) { return Cell{dateText(i.object()->getDate())}; }},
+    {{"Account", 106}, accountName},
+    {{"Type", 58}, [](const OperationItem& i) { return Cell{kTypeNames[i.object()->getType()]}; }},
+    {{"What", 128}, what},
+    {{"Quantity", 64, B_ALIGN_RIGHT}, quantity},
+    {{"Quote/Amount", 98, B_ALIGN_RIGHT}, [](const OperationItem& i) { return Cell{amountText(price(*i.object()))}; }},
+    {{"Cost", 62, B_ALIGN_RIGHT}, cost},
+    {{"Total", 118, B_ALIGN_RIGHT}, total},
+    {{"Auto", 36, B_ALIGN_CENTER}, [](const OperationItem& i) { return Cell{i.isAutomatic() ? "\u2713" : ""}; }},
+};
 
 void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
 {
     if (isAutomatic_ && !IsSelected()) {
+        // A selected row keeps the ground that the list has painted.
         const rgb_color text = owner->HighColor();
         owner->SetHighColor(look::kGenerated);
         owner->FillRect(frame);
@@ -117,16 +107,3 @@ void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
     // The text has the colour again that the list has set.
     ColumnItem::DrawItem(owner, frame, complete);
 }
-
-OperationListView::OperationListView(const char* name)
-    : ObjectListView({}, name, B_SINGLE_SELECTION_LIST,
-                     {{"Date", 78},
-                      {"Account", 106},
-                      {"Type", 58},
-                      {"What", 128},
-                      {"Quantity", 64, B_ALIGN_RIGHT},
-                      {"Quote/Amount", 98, B_ALIGN_RIGHT},
-                      {"Cost", 62, B_ALIGN_RIGHT},
-                      {"Total", 118, B_ALIGN_RIGHT},
-                      {"Auto", 36, B_ALIGN_CENTER}})
-{}

@@ -6,15 +6,18 @@
 /// A row for one operation.
 class OperationItem final : public ColumnItem {
 public:
+    static const std::vector<ColumnOf<OperationItem>> kColumns;
+
     explicit OperationItem(Operation* operation) : operation_(operation), isAutomatic_(operation->isAutomatic()) {}
 
     Operation* object() const { return operation_; }
     /// Null for an automatic operation: the next valuation destroys it and may make another one in its place.
     const void* key() const { return isAutomatic_ ? nullptr : operation_; }
-    /// Leaves the row without operation, and blank.
+    bool isAutomatic() const { return isAutomatic_; }
+    /// Leaves the row without operation, and blank until it is dropped.
     void release() { operation_ = nullptr; }
 
-    Cell cell(int column) const override;
+    Cell cell(std::size_t column) const override { return operation_ ? kColumns[column].cell(*this) : Cell(); }
     void DrawItem(BView* owner, BRect frame, bool complete) override;
 
 private:
@@ -23,7 +26,4 @@ private:
 };
 
 /// The operations of all accounts, automatic ones on a ground of their own.
-class OperationListView final : public ObjectListView<Operation, OperationItem> {
-public:
-    explicit OperationListView(const char* name);
-};
+using OperationListView = ObjectListView<Operation, OperationItem>;

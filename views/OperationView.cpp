@@ -39,6 +39,7 @@ struct TypePlan {
     uint32 code;
 };
 
+// In the order of the menu, by which a type is a bit of the sets below.
 constexpr TypePlan kTypes[] = {
     {"DEPOSIT", "Deposit", 'OPDe'}, {"TRANSFER", "Transfer", 'OPTr'}, {"BUY", "Buy", 'OPBu'}, {"SELL", "Sell", 'OPSe'}};
 
@@ -120,6 +121,7 @@ void OperationView::makeCommonFields(BBox* box)
 
 void OperationView::makeTypedFields(BBox* box)
 {
+    // Fields of different types stand in the same place; `SetType` shows those of one type and hides the others.
     const auto of = [this](unsigned types, auto* field) {
         typedFields_.push_back({field, types});
         return field;
@@ -135,6 +137,7 @@ void OperationView::makeTypedFields(BBox* box)
                                                     B_ALIGN_LEFT);
     };
 
+    // Of the first two, a deposit has the amount only.
     amount_ = of(kDeposit | kTransfer, number(0, 1, "txtAmount", "Amount", 'OTAm'));
     transferAccount_ = of(kTransfer, addMenu(box, cell(1, 1), "transferAccount", "To Account"));
     transferCost_ = of(kTransfer, number(2, 1, "txtTransferCost", "Cost", 'OTTc'));
@@ -145,6 +148,7 @@ void OperationView::makeTypedFields(BBox* box)
     transferToQuote_->SetToolTip("Rate of the receiving account's currency");
     transferRateCost_->SetToolTip("Cost in proportion to the amount, as a fraction: 0.01 for one percent");
 
+    // Purchase and sale. Whatever is typed into market or ticker sends the same code.
     marketName_ = of(kTrade, word(0, 1, "txtMarketName", "Market"));
     companyAbbreviation_ = of(kTrade, word(1, 1, "txtCompanyAbbreviation", "Ticker"));
     quantity_ = of(kTrade, number(2, 1, "txtQuantity", "Quantity", 'OTQy'));
@@ -235,6 +239,7 @@ void OperationView::fillAccounts(BMenu& menu, Account** accounts, int count)
 
 String OperationView::getType() const
 {
+    // One type is always marked, from the constructor on.
     return kTypes[type_->Menu()->IndexOf(type_->Menu()->FindMarked())].type;
 }
 

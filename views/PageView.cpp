@@ -1,15 +1,9 @@
 #include "views/PageView.h"
 
 #include "foundation/NumberText.h"
-#include "platform/Box.h"
 #include "platform/Button.h"
-#include "platform/CheckBox.h"
 #include "platform/StringView.h"
-#include "platform/TextControl.h"
-#include "views/DateControl.h"
 #include "views/Look.h"
-#include "views/ModelText.h"
-#include "views/NumberControl.h"
 
 #include <cmath>
 #include <cstring>
@@ -19,41 +13,10 @@ PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_
     SetViewColor(look::kPanel);
 }
 
-BBox* PageView::addBox(BView* parent, BRect frame, const char* label)
-{
-    auto* box = new BBox(frame, "");
-    box->SetLabel(label);
-    parent->AddChild(box);
-    return box;
-}
-
-BTextControl* PageView::addField(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
-                                 float divider)
-{
-    return addFieldOf<BTextControl>(parent, frame, name, label, code, divider, B_ALIGN_LEFT);
-}
-
-BTextControl* PageView::addNumber(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
-                                  float divider)
-{
-    return addFieldOf<BTextControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
-}
-
-DateControl* PageView::addDate(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
-                               float divider)
-{
-    return addFieldOf<DateControl>(parent, frame, name, label, code, divider, B_ALIGN_LEFT);
-}
-
-NumberControl* PageView::addTypedNumber(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
-                                        float divider)
-{
-    return addFieldOf<NumberControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
-}
-
 BButton* PageView::addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code)
 {
     auto* button = new BButton(frame, name, label, new BMessage(code));
+    // `app/Shortcuts.cpp` finds the button that adds by the same label.
     if (std::strcmp(label, kAddLabel) == 0)
         button->SetToolTip("Adds what the fields of this box say.  Ctrl+N, while the keyboard is in the box");
     parent->AddChild(button);
@@ -63,6 +26,7 @@ BButton* PageView::addButton(BView* parent, BRect frame, const char* name, const
 void PageView::addButtons(BView* parent, BRect area, const std::vector<ButtonPlan>& buttons)
 {
     const auto count = static_cast<float>(buttons.size());
+    // From the beginning of one button to that of the next: the last gap lies outside of the area.
     const float pitch = (area.Width() + look::kGap) / count;
     float left = area.left;
     for (const ButtonPlan& button : buttons) {
@@ -89,6 +53,7 @@ void PageView::addLoadAndSave(BView* page)
 void PageView::explain(BView& page, std::initializer_list<Tip> tips)
 {
     for (const Tip& tip : tips)
+        // A misspelt name would crash as soon as the page is made, and so in every test.
         page.FindView(tip.control)->SetToolTip(tip.text);
 }
 
@@ -114,16 +79,4 @@ void PageView::SetOpenFile(const String& path, unsigned changes)
     auto* line = static_cast<BStringView*>(FindView("txtOpenFile"));
     line->SetText(text.c_str());
     line->SetToolTip(wholeTextOf(path));
-}
-
-BCheckBox* PageView::addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code)
-{
-    auto* box = new BCheckBox(frame, name, label, new BMessage(code));
-    parent->AddChild(box);
-    return box;
-}
-
-void PageView::showText(BTextControl& field, const String& text)
-{
-    field.SetText(wholeTextOf(text));
 }

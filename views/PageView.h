@@ -1,18 +1,15 @@
 #pragma once
 
-#include "foundation/String.h"
-#include "platform/Message.h"
-#include "platform/View.h"
+#include "platform/Box.h"
+#include "platform/CheckBox.h"
+#include "views/DateControl.h"
+#include "views/ModelText.h"
+#include "views/NumberControl.h"
 
 #include <initializer_list>
 #include <vector>
 
-class BBox;
 class BButton;
-class BCheckBox;
-class BTextControl;
-class DateControl;
-class NumberControl;
 
 /// What the five pages have in common: the panel's grey, and how their controls are made.
 class PageView : public BView {
@@ -23,19 +20,36 @@ public:
     PageView(BRect frame, const char* name);
 
     // All of these put what they make into `parent`, which owns it.
-    static BBox* addBox(BView* parent, BRect frame, const char* label);
+    static BBox* addBox(BView* parent, BRect frame, const char* label)
+    {
+        BBox* box = added(parent, new BBox(frame, ""));
+        box->SetLabel(label);
+        return box;
+    }
     /// `code` is what the field sends, `divider` the room for the label in pixels.
     static BTextControl* addField(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
-                                  float divider);
+                                  float divider)
+    {
+        return addFieldOf<BTextControl>(parent, frame, name, label, code, divider, B_ALIGN_LEFT);
+    }
     /// The same for numbers, which stand at the right.
     static BTextControl* addNumber(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
-                                   float divider);
+                                   float divider)
+    {
+        return addFieldOf<BTextControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
+    }
     /// A field for a date.
     static DateControl* addDate(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
-                                float divider);
+                                float divider)
+    {
+        return addFieldOf<DateControl>(parent, frame, name, label, code, divider, B_ALIGN_LEFT);
+    }
     /// A field for a number that a person types.
     static NumberControl* addTypedNumber(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
-                                         float divider);
+                                         float divider)
+    {
+        return addFieldOf<NumberControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
+    }
     static BButton* addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code);
     struct ButtonPlan {
         const char* name;
@@ -58,10 +72,13 @@ public:
     static std::string fileName(const String& path);
     /// `path` is undefined before there is a file; `changes` is how many are not saved to it.
     void SetOpenFile(const String& path, unsigned changes);
-    static BCheckBox* addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code);
+    static BCheckBox* addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code)
+    {
+        return added(parent, new BCheckBox(frame, name, label, new BMessage(code)));
+    }
 
     /// Shows a text of the model; nothing for a String without text.
-    static void showText(BTextControl& field, const String& text);
+    static void showText(BTextControl& field, const String& text) { field.SetText(wholeTextOf(text)); }
 
 protected:
     /// A field of the class `Field`, in the look of all fields, with its text at the side `text`.
@@ -69,10 +86,17 @@ protected:
     static Field* addFieldOf(BView* parent, BRect frame, const char* name, const char* label, uint32 code,
                              float divider, alignment text)
     {
-        auto* field = new Field(frame, name, label, "", new BMessage(code));
+        auto* field = added(parent, new Field(frame, name, label, "", new BMessage(code)));
         field->SetDivider(divider);
         field->SetAlignment(B_ALIGN_RIGHT, text);
-        parent->AddChild(field);
         return field;
+    }
+
+private:
+    template <class View>
+    static View* added(BView* parent, View* view)
+    {
+        parent->AddChild(view);
+        return view;
     }
 };

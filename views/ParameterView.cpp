@@ -63,6 +63,7 @@ std::string firstToken(const std::string& text, bool isPercent)
         return c == ' ' || c == '\t' || c == '$' || c == '\xC2' || c == '\xA3' || (c >= 'A' && c <= 'Z') ||
                (c >= 'a' && c <= 'z') || (isPercent && c == '%');
     };
+    // What stands before the number is skipped, then the number ends where the next such character comes.
     std::size_t begin = 0;
     while (begin < text.size() && isDelimiter(text[begin]))
         ++begin;
@@ -95,6 +96,7 @@ ParameterView::ParameterView(BRect frame, const char* name, BWindow*) : PageView
 
 void ParameterView::Draw(BRect)
 {
+    // In line with the fields, at their right.
     constexpr float kBaseLine = 15; // of the field's text, from its top
     SetHighColor(look::kFaint);
     for (std::size_t i = 0; i < fields_.size(); ++i)
@@ -142,6 +144,7 @@ void ParameterView::setParameter(Wallet::Parameter parameter, float value)
 float ParameterView::getParameter(Wallet::Parameter parameter) const
 {
     const Kind kind = kPlan[parameter].kind;
+    // A person may leave the unit in the field, take it out or type another: it is skipped.
     const std::string token = firstToken(fields_[parameter]->Text(), kind == Kind::kRate);
     if (kind != Kind::kDays)
         return number(token, kind == Kind::kRate ? 100 : 1);

@@ -1,20 +1,9 @@
 #include "views/QuoteBox.h"
 
-#include "foundation/DateText.h"
-#include "foundation/NumberText.h"
 #include "views/Look.h"
 #include "views/PageView.h"
 
 using namespace look;
-
-Cell QuoteItem::cell(int column) const
-{
-    return {column == 0 ? dateText(object_->getDate()) : exactText(object_->getValue())};
-}
-
-QuoteListView::QuoteListView(const char* name)
-    : DatedListView({}, name, B_MULTIPLE_SELECTION_LIST, {{"Date", 82}, {"Value", 96, B_ALIGN_RIGHT}})
-{}
 
 QuoteBox::QuoteBox(BRect frame, const char* title, const Codes& codes) : BBox(frame, "")
 {
@@ -35,6 +24,7 @@ QuoteBox::QuoteBox(BRect frame, const char* title, const Codes& codes) : BBox(fr
     top += kRow;
     value_ = PageView::addTypedNumber(this, {kLeft, top, right, top + kFieldHeight}, "txtQuoteValue", "Value",
                                       codes.value, kDivider);
+    // Fields and buttons are told apart by a wider gap.
     top += kRow + kGap;
     PageView::addButtons(this, {kLeft, top, right, top + kButtonHeight},
                          {{"btnAddQuote", "Add", codes.add},

@@ -1,23 +1,9 @@
 #pragma once
 
-#include "market/Quote.h"
 #include "platform/Box.h"
 #include "views/DateControl.h"
-#include "views/DatedListView.h"
+#include "views/MarketDataLists.h"
 #include "views/NumberControl.h"
-
-/// A day and the value of that day.
-class QuoteItem final : public ObjectItem<Quote> {
-public:
-    using ObjectItem::ObjectItem;
-    Cell cell(int column) const override;
-};
-
-/// The quotes of a company or the rates of a currency, by date; several can be selected.
-class QuoteListView final : public DatedListView<Quote, QuoteItem> {
-public:
-    explicit QuoteListView(const char* name);
-};
 
 /// A list of quotes with the fields and buttons to add, change and remove them.
 ///

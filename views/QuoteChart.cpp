@@ -9,11 +9,7 @@ namespace {
 
 void add(GraphPolyElement& element, const Date& date, double value)
 {
-    auto* point = new GraphPoint;
-    point->setDateBased(true);
-    point->setDateX(date);
-    point->setY(static_cast<float>(value));
-    element.addGraphPoint(point);
+    element.addGraphPoint(new GraphPoint(date, static_cast<float>(value)));
 }
 
 } // namespace
@@ -22,6 +18,7 @@ QuoteChart::QuoteChart(BRect frame) : GraphView(frame, "grvQuotes")
 {
     SetAccessibleName("Quotes");
     setXDateBased(true);
+    // In this order they lie above one another: the band at the back, the trend in front.
     const struct {
         GraphPolyElement& element;
         rgb_color color;
@@ -44,6 +41,7 @@ bool QuoteChart::changeTo(const Content& content)
 {
     if (content == shown_)
         return false;
+    // From here on the caller owes the points that belong to this content.
     shown_ = content;
     // From here on there are no points at all, in the chart or in its elements.
     band_.clearAll();
@@ -60,16 +58,14 @@ void QuoteChart::fill(const std::vector<Day>& days)
 {
     if (days.empty())
         return;
-    if (days.front().date == days.back().date) { // no line, and no trend
-        auto* point = new GraphPoint;            // the chart's own
-        point->setDateBased(true);
-        point->setDateX(days.back().date);
-        point->setY(days.back().value);
+    if (days.front().date == days.back().date) {                           // no line, and no trend
+        auto* point = new GraphPoint(days.back().date, days.back().value); // the chart's own
         point->setColor(look::kSeries);
         addGraphElement(point);
         return;
     }
     for (const Day& day : days)
+        // The line owns its points; they come in order of their dates, and so need no sorting.
         add(line_, day.date, day.value);
     // The trend is a straight line: its ends are enough.
     for (const Day& day : {days.front(), days.back()})
@@ -80,6 +76,7 @@ void QuoteChart::fill(const std::vector<Day>& days)
 
 void QuoteChart::fillBand(const std::vector<Day>& days)
 {
+    // In `double`, as a sum of thousands of squares in `float` would lose its last terms.
     double squares = 0;
     for (const Day& day : days) {
         const double distance = static_cast<double>(day.value) - day.trend;

@@ -9,10 +9,8 @@
 #include "valuation/Evolution.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
-#include "views/AccountStateListView.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
-#include "views/ShareStateListView.h"
 
 namespace {
 
@@ -67,6 +65,7 @@ void WalletView::makeTop()
 void WalletView::makeTotals()
 {
     totalsBox_ = addBox(this, {kMargin, kTotalsTop, kRight, kTotalsEnd}, "Totals");
+    // They stand side by side, each with the room that its label needs.
     constexpr float kAmount = 124; // room for millions
     constexpr float kPercent = 70;
     float left = kBoxSide;
@@ -143,6 +142,7 @@ void WalletView::SetState(const State* state, const Totals& totals)
     if (state != nullptr) {
         const auto shares = state->shareStates();
         shares_->addAll({shares.begin(), shares.end()});
+        // When the rows are there. They are found again by account and share, since all states are new.
         accounts_->recall();
         shares_->recall();
     }
@@ -193,17 +193,13 @@ void WalletView::UpdateEvolution(const std::vector<EvolutionPoint>& points, cons
     ClearEvolution();
     const std::string symbol = reference != nullptr ? textOf(reference->getRepresentation()) : "???";
     evolution_->setXLegend(("Value in " + symbol).c_str());
+    // What is too long to be drawn, or has no beginning, is said in the chart; there it is looked for.
     if (outcome != EvolutionOutcome::kBuilt)
         noEvolution_->SetText(outcome == EvolutionOutcome::kTooLong
                                   ? "The evolution would be too long: is the date of an operation mistyped?"
                                   : "The first operation has no real date.");
-    for (const EvolutionPoint& point : points) {
-        auto* shown = new GraphPoint; // the line's from below on
-        shown->setDateBased(true);
-        shown->setDateX(point.date);
-        shown->setY(point.totalValue);
-        line_.addGraphPoint(shown);
-    }
+    for (const EvolutionPoint& point : points)
+        line_.addGraphPoint(new GraphPoint(point.date, point.totalValue)); // the line owns it
 }
 
 void WalletView::ClearEvolution()

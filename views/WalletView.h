@@ -7,15 +7,13 @@
 #include "views/DateControl.h"
 #include "views/ListPlaces.h"
 #include "views/PageView.h"
+#include "views/StateLists.h"
 
 #include <utility>
 
-class AccountState;
 class BStringView;
-class AccountStateListView;
 class Currency;
 class GraphView;
-class ShareStateListView;
 class State;
 enum class EvolutionOutcome;
 struct EvolutionPoint;

@@ -23,6 +23,7 @@ BAlert::BAlert(const char* title, const char* text, const char* button0, const c
 
 int32 BAlert::Go()
 {
+    // Tests and the tour answer by themselves; then no dialog comes up.
     const auto& answer = DialogAnswers::current().alert;
     const int32 chosen = answer ? answer(title_.c_str(), text_.c_str()) : ask();
     delete this;
@@ -32,6 +33,8 @@ int32 BAlert::Go()
 int32 BAlert::ask() const
 {
     constexpr int kMargin = 16;
+    // Lives as long as this function, in which the event loop of `exec` runs: windows are painted meanwhile, and
+    // messages wait, as the one that asks is still being handled.
     QDialog dialog(BWindow::front());
     dialog.setObjectName("Alert");
     dialog.setWindowTitle(QString::fromStdString(title_));
@@ -57,6 +60,7 @@ int32 BAlert::ask() const
         auto* button = new QPushButton(labelText(buttons_[i].c_str()));
         button->setObjectName(QString::fromStdString(buttons_[i]));
         button->setAccessibleName(QString::fromStdString(buttons_[i]));
+        // Enter presses the last one from the start; once another one has the keyboard, that.
         button->setDefault(i + 1 == buttons_.size());
         button->setAutoDefault(true);
         QObject::connect(button, &QPushButton::clicked, [&dialog, i] { dialog.done(static_cast<int>(i)); });

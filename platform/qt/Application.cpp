@@ -62,9 +62,12 @@ BApplication::BApplication(const char* signature) : BLooper(signature), signatur
         QApplication::setDesktopFileName(name.toLower());
         QApplication::setWindowIcon(iconOf(name.toLower()));
     }
+    // The same look on every desktop: the measures of the pages hold for this style and font only.
     QApplication::setStyle(QStyleFactory::create("Fusion"));
     QApplication::setPalette(panelColors());
     QApplication::setFont(be_plain_font->toQt());
+    // The program ends when it is asked to, as the window does when it closes, and not because no window is there:
+    // while it starts there is none, either.
     QApplication::setQuitOnLastWindowClosed(false);
     be_app = this;
 }
@@ -78,6 +81,8 @@ BApplication::~BApplication()
 int BApplication::Run()
 {
     const int status = QApplication::exec();
+    // `exec` has been left, so no more messages are handled. The windows are not asked again: whoever ended the program
+    // has done so.
     BWindow::closeAll();
     return status;
 }

@@ -2,7 +2,7 @@
 
 #include <cmath>
 
-BBox::BBox(BRect frame, const char* name, uint32 resizingMode, uint32 flags) : BView(frame, name, resizingMode, flags)
+BBox::BBox(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW)
 {
     SetViewColor(B_TRANSPARENT_COLOR);
     SetFont(be_bold_font);
@@ -31,6 +31,7 @@ void BBox::Draw(BRect)
     const float titleEnd = kTitleLeft + StringWidth(Label()) + kTitleGap;
 
     SetHighColor(kLine);
+    // The upper side is open where the title stands, at half its height.
     FillRect({0, top, titled ? kTitleLeft - kTitleGap : bounds.right, top + 1});
     if (titled)
         FillRect({titleEnd, top, bounds.right, top + 1});

@@ -19,14 +19,9 @@ QRectF toQt(const BRect& rect)
 QColor Canvas::color(rgb_color c) const
 {
     QColor result = toQt(c);
-    if (mode == B_OP_ALPHA)
+    if (state_.mode == B_OP_ALPHA)
         result.setAlpha(c.alpha);
     return result;
-}
-
-QColor Canvas::color(pattern p) const
-{
-    return color(p == B_SOLID_HIGH ? high : low);
 }
 
 void Canvas::fit()
@@ -36,21 +31,25 @@ void Canvas::fit()
                      static_cast<int>(std::ceil(widget_.height() * ratio)));
     if (picture_.size() == size && picture_.devicePixelRatio() == ratio)
         return;
+    // The view has another size, or has come to a screen of another resolution. What was drawn is lost with the old
+    // picture, so the view is asked to draw again.
     picture_ = QPixmap(size.expandedTo({1, 1}));
     picture_.setDevicePixelRatio(ratio);
-    picture_.fill(toQt(view));
+    picture_.fill(toQt(state_.view));
     stale_ = true;
 }
 
 const QPixmap& Canvas::picture(bool* fresh)
 {
     fit();
+    // Who is told that the picture is fresh has it drawn; it counts as up to date from here on.
     *fresh = std::exchange(stale_, false);
     return picture_;
 }
 
 void Canvas::paint(const std::function<void(QPainter&)>& draw)
 {
+    // Inside `drawAll` or `drawWith` all operations share one painter.
     if (painter_ != nullptr) {
         draw(*painter_);
         return;
@@ -58,6 +57,7 @@ void Canvas::paint(const std::function<void(QPainter&)>& draw)
     fit();
     QPainter painter(&picture_);
     draw(painter);
+    // The painter has to let go of the picture before somebody shows it.
     painter.end();
     widget_.update();
 }
@@ -65,19 +65,18 @@ void Canvas::paint(const std::function<void(QPainter&)>& draw)
 void Canvas::drawAll(const std::function<void()>& draw)
 {
     fit();
+    // Before the drawing, so that a view which asks inside `Draw` to be drawn again will be.
     stale_ = false;
-    if (view != B_TRANSPARENT_COLOR)
-        picture_.fill(toQt(view));
-    else
-        picture_.fill(Qt::transparent);
+    picture_.fill(state_.view != B_TRANSPARENT_COLOR ? toQt(state_.view) : QColor(Qt::transparent));
     QPainter painter(&picture_);
     drawWith(painter, draw);
 }
 
 void Canvas::drawWith(QPainter& painter, const std::function<void()>& draw)
 {
+    // The painter that was in use before, if any, is in use again when this returns.
     QPainter* outer = std::exchange(painter_, &painter);
-    painter.setFont(font.toQt());
+    painter.setFont(state_.font.toQt());
     draw();
     painter_ = outer;
 }

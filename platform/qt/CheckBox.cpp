@@ -4,11 +4,11 @@
 
 #include <QCheckBox>
 
-BCheckBox::BCheckBox(BRect frame, const char* name, const char* label, BMessage* message, uint32 resizingMode,
-                     uint32 flags)
-    : BControl(frame, name, label, message, resizingMode, flags, new QCheckBox(labelText(label)))
+BCheckBox::BCheckBox(BRect frame, const char* name, const char* label, BMessage* message)
+    : BControl(frame, name, label, message, new QCheckBox(labelText(label)))
 {
     auto* box = static_cast<QCheckBox*>(widget());
+    // `clicked` comes from a person only, so `SetValue` below sends nothing.
     QObject::connect(box, &QCheckBox::clicked, [this](bool on) {
         BControl::SetValue(on ? B_CONTROL_ON : B_CONTROL_OFF);
         Invoke();

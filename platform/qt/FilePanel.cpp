@@ -3,7 +3,6 @@
 #include "platform/DialogAnswers.h"
 #include "platform/Entry.h"
 #include "platform/Message.h"
-#include "platform/Path.h"
 #include "platform/View.h"
 #include "platform/Window.h"
 #include "platform/qt/WindowWidget.h"
@@ -11,6 +10,8 @@
 #include <QFileDialog>
 #include <QLineEdit>
 #include <QTreeView>
+
+#include <filesystem>
 
 BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const entry_ref* start, uint32,
                        BMessage* message, bool modal)
@@ -29,6 +30,7 @@ QFileDialog& BFilePanel::dialog()
 {
     if (dialog_ != nullptr)
         return *dialog_;
+    // A panel belongs to the window that it answers to, which keeps it in front of that.
     auto* window = target_.IsValid() ? dynamic_cast<BWindow*>(target_.Target()->Looper()) : nullptr;
     dialog_ = std::make_unique<QFileDialog>(window != nullptr ? &window->widget() : nullptr);
     dialog_->setObjectName(mode_ == B_OPEN_PANEL ? "OpenPanel" : "SavePanel");
@@ -63,6 +65,7 @@ void BFilePanel::Show()
             send(path);
         return;
     }
+    // The kit remembers the folder and the dialog does not: from here on it shows what the kit has.
     QFileDialog& shown = dialog();
     shown.setDirectory(directory_.empty() ? QDir::homePath() : QString::fromStdString(directory_));
     if (!saveText_.empty()) {
@@ -77,23 +80,26 @@ void BFilePanel::Show()
 
 void BFilePanel::accept()
 {
+    // The next time it comes up in the folder where this choice was made.
     directory_ = dialog_->directory().absolutePath().toStdString();
     send(dialog_->selectedFiles().value(0).toStdString());
 }
 
 void BFilePanel::send(const std::string& path) const
 {
-    entry_ref ref;
-    if (BEntry(path.c_str()).GetRef(&ref) != B_OK)
+    if (path.empty())
         return;
+    // A reference is a folder and a name in it. The folder that a save panel tells is one itself.
+    const std::filesystem::path chosen(path);
+    const std::filesystem::path folder = chosen.parent_path();
+    const entry_ref file{folder.string(), chosen.filename().string()};
+    const entry_ref place{folder.parent_path().string(), folder.filename().string()};
     BMessage answer = *message_;
     if (mode_ == B_OPEN_PANEL) {
-        answer.AddRef("refs", &ref);
+        answer.AddRef("refs", &file);
     } else {
-        entry_ref folder;
-        BEntry(ref.directory.c_str()).GetRef(&folder);
-        answer.AddRef("directory", &folder);
-        answer.AddString("name", ref.name.c_str());
+        answer.AddRef("directory", &place);
+        answer.AddString("name", file.name.c_str());
     }
     target_.SendMessage(&answer);
 }

@@ -18,6 +18,7 @@ const BFont* const be_bold_font = &boldFont;
 QFont BFont::toQt() const
 {
     QFont font = QFontDatabase::systemFont(QFontDatabase::GeneralFont);
+    // In pixels, not in points: the pages are laid out in pixels, whatever the resolution of the screen.
     font.setPixelSize(static_cast<int>(size_));
     font.setBold(bold_);
     return font;
@@ -33,5 +34,4 @@ void BFont::GetHeight(font_height* height) const
     const QFontMetricsF metrics(toQt());
     height->ascent = static_cast<float>(metrics.ascent());
     height->descent = static_cast<float>(metrics.descent());
-    height->leading = static_cast<float>(metrics.leading());
 }

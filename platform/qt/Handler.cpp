@@ -4,6 +4,7 @@
 
 namespace {
 
+/// Every handler, from its construction to its destruction, by token.
 std::unordered_map<std::uint64_t, BHandler*>& living()
 {
     static std::unordered_map<std::uint64_t, BHandler*> handlers;
@@ -12,6 +13,7 @@ std::unordered_map<std::uint64_t, BHandler*>& living()
 
 std::uint64_t nextToken()
 {
+    // 0 stays nobody's: a messenger without target has it.
     static std::uint64_t last = 0;
     return ++last;
 }
@@ -27,8 +29,6 @@ BHandler::~BHandler()
 {
     living().erase(token_);
 }
-
-void BHandler::MessageReceived(BMessage*) {}
 
 BHandler* BHandler::withToken(std::uint64_t token)
 {

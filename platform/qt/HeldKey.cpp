@@ -5,6 +5,7 @@
 
 HeldKey::HeldKey()
 {
+    // On the application, so that it sees every key before its receiver does.
     QCoreApplication::instance()->installEventFilter(this);
 }
 
@@ -23,5 +24,6 @@ bool HeldKey::eventFilter(QObject*, QEvent* event)
         const auto* key = static_cast<QKeyEvent*>(event);
         isRepeating_ = key->isAutoRepeat() || (released_ != 0 && key->timestamp() == released_);
     }
+    // Only watched: the receiver gets all events.
     return false;
 }

@@ -18,6 +18,7 @@ std::string keyBytes(const QKeyEvent& event)
         if (event.key() == control.key)
             return {control.byte};
     }
+    // Keys like Shift alone have no text, and so give nothing.
     return event.text().toStdString();
 }
 

@@ -1,7 +1,6 @@
 #include "platform/ListView.h"
 
 #include "platform/ListItem.h"
-#include "platform/Window.h"
 #include "platform/qt/Canvas.h"
 #include "platform/qt/ListWidget.h"
 
@@ -12,33 +11,17 @@
 #include <algorithm>
 #include <utility>
 
-namespace {
+// What is selected is known in three places: the list widget knows it by row numbers, which it moves along when rows
+// come and go; each item knows it of itself, so that taking a row out need not ask; and `selection_` holds the numbers,
+// gathered when they are asked for. Between calls of the functions here all three agree, or `selectionStale_` is set.
 
-/// Changes of rows take the selection along; Qt need not tell of that.
-class Silence {
-public:
-    explicit Silence(ListWidget& widget) : widget_(widget) { widget_.setSilent(true); }
-    ~Silence() { widget_.setSilent(false); }
-    Silence(const Silence&) = delete;
-    Silence& operator=(const Silence&) = delete;
-
-private:
-    ListWidget& widget_;
-};
-
-} // namespace
-
-BListView::BListView(BRect frame, const char* name, list_view_type type, uint32 resizingMode, uint32 flags)
-    : BView(frame, name, resizingMode, flags, new ListWidget(*this))
+BListView::BListView(BRect frame, const char* name, list_view_type type)
+    : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW | B_FRAME_EVENTS | B_NAVIGABLE,
+            new ListWidget(*this))
 {
     SetAccessibleName(name);
     listWidget().setSelectionMode(type == B_SINGLE_SELECTION_LIST ? QAbstractItemView::SingleSelection
                                                                   : QAbstractItemView::ExtendedSelection);
-}
-
-BListView::~BListView()
-{
-    listWidget().setSilent(true);
 }
 
 ListWidget& BListView::listWidget() const
@@ -46,20 +29,17 @@ ListWidget& BListView::listWidget() const
     return *static_cast<ListWidget*>(widget());
 }
 
-void BListView::AttachedToWindow()
-{
-    if (!HasTarget())
-        SetTarget(Window());
-}
-
 bool BListView::AddItem(BListItem* item, int32 index)
 {
     if (item == nullptr || index < 0 || index > CountItems())
         return false;
-    const Silence silence(listWidget());
+    // From begin to end the widget must not be asked for rows: it has been told of a change that `items_` does not show
+    // yet.
+    const auto silence = listWidget().silence();
     listWidget().rows().beginInsert(index, index);
     items_.insert(items_.begin() + index, item);
     firstUnnumbered_ = std::min(firstUnnumbered_, index);
+    // The same rows are selected as before, but those below have other numbers.
     selectionStale_ = true;
     listWidget().rows().endInsert();
     return true;
@@ -69,11 +49,12 @@ void BListView::AddItems(const std::vector<BListItem*>& items)
 {
     if (items.empty())
         return;
-    const Silence silence(listWidget());
+    const auto silence = listWidget().silence();
     const int first = CountItems();
     listWidget().rows().beginInsert(first, first + static_cast<int>(items.size()) - 1);
     items_.insert(items_.end(), items.begin(), items.end());
     firstUnnumbered_ = std::min(firstUnnumbered_, first);
+    // Rows at the end move no others, so the selection is not stale.
     listWidget().rows().endInsert();
 }
 
@@ -82,12 +63,14 @@ BListItem* BListView::RemoveItem(int32 index)
     BListItem* item = ItemAt(index);
     if (item == nullptr)
         return nullptr;
-    const Silence silence(listWidget());
+    const auto silence = listWidget().silence();
+    // From here to the end of the removal rows and numbers differ, as in `AddItem`.
     listWidget().rows().beginRemove(index, index);
     items_.erase(items_.begin() + index);
     firstUnnumbered_ = std::min(firstUnnumbered_, index);
     selectionStale_ = true;
     listWidget().rows().endRemove();
+    // Nothing in the item speaks of this list any more: it may be put into it again, or die.
     item->selected_ = false;
     item->index_ = -1;
     // Qt selects a neighbour in the place of the row that the keyboard was at; here nothing comes to be selected.
@@ -100,7 +83,8 @@ BListItem* BListView::RemoveItem(int32 index)
 
 void BListView::MakeEmpty()
 {
-    const Silence silence(listWidget());
+    const auto silence = listWidget().silence();
+    // The reset takes the selection with it, without a message.
     listWidget().rows().beginReset();
     for (BListItem* item : items_) {
         item->selected_ = false;
@@ -129,12 +113,14 @@ int32 BListView::IndexOf(const BListItem* item) const
 {
     if (item == nullptr)
         return -1;
+    // The item of another list may have a number that is good here, too, so what stands there is compared.
     renumber();
     return ItemAt(item->index_) == item ? item->index_ : -1;
 }
 
 void BListView::InvalidateItem(int32 index)
 {
+    // The next paint asks the item for its cells; nothing is kept of what they said.
     listWidget().update(listWidget().rows().index(index));
 }
 
@@ -143,22 +129,23 @@ void BListView::InvalidateItems()
     listWidget().viewport()->update();
 }
 
-// --- Selection.
-
 void BListView::Select(int32 first, int32 last, bool extend)
 {
     if (ItemAt(first) == nullptr || ItemAt(last) == nullptr)
         return;
+    // A row that is selected already changes nothing and sends no message, unless others lose their selection.
     const bool severalAllowed = listWidget().selectionMode() == QAbstractItemView::ExtendedSelection;
     const auto top = listWidget().rows().index(first);
     const auto bottom = listWidget().rows().index(severalAllowed ? last : first);
     listWidget().selectionModel()->select(
         {top, bottom}, extend && severalAllowed ? QItemSelectionModel::Select : QItemSelectionModel::ClearAndSelect);
+    // The keyboard goes on from this row. That alone selects nothing.
     listWidget().selectionModel()->setCurrentIndex(top, QItemSelectionModel::NoUpdate);
 }
 
 void BListView::selectionChangedByWidget(const std::vector<int32>& on, const std::vector<int32>& off)
 {
+    // Rows that were taken out are not among these: they go silently.
     for (const int32 row : off) {
         if (BListItem* item = ItemAt(row))
             item->selected_ = false;
@@ -167,15 +154,17 @@ void BListView::selectionChangedByWidget(const std::vector<int32>& on, const std
         if (BListItem* item = ItemAt(row))
             item->selected_ = true;
     }
+    // Before the message: what it sets off asks for the selection.
     selectionStale_ = true;
-    if (!quiet_ && selectionMessage_ != nullptr)
-        Invoke(selectionMessage_.get());
+    if (!quiet_)
+        Invoke();
 }
 
 int32 BListView::CountSelected() const
 {
     if (std::exchange(selectionStale_, false)) {
         selection_.clear();
+        // The ranges come in the order in which they were selected.
         for (const auto& range : listWidget().selectionModel()->selection()) {
             for (int row = range.top(); row <= range.bottom(); ++row)
                 selection_.push_back(row);
@@ -204,14 +193,6 @@ std::string BListView::SelectedText() const
     return text;
 }
 
-void BListView::invokedByWidget()
-{
-    if (CountSelected() > 0 && Message() != nullptr)
-        Invoke();
-}
-
-// --- Scrolling and drawing.
-
 void BListView::ScrollTo(int32 index)
 {
     if (ItemAt(index) != nullptr)
@@ -225,6 +206,7 @@ int32 BListView::TopRow() const
 
 void BListView::SetTopRow(int32 index)
 {
+    // There may be fewer rows now than when the number was taken.
     index = std::min(index, CountItems() - 1);
     if (ItemAt(index) != nullptr)
         listWidget().scrollTo(listWidget().rows().index(index), QAbstractItemView::PositionAtTop);
@@ -235,8 +217,10 @@ void BListView::drawRow(QPainter& painter, BRect frame, int32 index)
     BListItem* item = ItemAt(index);
     if (item == nullptr)
         return;
+    // A cell that is too wide must not write over its neighbours, nor change the pen of the list.
     painter.save();
     painter.setClipRect(toQt(frame));
+    // The item draws by the functions of the view, which go to the list's own painter meanwhile.
     canvas().drawWith(painter, [&] { item->DrawItem(this, frame, true); });
     painter.restore();
 }

@@ -10,6 +10,7 @@
 
 namespace {
 
+/// The numbers of the rows of a selection, which Qt gives as ranges.
 std::vector<int32> rowsOf(const QItemSelection& selection)
 {
     std::vector<int32> rows;
@@ -30,6 +31,7 @@ int ListModel::rowCount(const QModelIndex& parent) const
 QVariant ListModel::data(const QModelIndex& index, int role) const
 {
     const BListItem* item = list_.ItemAt(index.row());
+    // Nothing else is asked of the texts: the rows draw themselves. This is for typing and for assistive tools.
     if (item == nullptr || (role != Qt::DisplayRole && role != Qt::AccessibleTextRole))
         return {};
     return QString::fromStdString(item->Text());
@@ -38,14 +40,18 @@ QVariant ListModel::data(const QModelIndex& index, int role) const
 QModelIndexList ListModel::match(const QModelIndex& start, int role, const QVariant& value, int hits,
                                  Qt::MatchFlags flags) const
 {
+    // First the usual way, by the beginning of a row, which is its first cell.
     const QModelIndexList beginning = QAbstractListModel::match(start, role, value, hits, flags);
     if (!beginning.empty())
         return beginning;
+    // Another cell begins behind a tab.
     return QAbstractListModel::match(start, role, '\t' + value.toString(), hits, Qt::MatchContains | Qt::MatchWrap);
 }
 
 void ListRows::paint(QPainter* painter, const QStyleOptionViewItem& option, const QModelIndex& index) const
 {
+    // The list paints the ground and the item writes on it, in the high colour that is set here: what can be read on
+    // that ground. Without the keyboard the selection is paler, so that a person sees where the keys go.
     const QRect area = option.rect;
     const bool selected = (option.state & QStyle::State_Selected) != 0;
     const bool active = (option.state & QStyle::State_Active) != 0 && option.widget->hasFocus();
@@ -62,6 +68,7 @@ void ListRows::paint(QPainter* painter, const QStyleOptionViewItem& option, cons
                   {static_cast<float>(area.left()), static_cast<float>(area.top()),
                    static_cast<float>(area.left() + area.width()), static_cast<float>(area.top() + area.height())},
                   index.row());
+    // Where the keyboard stands, in a list of which that row is not selected.
     if ((option.state & QStyle::State_HasFocus) != 0 && !selected) {
         painter->setPen(QPen(option.palette.color(QPalette::Highlight), 1, Qt::DotLine));
         painter->drawRect(area.adjusted(0, 0, -1, -1));
@@ -75,11 +82,14 @@ QSize ListRows::sizeHint(const QStyleOptionViewItem&, const QModelIndex&) const
 
 ListWidget::ListWidget(BListView& list) : list_(list), rows_(list), painter_(list)
 {
+    // The widget then asks one row for its size, and not 100,000.
     setUniformItemSizes(true);
     setModel(&rows_);
     setItemDelegate(&painter_);
     setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    // Always, so that the columns keep their width, which the pages have reckoned with.
     setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOn);
+    // By whole rows, as `TopRow` and `SetTopRow` count them.
     setVerticalScrollMode(QAbstractItemView::ScrollPerItem);
     setEditTriggers(QAbstractItemView::NoEditTriggers);
     silent_ = false;
@@ -87,6 +97,7 @@ ListWidget::ListWidget(BListView& list) : list_(list), rows_(list), painter_(lis
 
 ListWidget::~ListWidget()
 {
+    // What follows changes the selection of a list view that is half destroyed.
     silent_ = true;
     setModel(nullptr); // it dies before the base class that looks at it
     setItemDelegate(nullptr);
@@ -95,29 +106,24 @@ ListWidget::~ListWidget()
 void ListWidget::selectionChanged(const QItemSelection& selected, const QItemSelection& deselected)
 {
     QListView::selectionChanged(selected, deselected);
+    // Silent while rows come and go: the list view then settles the selection itself, and no command is to hear of it.
     if (!silent_)
         list_.selectionChangedByWidget(rowsOf(selected), rowsOf(deselected));
 }
 
 void ListWidget::keyPressEvent(QKeyEvent* event)
 {
-    if (event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter)
-        list_.invokedByWidget();
-    else if (event->matches(QKeySequence::Copy))
+    // The rows that are selected, as a table that a spreadsheet takes.
+    if (event->matches(QKeySequence::Copy))
         QApplication::clipboard()->setText(QString::fromStdString(list_.SelectedText()));
     else
         QListView::keyPressEvent(event);
 }
 
-void ListWidget::mouseDoubleClickEvent(QMouseEvent* event)
-{
-    QListView::mouseDoubleClickEvent(event);
-    list_.invokedByWidget();
-}
-
 void ListWidget::paintEvent(QPaintEvent* event)
 {
     QListView::paintEvent(event);
+    // Which list has the keyboard shows also when no row is selected.
     if (!hasFocus())
         return;
     QPainter painter(viewport());

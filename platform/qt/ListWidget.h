@@ -2,6 +2,7 @@
 
 #include <QAbstractListModel>
 #include <QListView>
+#include <QScopedValueRollback>
 #include <QStyledItemDelegate>
 
 class BListView;
@@ -48,13 +49,12 @@ public:
     ~ListWidget() override;
 
     ListModel& rows() { return rows_; }
-    /// While set, changes of the selection are not passed on.
-    void setSilent(bool silent) { silent_ = silent; }
+    /// As long as the result lives, changes of the selection are not passed on: those of rows take it along.
+    [[nodiscard]] auto silence() { return QScopedValueRollback(silent_, true); }
 
 protected:
     void selectionChanged(const QItemSelection& selected, const QItemSelection& deselected) override;
     void keyPressEvent(QKeyEvent* event) override;
-    void mouseDoubleClickEvent(QMouseEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
 
 private:

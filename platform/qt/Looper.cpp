@@ -7,6 +7,7 @@ status_t BLooper::PostMessage(const BMessage* message, BHandler* handler)
 {
     if (message == nullptr)
         return B_BAD_VALUE;
+    // The message is copied, so the caller's may be changed or destroyed before its turn comes.
     MessageQueue::post(*message, *this, handler != nullptr ? *handler : *this);
     return B_OK;
 }
@@ -24,6 +25,7 @@ bool BLooper::IsNextMessage(uint32 what) const
 
 void BLooper::DispatchMessage(BMessage* message, BHandler* handler)
 {
+    // A looper that closes handles nothing any more: what waits in its queue is dropped here.
     if (!Lock())
         return;
     // The message may end the looper, which is then not there to be unlocked.
@@ -35,6 +37,7 @@ void BLooper::DispatchMessage(BMessage* message, BHandler* handler)
 
 bool BLooper::Lock()
 {
+    // Nobody waits: there is one thread, and all who lock are below one another on its stack.
     if (closing_)
         return false;
     ++locks_;
@@ -43,6 +46,7 @@ bool BLooper::Lock()
 
 void BLooper::Unlock()
 {
+    // Somebody may unlock who was refused the lock; that changes nothing.
     if (locks_ > 0)
         --locks_;
 }

@@ -1,37 +1,35 @@
 #include "platform/Menu.h"
 
-#include "platform/MenuItem.h"
-
 #include <algorithm>
 #include <cstring>
 
 void BMenuItem::SetMarked(bool marked)
 {
+    // Without a menu there are no others that would lose their mark.
     if (menu_ != nullptr)
         menu_->mark(this, marked);
     else
         marked_ = marked;
 }
 
-BMenu::BMenu(const char* name) : name_(name) {}
-
-BMenu::~BMenu() = default;
-
 bool BMenu::AddItem(BMenuItem* item)
 {
     items_.emplace_back(item);
     item->menu_ = this;
+    // After this the item is one of the menu, which destroys it.
     changed();
     return true;
 }
 
 void BMenu::ReplaceItems(const std::vector<BMenuItem*>& items)
 {
+    // The former items are destroyed, so nobody may hold on to the one that was marked.
     items_.clear();
     for (BMenuItem* item : items) {
         items_.emplace_back(item);
         item->menu_ = this;
     }
+    // Once for all: the menu field fills itself anew at each call.
     changed();
 }
 
@@ -42,29 +40,20 @@ BMenuItem* BMenu::ItemAt(int32 index) const
 
 BMenuItem* BMenu::FindItem(const char* label) const
 {
-    const auto found =
-        std::find_if(items_.begin(), items_.end(), [&](const auto& i) { return std::strcmp(i->Label(), label) == 0; });
-    return found != items_.end() ? found->get() : nullptr;
+    return ItemAt(find([label](const BMenuItem& item) { return std::strcmp(item.Label(), label) == 0; }));
 }
 
-BMenuItem* BMenu::FindMarked() const
+int32 BMenu::find(const std::function<bool(const BMenuItem&)>& isIt) const
 {
-    const auto found = std::find_if(items_.begin(), items_.end(), [](const auto& i) { return i->IsMarked(); });
-    return found != items_.end() ? found->get() : nullptr;
-}
-
-int32 BMenu::IndexOf(const BMenuItem* item) const
-{
-    const auto found = std::find_if(items_.begin(), items_.end(), [&](const auto& i) { return i.get() == item; });
+    const auto found = std::ranges::find_if(items_, [&](const auto& item) { return isIt(*item); });
     return found != items_.end() ? static_cast<int32>(found - items_.begin()) : -1;
 }
 
 void BMenu::mark(BMenuItem* item, bool marked)
 {
-    for (const auto& other : items_) {
-        if (marked)
-            other->marked_ = false;
-    }
+    // At most one item is marked, before and after.
+    for (const auto& other : items_)
+        other->marked_ = other->marked_ && !marked;
     item->marked_ = marked;
     changed();
 }

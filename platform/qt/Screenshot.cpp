@@ -20,6 +20,7 @@ status_t save_screenshot(const BWindow& window, BRect part, const char* path)
 
 status_t save_picture(BView& view, const char* path)
 {
+    // Writes beside the file and takes its place at `commit`: a disk that is full leaves a former picture whole.
     QSaveFile file(QString::fromUtf8(path));
     const bool isWritten = file.open(QIODevice::WriteOnly) && view.picture().save(&file, "PNG") && file.commit();
     return isWritten ? B_OK : B_ERROR;

@@ -6,6 +6,8 @@ std::size_t wholeCharacters(std::string_view text, std::size_t length)
         return text.size();
     constexpr std::size_t kLongestCharacter = 4;
     const auto isInside = [&](std::size_t i) { return (static_cast<unsigned char>(text[i]) & 0xC0) == 0x80; };
+    // The bytes of a character behind its first one begin with the bits 10: back to a first one, at most the length of
+    // a character.
     std::size_t end = length;
     while (end > 0 && length - end < kLongestCharacter && isInside(end))
         --end;

@@ -29,6 +29,7 @@ void BStringView::Draw(BRect)
     font_height height;
     font.GetHeight(&height);
     const BRect bounds = Bounds();
+    // Negative for a text that is too long: at the right it then loses its beginning, and in the middle both ends.
     const float room = bounds.Width() - StringWidth(Text());
     const float left = side_ == B_ALIGN_RIGHT ? room : side_ == B_ALIGN_CENTER ? room / 2 : 0;
     DrawString(Text(), {left, std::round((bounds.Height() + height.ascent - height.descent) / 2)});

@@ -14,6 +14,7 @@ BTabView::BTabView(BRect frame, const char* name, button_width, uint32 resizingM
     tabWidget().tabBar()->setAccessibleName(QString::fromUtf8(Name()));
     tabWidget().tabBar()->setExpanding(false);
     tabWidget().tabBar()->setFocusPolicy(Qt::TabFocus);
+    // From the last tab on to the first, and back.
     const auto step = [this](const QKeySequence& keys, int direction) {
         auto* shortcut = new QShortcut(keys, widget()); // the widget owns it
         QObject::connect(shortcut, &QShortcut::activated, [this, direction] {
@@ -27,6 +28,7 @@ BTabView::BTabView(BRect frame, const char* name, button_width, uint32 resizingM
 
 BTabView::~BTabView()
 {
+    // The pages of the tab widget are the parents of the views' widgets and die with it, so the views go before.
     while (CountChildren() > 0)
         delete ChildAt(CountChildren() - 1);
 }
@@ -39,6 +41,7 @@ QTabWidget& BTabView::tabWidget() const
 void BTabView::AddTab(BView* target, BTab* tab)
 {
     tabs_.emplace_back(tab);
+    // `AddChild` puts the view into the new page. The former ones keep what they have.
     host_ = new QWidget;
     tabWidget().setTabToolTip(tabWidget().addTab(host_, labelText(tab->Label())), QString::fromUtf8(tab->ToolTip()));
     AddChild(target);

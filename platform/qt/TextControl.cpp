@@ -35,6 +35,7 @@ protected:
         // Enter is the field's: it sends the message, and must not reach a default button.
         if (event->key() == Qt::Key_Up || event->key() == Qt::Key_Down || event->key() == Qt::Key_PageUp ||
             event->key() == Qt::Key_PageDown) {
+            // In a field of one line these keys do nothing by themselves.
             const std::string bytes = keyBytes(*event);
             view->KeyDown(bytes.c_str(), static_cast<int32>(bytes.size()));
             return;
@@ -53,12 +54,10 @@ Qt::Alignment toQt(alignment side)
 
 } // namespace
 
-BTextControl::BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message,
-                           uint32 resizingMode, uint32 flags)
-    : BControl(frame, name, label, message, resizingMode, (flags & ~static_cast<uint32>(B_NAVIGABLE)) | B_FRAME_EVENTS,
-               new QWidget),
-      field_(new Field(widget())), caption_(new QLabel(labelText(label), widget())),
-      divider_(std::floor(frame.Width() / 2)), text_(std::make_unique<FieldText>(kLongestShown))
+BTextControl::BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message)
+    : BControl(frame, name, label, message, new QWidget, B_WILL_DRAW | B_FRAME_EVENTS), field_(new Field(widget())),
+      caption_(new QLabel(labelText(label), widget())), divider_(*Label() == '\0' ? 0 : std::floor(frame.Width() / 2)),
+      text_(std::make_unique<FieldText>(kLongestShown))
 {
     // The field is what the keyboard reaches, so the field bears the names.
     widget()->setObjectName({});
@@ -68,14 +67,15 @@ BTextControl::BTextControl(BRect frame, const char* name, const char* label, con
     field_->setAccessibleName(QString::fromUtf8(Label()));
     show(text);
     caption_->setBuddy(field_);
-    if (*Label() == '\0')
-        divider_ = 0;
     layOut();
+    // Enter sends the text in any case, changed or not; leaving the field sends it only when it was changed since it
+    // was set or sent last. Qt reports Enter as both, in this order, and the second then finds nothing to send.
     QObject::connect(field_, &QLineEdit::returnPressed, [this] {
         committed_ = shown();
         Invoke();
     });
     QObject::connect(field_, &QLineEdit::editingFinished, [this] { commit(); });
+    // Changes by hand only: a text that is set is nothing that a person typed.
     QObject::connect(field_, &QLineEdit::textEdited, [this] { TextModified(); });
 }
 
@@ -83,7 +83,6 @@ BTextControl::~BTextControl() = default;
 
 void BTextControl::AttachedToWindow()
 {
-    BControl::AttachedToWindow();
     widget()->setFocusProxy(field_);
 }
 
@@ -93,6 +92,7 @@ void BTextControl::layOut()
     const int width = static_cast<int>(Bounds().Width());
     const int height = static_cast<int>(Bounds().Height());
     const int divider = static_cast<int>(divider_);
+    // Label and field share the control's frame; a divider at 0 leaves it all to the field.
     caption_->setGeometry(0, 0, std::max(divider - kGap, 0), height);
     field_->setGeometry(divider, 0, width - divider, height);
 }
@@ -101,6 +101,7 @@ void BTextControl::commit()
 {
     if (committed_ == shown())
         return;
+    // Before the message, which may put another text into the field.
     committed_ = shown();
     Invoke();
 }
@@ -119,12 +120,14 @@ void BTextControl::show(const char* text)
 {
     field_->setText(QString::fromStdString(text_->take(text)));
     committed_ = shown();
+    // What the field shows now and `text_` stand for the same bytes, and nothing waits to be sent.
     text_->noteShown(committed_);
 }
 
 void BTextControl::SetText(const char* text)
 {
     show(text);
+    // A long text shows its beginning.
     field_->setCursorPosition(0);
 }
 
@@ -149,15 +152,10 @@ void BTextControl::SetAlignment(alignment label, alignment text)
     field_->setAlignment(toQt(text));
 }
 
-void BTextControl::SetLabel(const char* label)
-{
-    BControl::SetLabel(label);
-    caption_->setText(labelText(label));
-    field_->setAccessibleName(QString::fromUtf8(label));
-}
-
 void BTextControl::SetEditable(bool editable)
 {
+    // Such a field still takes the keyboard, so that its text can be copied. The colours are those of the label, which
+    // nothing changes.
     field_->setReadOnly(!editable);
     QPalette colors = caption_->palette();
     if (!editable)
@@ -167,6 +165,8 @@ void BTextControl::SetEditable(bool editable)
 
 void BTextControl::MarkAsInvalid(const char* reason)
 {
+    // From the label's colours again, so that a former mark leaves nothing behind. Without a reason there is no tool
+    // tip, either.
     QPalette colors = caption_->palette();
     if (reason != nullptr)
         colors.setColor(QPalette::Base, QColor(255, 214, 209));

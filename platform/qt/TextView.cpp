@@ -42,5 +42,6 @@ const char* BTextView::Text() const
 void BTextView::SetText(const char* text)
 {
     field().setPlainText(QString::fromStdString(text_->take(text)));
+    // The field has line ends of its own: what it made of the text is what counts as untouched.
     text_->noteShown(field().toPlainText().toStdString());
 }

@@ -1,5 +1,6 @@
 #include "platform/View.h"
 
+#include "platform/Invoker.h"
 #include "platform/Window.h"
 #include "platform/qt/Canvas.h"
 #include "platform/qt/ViewWidget.h"
@@ -23,7 +24,7 @@ BView::BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags)
 
 BView::BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags, QWidget* widget)
     : BHandler(name), frame_(frame), resizingMode_(resizingMode), flags_(flags), widget_(widget),
-      canvas_(std::make_unique<Canvas>(*widget))
+      canvas_(std::make_unique<Canvas>(*widget, state_))
 {
     widget_->setObjectName(QString::fromUtf8(Name()));
     if ((flags & B_NAVIGABLE) != 0)
@@ -33,17 +34,20 @@ BView::BView(BRect frame, const char* name, uint32 resizingMode, uint32 flags, Q
 
 BView::~BView()
 {
+    // Whoever destroys a view need not take it out of its parent before. After this nobody reaches the view or its
+    // children any more.
     if (parent_ != nullptr)
         std::erase(parent_->children_, this);
     while (!children_.empty())
         delete children_.back(); // takes itself out
+    // Only now: the children's widgets stood in it and would have gone with it.
     delete widget_;
 }
 
-// --- The tree of views.
-
 void BView::AddChild(BView* child)
 {
+    // In this order: the widget has its parent and its place before it shows, and the view hears of its window when all
+    // of that is done.
     children_.push_back(child);
     child->parent_ = this;
     child->widget_->setParent(childHost());
@@ -86,16 +90,20 @@ BView* BView::viewAround(const QWidget& inner)
 
 void BView::setWindow(BWindow* window)
 {
+    // A view without window may be put together for long before it gets one, and hears of it once.
     if (window == window_)
         return;
     window_ = window;
+    // What sends messages sends them to its window, unless it was told of another target.
+    auto* invoker = dynamic_cast<BInvoker*>(this);
+    if (invoker != nullptr && !invoker->HasTarget())
+        invoker->SetTarget(window);
     if (window != nullptr)
         AttachedToWindow();
+    // After their parent, which may have added some of them just now. Those know already.
     for (BView* child : children_)
         child->setWindow(window);
 }
-
-// --- Place and size.
 
 void BView::placeWidget()
 {
@@ -116,6 +124,7 @@ void BView::MoveTo(float x, float y)
 
 void BView::ResizeTo(float width, float height)
 {
+    // Children follow by what the size has changed, so rounding does not add up.
     const float dx = width - frame_.Width();
     const float dy = height - frame_.Height();
     if (dx == 0 && dy == 0)
@@ -131,6 +140,7 @@ void BView::ResizeTo(float width, float height)
 
 void BView::followParent(float dx, float dy)
 {
+    // A view that follows both sides grows, one that follows only the far side moves, any other stays.
     const auto follows = [this](uint32 sides) { return (resizingMode_ & sides) == sides; };
     const float right = follows(B_FOLLOW_RIGHT) ? dx : 0;
     const float bottom = follows(B_FOLLOW_BOTTOM) ? dy : 0;
@@ -149,10 +159,9 @@ void BView::Hide()
 void BView::Show()
 {
     hidden_ = false;
+    // A widget without parent would show as a window of its own. `AddChild` shows it, unless it was hidden.
     widget_->setVisible(parent_ != nullptr || window_ != nullptr);
 }
-
-// --- Keyboard focus and what assistive tools say.
 
 bool BView::IsFocus() const
 {

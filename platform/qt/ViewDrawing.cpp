@@ -15,6 +15,7 @@ namespace {
 void strokeLine(QPainter& painter, BPoint from, BPoint to, float pen, const QColor& color)
 {
     if (from.x == to.x || from.y == to.y) {
+        // Across the line the pen is centred; along it the line ends where it is told to.
         const float left = std::floor(std::min(from.x, to.x) - (from.x == to.x ? (pen - 1) / 2 : 0));
         const float top = std::floor(std::min(from.y, to.y) - (from.y == to.y ? (pen - 1) / 2 : 0));
         const float width = from.x == to.x ? pen : std::abs(to.x - from.x);
@@ -48,6 +49,7 @@ void strokePath(QPainter& painter, const std::vector<BPoint>& points, float pen,
 void BView::drawAll()
 {
     canvas_->drawAll([this] {
+        // A view that does not draw still gets its ground.
         if ((flags_ & B_WILL_DRAW) != 0)
             Draw(Bounds());
     });
@@ -55,6 +57,7 @@ void BView::drawAll()
 
 const QPixmap& BView::picture()
 {
+    // Drawn when it is looked at, however often it was invalidated before.
     bool fresh = false;
     canvas_->picture(&fresh);
     if (fresh)
@@ -64,6 +67,7 @@ const QPixmap& BView::picture()
 
 void BView::paintOn(QPainter& screen)
 {
+    // First the picture, which is as `Draw` has left it, and above it what comes and goes.
     screen.drawPixmap(0, 0, picture());
     canvas_->drawWith(screen, [this] { DrawOver(Bounds()); });
 }
@@ -81,63 +85,30 @@ void BView::RefreshOver()
 
 void BView::Sync()
 {
+    // What was drawn is in the picture in any case; a view that does not show has no screen to bring it to.
     if (widget_->isVisible())
         widget_->repaint();
 }
 
 void BView::SetViewColor(rgb_color color)
 {
-    canvas_->view = color;
+    state_.view = color;
     Invalidate();
-}
-
-void BView::SetHighColor(rgb_color color)
-{
-    canvas_->high = color;
-}
-
-rgb_color BView::HighColor() const
-{
-    return canvas_->high;
-}
-
-void BView::SetLowColor(rgb_color color)
-{
-    canvas_->low = color;
-}
-
-void BView::SetPenSize(float size)
-{
-    canvas_->penSize = size;
-}
-
-void BView::SetDrawingMode(drawing_mode mode)
-{
-    canvas_->mode = mode;
 }
 
 void BView::SetFont(const BFont* font, uint32 mask)
 {
+    // There is one family of fonts, so of family and style only the weight is left.
     if ((mask & B_FONT_FAMILY_AND_STYLE) != 0)
-        canvas_->font.SetBold(font->IsBold());
+        state_.font.SetBold(font->IsBold());
     if ((mask & B_FONT_SIZE) != 0)
-        canvas_->font.SetSize(font->Size());
+        state_.font.SetSize(font->Size());
 }
 
 void BView::SetFontSize(float size)
 {
     const BFont font(size, false);
     SetFont(&font, B_FONT_SIZE);
-}
-
-void BView::GetFont(BFont* font) const
-{
-    *font = canvas_->font;
-}
-
-float BView::StringWidth(const char* text) const
-{
-    return canvas_->font.StringWidth(text);
 }
 
 void BView::FillRect(BRect rect, pattern p)
@@ -147,7 +118,8 @@ void BView::FillRect(BRect rect, pattern p)
 
 void BView::StrokeRect(BRect rect, pattern p)
 {
-    const float pen = canvas_->penSize;
+    const float pen = state_.penSize;
+    // Within the rectangle, and no pixel twice: a translucent colour would show where sides meet.
     FillRect({rect.left, rect.top, rect.right, rect.top + pen}, p);
     FillRect({rect.left, rect.bottom - pen, rect.right, rect.bottom}, p);
     FillRect({rect.left, rect.top + pen, rect.left + pen, rect.bottom - pen}, p);
@@ -156,7 +128,7 @@ void BView::StrokeRect(BRect rect, pattern p)
 
 void BView::StrokeLine(BPoint from, BPoint to, pattern p)
 {
-    canvas_->paint([&](QPainter& painter) { strokeLine(painter, from, to, canvas_->penSize, canvas_->color(p)); });
+    canvas_->paint([&](QPainter& painter) { strokeLine(painter, from, to, state_.penSize, canvas_->color(p)); });
 }
 
 void BView::BeginLineArray(int32 count)
@@ -171,6 +143,8 @@ void BView::AddLine(BPoint from, BPoint to, rgb_color color)
         return;
     constexpr std::size_t kLongest = 16; // of a stroke: the time for one grows faster than its length
     auto& points = canvas_->lines->points;
+    // A line that does not go on where the last one ended begins a stroke of its own, as does one of another colour.
+    // After this the stroke has at least this line.
     if (points.empty() || points.size() > kLongest || !(points.back() == from) || !(canvas_->lines->color == color))
         flushLines();
     if (points.empty())
@@ -191,10 +165,11 @@ void BView::flushLines()
     auto& points = canvas_->lines->points;
     canvas_->paint([&](QPainter& painter) {
         const QColor color = canvas_->color(canvas_->lines->color);
+        // A single line may be upright or level, and is then sharp.
         if (points.size() == 2)
-            strokeLine(painter, points[0], points[1], canvas_->penSize, color);
+            strokeLine(painter, points[0], points[1], state_.penSize, color);
         else if (!points.empty())
-            strokePath(painter, points, canvas_->penSize, color);
+            strokePath(painter, points, state_.penSize, color);
     });
     points.clear();
 }
@@ -207,12 +182,6 @@ void BView::FillPolygon(const BPoint* points, int32 count, pattern p)
         painter.setBrush(canvas_->color(p));
         painter.drawPolygon(polygon(points, count));
     });
-}
-
-void BView::FillTriangle(BPoint a, BPoint b, BPoint c, pattern p)
-{
-    const BPoint corners[] = {a, b, c};
-    FillPolygon(corners, 3, p);
 }
 
 void BView::FillArc(BPoint center, float xRadius, float yRadius, float startAngle, float arcAngle, pattern p)
@@ -231,7 +200,7 @@ void BView::FillArc(BPoint center, float xRadius, float yRadius, float startAngl
 void BView::DrawString(const char* text, BPoint where)
 {
     canvas_->paint([&](QPainter& painter) {
-        painter.setFont(canvas_->font.toQt());
+        painter.setFont(state_.font.toQt());
         painter.setPen(canvas_->color(B_SOLID_HIGH));
         painter.drawText(QPointF(where.x, where.y), QString::fromUtf8(text));
     });

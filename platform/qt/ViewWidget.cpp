@@ -19,6 +19,7 @@ BPoint at(const QMouseEvent& event)
 
 ViewWidget::ViewWidget(BView& view) : view_(view)
 {
+    // The view hears of the pointer also while no button is held.
     setMouseTracking(true);
 }
 
@@ -35,6 +36,7 @@ void ViewWidget::mouseMoveEvent(QMouseEvent* event)
 
 void ViewWidget::leaveEvent(QEvent*)
 {
+    // Nowhere in the view.
     view_.MouseMoved({-1, -1}, false);
 }
 
@@ -46,6 +48,7 @@ void ViewWidget::contextMenuEvent(QContextMenuEvent* event)
 void ViewWidget::keyPressEvent(QKeyEvent* event)
 {
     const std::string bytes = keyBytes(*event);
+    // Keys without text, such as Tab, are for Qt, or for a widget further out.
     if (bytes.empty())
         QWidget::keyPressEvent(event);
     else
@@ -54,6 +57,7 @@ void ViewWidget::keyPressEvent(QKeyEvent* event)
 
 void ViewWidget::focusInEvent(QFocusEvent* event)
 {
+    // What marks the keyboard is drawn over the picture, which stays.
     view_.RefreshOver();
     QWidget::focusInEvent(event);
 }

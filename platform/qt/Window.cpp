@@ -15,6 +15,7 @@
 
 namespace {
 
+/// The windows that are there, in the order of their opening.
 std::vector<BWindow*>& windows()
 {
     static std::vector<BWindow*> all;
@@ -37,6 +38,7 @@ BWindow::BWindow(BRect frame, const char* title, window_type, uint32 flags, uint
     const QSize size(static_cast<int>(frame.Width()), static_cast<int>(frame.Height()));
     const QPoint place(static_cast<int>(frame.left), static_cast<int>(frame.top));
     widget_->fitTo(place, size, (flags & B_NOT_RESIZABLE) == 0);
+    // Before there are views, so that each hears of the window when it is added.
     root_->setWindow(this);
     widget_->setWidget(root_->widget());
     windows().push_back(this);
@@ -46,6 +48,7 @@ BWindow::~BWindow()
 {
     beginClosing();
     widget_->hide();
+    // No dialog comes up before this window any more. Then the views go while the widget is there to be told.
     std::erase(windows(), this);
     widget_->takeWidget(); // the view owns it
     root_.reset();
@@ -69,6 +72,7 @@ BView* BWindow::CurrentFocus() const
 
 void BWindow::AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHandler* target)
 {
+    // Kept by the shortcut, which lives as long as the window; `target` may go before.
     const std::shared_ptr<const BMessage> sent(message);
     const BMessenger messenger(target != nullptr ? target : this);
     widget_->addShortcut(static_cast<int>(key), modifiers, [messenger, sent] { messenger.SendMessage(sent.get()); });
@@ -107,10 +111,12 @@ void BWindow::MessageReceived(BMessage* message)
 
 bool BWindow::askToClose()
 {
+    // Asked twice, as by two clicks: it closes already.
     if (isClosing())
         return true;
     if (!QuitRequested())
         return false;
+    // No command begins from here on. Those whose messages wait find no lock.
     beginClosing();
     // The desktop's side is still at work on this very window.
     QMetaObject::invokeMethod(
@@ -125,6 +131,7 @@ bool BWindow::askToClose()
 
 QWidget* BWindow::front()
 {
+    // Over a dialog that is open, where there is one.
     if (QWidget* active = QApplication::activeWindow())
         return active;
     return windows().empty() ? nullptr : &windows().back()->widget();
@@ -132,6 +139,7 @@ QWidget* BWindow::front()
 
 void BWindow::closeAll()
 {
+    // `Quit` destroys the window, which then takes itself out.
     while (!windows().empty())
         windows().back()->Quit();
 }

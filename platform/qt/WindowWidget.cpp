@@ -29,9 +29,11 @@ void WindowWidget::addShortcut(int key, uint32 modifiers, const std::function<vo
     auto* shortcut = new QShortcut(QKeySequence(combination), this); // this owns it
     HeldKey::watch();
     QObject::connect(shortcut, &QShortcut::activated, [this, action] {
+        // A key that is held would open dialog after dialog.
         if (HeldKey::isRepeating())
             return;
         if (QWidget* field = focusWidget()) {
+            // Leaving the field commits it; the keyboard is back in it before the action asks where it is.
             field->clearFocus();
             field->setFocus(Qt::OtherFocusReason);
         }
@@ -48,12 +50,14 @@ void WindowWidget::fitTo(QPoint place, QSize content, bool resizable)
     const int title = style()->pixelMetric(QStyle::PM_TitleBarHeight);
     const QRect room = screen()->availableGeometry().adjusted(border, title, -border, -border);
     const int bar = style()->pixelMetric(QStyle::PM_ScrollBarExtent);
+    // A scroll bar takes room itself: where the content is too high it needs more width, and the other way round.
     QSize size = content;
     if (room.height() < size.height())
         size.rwidth() += bar;
     if (room.width() < size.width() && room.height() >= content.height() + bar)
         size.rheight() += bar;
     size = size.boundedTo(room.size());
+    // From here on the window fits the screen. It is moved as far as needed for all of it to show.
     if (resizable)
         resize(size);
     else
@@ -64,6 +68,7 @@ void WindowWidget::fitTo(QPoint place, QSize content, bool resizable)
 
 void WindowWidget::closeEvent(QCloseEvent* event)
 {
+    // The window closes itself with its own message later; here the desktop only hears whether it may.
     if (window_.askToClose())
         event->accept();
     else
