@@ -46,8 +46,6 @@ public:
 class WalletToStates final : public OneToManyAssociation<WalletToStates, Wallet, State> {
 public:
     using OneToManyAssociation::OneToManyAssociation;
-    /// Destroys every state.
-    void deleteAll();
     static auto& link(auto& state) { return state.wallet_; }
 };
 
