@@ -172,6 +172,12 @@ public:
             delete elements_[sorted ? count_ - 1 : 0];
         }
     }
+    /// Empties the list without a word to its elements: for those that all cease to be at once.
+    void forgetAll()
+    {
+        count_ = 0;
+        shrink();
+    }
     /// Unlinks every element and leaves it alone otherwise; stops at one that will not be unlinked.
     void unlinkAll()
     {

@@ -58,6 +58,21 @@ public:
 #endif
     }
 
+    /// Takes back the places of all objects at once, without destroying them, if there are `count`: for one who knows
+    /// so many, and so all of them, and then forgets them. @return false, when there are others, and nothing is done.
+    static bool takeBackAll([[maybe_unused]] std::size_t count) noexcept
+    {
+#ifdef PELORIN_PLAIN_ALLOCATION
+        return false;
+#else
+        if (live_ != count)
+            return false;
+        live_ = 0;
+        releaseBlocks(kKeptBlocks);
+        return true;
+#endif
+    }
+
     /// Gives back what is kept for objects to come, unless there are any now.
     static void releaseKept() noexcept
     {

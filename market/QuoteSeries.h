@@ -84,7 +84,9 @@ public:
             while (next_ < quotes_.size() && quotes_[next_]->getPackedDate() < day)
                 ++next_;
             day_ = day;
-            return series_->realQuote(day, next_);
+            if (next_ == 0 || next_ == quotes_.size()) // on a line, perhaps
+                return series_->realQuote(day, next_);
+            return quotes_[quotes_[next_]->getPackedDate() == day ? next_ : next_ - 1]->getValue();
         }
 
     private:

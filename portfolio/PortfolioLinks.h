@@ -44,8 +44,6 @@ struct SharesToWallet final : ManyToOneAssociation<SharesToWallet, Share, Wallet
 class WalletToStates final : public OneToManyAssociation<WalletToStates, Wallet, State> {
 public:
     using OneToManyAssociation::OneToManyAssociation;
-    /// Destroys every state.
-    void deleteAll();
     static auto& link(auto& state) { return state.wallet_; }
 };
 

@@ -11,7 +11,7 @@ Wallet::Wallet() : shares_(this), accounts_(this), states_(this) {}
 Wallet::~Wallet()
 {
     // States refer to accounts and holdings, operations to holdings. What refers goes before what it refers to.
-    states_.deleteAll();
+    removeAllStates();
     accounts_.deleteAll();
     shares_.deleteAll();
 }

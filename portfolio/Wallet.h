@@ -56,7 +56,7 @@ public:
     State** getAllStates(unsigned* n) const { return states_.getAll(n); }
     std::span<State* const> states() const { return states_.all(); }
     /// Destroys all states.
-    void removeAllStates() { states_.deleteAll(); }
+    void removeAllStates();
 
     /// Keep copies of the pointers; what they point to is never freed here.
     void setCurrencies(int count, Currency** currencies) { currencies_.assign(currencies, currencies + count); }

@@ -104,56 +104,64 @@ void DailyStates::takeShare(Share& share)
             operation->isBuy() ? -purchaseCost(*operation, wallet_) : saleProceeds(*operation, wallet_);
         takeMove(*operation, cash_[found->second], amount);
     }
+    line.operations.emplace_back(kNever, nullptr);
+    line.nextDay = line.operations.front().first;
     // The walk begins before the first quote and is only asked for later and later days.
     if (share.company() != nullptr)
         line.walk.emplace(*share.company());
     share.reserveShareStates(share.getNbrShareStates() + static_cast<unsigned>(days_.size()));
 }
 
-/// The company's real quote of that day and those behind it.
-void DailyStates::takeQuotesFrom(std::size_t day)
-{
-    const std::size_t count = std::min(kDaysAhead, days_.size() - day);
-    // Before: each walk has been asked for the days before `day`, in order. After: for those taken ahead, too.
-    for (Line& line : lines_)
-        if (line.walk)
-            for (std::size_t i = 0; i < count; ++i)
-                line.quotes[i] = line.walk->realQuote(days_[day + i]);
-}
-
 void DailyStates::build()
 {
-    for (std::size_t day = 0; day < days_.size(); ++day)
-        buildDay(day);
+    for (std::size_t day = 0; day < days_.size(); day += kDaysAtOnce)
+        buildDays(day, std::min(day + kDaysAtOnce, days_.size()));
 }
 
-void DailyStates::buildDay(std::size_t day)
+/// Builds the states of the days from `begin` up to `end`; all earlier ones have been built.
+void DailyStates::buildDays(std::size_t begin, std::size_t end)
 {
-    // `line.quotes` then covers this day and up to `kDaysAhead` - 1 behind it.
-    if (day % kDaysAhead == 0)
-        takeQuotesFrom(day);
-    // All earlier days have been built: the ledgers hold what has happened up to the day before. After this loop they
-    // hold this day's moves, too, and a balance is summed again only where one has changed.
+    State* states[kDaysAtOnce];
+    for (std::size_t day = begin; day < end; ++day)
+        states[day - begin] = newState(day);
+    // Behind the accounts the holdings, as the replay makes them, and each state has its own in the wallet's order.
+    for (Line& line : lines_)
+        for (std::size_t day = begin; day < end; ++day) {
+            if (line.nextDay <= day)
+                replay(line, day);
+            const float quote = line.walk ? line.walk->realQuote(days_[day]) : 0;
+            new ShareState(*line.share, states[day - begin]->shareStates_, line.holding, quote);
+        }
+}
+
+/// The state of that day, owned by the wallet, with its accounts and without its holdings.
+State* DailyStates::newState(std::size_t day)
+{
+    // The ledgers hold what has happened up to the day before. After this loop they hold this day's moves, too, and a
+    // balance is summed again only where one has changed.
     for (const Event& event : events_[day])
         event.ledger->happen(event.rank);
 
-    auto* state = new State(&wallet_, days_[day].date()); // owned by the wallet, and the others by it
+    auto* state = new State(&wallet_, days_[day].date());
     state->setFirstOperationDate(firstOperationDate_);
     state->setTotalDeposit(deposits_.balance());
-    // In the wallet's order, as the replay makes them: accounts, then holdings.
     state->accountStates_.reserve(static_cast<unsigned>(accounts_.size()));
     for (std::size_t i = 0; i < accounts_.size(); ++i)
         new AccountState(accounts_[i], state, cash_[i].balance());
     state->shareStates_.reserve(static_cast<unsigned>(lines_.size()));
-    for (Line& line : lines_) {
-        // Before: the holding has taken in the operations up to `replayed`. After: all those that count by this day.
-        for (; line.replayed < line.operations.size() && line.operations[line.replayed].first <= day; ++line.replayed) {
-            const ShareOperation& operation = *line.operations[line.replayed].second;
-            if (operation.isBuy())
-                line.holding.buy(operation, wallet_.getInvestementPeriod());
-            else
-                line.holding.sell(operation);
-        }
-        new ShareState(*line.share, *state, line.holding, line.quotes[day % kDaysAhead]);
+    return state;
+}
+
+/// Before: the holding has taken in the operations up to `replayed`. After: all those that count by this day.
+void DailyStates::replay(Line& line, std::size_t day)
+{
+    Holding holding = *line.holding;
+    for (; line.nextDay <= day; line.nextDay = line.operations[line.replayed].first) {
+        const ShareOperation& operation = *line.operations[line.replayed++].second;
+        if (operation.isBuy())
+            holding.buy(operation, wallet_.getInvestementPeriod());
+        else
+            holding.sell(operation);
     }
+    line.holding = SharedHolding(holding);
 }

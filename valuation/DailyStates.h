@@ -2,10 +2,9 @@
 
 #include "foundation/Date.h"
 #include "market/Company.h"
-#include "valuation/Holding.h"
 #include "valuation/Ledger.h"
+#include "valuation/SharedHolding.h"
 
-#include <array>
 #include <optional>
 #include <unordered_map>
 #include <utility>
@@ -15,6 +14,7 @@ class Account;
 class Operation;
 class Share;
 class ShareOperation;
+class State;
 class Wallet;
 
 /// Builds a wallet's state of every day of an evolution in one sweep, each bit for bit what `State(wallet, day, false)`
@@ -34,9 +34,10 @@ public:
     void build();
 
 private:
-    /// Quotes are taken for that many days at a time, one holding after the other: neighbours in a series are
-    /// neighbours in memory.
-    static constexpr std::size_t kDaysAhead = 512;
+    /// The states of that many days are filled together, one holding after the other: its operations, its quotes and
+    /// its list stay at hand for all of them.
+    static constexpr std::size_t kDaysAtOnce = 60;
+    static constexpr std::size_t kNever = ~std::size_t{0};
 
     /// A move that happens on a day.
     struct Event {
@@ -46,20 +47,21 @@ private:
     /// A holding on its way through the days.
     struct Line {
         Share* share;
+        std::size_t nextDay = 0; // the day of the next operation
+        SharedHolding holding;
         std::vector<std::pair<std::size_t, const ShareOperation*>> operations; // with the day each counts from
         std::size_t replayed = 0;
-        Holding holding;
-        std::optional<Company::Walk> walk;      // none without a company
-        std::array<float, kDaysAhead> quotes{}; // of the days taken ahead
+        std::optional<Company::Walk> walk; // none without a company
     };
 
     void takeOwnMoves(std::size_t account);
     void takeReceivedTransfers(std::size_t account, bool automatic);
     void takeShare(Share& share);
-    void takeQuotesFrom(std::size_t day);
     void takeMove(const Operation& operation, Ledger& ledger, double amount);
     std::size_t dayOf(const Date& date) const;
-    void buildDay(std::size_t day);
+    void buildDays(std::size_t begin, std::size_t end);
+    State* newState(std::size_t day);
+    void replay(Line& line, std::size_t day);
 
     Wallet& wallet_;
     std::vector<PackedDate> days_;

@@ -10,7 +10,7 @@
 namespace {
 
 // A mistyped year, 99 for 1999, would ask for the states of two thousand years. Two centuries of days, and half a
-// century of a thousand holdings (about 2 gigabytes), are more than a person's portfolio has.
+// century of a thousand holdings (about 1.1 gigabytes), are more than a person's portfolio has.
 constexpr std::int64_t kMostDays = 100000;
 constexpr std::int64_t kMostHoldingDays = 20000000;
 

@@ -10,14 +10,6 @@
 #include "valuation/CashMoves.h"
 #include "valuation/State.h"
 
-ShareState::ShareState(Share& share, State& state, const Holding& holding, float quote)
-    : quote_(quote), holding_(holding)
-{
-    // The state has just been made and is in no list: both links are entered without asking.
-    ShareStatesToShare::list(share).addNew(this);
-    ShareStatesToState::list(state).addNew(this);
-}
-
 ShareState::ShareState(Share* share, State* state, const Date& date, bool automatic)
 {
     // The links first, so that the state is listed and owned even where there is nothing to replay.
@@ -30,8 +22,8 @@ ShareState::ShareState(Share* share, State* state, const Date& date, bool automa
     const bool isComplete = replay(date, &sellingAccount);
     share->getQuote(date, &quote_);
     // A holding with operations behind the state's day has a known future: nothing is simulated there.
-    if (automatic && isComplete && holding_.quantity >= 1)
-        AutomaticSale(*share, *state->wallet(), holding_).make(date, sellingAccount);
+    if (automatic && isComplete && holding_->quantity >= 1)
+        AutomaticSale(*share, *state->wallet(), *holding_).make(date, sellingAccount);
 }
 
 ShareState::~ShareState()
@@ -46,21 +38,25 @@ bool ShareState::replay(const Date& date, Account** sellingAccount)
 {
     State& whole = *state();
     const Wallet& wallet = *whole.wallet();
+    Holding holding;
+    bool isComplete = true;
     for (const ShareOperation* operation : share()->shareOperations()) {
         whole.noteOperationDate(operation->getDate());
-        if (operation->getDate() > date)
-            return false;
+        isComplete = operation->getDate() <= date;
+        if (!isComplete)
+            break;
         // The account of the last trade, a purchase or a sale, is the one that a simulated sale sells from.
         *sellingAccount = operation->account();
         if (operation->isBuy()) {
             whole.BuyShares(*sellingAccount, purchaseCost(*operation, wallet));
-            holding_.buy(*operation, wallet.getInvestementPeriod());
+            holding.buy(*operation, wallet.getInvestementPeriod());
         } else {
             whole.SellShares(*sellingAccount, saleProceeds(*operation, wallet));
-            holding_.sell(*operation);
+            holding.sell(*operation);
         }
     }
-    return true;
+    holding_ = SharedHolding(holding);
+    return isComplete;
 }
 
 QuoteBasis ShareState::quoteBasis() const

@@ -4,7 +4,7 @@
 #include "foundation/Pooled.h"
 #include "foundation/String.h"
 #include "portfolio/Share.h"
-#include "valuation/Holding.h"
+#include "valuation/SharedHolding.h"
 #include "valuation/StateLinks.h"
 
 class Account;
@@ -18,7 +18,7 @@ struct QuoteBasis {
 };
 
 /// One holding at the day of a state.
-class ShareState final : public Pooled<ShareState, (std::size_t{192} << 20)> {
+class ShareState final : public Pooled<ShareState, (std::size_t{128} << 20)> {
 public:
     /// Replays the holding's operations up to and including `date`, moving cash in the account states of `state`.
     /// `automatic` also searches the automatic sale of what is held, when no operation is dated after `date`.
@@ -28,22 +28,22 @@ public:
     ShareState& operator=(const ShareState&) = delete;
 
     /// Number of shares held; negative when more were sold than held.
-    int getQuantity() const { return holding_.quantity; }
+    int getQuantity() const { return holding_->quantity; }
     /// False for what was sold whole; such a holding stays in the portfolio.
-    bool isHeld() const { return holding_.quantity != 0; }
+    bool isHeld() const { return holding_->quantity != 0; }
     /// Average purchase price, in the currency of the company's market.
-    float getBuyQuote() const { return holding_.buyQuote; }
+    float getBuyQuote() const { return holding_->buyQuote; }
     /// The company's price at the state's day, 0 without a company.
     float getQuote() const { return quote_; }
     /// By the company's quotes as they are now.
     QuoteBasis quoteBasis() const;
     /// Quantity times quote.
-    double worth() const { return static_cast<double>(quote_) * holding_.quantity; }
+    double worth() const { return static_cast<double>(quote_) * holding_->quantity; }
     /// Change from the average purchase price to the quote, a fraction; -1 without any quote, not finite when the
     /// purchase price is 0.
-    double gain() const { return static_cast<double>(quote_) / holding_.buyQuote - 1; }
+    double gain() const { return static_cast<double>(quote_) / holding_->buyQuote - 1; }
     /// End of the investment horizon, undefined before the first purchase.
-    Date getEndDate() const { return holding_.endDate.date(); }
+    Date getEndDate() const { return holding_->endDate.date(); }
     /// The state's day, undefined without a state.
     Date getDate() const;
     const String& getCompanyAbbreviation() const;
@@ -64,8 +64,13 @@ private:
     friend class StateToShareStates;
     friend class DailyStates;
 
-    /// With everything known already.
-    ShareState(Share& share, State& state, const Holding& holding, float quote);
+    /// With everything known already. The state has just been made and is in no list: both are entered without asking.
+    ShareState(Share& share, StateToShareStates& states, const SharedHolding& holding, float quote)
+        : quote_(quote), holding_(holding)
+    {
+        ShareStatesToShare::list(share).addNew(this);
+        states.addNew(this);
+    }
 
     bool replay(const Date& date, Account** sellingAccount);
 
@@ -73,6 +78,6 @@ private:
     // of its last word.
     [[no_unique_address]] ShareStatesToShare share_;
     float quote_ = 0;
-    ShareStatesToState state_;
-    Holding holding_;
+    [[no_unique_address]] ShareStatesToState state_;
+    SharedHolding holding_;
 };

@@ -5,6 +5,33 @@
 #include "valuation/AccountState.h"
 #include "valuation/ShareState.h"
 
+namespace {
+
+/// Lets go of the parts of all `states` at once, those of the `items`: holdings, or accounts. For each part to leave
+/// its two lists by itself would take as long as making it.
+/// @return false when there are parts elsewhere, too; nothing is done then.
+template <class Part, class ToState, class ToItem>
+bool dropParts(auto states, auto items)
+{
+    std::size_t inStates = 0, ofItems = 0;
+    for (State* state : states)
+        inStates += ToState::list(*state).getNbr();
+    for (auto* item : items)
+        ofItems += ToItem::list(*item).getNbr();
+    // When no more parts exist than these states have, no others do. When the items have as many, they have all of
+    // them.
+    if (inStates != ofItems || !Part::takeBackAll(inStates))
+        return false;
+    // The parts are gone. Afterwards nothing refers to them any more.
+    for (State* state : states)
+        ToState::list(*state).forgetAll();
+    for (auto* item : items)
+        ToItem::list(*item).forgetAll();
+    return true;
+}
+
+} // namespace
+
 State::State(Wallet* wallet, const Date& date) : shareStates_(this), accountStates_(this), date_(date)
 {
     setWallet(wallet);
@@ -73,9 +100,13 @@ void State::SellShares(Account* account, float amount)
         state->setCash(state->getCash() + amount);
 }
 
-void WalletToStates::deleteAll()
+void Wallet::removeAllStates()
 {
-    OneToManyAssociation::deleteAll();
+    if (dropParts<ShareState, ShareStatesToState, ShareStatesToShare>(states(), shares()))
+        SharedHolding::forgetAll(); // only they had any
+    dropParts<AccountState, AccountStatesToState, AccountStatesToAccount>(states(), accounts());
+    // Each state destroys what it still has: where there are states elsewhere, too, all its parts.
+    states_.deleteAll();
 }
 
 int Wallet::addState(State* state)

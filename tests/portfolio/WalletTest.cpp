@@ -154,6 +154,7 @@ public:
             [&] { delete share; },
             [&] { delete operation; },
             [&] { delete pick(now.states); },
+            [&] { wallet->removeAllStates(); },
             [&] { delete pick(now.companies); },
             [&] { delete (day == 0 ? pick(now.markets) : nullptr); },
             [&] { day == 0 ? destroyOne(currencies_) : void(); },

@@ -154,3 +154,26 @@ TEST(EvolutionTest, EveryDailyStateIsBitForBitTheFullReplayOfItsDay)
     }
     EXPECT_GT(evolutions, 40);
 }
+
+TEST(EvolutionTest, StatesRemovedAtOnceAreForgottenByAccountsAndHoldingsOfAnyWallet)
+{
+    for (const bool isMoved : {false, true}) {
+        SmallPortfolio p;
+        Account* account = addAccount(p.wallet, "Main", p.euro);
+        deposit(account, 0, 100);
+        auto* share = new Share(&p.wallet, p.alpha);
+        trade(share, account, 1, 2, 10);
+        EvolutionOutcome outcome;
+        Wallet other;
+        const std::string text = textOf(*refreshStates(p.wallet, daysAfterStart(9), false, &outcome));
+        for (Wallet* wallet : {&other, &p.wallet}) {
+            if (isMoved) {
+                account->setWallet(wallet);
+                share->setWallet(wallet);
+            }
+            p.wallet.removeAllStates();
+            EXPECT_EQ(share->getNbrShareStates() + account->getNbrAccountStates(), 0U) << isMoved;
+        }
+        EXPECT_EQ(textOf(*refreshStates(p.wallet, daysAfterStart(9), false, &outcome)), text) << isMoved;
+    }
+}
