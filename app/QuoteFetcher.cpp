@@ -93,7 +93,9 @@ void QuoteFetcher::report()
     }
     const std::string came = std::to_string(came_) + " of " + std::to_string(asked_) + " quotes came";
     if (came_ == asked_)
-        return window_.showNotice({kNotice, came, {}, true});
-    window_.showNotice(
-        {kNotice, (asked_ > 1 ? came + "; none for " : "No quotes for ") + missing_ + ": " + reason(), {}});
+        window_.showNotice({kNotice, came, {}, true});
+    else if (asked_ == 1)
+        window_.showNotice({kNotice, "No quotes for " + missing_ + ": " + reason(), {}});
+    else // the tickers last: there may be many
+        window_.showNotice({kNotice, came + ": " + reason() + "; none for " + missing_, {}});
 }

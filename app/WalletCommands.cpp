@@ -182,7 +182,7 @@ void PLWindow::UpdateState()
     if (isEvolutionAsked)
         walletView_->UpdateEvolution(evolutionPoints(*wallet_, catalogue_), catalogue_.getReferenceCurrency(), outcome);
     else
-        walletView_->ClearEvolution();
+        walletView_->ClearEvolution(state->getFirstOperationDate() < date);
     SetState(state);
     tellSimulation();
 }

@@ -156,7 +156,7 @@ void WalletView::makeChart()
     evolution_->addGraphElement(&line_);
     // The chart draws its own notice when it is empty; this one says why it is.
     const BRect reasonPlace(10, 30, 700, 50); // below the chart's own "No data"
-    noEvolution_ = new BStringView(reasonPlace, "", "");
+    noEvolution_ = new BStringView(reasonPlace, "txtNoEvolution", "");
     evolution_->AddChild(noEvolution_);
     AddChild(evolution_);
 }
@@ -269,13 +269,13 @@ void WalletView::UpdateEvolution(const std::vector<EvolutionPoint>& points, cons
     }
 }
 
-void WalletView::ClearEvolution()
+void WalletView::ClearEvolution(bool isNotAsked)
 {
     // The chart keeps the line, which has no points now, and so shows that there is no data.
     line_.clearAll();
     evolution_->removeAllGraphPoints();
     evolution_->setXLegend(String());
-    noEvolution_->SetText(isComputeEvolution() ? "" : "tick Compute Evolution");
+    noEvolution_->SetText(isNotAsked ? "tick Compute Evolution" : "");
     evolution_->Invalidate();
 }
 

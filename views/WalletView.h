@@ -45,7 +45,8 @@ public:
     /// Fills the chart with values in the reference currency, null without one, or says why there are none.
     void UpdateEvolution(const std::vector<EvolutionPoint>& points, const Currency* reference,
                          EvolutionOutcome outcome);
-    void ClearEvolution();
+    /// `isNotAsked`: there would be something to draw.
+    void ClearEvolution(bool isNotAsked = false);
 
     String getAccountName() const { return accountName_->Text(); }
     void setAccountName(const String& name) { showText(*accountName_, name); }
