@@ -2,8 +2,8 @@
 
 #include <memory>
 
-/// Tells a command that blocks whether a person has pressed Escape, or closes the window, since the watch began. The
-/// kits have none.
+/// Tells a command that blocks whether a person has pressed Escape, or closes the window or the program, since the
+/// watch began. The kits have none.
 ///
 /// Looking also puts on the screen what is to be drawn, so that a window that waits is not blank, and does nothing
 /// else: messages wait for their turn, and what a person types, clicks and closes meanwhile is handed on in its order

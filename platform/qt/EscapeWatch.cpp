@@ -35,7 +35,8 @@ bool isInput(const QEvent& event)
 
 } // namespace
 
-/// Holds back what comes for the desktop's windows, in front of all that Qt makes of it: shortcuts, clicks, focus.
+/// Holds back what comes for the desktop's windows, in front of what Qt makes of it for the controls. A shortcut comes
+/// through, and ends as a message that waits, or as a window that is asked to close.
 class EscapeWatch::Filter final : public QObject {
 public:
     Filter()
@@ -55,8 +56,7 @@ public:
     {
         constexpr qint64 kPause = 50; // milliseconds: a fetch that is quicker costs no look
         if (!isPressed_ && sinceLook_.elapsed() >= kPause) {
-            // Sockets wait as well: a signal to end the program comes by one.
-            QCoreApplication::processEvents(QEventLoop::ExcludeSocketNotifiers);
+            QCoreApplication::processEvents();
             sinceLook_.restart();
         }
         return isPressed_;
@@ -65,6 +65,7 @@ public:
 protected:
     bool eventFilter(QObject* receiver, QEvent* event) override
     {
+        isPressed_ = isPressed_ || event->type() == QEvent::Quit; // the program is to end, by a signal
         if (!receiver->isWindowType() || !isInput(*event))
             return false;
         const bool isKey = event->type() == QEvent::KeyPress || event->type() == QEvent::KeyRelease;
