@@ -2,6 +2,7 @@
 
 #include "app/Holds.h"
 #include "app/MessageView.h"
+#include "app/NoticeLine.h"
 #include "app/Shortcuts.h"
 #include "foundation/Today.h"
 #include "platform/Alert.h"
@@ -14,6 +15,7 @@
 
 #include <algorithm>
 #include <iterator>
+#include <span>
 
 namespace {
 
@@ -103,13 +105,32 @@ constexpr Command kCommands[] = {
     // The file panels.
     {'SAVE', [](PLWindow& w, BMessage* m) { w.Save(m); }},
     {B_REFS_RECEIVED, [](PLWindow& w, BMessage* m) { w.RefsReceived(m); }, "Load"},
-    // The window.
+};
+static_assert(std::size(kCommands) == 65);
+
+/// Beside the vocabulary.
+constexpr Command kOwnCommands[] = {
     {'HUnd', [](PLWindow& w, BMessage*) { w.Undo(); }},
     {'HRed', [](PLWindow& w, BMessage*) { w.Redo(); }},
+    {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
+    {'WBGd', [](PLWindow& w, BMessage*) { w.valueAtLastQuotes(); }}, // the portfolio page
+    {'NtSm', [](PLWindow& w, BMessage*) { w.takeBackSimulation(); }},
 };
-static_assert(std::size(kCommands) == 67);
+
+/// Null when the code is no command.
+const Command* commandOf(uint32 code)
+{
+    for (const std::span<const Command> table :
+         {std::span<const Command>(kCommands), std::span<const Command>(kOwnCommands)}) {
+        const auto found = std::ranges::find(table, code, &Command::code);
+        if (found != table.end())
+            return &*found;
+    }
+    return nullptr;
+}
 
 const BRect kPageFrame(0, 0, 800, 775);
+const BRect kNoticeFrame(8, 757, 792, 779); // between what is on the pages and the letters of the status line
 
 } // namespace
 
@@ -152,15 +173,15 @@ void PLWindow::makePages()
     messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
+    AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // in front of the edges of both
     makeUndoButtons();
 }
 
 void PLWindow::MessageReceived(BMessage* message)
 {
-    const auto* command = std::find_if(std::begin(kCommands), std::end(kCommands),
-                                       [&](const Command& c) { return c.code == message->what; });
+    const Command* command = commandOf(message->what);
     // Many text fields have codes that are no commands: typing changes nothing until a button is pressed.
-    if (command == std::end(kCommands)) {
+    if (command == nullptr) {
         BWindow::MessageReceived(message);
         return;
     }
@@ -188,10 +209,31 @@ void PLWindow::SetMessage(const char* text, const char* toolTip)
     messageView_->SetMessage(text);
 }
 
+void PLWindow::showNotice(Notice notice)
+{
+    const WindowLock lock(*this);
+    if (lock.isHeld())
+        noticeLine_->show(std::move(notice));
+}
+
+void PLWindow::dropNotice(const std::string& key)
+{
+    const WindowLock lock(*this);
+    if (lock.isHeld())
+        noticeLine_->drop(key);
+}
+
+void PLWindow::pressNotice(BMessage* message)
+{
+    noticeLine_->press(message);
+}
+
 bool PLWindow::confirm(const char* question)
 {
     constexpr int32 kContinue = 1;
-    return (new BAlert("Warning", question, "Cancel", "Continue"))->Go() == kContinue;
+    auto* alert = new BAlert("Warning", question, "Cancel", "Continue"); // gone after `Go`
+    alert->SetDefaultButton(0); // Enter, pressed without reading, destroys nothing
+    return alert->Go() == kContinue;
 }
 
 Market** PLWindow::getMarkets(int* n) const

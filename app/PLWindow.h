@@ -3,6 +3,7 @@
 #include "app/DataFiles.h"
 #include "app/EventEditor.h"
 #include "app/History.h"
+#include "app/Notice.h"
 #include "app/OperationEditor.h"
 #include "app/QuoteEditor.h"
 #include "market/Catalogue.h"
@@ -14,6 +15,7 @@
 
 class BButton;
 class MessageView;
+class NoticeLine;
 class ParameterView;
 class Shortcuts;
 class State;
@@ -43,7 +45,12 @@ public:
 
     /// Shows `text` in the status line, at once; `toolTip` says more of it.
     void SetMessage(const char* text, const char* toolTip = "");
-    /// Asks in an alert titled "Warning". @return true for "Continue".
+    /// Shows `notice` in the line above the status line, or lets it wait until those before it are dismissed.
+    void showNotice(Notice notice);
+    /// Takes the notice of that key away, shown or waiting; its reason is gone.
+    void dropNotice(const std::string& key);
+    void pressNotice(BMessage* message);
+    /// Asks in an alert titled "Warning", in which Enter and Escape cancel. @return true for "Continue".
     static bool confirm(const char* question);
 
     // The model.
@@ -72,6 +79,10 @@ public:
     /// Starts a new, empty portfolio, which has no file yet.
     void ReinitWallet();
     void ChangeParameter(uint32 code);
+    /// Goes to the last day with all quotes of what is held.
+    void valueAtLastQuotes();
+    /// Ends the simulation, and removes the sales that it has left in the portfolio.
+    void takeBackSimulation();
     /// Puts an empty portfolio, without a value, in the place of the one that is here.
     void replaceWallet();
     /// Shows and values the portfolio after it was replaced or read.
@@ -179,6 +190,8 @@ private:
     void removeMarkets(const Currency& currency);
     void showParameters();
     void showAccounts();
+    /// Tells in a notice that there are simulated sales, or no longer.
+    void tellSimulation();
     /// Null, after a message, when there is none.
     Account* selectedAccount();
 
@@ -187,6 +200,7 @@ private:
     State* state_ = nullptr; // in the wallet
     // The window's views own each other.
     MessageView* messageView_ = nullptr;
+    NoticeLine* noticeLine_ = nullptr;
     BTabView* tabView_ = nullptr;
     CompanyView* companyView_ = nullptr;
     CurrencyView* currencyView_ = nullptr;
@@ -205,6 +219,7 @@ private:
     std::unique_ptr<EventEditor> events_;
     std::unique_ptr<OperationEditor> operations_;
     std::unique_ptr<Shortcuts> shortcuts_;
-    int holds_ = 0;            // of the valuation; 0 between two commands
-    bool isUpdateDue_ = false; // it was asked for meanwhile
+    int holds_ = 0;              // of the valuation; 0 between two commands
+    bool isUpdateDue_ = false;   // it was asked for meanwhile
+    std::string simulationTold_; // of simulated sales; what a person has dismissed does not come again
 };

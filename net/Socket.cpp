@@ -4,35 +4,14 @@
 #include "foundation/FieldIO.h"
 #include "net/HostLookup.h"
 
-#include <algorithm>
 #include <arpa/inet.h>
 #include <cerrno>
 #include <cstring>
+#include <fcntl.h>
 #include <poll.h>
 #include <string>
 #include <sys/socket.h>
 #include <unistd.h>
-
-namespace {
-
-/// 0 when it has passed.
-std::chrono::milliseconds millisecondsUntil(Socket::Clock::time_point deadline)
-{
-    return std::max(std::chrono::ceil<std::chrono::milliseconds>(deadline - Socket::Clock::now()),
-                    std::chrono::milliseconds(0));
-}
-
-/// What `poll` gives; 0 at once when the deadline has passed.
-int waitToReceive(int descriptor, Socket::Clock::time_point deadline)
-{
-    const auto left = millisecondsUntil(deadline);
-    if (left.count() == 0)
-        return 0;
-    pollfd waiting{descriptor, POLLIN, 0};
-    return poll(&waiting, 1, static_cast<int>(left.count()));
-}
-
-} // namespace
 
 // A socket is in one of three states. Without a descriptor it can become a client or a server. With one it transfers,
 // and accepts when `isServer_` is set. Closed, it keeps the number of its descriptor and so counts as open, though the
@@ -68,9 +47,10 @@ int Socket::connectToName(const String& host, unsigned short port)
     closePrevious();
     const auto deadline = connectDeadline();
     // The address is found before there is a descriptor: a host that is not there leaves the object as it was.
-    if (lookUpHost(host.getCharacterArray(), deadline, &address_.sin_addr) != 0)
-        return -1;
-    return connectToAddress(port, deadline);
+    connectFailure_ = lookUpHost(host.getCharacterArray(), deadline, stop_, &address_.sin_addr);
+    if (connectFailure_ == -1)
+        connectFailure_ = kNoHost;
+    return connectFailure_ == 0 ? connectToAddress(port, deadline) : -1;
 }
 
 int Socket::serverOn(unsigned short port, in_addr local)
@@ -188,11 +168,10 @@ int Socket::getCharacterArray(char* bytes, int count)
 int Socket::receive(char* bytes, std::size_t count, Clock::time_point deadline, std::size_t* received)
 {
     for (;;) {
-        const int ready = waitToReceive(descriptor_, deadline);
-        if (ready == 0)
-            return kTimedOut;
+        if (const int result = waitFor(descriptor_, POLLIN, deadline, stop_))
+            return result;
         // Never blocks: what `poll` has announced may be gone when the system finds it damaged.
-        const ssize_t n = ready > 0 ? recv(descriptor_, bytes, count, MSG_DONTWAIT) : ready;
+        const ssize_t n = recv(descriptor_, bytes, count, MSG_DONTWAIT);
         if (n >= 0) {
             *received = static_cast<std::size_t>(n);
             return 0;
@@ -253,15 +232,31 @@ int Socket::connectToAddress(unsigned short port, std::optional<Clock::time_poin
 {
     address_.sin_family = AF_INET;
     address_.sin_port = htons(port);
-    if (open() != 0)
+    connectFailure_ = -1;
+    if (open() == 0)
+        connectFailure_ = deadline
+                              ? connectBefore(*deadline)
+                              : connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_);
+    return connectFailure_ == 0 ? 0 : -1;
+}
+
+/// Begins to connect, and waits. Whatever comes of it, later transfers block again.
+/// @return 0, -1, `kTimedOut` or `kStopped`.
+int Socket::connectBefore(Clock::time_point deadline) const
+{
+    const int flags = fcntl(descriptor_, F_GETFL);
+    if (flags < 0 || fcntl(descriptor_, F_SETFL, flags | O_NONBLOCK) != 0)
         return -1;
-    // The search for the host has used up a part of the time. At least a millisecond is left: 0 would stand for ever.
-    if (deadline)
-        applyTimeLimit(std::max(millisecondsUntil(*deadline), std::chrono::milliseconds(1)));
-    const int result = connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_);
-    // Whatever came of it, later transfers have the whole limit again.
-    applyTimeLimit(timeLimit_);
-    return result == 0 ? 0 : -1;
+    int result = connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_);
+    if (result != 0 && errno == EINPROGRESS)
+        result = waitFor(descriptor_, POLLOUT, deadline, stop_);
+    int error = 0;
+    socklen_t size = sizeof error;
+    if (result == 0 && (getsockopt(descriptor_, SOL_SOCKET, SO_ERROR, &error, &size) != 0 || error != 0))
+        result = -1;
+    if (fcntl(descriptor_, F_SETFL, flags) != 0)
+        return -1;
+    return result;
 }
 
 void Socket::applyTimeLimit(std::chrono::milliseconds limit) const
@@ -269,14 +264,14 @@ void Socket::applyTimeLimit(std::chrono::milliseconds limit) const
     constexpr int kThousand = 1000; // milliseconds a second, microseconds a millisecond
     const timeval value{limit.count() / kThousand, limit.count() % kThousand * kThousand};
     setsockopt(descriptor_, SOL_SOCKET, SO_RCVTIMEO, &value, sizeof value);
-    setsockopt(descriptor_, SOL_SOCKET, SO_SNDTIMEO, &value, sizeof value); // a connect, too
+    setsockopt(descriptor_, SOL_SOCKET, SO_SNDTIMEO, &value, sizeof value);
 }
 
 /// Receives a byte of a line. A signal ends the wait as the deadline does.
 /// @return 0; `kTimedOut`, or -1 at the end of the connection and on an error.
 int Socket::readBefore(Clock::time_point deadline, char* c) const
 {
-    const int ready = waitToReceive(descriptor_, deadline);
+    const int ready = pollUntil(descriptor_, POLLIN, deadline);
     if (ready == 0)
         return kTimedOut;
     // A byte at a time, since nothing behind the line may be taken from the socket.

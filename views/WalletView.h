@@ -11,12 +11,14 @@
 
 #include <utility>
 
+class BButton;
 class BStringView;
 class Currency;
 class GraphView;
 class State;
 enum class EvolutionOutcome;
 struct EvolutionPoint;
+struct QuoteCoverage;
 struct Totals;
 
 /// The page of the portfolio as it stands on a day: totals, accounts, holdings, and how its value came about.
@@ -33,6 +35,10 @@ public:
     /// Shows `state` and its totals; null empties the page. What was selected before `ClearState` is selected again,
     /// where it still is.
     void SetState(const State* state, const Totals& totals);
+    /// Says beside the totals how many of the quotes that they rest on are not of `day`, or else of the rates.
+    void showCoverage(const Date& day, const QuoteCoverage& quotes, const QuoteCoverage& rates);
+    /// The last day with all quotes, where the page speaks of one; otherwise undefined.
+    Date lastQuotedDay() const { return lastQuotedDay_; }
     /// Empties the page before its state is destroyed, keeping in mind what was selected.
     void ClearState();
     /// What was selected belongs to a portfolio that is gone.
@@ -40,7 +46,8 @@ public:
     /// Fills the chart with values in the reference currency, null without one, or says why there are none.
     void UpdateEvolution(const std::vector<EvolutionPoint>& points, const Currency* reference,
                          EvolutionOutcome outcome);
-    void ClearEvolution();
+    /// `isNotAsked`: there would be something to draw.
+    void ClearEvolution(bool isNotAsked = false);
 
     String getAccountName() const { return accountName_->Text(); }
     void setAccountName(const String& name) { showText(*accountName_, name); }
@@ -64,6 +71,8 @@ private:
     void makeAccounts();
     void makeHoldings();
     void makeChart();
+    void makeCoverage();
+    void hideCoverage();
     void showTotals(const Totals& totals);
 
     DateControl* date_ = nullptr;
@@ -73,6 +82,9 @@ private:
     BTextControl* totalValue_ = nullptr;
     BTextControl* profit_ = nullptr;
     BTextControl* annualRevenue_ = nullptr;
+    BStringView* coverage_ = nullptr;
+    BButton* goToLastQuotes_ = nullptr;
+    Date lastQuotedDay_;
     AccountStateListView* accounts_ = nullptr;
     BTextControl* accountName_ = nullptr;
     BTextControl* accountCurrency_ = nullptr;

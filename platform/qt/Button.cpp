@@ -10,6 +10,8 @@ BButton::BButton(BRect frame, const char* name, const char* label, BMessage* mes
     auto* button = static_cast<QPushButton*>(widget());
     // Enter presses the button that has the keyboard, as the space bar does.
     button->setAutoDefault(true);
+    if ((flags & B_NAVIGABLE) == 0)
+        button->setFocusPolicy(Qt::NoFocus);
     QObject::connect(button, &QPushButton::clicked, [this] { Invoke(); });
 }
 
