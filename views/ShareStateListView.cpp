@@ -58,9 +58,8 @@ Cell ShareStateItem::quoteDay() const
 
 Cell ShareStateItem::gain() const
 {
-    if (!basis_.isKnown || state_->getBuyQuote() == 0 || !state_->isHeld())
-        return {};
-    return {changeText(state_->gain()), state_->gain() < 0 ? look::kLoss : look::kGain};
+    const auto gain = state_->gain();
+    return gain ? Cell{changeText(*gain), *gain < 0 ? look::kLoss : look::kGain} : Cell();
 }
 
 ShareStateListView::ShareStateListView(const char* name)

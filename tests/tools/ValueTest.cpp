@@ -115,21 +115,24 @@ TEST_F(ValueTest, TableColumnsAreAsWideOnTheTerminalAsTheirTexts)
     fill();
     beta->setName("Beta\n\x1B");
     new Share(&wallet, beta);
+    auto* unquoted = new Share(&wallet, new Company(paris, "Gamma", "GA"));
+    trade(unquoted, cash_, 3, 5, 10); // which shows no gain
     EXPECT_EQ(value("--date 11/01/1999").out, R"(Portfolio on 11/01/1999, in Euro (EUR)
 
 Total Deposit      7,000.00  EUR
-Total Value        7,130.58  EUR
-Profit               130.58  EUR
-Annual Revenu         68.14  %
+Total Value        7,080.50  EUR
+Profit                80.50  EUR
+Annual Revenu         42.00  %
 First operation  01/01/1999
 
 Account      Cash       Value in EUR
-Cash     4,217.58  EUR      4,217.58
+Cash     4,167.50  EUR      4,167.50
 Café "?  1,096.50  USD      2,193.00  default transfer account
 
 Holding  Ticker  Market  Quantity  Bought at  Quote         Gain  Value in EUR  End date
 Alpha    AC      Paris         60      10.00  12.00  EUR  +20.0%        720.00  04/04/1999
 Beta??   AC      York           0              0.00  USD
+Gamma    GA      Paris          5      10.00   0.00  EUR                  0.00  04/04/1999
 )");
 }
 
