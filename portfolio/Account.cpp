@@ -98,7 +98,7 @@ int Account::writeTransferOperations(FILE* file) const
     return 0;
 }
 
-int Account::readTransferOperations(FILE* file)
+int Account::readTransferOperations(FILE* file, bool* hasLostRecipient)
 {
     // The turns are good for one reading: the account keeps none of them from here on.
     const std::vector<std::uint32_t> turns = std::move(transferTurns_);
@@ -111,9 +111,12 @@ int Account::readTransferOperations(FILE* file)
         if (i < turns.size())
             operations_.setTurn(transfer.get(), turns[i]);
         if (transfer->rd(file) != 0) {
+            if (reachedEnd(file))
+                return -1;
             // Intended: a transfer to an unknown account is not dropped, the person shall see that it is there.
-            if (!reachedEnd(file))
-                transfer.release();
+            transfer.release();
+            if (hasLostRecipient != nullptr && i < turns.size())
+                *hasLostRecipient = true;
             return -1;
         }
         transfer.release(); // the account owns it

@@ -46,19 +46,16 @@ int WalletNames::find(const PairMap<T>& map, const String& market, const String&
 {
     const bool canMatch = market.hasText() && abbreviation.hasText();
     const auto found = canMatch ? map.find({market.comparedBytes(), abbreviation.comparedBytes()}) : map.end();
-    // The wallet reports the name that was looked for last without success as the reason of a failed read.
     *out = found != map.end() ? found->second : nullptr;
-    if (*out == nullptr)
-        unknown_ = abbreviation;
     return *out != nullptr ? 0 : -1;
 }
 
-int WalletNames::getCompany(const String& market, const String& abbreviation, Company** out)
+int WalletNames::getCompany(const String& market, const String& abbreviation, Company** out) const
 {
     return find(companies_, market, abbreviation, out);
 }
 
-int WalletNames::getShare(const String& market, const String& abbreviation, Share** out)
+int WalletNames::getShare(const String& market, const String& abbreviation, Share** out) const
 {
     return find(shares_, market, abbreviation, out);
 }
@@ -70,11 +67,9 @@ T* WalletNames::find(const Map<T>& map, const String& name)
     return found != map.end() ? found->second : nullptr;
 }
 
-int WalletNames::getCurrency(const String& name, Currency** out)
+int WalletNames::getCurrency(const String& name, Currency** out) const
 {
     *out = find(currencies_, name);
-    if (*out == nullptr)
-        unknown_ = name;
     return *out != nullptr ? 0 : -1;
 }
 

@@ -26,14 +26,11 @@ public:
     void add(Account* account);
 
     /// @return 0; -1 and a null `*out` when there is none.
-    int getCurrency(const String& name, Currency** out);
-    int getCompany(const String& market, const String& abbreviation, Company** out);
-    int getShare(const String& market, const String& abbreviation, Share** out);
+    int getCurrency(const String& name, Currency** out) const;
+    int getCompany(const String& market, const String& abbreviation, Company** out) const;
+    int getShare(const String& market, const String& abbreviation, Share** out) const;
     /// Null when there is none.
     Account* getAccount(const String& name) const;
-
-    /// The ticker or currency name that a look-up did not find last; undefined when all were found.
-    const String& getUnknown() const { return unknown_; }
 
 private:
     using Pair = std::pair<std::string_view, std::string_view>;
@@ -47,7 +44,7 @@ private:
 
     static Pair pairOf(const Market& market, const Company& company);
     template <class T>
-    int find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out);
+    static int find(const PairMap<T>& map, const String& market, const String& abbreviation, T** out);
     template <class T>
     static T* find(const Map<T>& map, const String& name);
 
@@ -55,5 +52,4 @@ private:
     PairMap<Share> shares_;
     Map<Currency> currencies_;
     Map<Account> accounts_;
-    String unknown_;
 };
