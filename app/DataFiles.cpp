@@ -5,11 +5,16 @@
 #include "platform/Entry.h"
 #include "platform/Message.h"
 #include "platform/Path.h"
+#include "platform/ShortText.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
+#include "portfolio/WalletDiagnosis.h"
 #include "storage/DurableSave.h"
+#include "storage/Folders.h"
 #include "storage/InputFile.h"
 
+#include <algorithm>
+#include <filesystem>
 #include <stdexcept>
 
 namespace {
@@ -21,6 +26,21 @@ std::unique_ptr<InputFile> openFile(const char* path)
     } catch (const std::runtime_error&) {
         return nullptr; // the caller's message names the path
     }
+}
+
+/// A name for a line of the window, whatever bytes a file has in it.
+std::string shownName(std::string_view name)
+{
+    constexpr std::size_t kLongest = 60;
+    std::string text = shortened(name, kLongest);
+    std::ranges::replace_if(
+        text, [](char c) { return c >= 0 && c < ' '; }, ' ');
+    return text;
+}
+
+std::string fileName(const String& path)
+{
+    return std::filesystem::path(path.getCharacterArray()).filename();
 }
 
 BFilePanel makePanel(file_panel_mode mode, PLWindow& window)
@@ -36,24 +56,25 @@ DataFiles::DataFiles(PLWindow& window, const BTabView& tabs, const DataFolder& f
       savePanel_(makePanel(B_SAVE_PANEL, window))
 {}
 
-std::optional<DataFiles::Kind> DataFiles::kindInFront() const
+std::optional<FileKind> DataFiles::kindInFront() const
 {
     // The order of the tabs is that of `PLWindow::makePages`.
     switch (tabs_.Selection()) {
     case 0:
     case 1:
-        return Kind::kMarkets;
+        return FileKind::kMarkets;
     case 2:
-        return Kind::kWallet;
+        return FileKind::kWallet;
     default:
         return std::nullopt;
     }
 }
 
-void DataFiles::showFolder(BFilePanel& panel, Kind kind)
+void DataFiles::showFolder(BFilePanel& panel, FileKind kind)
 {
     std::string error;
-    panel.SetPanelDirectory((kind == Kind::kMarkets ? folder_.companies(&error) : folder_.portoFolios(&error)).c_str());
+    panel.SetPanelDirectory(
+        (kind == FileKind::kMarkets ? folder_.companies(&error) : folder_.portoFolios(&error)).c_str());
     if (!error.empty())
         window_.SetMessage(error.c_str());
 }
@@ -66,7 +87,7 @@ void DataFiles::askForLoad()
             const auto kind = kindInFront();
             if (!kind)
                 return;
-            const bool isMarkets = kind == Kind::kMarkets;
+            const bool isMarkets = kind == FileKind::kMarkets;
             const char* question = isMarkets ? "This will delete all unsaved changes to the wallet and the markets..."
                                              : "This will delete all unsaved changes to the wallet...";
             // A portfolio is always asked for, even an empty one.
@@ -95,39 +116,109 @@ void DataFiles::load(BMessage* message)
     if (!lock.isHeld())
         return;
     // The portfolio refers to markets and companies by name, so new markets take it along.
+    const bool wasEmpty = isWalletEmpty();
     window_.replaceWallet();
-    if (kind == Kind::kMarkets)
-        loadMarkets(file->stream(), path.Path());
-    else
-        loadWallet(file->stream(), path.Path());
+    if (kind == FileKind::kWallet)
+        return loadWallet(*file);
+    names_.wallet.isEmptied = names_.wallet.isEmptied || !wasEmpty;
+    tell(FileKind::kWallet, "");
+    loadMarkets(*file);
 }
 
-void DataFiles::loadMarkets(FILE* file, const char* path)
+void DataFiles::loadMarkets(const InputFile& file)
 {
+    names_.markets = {file.path().c_str(), FileStamp::of(fileno(file.stream()))};
     window_.RemoveAllMarkets();
     // The currencies that are here stay, and the file's come behind them. Intended: a file loaded twice has each of its
     // currencies twice.
     const unsigned before = window_.catalogue().getNbrCurrencies();
-    const bool isWhole = window_.catalogue().rd(file) == 0;
+    const bool isWhole = window_.catalogue().rd(file.stream()) == 0;
     window_.showCatalogue(before);
-    // A save must not put what could be read in the place of a damaged file, nor in that of the one loaded before.
-    markets_.isAsked = !isWhole;
-    if (isWhole)
-        markets_.path = path;
     window_.SetMessage(isWhole ? "Markets successfully loaded..." : "Failed to load the markets");
+    if (isWhole) {
+        window_.noteFile(FileKind::kMarkets);
+    } else {
+        const bool isPartHere = window_.catalogue().getNbrCurrencies() > before;
+        names_.markets.failure = shownName(fileName(names_.markets.path)) +
+                                 (isPartHere ? " was loaded only in part: " : " was not loaded: ") +
+                                 faultOfMarketFile(file.stream(), shownName);
+    }
+    tell(FileKind::kMarkets, names_.markets.failure);
 }
 
-void DataFiles::loadWallet(FILE* file, const char* path)
+void DataFiles::loadWallet(const InputFile& file)
 {
-    if (window_.getWallet()->rd(file, nullptr) != 0) {
+    names_.wallet = {file.path().c_str(), FileStamp::of(fileno(file.stream()))};
+    const bool isRead = window_.getWallet()->rd(file.stream(), nullptr) == 0;
+    const std::string report = reportOn(file, isRead);
+    if (!isRead) {
+        names_.wallet.failure = report;
         window_.SetMessage("Failed to load the wallet");
         window_.replaceWallet(); // a part of a portfolio would pass for the whole
     }
     window_.showWallet();
-    wallet_.path = path;
-    // Intended: it follows the failure's message, too, and the path is the failed file's. What a save writes over is
-    // kept among the versions.
+    // Intended: it follows the failure's message, too, and the path is the failed file's. The notice tells what has
+    // happened, and the next save asks for a name.
     window_.SetMessage("Wallet successfully loaded...");
+    tell(FileKind::kWallet, report);
+    if (isRead)
+        window_.noteFile(FileKind::kWallet);
+}
+
+std::string DataFiles::reportOn(const InputFile& file, bool isRead) const
+{
+    if (isRead && !window_.getWallet()->hasLostRecipient())
+        return {};
+    const Catalogue& catalogue = window_.catalogue();
+    const WalletDiagnosis diagnosis(file.stream(), catalogue, shownName);
+    const std::string self = shownName(fileName(names_.wallet.path));
+    std::string markets;
+    if (catalogue.getNbrCurrencies() > 0)
+        markets = names_.markets.path.isUndefined() ? "the market data here"
+                                                    : "the market file " + shownName(fileName(names_.markets.path));
+    const std::string text = diagnosis.text(self, markets);
+    // A text on missing names begins with what needs them.
+    return diagnosis.isNameMissing() ? text : self + (isRead ? ": " : " was not loaded: ") + text;
+}
+
+void DataFiles::tell(FileKind kind, const std::string& text)
+{
+    const std::string key = kind == FileKind::kMarkets ? "market file" : "portfolio file";
+    if (text.empty())
+        window_.dropNotice(key);
+    else
+        window_.showNotice({key, text, {}, false});
+}
+
+void DataFiles::forgetWallet()
+{
+    names_.wallet = {};
+    tell(FileKind::kWallet, "");
+}
+
+bool DataFiles::isWalletEmpty() const
+{
+    const Wallet* wallet = window_.getWallet();
+    return wallet == nullptr || wallet->getNbrAccounts() + wallet->getNbrShares() == 0;
+}
+
+std::string DataFiles::doubtAbout(FileKind kind) const
+{
+    const Remembered& file = names_.of(kind);
+    const auto stamp = FileStamp::of(file.path.getCharacterArray());
+    if (!stamp)
+        return {}; // it was deleted meanwhile: there is nothing to write over
+    const std::string name = shownName(fileName(file.path));
+    if (!file.failure.empty())
+        return file.failure;
+    if (file.isEmptied && isWalletEmpty()) {
+        const auto saved = openFile(file.path.getCharacterArray());
+        if (saved == nullptr || !isEmptyPortfolioFile(saved->stream()))
+            return "the portfolio is empty since a market file was loaded, and " + name + " is not";
+    }
+    if (file.stamp && file.stamp != stamp)
+        return name + " was changed by another program or window since it was loaded or saved here";
+    return {};
 }
 
 void DataFiles::saveOrAsk()
@@ -135,12 +226,19 @@ void DataFiles::saveOrAsk()
     const auto kind = kindInFront();
     if (!kind)
         return;
-    const Remembered& file = remembered(*kind);
-    if (!file.path.isUndefined() && !file.isAsked) {
-        save(file.path);
-        return;
+    const String path = names_.of(*kind).path;
+    if (path.isUndefined()) {
+        showFolder(savePanel_, *kind);
+        savePanel_.SetSaveText("");
+    } else {
+        const std::string doubt = doubtAbout(*kind);
+        if (doubt.empty())
+            return save(path);
+        tell(*kind, "Save asks for a name: " + doubt);
+        // The folder, too, is the file's own: Enter and a yes then mean that very file.
+        savePanel_.SetPanelDirectory(folderOf(path.getCharacterArray()).c_str());
+        savePanel_.SetSaveText(fileName(path).c_str());
     }
-    showFolder(savePanel_, *kind);
     savePanel_.Show();
 }
 
@@ -161,8 +259,10 @@ status_t DataFiles::save(BMessage* message)
     const auto kind = kindInFront();
     if (status != B_OK || !kind)
         return status;
-    // Remembered before it is written: after a save that fails, the next one tries the same file again.
-    remembered(*kind) = {path.Path()};
+    // Remembered before it is written: after a save that fails, the next one tries the same file again. The name was
+    // given by a person, so whatever was in doubt is settled.
+    names_.of(*kind) = {path.Path()};
+    tell(*kind, "");
     save(String(path.Path()));
     return B_OK;
 }
@@ -177,7 +277,7 @@ void DataFiles::save(const String& path)
         return;
     const Wallet* wallet = window_.getWallet();
     const auto write = [&](FILE* file) {
-        if (kind == Kind::kMarkets)
+        if (kind == FileKind::kMarkets)
             return window_.catalogue().wrt(file, today());
         return wallet != nullptr ? wallet->wrt(file, today()) : 0; // without a wallet the file is left empty
     };
@@ -188,7 +288,12 @@ void DataFiles::save(const String& path)
         text = "Failed to open the file.";
     else if (result.outcome == DurableSave::Outcome::kWriteFailed)
         text = "Failed to write the file.";
-    else if (kind == Kind::kWallet)
+    else if (kind == FileKind::kWallet)
         text = wallet != nullptr ? "Wallet successfully saved..." : "No wallet to save...";
     window_.SetMessage(text, result.reason.c_str());
+    if (result.outcome != DurableSave::Outcome::kSaved)
+        return;
+    if (names_.of(*kind).path == path)
+        names_.of(*kind) = {path, result.stamp};
+    window_.noteFile(*kind);
 }
