@@ -152,7 +152,6 @@ void DataFiles::loadWallet(const InputFile& file)
     const bool isRead = window_.getWallet()->rd(file.stream(), nullptr) == 0;
     const std::string report = reportOn(file, isRead);
     if (!isRead) {
-        names_.wallet.failure = report;
         window_.SetMessage("Failed to load the wallet");
         window_.replaceWallet(); // a part of a portfolio would pass for the whole
     }
@@ -165,7 +164,7 @@ void DataFiles::loadWallet(const InputFile& file)
         window_.noteFile(FileKind::kWallet);
 }
 
-std::string DataFiles::reportOn(const InputFile& file, bool isRead) const
+std::string DataFiles::reportOn(const InputFile& file, bool isRead)
 {
     if (isRead && !window_.getWallet()->hasLostRecipient())
         return {};
@@ -177,8 +176,11 @@ std::string DataFiles::reportOn(const InputFile& file, bool isRead) const
         markets = names_.markets.path.isUndefined() ? "the market data here"
                                                     : "the market file " + shownName(fileName(names_.markets.path));
     const std::string text = diagnosis.text(self, markets);
-    // A text on missing names begins with what needs them.
-    return diagnosis.isNameMissing() ? text : self + (isRead ? ": " : " was not loaded: ") + text;
+    const std::string whole = self + (isRead ? ": " : " was not loaded: ") + text;
+    if (!isRead)
+        names_.wallet.failure = whole;
+    // A text on missing names speaks for itself.
+    return diagnosis.isNameMissing() ? text : whole;
 }
 
 void DataFiles::tell(FileKind kind, const std::string& text)

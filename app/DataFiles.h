@@ -61,8 +61,8 @@ private:
     void showFolder(BFilePanel& panel, FileKind kind);
     void loadMarkets(const InputFile& file);
     void loadWallet(const InputFile& file);
-    /// Why a portfolio could not be loaded, or what was lost of it; empty when nothing was.
-    std::string reportOn(const InputFile& file, bool isRead) const;
+    /// Why a portfolio could not be loaded, which is remembered, or what was lost of it; empty when nothing was.
+    std::string reportOn(const InputFile& file, bool isRead);
     /// The notice about the file of that kind, in place of the one before; an empty text only takes that away.
     void tell(FileKind kind, const std::string& text);
     /// Why the file that is remembered must not be written over without asking; empty when it may be.

@@ -214,6 +214,8 @@ TEST_F(FileTest, PortfolioThatCannotBeReadGivesAnEmptyOneAndANoticeOfItsCause)
     answerNextAlert("Continue");
     loadWallet(walletFile());
     EXPECT_THAT(notice(), MatchesRegex("Sample needs .* operations?\\).*; the market file Sample has none of them"));
+    savedTo("btnSavePortoFolio", "");
+    EXPECT_THAT(notice(), MatchesRegex("Save asks for a name: Sample was not loaded: Sample needs .*"));
     loadMarkets(walletFile());
     EXPECT_EQ(message(), "Failed to load the markets");
     EXPECT_EQ(notice(), "Sample was not loaded: this is a portfolio file");
