@@ -293,9 +293,8 @@ void DataFiles::save(const String& path)
     else if (kind == FileKind::kWallet)
         text = wallet != nullptr ? "Wallet successfully saved..." : "No wallet to save...";
     window_.SetMessage(text, result.reason.c_str());
-    if (result.outcome != DurableSave::Outcome::kSaved)
+    if (result.outcome != DurableSave::Outcome::kSaved || names_.of(*kind).path != path)
         return;
-    if (names_.of(*kind).path == path)
-        names_.of(*kind) = {path, result.stamp};
+    names_.of(*kind) = {path, result.stamp};
     window_.noteFile(*kind);
 }
