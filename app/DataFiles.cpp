@@ -5,11 +5,16 @@
 #include "platform/Entry.h"
 #include "platform/Message.h"
 #include "platform/Path.h"
+#include "platform/ShortText.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
+#include "portfolio/WalletDiagnosis.h"
 #include "storage/DurableSave.h"
+#include "storage/Folders.h"
 #include "storage/InputFile.h"
 
+#include <algorithm>
+#include <filesystem>
 #include <stdexcept>
 
 namespace {
@@ -21,6 +26,21 @@ std::unique_ptr<InputFile> openFile(const char* path)
     } catch (const std::runtime_error&) {
         return nullptr; // the caller's message names the path
     }
+}
+
+/// A name for a line of the window, whatever bytes a file has in it.
+std::string shownName(std::string_view name)
+{
+    constexpr std::size_t kLongest = 60;
+    std::string text = shortened(name, kLongest);
+    std::ranges::replace_if(
+        text, [](char c) { return c >= 0 && c < ' '; }, ' ');
+    return text;
+}
+
+std::string fileName(const String& path)
+{
+    return std::filesystem::path(path.getCharacterArray()).filename();
 }
 
 BFilePanel makePanel(file_panel_mode mode, PLWindow& window)
@@ -96,42 +116,111 @@ void DataFiles::load(BMessage* message)
     if (!lock.isHeld())
         return;
     // The portfolio refers to markets and companies by name, so new markets take it along.
+    const bool wasEmpty = isWalletEmpty();
     window_.replaceWallet();
-    if (kind == FileKind::kMarkets)
-        loadMarkets(file->stream(), path.Path());
-    else
-        loadWallet(file->stream(), path.Path());
+    if (kind == FileKind::kWallet)
+        return loadWallet(*file);
+    names_.wallet.isEmptied = names_.wallet.isEmptied || !wasEmpty;
+    tell(FileKind::kWallet, "");
+    loadMarkets(*file);
 }
 
-void DataFiles::loadMarkets(FILE* file, const char* path)
+void DataFiles::loadMarkets(const InputFile& file)
 {
+    names_.markets = {file.path().c_str(), FileStamp::of(fileno(file.stream()))};
     window_.RemoveAllMarkets();
     // The currencies that are here stay, and the file's come behind them. Intended: a file loaded twice has each of its
     // currencies twice.
     const unsigned before = window_.catalogue().getNbrCurrencies();
-    const bool isWhole = window_.catalogue().rd(file) == 0;
+    const bool isWhole = window_.catalogue().rd(file.stream()) == 0;
     window_.showCatalogue(before);
-    // A save must not put what could be read in the place of a damaged file, nor in that of the one loaded before.
-    names_.markets.isAsked = !isWhole;
-    if (isWhole) {
-        names_.markets.path = path;
-        window_.noteFile(FileKind::kMarkets);
-    }
     window_.SetMessage(isWhole ? "Markets successfully loaded..." : "Failed to load the markets");
+    if (isWhole) {
+        window_.noteFile(FileKind::kMarkets);
+    } else {
+        const bool isPartHere = window_.catalogue().getNbrCurrencies() > before;
+        names_.markets.failure = shownName(fileName(names_.markets.path)) +
+                                 (isPartHere ? " was loaded only in part: " : " was not loaded: ") +
+                                 faultOfMarketFile(file.stream(), shownName);
+    }
+    tell(FileKind::kMarkets, names_.markets.failure);
 }
 
-void DataFiles::loadWallet(FILE* file, const char* path)
+void DataFiles::loadWallet(const InputFile& file)
 {
-    if (window_.getWallet()->rd(file, nullptr) != 0) {
+    names_.wallet = {file.path().c_str(), FileStamp::of(fileno(file.stream()))};
+    const bool isRead = window_.getWallet()->rd(file.stream(), nullptr) == 0;
+    const std::string report = reportOn(file, isRead);
+    if (!isRead) {
         window_.SetMessage("Failed to load the wallet");
         window_.replaceWallet(); // a part of a portfolio would pass for the whole
     }
     window_.showWallet();
-    names_.wallet.path = path;
-    window_.noteFile(FileKind::kWallet);
-    // Intended: it follows the failure's message, too, and the path is the failed file's. What a save writes over is
-    // kept among the versions.
+    // Intended: it follows the failure's message, too, and the path is the failed file's. The notice tells what has
+    // happened, and the next save asks for a name.
     window_.SetMessage("Wallet successfully loaded...");
+    tell(FileKind::kWallet, report);
+    if (isRead)
+        window_.noteFile(FileKind::kWallet);
+}
+
+std::string DataFiles::reportOn(const InputFile& file, bool isRead)
+{
+    if (isRead && !window_.getWallet()->hasLostRecipient())
+        return {};
+    const Catalogue& catalogue = window_.catalogue();
+    const WalletDiagnosis diagnosis(file.stream(), catalogue, shownName);
+    const std::string self = shownName(fileName(names_.wallet.path));
+    std::string markets;
+    if (catalogue.getNbrCurrencies() > 0)
+        markets = names_.markets.path.isUndefined() ? "the market data here"
+                                                    : "the market file " + shownName(fileName(names_.markets.path));
+    const std::string text = diagnosis.text(self, markets);
+    const std::string whole = self + (isRead ? ": " : " was not loaded: ") + text;
+    if (!isRead)
+        names_.wallet.failure = whole;
+    // A text on missing names speaks for itself.
+    return diagnosis.isNameMissing() ? text : whole;
+}
+
+void DataFiles::tell(FileKind kind, const std::string& text)
+{
+    const std::string key = kind == FileKind::kMarkets ? "market file" : "portfolio file";
+    if (text.empty())
+        window_.dropNotice(key);
+    else
+        window_.showNotice({key, text, {}, false});
+}
+
+void DataFiles::forgetWallet()
+{
+    names_.wallet = {};
+    tell(FileKind::kWallet, "");
+}
+
+bool DataFiles::isWalletEmpty() const
+{
+    const Wallet* wallet = window_.getWallet();
+    return wallet == nullptr || wallet->getNbrAccounts() + wallet->getNbrShares() == 0;
+}
+
+std::string DataFiles::doubtAbout(FileKind kind) const
+{
+    const Remembered& file = names_.of(kind);
+    const auto stamp = FileStamp::of(file.path.getCharacterArray());
+    if (!stamp)
+        return {}; // it was deleted meanwhile: there is nothing to write over
+    const std::string name = shownName(fileName(file.path));
+    if (!file.failure.empty())
+        return file.failure;
+    if (file.isEmptied && isWalletEmpty()) {
+        const auto saved = openFile(file.path.getCharacterArray());
+        if (saved == nullptr || !isEmptyPortfolioFile(saved->stream()))
+            return "the portfolio is empty since a market file was loaded, and " + name + " is not";
+    }
+    if (file.stamp && file.stamp != stamp)
+        return name + " was changed by another program or window since it was loaded or saved here";
+    return {};
 }
 
 void DataFiles::saveOrAsk()
@@ -139,12 +228,19 @@ void DataFiles::saveOrAsk()
     const auto kind = kindInFront();
     if (!kind)
         return;
-    const Remembered& file = names_.of(*kind);
-    if (!file.path.isUndefined() && !file.isAsked) {
-        save(file.path);
-        return;
+    const String path = names_.of(*kind).path;
+    if (path.isUndefined()) {
+        showFolder(savePanel_, *kind);
+        savePanel_.SetSaveText("");
+    } else {
+        const std::string doubt = doubtAbout(*kind);
+        if (doubt.empty())
+            return save(path);
+        tell(*kind, "Save asks for a name: " + doubt);
+        // The folder, too, is the file's own: Enter and a yes then mean that very file.
+        savePanel_.SetPanelDirectory(folderOf(path.getCharacterArray()).c_str());
+        savePanel_.SetSaveText(fileName(path).c_str());
     }
-    showFolder(savePanel_, *kind);
     savePanel_.Show();
 }
 
@@ -165,8 +261,10 @@ status_t DataFiles::save(BMessage* message)
     const auto kind = kindInFront();
     if (status != B_OK || !kind)
         return status;
-    // Remembered before it is written: after a save that fails, the next one tries the same file again.
+    // Remembered before it is written: after a save that fails, the next one tries the same file again. The name was
+    // given by a person, so whatever was in doubt is settled.
     names_.of(*kind) = {path.Path()};
+    tell(*kind, "");
     save(String(path.Path()));
     return B_OK;
 }
@@ -187,8 +285,6 @@ void DataFiles::save(const String& path)
     };
     // Whatever fails, the path is that of the old file or of the new one, and never of a part.
     const auto result = DurableSave(folder_).save(path.getCharacterArray(), write);
-    if (result.outcome == DurableSave::Outcome::kSaved && path == names_.of(*kind).path)
-        window_.noteFile(*kind);
     const char* text = "Currencies successfully saved...";
     if (result.outcome == DurableSave::Outcome::kOpenFailed)
         text = "Failed to open the file.";
@@ -197,4 +293,8 @@ void DataFiles::save(const String& path)
     else if (kind == FileKind::kWallet)
         text = wallet != nullptr ? "Wallet successfully saved..." : "No wallet to save...";
     window_.SetMessage(text, result.reason.c_str());
+    if (result.outcome != DurableSave::Outcome::kSaved || names_.of(*kind).path != path)
+        return;
+    names_.of(*kind) = {path, result.stamp};
+    window_.noteFile(*kind);
 }

@@ -4,19 +4,24 @@
 #include "foundation/String.h"
 #include "platform/FilePanel.h"
 #include "storage/DataFolder.h"
+#include "storage/FileStamp.h"
 
 #include <cstdio>
 #include <optional>
+#include <string>
 
 class BMessage;
 class BTabView;
+class InputFile;
 class PLWindow;
 
 /// The commands on files: asking for one in a panel, loading and saving it. The tab that is in front decides which kind
 /// of file a command is about.
 ///
-/// Of each kind the file loaded or saved last is remembered, and saved to without asking. A market file of which only a
-/// part could be read is not: the next save of the markets then asks.
+/// Of each kind the file loaded or saved last is remembered, and saved to without asking. Only where that would write
+/// over something by mistake is the name asked for once more, and a notice says why: the load of that file has failed;
+/// the portfolio is empty because a market file was loaded since, and the file's is not; another program or window has
+/// changed the file since.
 class DataFiles {
 public:
     /// The panels open in `folder`, and it keeps the files that are replaced. Window and tabs outlive this.
@@ -26,21 +31,24 @@ public:
     void askForLoad();
     /// The answer of the open panel: loads the file. When it can be opened the portfolio goes, whichever kind it is.
     void load(BMessage* message);
-    /// Saves to the file that is remembered, or shows the save panel.
+    /// Saves to the file that is remembered, or shows the save panel, with the file's name in it when there is one.
     void saveOrAsk();
     /// The answer of the save panel. @return `B_OK`; what is missing in the message.
     status_t save(BMessage* message);
     void save(const String& path);
     /// The next save of the portfolio asks for a name.
-    void forgetWallet() { names_.wallet = {}; }
+    void forgetWallet();
 
     struct Remembered {
-        String path;          ///< undefined before the first file
-        bool isAsked = false; ///< the next save asks for a name, whatever the path
+        String path = {};                    ///< undefined before the first file
+        std::optional<FileStamp> stamp = {}; ///< of the file as it was loaded or saved; nothing when that is not known
+        std::string failure = {};            ///< why it could not be loaded; empty when it could
+        bool isEmptied = false;              ///< the portfolio was thrown away by a market file
 
+        /// The same file, in the same trouble.
         bool operator==(const Remembered& other) const
         {
-            return path.bytes() == other.path.bytes() && isAsked == other.isAsked;
+            return path.bytes() == other.path.bytes() && failure == other.failure && isEmptied == other.isEmptied;
         }
     };
     /// The file of each kind that was loaded or saved last.
@@ -61,8 +69,15 @@ private:
     std::optional<FileKind> kindInFront() const;
     /// Has the panel open in the folder of that kind.
     void showFolder(BFilePanel& panel, FileKind kind);
-    void loadMarkets(std::FILE* file, const char* path);
-    void loadWallet(std::FILE* file, const char* path);
+    void loadMarkets(const InputFile& file);
+    void loadWallet(const InputFile& file);
+    /// Why a portfolio could not be loaded, which is remembered, or what was lost of it; empty when nothing was.
+    std::string reportOn(const InputFile& file, bool isRead);
+    /// The notice about the file of that kind, in place of the one before; an empty text only takes that away.
+    void tell(FileKind kind, const std::string& text);
+    /// Why the file that is remembered must not be written over without asking; empty when it may be.
+    std::string doubtAbout(FileKind kind) const;
+    bool isWalletEmpty() const;
 
     PLWindow& window_;
     const BTabView& tabs_;

@@ -68,6 +68,10 @@ void History::note(Moment now, const DataFiles::Names& names, const std::string&
     entries_.push_back(std::move(entry));
     ++now_;
     ++serial_;
+    // A file that could not be loaded: changes are counted from here.
+    for (const FileKind kind : kKinds)
+        if (!marks_.contains({kind, pathOf(kind)}))
+            noteFile(kind);
     forgetOldest();
 }
 

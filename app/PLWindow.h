@@ -43,6 +43,9 @@ public:
     /// Loads the file that the open panel was left with.
     virtual void RefsReceived(BMessage* message) { files_->load(message); }
 
+    /// What is here of that kind is what its file has: it was just loaded or saved.
+    void noteFile(FileKind) {}
+
     /// Shows `text` in the status line, at once; `toolTip` says more of it.
     void SetMessage(const char* text, const char* toolTip = "");
     /// Shows `notice` in the line above the status line, or lets it wait until those before it are dismissed.

@@ -122,8 +122,9 @@ void PLWindow::ChangeParameter(uint32 code)
     const auto parameter = ParameterView::parameterOf(code);
     if (!parameter)
         return;
-    wallet_->setParameter(*parameter, parameterView_->getParameter(*parameter));
-    showParameters(); // what was understood, in place of what was typed
+    const float value = parameterView_->getParameter(*parameter);
+    wallet_->setParameter(*parameter, value);
+    parameterView_->setParameter(*parameter, value); // what was understood, in place of what was typed
     if (ParameterView::revalues(*parameter))
         UpdateState();
     else

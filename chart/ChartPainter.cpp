@@ -2,6 +2,7 @@
 
 #include "chart/ColumnReduction.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace {
@@ -57,20 +58,14 @@ void ChartPainter::drawNotice(const char* text, BPoint where, float size)
 
 void ChartPainter::drawChart(const ChartLayout& layout, const std::vector<ChartSeries>& series)
 {
-    using Shape = ChartSeries::Shape;
-    const auto drawAll = [&series](Shape shape, const auto& draw) {
-        for (const ChartSeries& one : series)
-            if (one.shape == shape)
-                draw(one);
-    };
-    // From back to front. Polygons lie below the axes, and lines above both.
+    // The elements keep their order: a later one covers an earlier one, whatever the two are.
+    const auto isPolygon = [](const ChartSeries& one) { return one.shape == ChartSeries::Shape::kPolygon; };
+    const auto front = std::ranges::find_if_not(series, isPolygon);
+    const auto draw = [&](const ChartSeries& one) { drawElement(one, layout.scale); };
     drawGrid(layout);
-    drawAll(Shape::kPolygon, [&](const ChartSeries& one) { drawPolygon(one, layout.scale); });
+    std::for_each(series.begin(), front, draw);
     drawAxes(layout);
-    drawAll(Shape::kLine, [&](const ChartSeries& one) { drawLine(one, layout.scale); });
-    drawAll(Shape::kPoint, [&](const ChartSeries& one) {
-        fillDisc(layout.scale.pixel(one.points.front()), discRadius(one.penSize), one.color);
-    });
+    std::for_each(front, series.end(), draw);
     for (const ChartMark& mark : layout.marks)
         // Above all lines, since they are about the values themselves. The texts come last: nothing covers them.
         drawMark(mark);
@@ -132,6 +127,18 @@ void ChartPainter::drawAxes(const ChartLayout& layout)
     for (const float y : layout.rows)
         view_.AddLine({plot.left - kTickLength, y}, {plot.left, y}, axis_);
     view_.EndLineArray();
+}
+
+void ChartPainter::drawElement(const ChartSeries& series, const ChartScale& scale)
+{
+    switch (series.shape) {
+    case ChartSeries::Shape::kLine:
+        return drawLine(series, scale);
+    case ChartSeries::Shape::kPolygon:
+        return drawPolygon(series, scale);
+    case ChartSeries::Shape::kPoint:
+        return fillDisc(scale.pixel(series.points.front()), discRadius(series.penSize), series.color);
+    }
 }
 
 void ChartPainter::drawPolygon(const ChartSeries& series, const ChartScale& scale)

@@ -13,7 +13,8 @@ public:
     void fillBackground();
     /// A text in place of a chart.
     void drawNotice(const char* text, BPoint where, float size);
-    /// From back to front: grid, polygons, axes, lines, points, lowest and highest value, texts.
+    /// From back to front: grid, the elements in the order of `series`, lowest and highest value, texts. The axes come
+    /// before the first element that is no polygon: areas behind all else lie below them.
     void drawChart(const ChartLayout& layout, const std::vector<ChartSeries>& series);
     /// A frame around the chart that has the keyboard.
     void drawFocus();
@@ -22,6 +23,7 @@ public:
 private:
     void drawGrid(const ChartLayout& layout);
     void drawAxes(const ChartLayout& layout);
+    void drawElement(const ChartSeries& series, const ChartScale& scale);
     void drawPolygon(const ChartSeries& series, const ChartScale& scale);
     void drawLine(const ChartSeries& series, const ChartScale& scale);
     void drawMark(const ChartMark& mark);

@@ -117,7 +117,7 @@ void GraphView::askForPictureFile()
     constexpr std::size_t kLongest = 200; // bytes; the name of a file has 255
     name.resize(wholeCharacters(name, kLongest));
     std::replace(name.begin(), name.end(), '/', '-');
-    savePanel_->SetSaveText(((name.empty() ? "Chart" : name) + ".png").c_str());
+    savePanel_->SetSaveText(((name.empty() ? "Chart" : name) + ".png").c_str(), "png");
     savePanel_->Show();
 }
 

@@ -35,8 +35,10 @@ public:
     /// Without it the panel begins in the person's home folder.
     void SetPanelDirectory(const char* path);
     const std::string& PanelDirectory() const { return directory_; }
-    /// The name that a save panel comes up with. Its ending is added to a name that is typed without one.
-    void SetSaveText(const char* text) { saveText_ = text; }
+    /// The name that a save panel comes up with, none when it is empty. `ending` is added to a name that is typed
+    /// without one, unless it is empty.
+    void SetSaveText(const char* text, const char* ending = "");
+    const std::string& SaveText() const { return saveText_; }
     void Show();
 
 private:
@@ -48,6 +50,7 @@ private:
     BMessenger target_;
     std::string directory_;
     std::string saveText_;
+    std::string saveEnding_;
     std::unique_ptr<BMessage> message_;
     bool modal_;
     std::unique_ptr<QFileDialog> dialog_; // made when first shown: that takes its time

@@ -96,7 +96,7 @@ int Account::writeTransferOperations(FILE* file) const
     return 0;
 }
 
-int Account::readTransferOperations(FILE* file)
+int Account::readTransferOperations(FILE* file, bool* hasLostRecipient)
 {
     // The turns are good for one reading: the account keeps none of them from here on.
     const std::vector<std::uint32_t> turns = std::move(transferTurns_);
@@ -106,13 +106,17 @@ int Account::readTransferOperations(FILE* file)
         auto transfer = std::make_unique<TransferAccountOperation>();
         // It stands behind the operations of its day now, and is given back the place that its letter had.
         transfer->setAccount(this);
-        if (next < turns.size())
+        const bool isListed = next < turns.size(); // the account's own record has a letter for it
+        if (isListed)
             operations_.setTurn(transfer.get(), turns[next++]);
         const int result = transfer->rd(file);
+        if (result != 0 && reachedEnd(file))
+            return -1;
         // The account owns it. Intended: a transfer to an unknown account is not dropped either, the person shall see
         // that it is there.
-        if (result == 0 || !reachedEnd(file))
-            transfer.release();
+        transfer.release();
+        if (result != 0 && isListed && hasLostRecipient != nullptr)
+            *hasLostRecipient = true;
         return result;
     });
 }

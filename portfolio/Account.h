@@ -25,9 +25,11 @@ public:
     int rd(FILE* file) override;
     /// The transfer block: number of transfers sent, then their bodies in the order of their letters.
     int writeTransferOperations(FILE* file) const;
+    /// @param hasLostRecipient becomes true at a transfer, one of those that the account has letters for, whose
+    /// recipient is unknown; may be null.
     /// @return 0; -1 at a transfer whose recipient is unknown, which stays as a new one without recipient, and when
     /// the file ends inside the block. All accounts of the wallet have been read before.
-    int readTransferOperations(FILE* file);
+    int readTransferOperations(FILE* file, bool* hasLostRecipient = nullptr);
 
     const String& getName() const { return name_; }
     void setName(const String& name) { name_ = name; }

@@ -30,10 +30,11 @@ public:
     /// Replaces the content by the file's. Markets and currencies have been set before. `*stamp` becomes the date at
     /// the head of the file; `stamp` may be null.
     /// @return 0; -1 at a company, currency or holding that is not known, and at the end of the file: what was read
-    /// whole before that stays. The unknown company is reported on standard output.
+    /// whole before that stays. The unknown company is reported on standard output. A transfer that has lost its
+    /// recipient is no failure, even when what is read out of place behind it meets the end.
     int rd(FILE* file, Date* stamp);
-    /// The ticker or currency name for which the last `rd` failed; undefined when that was not the reason.
-    const String& getUnknownName() const { return unknownName_; }
+    /// Whether the last `rd` met a transfer to an account that the file does not have; `WalletDiagnosis` tells which.
+    bool hasLostRecipient() const { return hasLostRecipient_; }
 
     int addAccount(Account* account) { return accounts_.add(account); }
     int removeAccount(Account* account) { return accounts_.remove(account); }
@@ -138,7 +139,7 @@ private:
     std::vector<Market*> markets_;      // not owned
     std::vector<Currency*> currencies_; // not owned
     WalletNames* names_ = nullptr;      // only while a file is read
-    String unknownName_;
+    bool hasLostRecipient_ = false;
 
     // By number. The period is a whole number of 16 bits, which a float holds exactly; the two lose rates are equal, so
     // that by default the loss limit stands still.

@@ -49,17 +49,17 @@ int Wallet::rd(FILE* file, Date* stamp)
     names_ = &names;
     const bool isRead = readShares(file) == 0 && readAccounts(file) == 0;
     // Intended: a transfer to an unknown account does not fail the file, so that a portfolio that names an account it
-    // no longer has still opens; what follows is then read out of place.
+    // no longer has still opens; what follows is then read out of place, and may well meet the end.
+    hasLostRecipient_ = false;
     if (isRead)
         for (Account* account : accounts())
-            account->readTransferOperations(file);
+            account->readTransferOperations(file, &hasLostRecipient_);
     // The names may change again from here on, which the index would not see.
     names_ = nullptr;
-    unknownName_ = isRead ? String() : names.getUnknown();
     if (!isRead)
         return -1;
     readParameters(file);
-    return reachedEnd(file) ? -1 : 0;
+    return reachedEnd(file) && !hasLostRecipient_ ? -1 : 0;
 }
 
 int Wallet::readShares(FILE* file)
@@ -115,9 +115,11 @@ void Wallet::writeParameters(FILE* file) const
 
 void Wallet::readParameters(FILE* file)
 {
-    for (int i = 0; i < kParameterCount; ++i)
-        if (i == kInvestementPeriod)
-            setInvestementPeriod(static_cast<short>(freadshort(file)));
-        else
-            parameters_[static_cast<std::size_t>(i)] = freadfloat(file);
+    for (int i = 0; i < kParameterCount; ++i) {
+        const float value = i == kInvestementPeriod ? static_cast<short>(freadshort(file)) : freadfloat(file);
+        // A portfolio that was read out of place has to be of use without the parameters that the end has cost it.
+        if (reachedEnd(file))
+            return;
+        parameters_[static_cast<std::size_t>(i)] = value;
+    }
 }

@@ -55,29 +55,26 @@ int WalletNames::find(const Map<T>& map, const String& market, const String& nam
     // The views live as long as this call, which is all that a search needs; the keys in the map refer to names that
     // stay.
     const auto found = canMatch ? map.find({market.comparedBytes(), name.comparedBytes()}) : map.end();
-    // The wallet reports the name that was looked for last without success as the reason of a failed read.
     *out = found != map.end() ? found->second : nullptr;
-    if (*out == nullptr)
-        unknown_ = name;
     return *out != nullptr ? 0 : -1;
 }
 
-int WalletNames::getCompany(const String& market, const String& abbreviation, Company** out)
+int WalletNames::getCompany(const String& market, const String& abbreviation, Company** out) const
 {
     return find(companies_, market, abbreviation, out);
 }
 
-int WalletNames::getShare(const String& market, const String& abbreviation, Share** out)
+int WalletNames::getShare(const String& market, const String& abbreviation, Share** out) const
 {
     return find(shares_, market, abbreviation, out);
 }
 
-int WalletNames::getCurrency(const String& name, Currency** out)
+int WalletNames::getCurrency(const String& name, Currency** out) const
 {
     return find(currencies_, kNoMarket, name, out);
 }
 
-Account* WalletNames::getAccount(const String& name)
+Account* WalletNames::getAccount(const String& name) const
 {
     Account* account = nullptr;
     find(accounts_, kNoMarket, name, &account);

@@ -26,14 +26,11 @@ public:
     void add(Account* account);
 
     /// @return 0; -1 and a null `*out` when there is none.
-    int getCurrency(const String& name, Currency** out);
-    int getCompany(const String& market, const String& abbreviation, Company** out);
-    int getShare(const String& market, const String& abbreviation, Share** out);
+    int getCurrency(const String& name, Currency** out) const;
+    int getCompany(const String& market, const String& abbreviation, Company** out) const;
+    int getShare(const String& market, const String& abbreviation, Share** out) const;
     /// Null when there is none.
-    Account* getAccount(const String& name);
-
-    /// The ticker or name that a look-up did not find last; undefined when all were found.
-    const String& getUnknown() const { return unknown_; }
+    Account* getAccount(const String& name) const;
 
 private:
     /// Market and ticker; of what stands in no market only the name.
@@ -46,11 +43,10 @@ private:
 
     static Key keyOf(const Market& market, const Company& company);
     template <class T>
-    int find(const Map<T>& map, const String& market, const String& name, T** out);
+    static int find(const Map<T>& map, const String& market, const String& name, T** out);
 
     Map<Company> companies_;
     Map<Share> shares_;
     Map<Currency> currencies_;
     Map<Account> accounts_;
-    String unknown_;
 };

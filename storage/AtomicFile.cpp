@@ -226,6 +226,11 @@ void AtomicFile::flush()
     flushed_ = true;
 }
 
+std::optional<FileStamp> AtomicFile::stamp() const
+{
+    return FileStamp::of(fileno(stream_));
+}
+
 bool AtomicFile::replaces() const
 {
     struct stat status;

@@ -1,6 +1,9 @@
 #pragma once
 
+#include "storage/FileStamp.h"
+
 #include <cstdio>
+#include <optional>
 #include <stdexcept>
 #include <string>
 
@@ -50,6 +53,9 @@ public:
     /// may set them. Nothing may be written afterwards. For work that must wait until the contents are safe, and come
     /// before the commit.
     void flush();
+    /// What tells the new file from all others, once it is flushed: a rename changes nothing of it. Comes before the
+    /// commit, because afterwards another program may have put its own in the place.
+    std::optional<FileStamp> stamp() const;
     /// Whether there is a file now that the commit would replace. Throws a WriteError when that cannot be told.
     bool replaces() const;
     /// Flushes unless that is done, and gives the contents their name.

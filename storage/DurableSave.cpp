@@ -74,7 +74,7 @@ DurableSave::Result failed(DurableSave::Outcome outcome, std::string reason)
     // File names may contain anything.
     std::ranges::replace_if(
         reason, [](char c) { return c >= 0 && c < ' '; }, ' ');
-    return {outcome, reason};
+    return {outcome, reason, std::nullopt};
 }
 
 } // namespace
@@ -84,11 +84,10 @@ DurableSave::Result DurableSave::save(const std::string& path, const Writer& wri
     // For as long as the save lasts, and for the device as well.
     const SizeSignalIgnored ignored;
     try {
-        if (isDevice(path))
-            writeDevice(path, write);
-        else
-            replace(path, write);
-        return {Outcome::kSaved, ""};
+        if (!isDevice(path))
+            return {Outcome::kSaved, "", replace(path, write)};
+        writeDevice(path, write);
+        return {Outcome::kSaved, "", std::nullopt};
     } catch (const AtomicFile::OpenError& error) {
         return failed(Outcome::kOpenFailed, error.what());
     } catch (const std::runtime_error& error) {
@@ -96,17 +95,18 @@ DurableSave::Result DurableSave::save(const std::string& path, const Writer& wri
     }
 }
 
-void DurableSave::replace(const std::string& path, const Writer& write) const
+std::optional<FileStamp> DurableSave::replace(const std::string& path, const Writer& write) const
 {
     AtomicFile file(path, AtomicFile::Existing::kReplace);
     fill(file.stream(), path, write);
     // The old file is kept only when it is sure to be replaced, and as late as possible.
     file.flush();
+    const auto stamp = file.stamp();
     const SaveLock lock(file.target(), folder_, patience_);
     // Asked under the lock: another program may have made the file since this save began.
     if (!file.replaces()) {
         file.commit();
-        return;
+        return stamp;
     }
     // Before: the old file has its name and nobody else saves here. After `keep` it has a second name, in Backups,
     // which survives the commit.
@@ -120,4 +120,5 @@ void DurableSave::replace(const std::string& path, const Writer& write) const
         throw;
     }
     versions.prune(file.target(), version);
+    return stamp;
 }

@@ -1,10 +1,12 @@
 #pragma once
 
+#include "storage/FileStamp.h"
 #include "storage/KeptVersions.h"
 #include "storage/SaveLock.h"
 
 #include <cstdio>
 #include <functional>
+#include <optional>
 #include <string>
 
 /// Saves a file so that a crash, a full disk or a pulled plug at any moment leaves the old file or the new one, whole,
@@ -20,7 +22,8 @@ public:
     enum class Outcome { kSaved, kOpenFailed, kWriteFailed };
     struct Result {
         Outcome outcome;
-        std::string reason; // one line for the user, with the file's path; empty when it is saved
+        std::string reason;             // one line for the user, with the file's path; empty when it is saved
+        std::optional<FileStamp> stamp; // of the new file; nothing when it is not saved, and for a device
     };
     /// Writes the contents, perhaps none. @return 0, or -1 when that failed.
     using Writer = std::function<int(FILE*)>;
@@ -37,7 +40,7 @@ public:
 private:
     static constexpr SaveLock::Patience kPatience{10000}; // longer than a slow disk takes to copy a large file
 
-    void replace(const std::string& path, const Writer& write) const;
+    std::optional<FileStamp> replace(const std::string& path, const Writer& write) const;
 
     DataFolder folder_;
     SaveLock::Patience patience_;

@@ -147,10 +147,11 @@ private:
             const Share* share = state->share();
             const String& symbol = state->getCurrencyRepresentation();
             const bool isHeld = state->isHeld();
+            const auto gain = state->gain();
             table.addRow({plain(state->getCompanyName()), plain(state->getCompanyAbbreviation()),
                           share != nullptr ? plain(share->getMarketName()) : "", countText(state->getQuantity()),
                           isHeld ? amountText(state->getBuyQuote()) : "", amountText(state->getQuote()), plain(symbol),
-                          isHeld ? changeText(state->gain()) : "", isHeld ? inReference(state->worth(), symbol) : "",
+                          gain ? changeText(*gain) : "", isHeld ? inReference(state->worth(), symbol) : "",
                           isHeld ? dateText(state->getEndDate()) : ""});
         }
         return table.isEmpty() ? "" : '\n' + table.toString();

@@ -1,15 +1,11 @@
 #include "tools/Valuation.h"
 
-#include "foundation/FieldIO.h"
-#include "portfolio/Account.h"
-#include "portfolio/TransferAccountOperation.h"
+#include "portfolio/WalletDiagnosis.h"
 #include "storage/InputFile.h"
 #include "tools/TextTable.h"
 #include "valuation/State.h"
 
 #include <algorithm>
-#include <cerrno>
-#include <cstring>
 #include <stdexcept>
 
 namespace {
@@ -17,23 +13,6 @@ namespace {
 [[noreturn]] void failFor(const std::string& path, const std::string& reason)
 {
     throw std::runtime_error(path + ": " + reason);
-}
-
-/// For a file whose reading has failed: by itself, at its end, or else for `otherwise`.
-[[noreturn]] void failReading(const InputFile& file, const char* kind, const std::string& otherwise)
-{
-    // The order matters: an error of the disk also counts as an end. Only when there was neither is it the contents
-    // that the reader has refused.
-    if (std::ferror(file.stream()) != 0)
-        failFor(file.path(), std::string("cannot be read: ") + std::strerror(errno));
-    if (reachedEnd(file.stream()))
-        failFor(file.path(), std::string("ends too early; it is cut short or not a ") + kind + " file");
-    failFor(file.path(), otherwise);
-}
-
-std::string quoted(const String& name)
-{
-    return '"' + printable(name.bytes()) + '"';
 }
 
 } // namespace
@@ -50,7 +29,7 @@ void Valuation::readMarket()
 {
     const InputFile file(marketPath_);
     if (catalogue_.rd(file.stream()) != 0)
-        failReading(file, "market", "is damaged: it has the reference currency over and over");
+        failFor(marketPath_, faultOfMarketFile(file.stream(), printable));
     // The wallet keeps copies of the lists, so they are set when the catalogue is whole.
     wallet_.setCatalogue(catalogue_);
 }
@@ -58,15 +37,14 @@ void Valuation::readMarket()
 void Valuation::readPortfolio()
 {
     const InputFile file(portfolioPath_);
-    if (wallet_.rd(file.stream(), nullptr) == 0)
+    const bool isRead = wallet_.rd(file.stream(), nullptr) == 0;
+    if (isRead && !wallet_.hasLostRecipient())
         return;
-    // A transfer that leads nowhere puts what follows out of place, so that the failure lies there and not where it
-    // showed.
-    if (!doubt().empty())
-        throw std::runtime_error(doubt());
-    failReading(file, "portfolio",
-                "names " + quoted(wallet_.getUnknownName()) +
-                    ", which is no company or currency of the market file, or none of its own holdings");
+    const WalletDiagnosis diagnosis(file.stream(), catalogue_, printable);
+    const std::string reason = diagnosis.text("the portfolio", "the market file " + marketPath_);
+    if (!isRead)
+        failFor(portfolioPath_, reason);
+    doubt_ = portfolioPath_ + ": " + reason;
 }
 
 void Valuation::compute(const Date& date, bool previsions, bool evolution)
@@ -97,25 +75,4 @@ void Valuation::checkOutcome(EvolutionOutcome outcome) const
         failFor(portfolioPath_, start + ", which is no day of the calendar");
     const std::string days = std::to_string(state_->getDate() - state_->getFirstOperationDate());
     failFor(portfolioPath_, start + ": too many days (" + days + ") for its accounts and holdings");
-}
-
-/// The account of a transfer without recipient. No wallet has such a transfer but by an unknown name in its file.
-const Account* Valuation::senderToNowhere() const
-{
-    for (const Account* account : wallet_.accounts())
-        for (const Operation* operation : account->operations()) {
-            const auto* transfer = dynamic_cast<const TransferAccountOperation*>(operation);
-            if (transfer != nullptr && transfer->recipient() == nullptr)
-                return account;
-        }
-    return nullptr;
-}
-
-std::string Valuation::doubt() const
-{
-    const Account* sender = senderToNowhere();
-    if (sender == nullptr)
-        return {};
-    return portfolioPath_ + ": a transfer from " + quoted(sender->getName()) +
-           " goes to an account that the file does not have; what follows it is read out of place";
 }

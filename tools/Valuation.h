@@ -31,16 +31,16 @@ public:
     const std::vector<EvolutionPoint>& evolution() const { return evolution_; }
 
     /// One line on a portfolio file that could be read but cannot be right; empty without a doubt.
-    std::string doubt() const;
+    const std::string& doubt() const { return doubt_; }
 
 private:
     void readMarket();
     void readPortfolio();
     void checkOutcome(EvolutionOutcome outcome) const;
-    const Account* senderToNowhere() const;
 
     std::string marketPath_;
     std::string portfolioPath_;
+    std::string doubt_;
     Catalogue catalogue_; // outlives the wallet, which refers to it
     Wallet wallet_;
     const State* state_ = nullptr; // owned by the wallet

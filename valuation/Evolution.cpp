@@ -38,8 +38,12 @@ State* refreshStates(Wallet& wallet, const Date& date, bool previsions, Evolutio
         return nullptr;
     // The current state comes first in the wallet's list; the days of the evolution stand behind it.
     auto* current = new State(&wallet, date, previsions); // owned by the wallet
-    if (outcome != nullptr)
-        *outcome = buildDailyStates(wallet, current->getFirstOperationDate(), date);
+    if (outcome == nullptr)
+        return current;
+    *outcome = buildDailyStates(wallet, current->getFirstOperationDate(), date);
+    // Daily states would have removed them. A save must not make transfers real that nobody has ordered.
+    if (*outcome != EvolutionOutcome::kBuilt)
+        wallet.removeAutomaticOperations();
     return current;
 }
 

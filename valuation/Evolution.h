@@ -17,7 +17,8 @@ enum class EvolutionOutcome {
 
 /// Recomputes the states of `wallet`: destroys all of them, builds the current one for `date`, with automatic sales
 /// when `previsions` is set, and, when `outcome` is given, the daily ones of the evolution behind it. The daily states
-/// remove the automatic operations of the accounts again, as every state does.
+/// remove the automatic operations of the accounts again, as every state does; an evolution that is refused does so,
+/// too.
 /// @return the current state, owned by the wallet; null when `date` is undefined.
 State* refreshStates(Wallet& wallet, const Date& date, bool previsions, EvolutionOutcome* outcome);
 

@@ -72,6 +72,14 @@ QuoteBasis ShareState::quoteBasis() const
             quoted.isUndefined() ? company->getFirstQuote() : quoted};
 }
 
+std::optional<double> ShareState::gain() const
+{
+    const Company* company = share() != nullptr ? share()->company() : nullptr;
+    if (!isHeld() || getBuyQuote() == 0 || company == nullptr || company->getNbrQuotes() == 0)
+        return std::nullopt;
+    return static_cast<double>(quote_) / getBuyQuote() - 1;
+}
+
 Date ShareState::getDate() const
 {
     return state() != nullptr ? state()->getDate() : Date();

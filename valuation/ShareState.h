@@ -7,6 +7,8 @@
 #include "valuation/SharedHolding.h"
 #include "valuation/StateLinks.h"
 
+#include <optional>
+
 class Account;
 
 /// What the quote of a holding rests on, on the day of its state.
@@ -39,9 +41,9 @@ public:
     QuoteBasis quoteBasis() const;
     /// Quantity times quote.
     double worth() const { return static_cast<double>(quote_) * holding_->quantity; }
-    /// Change from the average purchase price to the quote, a fraction; -1 without any quote, not finite when the
-    /// purchase price is 0.
-    double gain() const { return static_cast<double>(quote_) / holding_->buyQuote - 1; }
+    /// Change from the average purchase price to the quote, a fraction. Nothing where that says nothing: nothing is
+    /// held, the company has no quote, or the purchase price is 0.
+    std::optional<double> gain() const;
     /// End of the investment horizon, undefined before the first purchase.
     Date getEndDate() const { return holding_->endDate.date(); }
     /// The state's day, undefined without a state.

@@ -80,6 +80,33 @@ float number(const std::string& token, double unit)
     return static_cast<float>(std::clamp(std::strtod(token.c_str(), nullptr) / unit, -kLargest, kLargest));
 }
 
+float readAs(Kind kind, const std::string& text)
+{
+    // A person may leave the unit in the field, take it out or type another: it is skipped.
+    const std::string token = firstToken(text, kind == Kind::kRate);
+    if (kind != Kind::kDays)
+        return number(token, kind == Kind::kRate ? 100 : 1);
+    // A whole number ends at the first character that is no digit, so "90.7" is 90.
+    constexpr long kShortest = std::numeric_limits<short>::min();
+    constexpr long kLongest = std::numeric_limits<short>::max();
+    return static_cast<float>(std::clamp(std::strtol(token.c_str(), nullptr, 10), kShortest, kLongest));
+}
+
+/// With two decimals, or as many more as the text needs to be read back to `value`: Enter in a field that nobody has
+/// typed in must not change the number.
+std::string textOf(float value, Kind kind)
+{
+    constexpr int kMostDecimals = 60; // more than the smallest float needs
+    const bool isRate = kind == Kind::kRate;
+    for (int decimals = kind == Kind::kDays ? 0 : 2;; ++decimals) {
+        char text[kMostDecimals + 60]; // the largest float has 39 digits before the point
+        std::snprintf(text, sizeof text, isRate ? "%.*f %%" : "%.*f", decimals, isRate ? value * 100.0 : value);
+        // What is no number, from a damaged file, has no text that reads back.
+        if (readAs(kind, text) == value || decimals == kMostDecimals)
+            return text;
+    }
+}
+
 } // namespace
 
 ParameterView::ParameterView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
@@ -128,28 +155,11 @@ bool ParameterView::revalues(Wallet::Parameter parameter)
 
 void ParameterView::setParameter(Wallet::Parameter parameter, float value)
 {
-    const Kind kind = kPlan[parameter].kind;
-    constexpr std::size_t kLongest = 60; // the largest float has 39 digits before the point
-    char text[kLongest];
-    if (kind == Kind::kDays)
-        std::snprintf(text, sizeof text, "%.0f", static_cast<double>(value));
-    else if (kind == Kind::kRate)
-        std::snprintf(text, sizeof text, "%.2f %%", value * 100.0);
-    else
-        std::snprintf(text, sizeof text, "%.2f", static_cast<double>(value));
     // This is not typing: no message is sent, and nothing is stored in the wallet.
-    fields_[parameter]->SetText(text);
+    fields_[parameter]->SetText(textOf(value, kPlan[parameter].kind).c_str());
 }
 
 float ParameterView::getParameter(Wallet::Parameter parameter) const
 {
-    const Kind kind = kPlan[parameter].kind;
-    // A person may leave the unit in the field, take it out or type another: it is skipped.
-    const std::string token = firstToken(fields_[parameter]->Text(), kind == Kind::kRate);
-    if (kind != Kind::kDays)
-        return number(token, kind == Kind::kRate ? 100 : 1);
-    // A whole number ends at the first character that is no digit, so "90.7" is 90.
-    constexpr long kShortest = std::numeric_limits<short>::min();
-    constexpr long kLongest = std::numeric_limits<short>::max();
-    return static_cast<float>(std::clamp(std::strtol(token.c_str(), nullptr, 10), kShortest, kLongest));
+    return readAs(kPlan[parameter].kind, fields_[parameter]->Text());
 }

@@ -77,11 +77,8 @@ Cell value(const Item& item)
 
 Cell gain(const Item& item)
 {
-    const ShareState& state = *item.object();
-    // Without a buy quote there is nothing to compare with.
-    if (!item.basis().isKnown || state.getBuyQuote() == 0 || !state.isHeld())
-        return {};
-    return {changeText(state.gain()), state.gain() < 0 ? look::kLoss : look::kGain};
+    const auto gain = item.object()->gain();
+    return gain ? Cell{changeText(*gain), *gain < 0 ? look::kLoss : look::kGain} : Cell();
 }
 
 /// `text` of a holding that there is still something of.

@@ -57,6 +57,12 @@ void BFilePanel::SetPanelDirectory(const char* path)
         dialog_->setDirectory(QString::fromUtf8(path));
 }
 
+void BFilePanel::SetSaveText(const char* text, const char* ending)
+{
+    saveText_ = text;
+    saveEnding_ = ending;
+}
+
 void BFilePanel::Show()
 {
     if (const auto& answer = DialogAnswers::current().panel) {
@@ -68,10 +74,12 @@ void BFilePanel::Show()
     // The kit remembers the folder and the dialog does not: from here on it shows what the kit has.
     QFileDialog& shown = dialog();
     shown.setDirectory(directory_.empty() ? QDir::homePath() : QString::fromStdString(directory_));
-    if (!saveText_.empty()) {
-        const QString name = QString::fromStdString(saveText_);
-        shown.setDefaultSuffix(QFileInfo(name).suffix());
-        shown.selectFile(name);
+    if (mode_ == B_SAVE_PANEL) {
+        shown.setDefaultSuffix(QString::fromStdString(saveEnding_));
+        // The name of the last time may be that of another file.
+        if (auto* field = shown.findChild<QLineEdit*>("fileNameEdit"))
+            field->clear();
+        shown.selectFile(QString::fromStdString(saveText_));
     }
     shown.show();
     shown.raise();

@@ -114,4 +114,21 @@ TEST_F(GraphViewTest, CoversWithAlpha0AndLetsShineThroughBetween)
     EXPECT_EQ(colorAt(image(), 6.5, 2.2), QColor(kColor.red, kColor.green, kColor.blue));
 }
 
+TEST_F(GraphViewTest, LaterElementsCoverEarlierOnesWhateverTheyAre)
+{
+    GraphPolygon cover;
+    cover.setColor({0, 255, 0, 255});
+    view_.addGraphElement(&cover);
+    auto* point = new GraphPoint(8, 1);
+    point->setColor(kColor);
+    view_.addGraphElement(point);
+    fill(line_, {{0, 0}, {2, 1}, {10, 1}});
+    fill(cover, {{5, 0.5}, {10, 0.5}, {10, 3}, {5, 3}});
+    const QImage drawn = image();
+    const QColor color(kColor.red, kColor.green, kColor.blue);
+    EXPECT_EQ(colorAt(drawn, 4, 1), color);
+    EXPECT_EQ(colorAt(drawn, 6.5, 1), QColor(0, 255, 0)) << "the polygon came after the line";
+    EXPECT_EQ(colorAt(drawn, 8, 1), color) << "and the point after the polygon";
+}
+
 } // namespace

@@ -2,6 +2,7 @@
 // is written of it reads back to the same bytes.
 
 #include "market/CompanyEvent.h"
+#include "market/MarketDiagnosis.h"
 #include "tests/fuzz/Require.h"
 #include "tests/support/Bytes.h"
 #include "tests/support/SmallPortfolio.h"
@@ -92,7 +93,9 @@ void checkRereading(const Catalogue& catalogue)
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
     Catalogue catalogue;
-    catalogue.rd(BytesFile(std::string(reinterpret_cast<const char*>(data), size)));
+    const BytesFile file(std::string(reinterpret_cast<const char*>(data), size));
+    catalogue.rd(file);
+    faultOfMarketFile(file, [](std::string_view name) { return std::string(name); });
     checkRereading(catalogue);
     askEverything(catalogue);
     if (catalogue.getNbrCurrencies() > 0) {

@@ -1,6 +1,8 @@
 // Any bytes as a portfolio file: the reader neither crashes nor hangs, the portfolio can be valued whatever is in it,
-// the days of its evolution equal full replays, and what is written of it reads back to the same bytes.
+// the days of its evolution equal full replays, what is written of it reads back to the same bytes, and the cause of a
+// failed read can be told.
 
+#include "portfolio/WalletDiagnosis.h"
 #include "tests/fuzz/FuzzedPortfolio.h"
 #include "tests/fuzz/Require.h"
 #include "tests/support/Bytes.h"
@@ -92,7 +94,10 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     FuzzedPortfolio p;
     Wallet& wallet = p.wallet;
     const Catalogue& catalogue = p.catalogue;
-    wallet.rd(BytesFile(std::string(reinterpret_cast<const char*>(data), size)), nullptr);
+    const BytesFile file(std::string(reinterpret_cast<const char*>(data), size));
+    const bool isRead = wallet.rd(file, nullptr) == 0;
+    const WalletDiagnosis diagnosis(file, catalogue, [](std::string_view name) { return std::string(name); });
+    require(!isRead || !diagnosis.isNameMissing(), "no name is missing in what could be read");
     const std::string bytes = writtenForReading(wallet);
     if (!bytes.empty())
         checkRereading(wallet, catalogue, bytes);

@@ -1,21 +1,30 @@
 // Loading, saving and starting anew, by buttons and panels.
 
+#include "platform/DialogAnswers.h"
 #include "platform/Entry.h"
+#include "platform/FilePanel.h"
 #include "platform/Message.h"
+#include "platform/qt/WindowWidget.h"
 #include "portfolio/Account.h"
+#include "portfolio/Share.h"
 #include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"
 #include "tests/support/ToolRun.h"
 
+#include <QApplication>
+#include <QLineEdit>
 #include <filesystem>
 #include <fstream>
+#include <functional>
 #include <gmock/gmock.h>
 #include <sys/stat.h>
 
 namespace {
 
 using testing::ElementsAre;
+using testing::HasSubstr;
 using testing::IsEmpty;
+using testing::MatchesRegex;
 using testing::SizeIs;
 
 class FileTest : public WindowTest {
@@ -36,6 +45,26 @@ protected:
         window().PostMessage(&refs);
         settle();
         EXPECT_EQ(message(), expected);
+    }
+
+    /// Presses a button for saving; a panel is answered with `path`, or left when that is empty.
+    /// @return the path that the panel came with; empty when there was none.
+    std::string savedTo(const char* button, const std::string& path)
+    {
+        std::string offered;
+        DialogAnswers::current().panel = [&](const BFilePanel& panel) {
+            offered = panel.PanelDirectory() + '/' + panel.SaveText();
+            return path;
+        };
+        click(button);
+        DialogAnswers::current().panel = nullptr;
+        return offered;
+    }
+    /// The notice that is shown, empty when there is none.
+    std::string notice()
+    {
+        auto* text = window().widget().findChild<QWidget*>("txtNotice");
+        return text->isVisible() ? text->accessibleName().toStdString() : "";
     }
 
     static void write(const std::string& path, const std::string& content)
@@ -152,7 +181,7 @@ TEST_F(FileTest, DamagedMarketFileKeepsWhatWasReadAndIsNotSavedOver)
     EXPECT_EQ(message(), "Failed to load the markets");
     EXPECT_GT(window().catalogue().getNbrCurrencies(), 0U);
     click("btnSaveMarket");
-    EXPECT_EQ(panelFolder("SavePanel"), folder() + "/Companies") << "no path is known to save to";
+    EXPECT_EQ(panelFolder("SavePanel"), folder() + "/Companies");
     answerPanel("SavePanel", "");
     EXPECT_EQ(contentOf(damaged).size(), whole.size() / 2);
 
@@ -167,23 +196,154 @@ TEST_F(FileTest, DamagedMarketFileKeepsWhatWasReadAndIsNotSavedOver)
     EXPECT_EQ(panelFolder("SavePanel"), "");
 }
 
-TEST_F(FileTest, DamagedPortfolioGivesAnEmptyOneAndTheVersionSavedOverIsKept)
+TEST_F(FileTest, PortfolioThatCannotBeReadGivesAnEmptyOneAndANoticeOfItsCause)
 {
     loadSample();
     const std::string damaged = folder() + "/PortoFolios/Damaged";
-    write(damaged, "no portfolio");
+    write(damaged, contentOf(walletFile()).substr(0, 100));
     loadWallet(damaged);
     EXPECT_EQ(message(), "Wallet successfully loaded...");
     EXPECT_EQ(wallet().getNbrAccounts(), 0U);
-    click("btnSavePortoFolio");
-    EXPECT_EQ(message(), "Wallet successfully saved...");
-    EXPECT_NE(contentOf(damaged), "no portfolio");
-    std::vector<std::string> kept;
-    for (const auto& entry : std::filesystem::recursive_directory_iterator(folder() + "/Backups")) {
-        if (entry.is_regular_file())
-            kept.push_back(contentOf(entry.path()));
+    EXPECT_THAT(notice(), MatchesRegex("Damaged was not loaded: the file ends in the middle of holding [0-9]+"));
+    loadWallet(marketFile());
+    EXPECT_EQ(notice(), "Sample was not loaded: this is a market file");
+    loadWallet(walletFile());
+    EXPECT_EQ(notice(), "");
+
+    window().RemoveMarket(window().catalogue().getMarkets()[0], false);
+    answerNextAlert("Continue");
+    loadWallet(walletFile());
+    EXPECT_THAT(notice(), MatchesRegex("Sample needs .* operations?\\).*; the market file Sample has none of them"));
+    savedTo("btnSavePortoFolio", "");
+    EXPECT_THAT(notice(), MatchesRegex("Save asks for a name: Sample was not loaded: Sample needs .*"));
+    loadMarkets(walletFile());
+    EXPECT_EQ(message(), "Failed to load the markets");
+    EXPECT_EQ(notice(), "Sample was not loaded: this is a portfolio file");
+}
+
+TEST_F(FileTest, TransferThatHasLostItsRecipientIsToldOfAndThePortfolioStays)
+{
+    loadSample();
+    std::string bytes = contentOf(walletFile());
+    const TransferAccountOperation* sent = nullptr;
+    for (const Account* account : wallet().accounts())
+        for (const TransferAccountOperation* received : account->transferOperations())
+            sent = received;
+    ASSERT_NE(sent, nullptr);
+    const std::string name(sent->recipient()->getName().bytes());
+    std::string other = name;
+    other.back() = '?';
+    bytes.replace(bytes.rfind(name), name.size(), other);
+    const unsigned accounts = wallet().getNbrAccounts();
+    write(folder() + "/PortoFolios/Lost", bytes);
+    loadWallet(folder() + "/PortoFolios/Lost");
+    EXPECT_EQ(wallet().getNbrAccounts(), accounts);
+    EXPECT_THAT(notice(), MatchesRegex("Lost: the transfers? of .* lost .*"));
+    EXPECT_THAT(notice(), HasSubstr(other));
+    EXPECT_EQ(savedTo("btnSavePortoFolio", ""), "") << "it is no failure";
+}
+
+TEST_F(FileTest, NextSaveAsksWhereItWouldWriteOverAFileByMistake)
+{
+    const std::string damaged = folder() + "/PortoFolios/Damaged";
+    const std::string changed = "Sample was changed by another program or window since it was loaded or saved here";
+    const auto touch = [](const std::string& path) { write(path, contentOf(path)); };
+    const struct {
+        const char* page;
+        std::string path;
+        std::function<void()> prepare;
+        std::string reason;
+    } cases[] = {
+        {"portfolio", damaged,
+         [&] {
+             write(damaged, "no portfolio");
+             loadWallet(damaged);
+         },
+         "Damaged was not loaded: this is no portfolio file"},
+        {"portfolio", walletFile(), [&] { loadMarkets(marketFile()); },
+         "the portfolio is empty since a market file was loaded, and Sample is not"},
+        {"portfolio", walletFile(), [&] { touch(walletFile()); }, changed},
+        {"portfolio", walletFile(),
+         [&] {
+             savedTo("btnSavePortoFolio", "");
+             touch(walletFile());
+         },
+         changed},
+        {"market", marketFile(), [&] { touch(marketFile()); }, changed},
+        {"market", marketFile(),
+         [&] {
+             write(marketFile(), contentOf(marketFile()).substr(0, 100));
+             loadMarkets(marketFile());
+         },
+         "Sample was loaded only in part: the file ends in the middle of company 1 of the market Paris"},
+    };
+    for (const auto& c : cases) {
+        restart();
+        loadSample();
+        c.prepare();
+        const bool isMarket = std::string_view(c.page) == "market";
+        const char* button = isMarket ? "btnSaveMarket" : "btnSavePortoFolio";
+        show(isMarket ? kCompanyPage : kPortoFolioPage);
+        const std::string before = contentOf(c.path);
+        clearMessage();
+        EXPECT_EQ(savedTo(button, ""), c.path) << c.reason;
+        EXPECT_EQ(notice(), "Save asks for a name: " + c.reason);
+        EXPECT_EQ(contentOf(c.path), before) << "nothing was chosen: " << c.reason;
+        EXPECT_EQ(message(), "");
+        EXPECT_EQ(savedTo(button, c.path), c.path) << "asked once more: " << c.reason;
+        EXPECT_THAT(message(), HasSubstr("successfully saved"));
+        EXPECT_EQ(notice(), "");
+        EXPECT_EQ(savedTo(button, ""), "") << "settled by the name: " << c.reason;
     }
-    EXPECT_THAT(kept, ElementsAre("no portfolio"));
+}
+
+TEST_F(FileTest, OtherSavesAreSilent)
+{
+    const auto clear = [this] {
+        while (wallet().getNbrAccounts() > 0)
+            delete wallet().getAccount(0);
+        while (wallet().getNbrShares() > 0)
+            delete wallet().shares().front();
+    };
+    loadSample();
+    EXPECT_EQ(savedTo("btnSavePortoFolio", ""), "") << "just loaded";
+    EXPECT_EQ(savedTo("btnSavePortoFolio", ""), "") << "just saved";
+    loadMarkets(marketFile());
+    (new Account("New"))->setWallet(&wallet());
+    wallet().getAccount(0)->setCurrency(window().getReferenceCurrency());
+    show(kPortoFolioPage);
+    EXPECT_EQ(savedTo("btnSavePortoFolio", ""), "") << "not empty, though a market file was loaded";
+    clear();
+    window().UpdateState();
+    EXPECT_EQ(savedTo("btnSavePortoFolio", ""), "") << "emptied by hand";
+    loadMarkets(marketFile());
+    show(kPortoFolioPage);
+    EXPECT_EQ(savedTo("btnSavePortoFolio", ""), "") << "both are empty";
+    std::filesystem::remove(walletFile());
+    EXPECT_EQ(savedTo("btnSavePortoFolio", ""), "") << "deleted meanwhile";
+    EXPECT_TRUE(std::filesystem::exists(walletFile()));
+    EXPECT_EQ(notice(), "");
+}
+
+TEST_F(FileTest, SavePanelComesWithTheOldNameAndWithoutOneForANewPortfolio)
+{
+    loadSample();
+    write(walletFile(), contentOf(walletFile()));
+    const auto panelName = [] {
+        for (QWidget* widget : QApplication::topLevelWidgets())
+            if (widget->objectName() == "SavePanel")
+                return widget->findChild<QLineEdit*>("fileNameEdit")->text().toStdString();
+        return std::string("no panel");
+    };
+    click("btnSavePortoFolio");
+    EXPECT_EQ(panelName(), "Sample");
+    answerPanel("SavePanel", "Other.2026");
+    EXPECT_TRUE(std::filesystem::exists(folder() + "/PortoFolios/Other.2026"));
+    click("btnReinitPortoFolio");
+    click("btnSavePortoFolio");
+    EXPECT_EQ(panelName(), "");
+    answerPanel("SavePanel", "New");
+    EXPECT_TRUE(std::filesystem::exists(folder() + "/PortoFolios/New")) << "no ending is added";
 }
 
 TEST_F(FileTest, ReinitForgetsThePathAndAsksForAName)

@@ -179,6 +179,21 @@ TEST_F(ParameterPageTest, FieldsShowTheDefaultsTakeWhatTheyBeginWithAndAllButThe
         EXPECT_EQ(text(c.field), c.understood) << c.field;
     EXPECT_EQ(wallet().getSellRateCost(), 0.005F);
     EXPECT_EQ(wallet().getBeginProfitSellRate(), 1.507F);
+    const struct {
+        const char *field, *typed, *shown;
+        Wallet::Parameter parameter;
+        float value;
+    } fine[] = {{"txtBuyRateCost", "0.123", "0.123 %", Wallet::kBuyRateCost, 0.00123F},
+                {"txtSellRateCost", "0.0001", "0.0001 %", Wallet::kSellRateCost, 0.000001F},
+                {"txtSellCost", "a0.004", "0.004", Wallet::kSellCost, 0.004F}};
+    for (const auto& c : fine)
+        enter(c.field, c.typed);
+    for (const auto& c : fine) {
+        EXPECT_EQ(text(c.field), c.shown) << "though another field was entered";
+        QTest::keyClick(&find<QLineEdit>(c.field), Qt::Key_Return);
+        settle();
+        EXPECT_EQ(wallet().getParameter(c.parameter), c.value) << c.field;
+    }
     enter("txtBuyCost", std::string(43, '1'));
     EXPECT_EQ(wallet().getBuyCost(), std::numeric_limits<float>::max());
 }

@@ -1,3 +1,4 @@
+#include "market/MarketDiagnosis.h"
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
 #include "tests/support/Bytes.h"
@@ -105,6 +106,36 @@ TEST(MarketFileTest, AFileCutAnywhereKeepsWhatIsWhole)
         EXPECT_EQ(catalogue.rd(BytesFile(bytes.substr(0, size))), -1) << "cut after " << size;
         EXPECT_EQ(summary(catalogue), holds) << "cut after " << size;
     }
+}
+
+TEST(MarketFileTest, AFailedReadIsToldItsCause)
+{
+    const std::string place = "the file ends in the middle of ";
+    const std::string euros = bytesOf("0100 0200 D3070000 04000000 'Euro' 03000000 'EUR' 00000000 00000000");
+    std::string references = bytesOf("03000000 'EUR' FF000000");
+    for (int i = 0; i < 255; ++i)
+        references += euros;
+    const std::pair<std::string, std::string> cases[] = {
+        {"", "the file is empty"},
+        {pieces(0, 1).substr(0, 9), place + "its head"},
+        {pieces(0, 2).substr(0, 20), place + "currency 1"},
+        {pieces(0, 2), place + "market 1 of the currency Euro"},
+        {pieces(0, 3), place + "company 1 of the market NYSE"},
+        {pieces(0, 8), place + "company 1 of the market NYSE"},
+        {pieces(0, 9) + "x", place + "company 2 of the market NYSE"},
+        {pieces(0, 11) + "x", place + "the rates of the currency Euro"},
+        {pieces(0, 13), place + "currency 2"},
+        {bytesOf("0100 0200 D3070000 00000000 00000000"), "this is a portfolio file"},
+        {references, "it has the reference currency over and over"},
+    };
+    const auto shown = [](std::string_view name) { return std::string(name); };
+    for (const auto& [bytes, fault] : cases) {
+        const BytesFile file(bytes);
+        ASSERT_EQ(Catalogue().rd(file), -1) << fault;
+        EXPECT_EQ(faultOfMarketFile(file, shown), fault);
+    }
+    EXPECT_TRUE(looksLikeMarketFile(BytesFile(pieces(0, 2)))) << "though it is cut short";
+    EXPECT_TRUE(looksLikeMarketFile(BytesFile(std::string(8, '\0')))) << "an empty catalogue";
 }
 
 TEST(MarketFileTest, AnUnknownEventTypeIsSkippedWithoutARecord)

@@ -1,3 +1,4 @@
+#include "portfolio/WalletDiagnosis.h"
 #include "tests/support/Bytes.h"
 #include "tests/support/Links.h"
 
@@ -62,6 +63,12 @@ void fill(SmallPortfolio& p)
                            &Wallet::setBeginLoseSellRate, &Wallet::setEndLoseSellRate, &Wallet::setReinvestRate})
         (p.wallet.*set)(++value);
     p.wallet.setInvestementPeriod(-90);
+}
+
+std::string diagnosisOf(const BytesFile& file, const Catalogue& catalogue)
+{
+    const auto shown = [](std::string_view name) { return std::string(name); };
+    return WalletDiagnosis(file, catalogue, shown).text("Mine", "the market file Sample");
 }
 
 std::string replaced(std::string bytes, const char* what, const char* with)
@@ -199,4 +206,68 @@ TEST(WalletFileTest, ATransferToNobodyStaysAndWhatFollowsIsReadOutOfPlace)
     EXPECT_EQ(p.wallet.getBuyCost(), 200);
     EXPECT_EQ(p.wallet.getSellRateCost(), 1.5F);
     EXPECT_EQ(p.wallet.getInvestementPeriod(), 0);
+    EXPECT_TRUE(p.wallet.hasLostRecipient());
+}
+
+TEST(WalletFileTest, ATransferToNobodyIsNoFailureEvenWhenWhatIsReadOutOfPlaceMeetsTheEnd)
+{
+    SmallPortfolio p;
+    const BytesFile file(replaced(bytesOfPieces(), "01000000 04000000 'Side' 0000", "01000000 04000000 'Sude' 0000"));
+    EXPECT_EQ(p.wallet.rd(file, nullptr), 0);
+    ASSERT_EQ(p.wallet.getNbrAccounts(), 2U);
+    EXPECT_EQ(p.wallet.getAccount(0)->getNbrOperations(), 4U);
+    EXPECT_EQ(p.wallet.getBuyCost(), Wallet().getBuyCost()) << "a parameter that the end has cost it";
+    EXPECT_EQ(diagnosisOf(file, p.catalogue), "the transfer of 200.00 from Main to Sude on 02/01/1999 lost its "
+                                              "recipient, which is no account of the file; what stands behind is read "
+                                              "out of place");
+    EXPECT_EQ(p.wallet.rd(BytesFile(bytesOfPieces()), nullptr), 0);
+    EXPECT_FALSE(p.wallet.hasLostRecipient());
+}
+
+TEST(WalletFileTest, AFailedReadIsToldAllThatIsMissingOrWhereTheFileEnds)
+{
+    const std::string place = "the file ends in the middle of ";
+    const std::string sample = "; the market file Sample ";
+    const std::string lyons =
+        replaced(replaced(replaced(bytesOfPieces(), "'Paris'", "'Lyons'"), "'Paris'", "'Lyons'"), "'Paris'", "'Lyons'");
+    const std::string yuan = replaced(lyons, "04000000 'Euro'", "04000000 'Yuan'");
+    const auto upTo = [](std::size_t piece, std::size_t more) {
+        std::size_t size = more;
+        for (std::size_t i = 0; i < piece; ++i)
+            size += bytesOf(kPieces[i].bytes).size();
+        return bytesOfPieces().substr(0, size);
+    };
+    const std::pair<std::string, std::string> cases[] = {
+        {lyons, "Mine needs Lyons / AC (2 operations)" + sample + "does not have it"},
+        {yuan, "Mine needs Lyons / AC (2 operations) and the currency Yuan" + sample + "has neither"},
+        {replaced(yuan, "'Dollar'", "'dollar'"),
+         "Mine needs Lyons / AC (2 operations), the currency Yuan and the currency dollar" + sample +
+             "has none of them"},
+        {yuan.substr(0, 60),
+         "Mine needs Lyons / AC (0 operations) and the currency Yuan" + sample + "has neither; " + place + "account 1"},
+        {replaced(bytesOfPieces(), "'S' 'N' 05000000 'Paris'", "'S' 'N' 05000000 'Lyons'"),
+         "the file has operations on what it does not list as a holding: Lyons / AC (1 operation)"},
+        {"", "the file is empty"},
+        {upTo(0, 9), place + "its head"},
+        {upTo(0, 15), place + "holding 1"},
+        {upTo(2, 1), place + "account 1"},
+        {upTo(4, 0), place + "account 2"},
+        {upTo(5, 9), place + "the transfers of account 1"},
+        {upTo(6, 0), place + "the transfers of account 2"},
+        {upTo(7, 0).substr(0, bytesOfPieces().size() - 1), place + "its parameters"},
+        {bytesOf("03000000 'EUR' 01000000 0100 0200 D3070000 04000000"), "this is a market file"},
+        {"no portfolio", "this is no portfolio file"},
+    };
+    for (const auto& [bytes, text] : cases) {
+        SmallPortfolio p;
+        const BytesFile file(bytes);
+        testing::internal::CaptureStdout();
+        EXPECT_EQ(p.wallet.rd(file, nullptr), -1) << text;
+        testing::internal::GetCapturedStdout();
+        EXPECT_EQ(diagnosisOf(file, p.catalogue), text);
+    }
+    const auto shown = [](std::string_view name) { return std::string(name); };
+    EXPECT_EQ(WalletDiagnosis(BytesFile(lyons), Catalogue(), shown).text("Mine", ""),
+              "no market file is loaded, and Mine needs Lyons / AC (2 operations), the currency Euro and the currency "
+              "Dollar");
 }

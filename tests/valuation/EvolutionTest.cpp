@@ -38,6 +38,22 @@ TEST(EvolutionTest, TheCurrentStateComesFirstThenEveryDayBeforeIt)
     EXPECT_EQ(p.wallet.getNbrStates(), 0U) << "the old states go all the same";
 }
 
+TEST(EvolutionTest, ARefusedOneLeavesNoAutomaticTransferForASaveToMakeReal)
+{
+    for (const bool isEvolutionAsked : {false, true}) {
+        SmallPortfolio p;
+        Account* from = addAccount(p.wallet, "Main", p.euro);
+        addAccount(p.wallet, "Profits", p.euro)->setDefaultTransferAccount(true);
+        setTrend(p.alpha, 30);
+        trade(new Share(&p.wallet, p.alpha), from, 0, 100, 10); // the trend is above the profit limit
+        deposit(from, -700000, 100);
+        EvolutionOutcome outcome = EvolutionOutcome::kTooLong;
+        refreshStates(p.wallet, daysAfterStart(1), true, isEvolutionAsked ? &outcome : nullptr);
+        EXPECT_EQ(outcome, EvolutionOutcome::kTooLong);
+        EXPECT_EQ(from->getNbrOperations(), isEvolutionAsked ? 2U : 3U);
+    }
+}
+
 TEST(EvolutionTest, WithoutARealFirstDayOrWithTooManyThereAreNoDailyStates)
 {
     constexpr auto Built = EvolutionOutcome::kBuilt, BadFirstDay = EvolutionOutcome::kBadFirstDay,
