@@ -4,7 +4,6 @@
 
 #include <algorithm>
 #include <cerrno>
-#include <csignal>
 #include <cstring>
 #include <fcntl.h>
 #include <memory>
@@ -13,37 +12,6 @@
 #include <unistd.h>
 
 namespace {
-
-/// A file that grows past the user's limit is to be a failed write, not the end of the program.
-class SizeSignalIgnored {
-public:
-    SizeSignalIgnored()
-    {
-        struct sigaction ignore {};
-        ignore.sa_handler = SIG_IGN;
-        sigaction(SIGXFSZ, &ignore, &former_);
-    }
-    ~SizeSignalIgnored() { sigaction(SIGXFSZ, &former_, nullptr); }
-    SizeSignalIgnored(const SizeSignalIgnored&) = delete;
-    SizeSignalIgnored& operator=(const SizeSignalIgnored&) = delete;
-
-private:
-    struct sigaction former_ {};
-};
-
-[[noreturn]] void failWriting(const std::string& path)
-{
-    throw AtomicFile::WriteError(
-        path + ": cannot be written: " + (errno != 0 ? std::strerror(errno) : "not all of it can be saved"));
-}
-
-/// Lets `write` write; throws a WriteError when it fails.
-void fill(FILE* stream, const std::string& path, const DurableSave::Writer& write)
-{
-    errno = 0;
-    if (write(stream) != 0 || std::ferror(stream) != 0)
-        failWriting(path);
-}
 
 bool isDevice(const std::string& path)
 {

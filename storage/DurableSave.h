@@ -2,9 +2,8 @@
 
 #include "storage/KeptVersions.h"
 #include "storage/SaveLock.h"
+#include "storage/Writing.h"
 
-#include <cstdio>
-#include <functional>
 #include <string>
 
 /// Saves a file so that a crash, a full disk or a pulled plug at any moment leaves the old file or the new one, whole,
@@ -22,8 +21,7 @@ public:
         Outcome outcome;
         std::string reason; // one line for the user, with the file's path; empty when it is saved
     };
-    /// Writes the contents, perhaps none. @return 0, or -1 when that failed.
-    using Writer = std::function<int(FILE*)>;
+    using Writer = FileWriter;
 
     /// @param patience how long a save waits for another program that saves in the same folder.
     explicit DurableSave(const DataFolder& folder, SaveLock::Patience patience = kPatience)
