@@ -2,6 +2,7 @@
 
 #include "app/Holds.h"
 #include "app/MessageView.h"
+#include "app/NoticeLine.h"
 #include "app/Shortcuts.h"
 #include "foundation/Today.h"
 #include "platform/Alert.h"
@@ -14,6 +15,7 @@
 
 #include <algorithm>
 #include <iterator>
+#include <span>
 
 namespace {
 
@@ -105,7 +107,25 @@ constexpr Command kCommands[] = {
 };
 static_assert(std::size(kCommands) == 65);
 
+/// Beside the vocabulary.
+constexpr Command kOwnCommands[] = {
+    {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
+};
+
+/// Null when the code is no command.
+const Command* commandOf(uint32 code)
+{
+    for (const std::span<const Command> table :
+         {std::span<const Command>(kCommands), std::span<const Command>(kOwnCommands)}) {
+        const auto found = std::ranges::find(table, code, &Command::code);
+        if (found != table.end())
+            return &*found;
+    }
+    return nullptr;
+}
+
 const BRect kPageFrame(0, 0, 800, 775);
+const BRect kNoticeFrame(8, 757, 792, 779); // between what is on the pages and the letters of the status line
 
 } // namespace
 
@@ -146,14 +166,14 @@ void PLWindow::makePages()
     messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
+    AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // last: in front of the edges of both
 }
 
 void PLWindow::MessageReceived(BMessage* message)
 {
-    const auto* command = std::find_if(std::begin(kCommands), std::end(kCommands),
-                                       [&](const Command& c) { return c.code == message->what; });
+    const Command* command = commandOf(message->what);
     // Many text fields have codes that are no commands: typing changes nothing until a button is pressed.
-    if (command == std::end(kCommands)) {
+    if (command == nullptr) {
         BWindow::MessageReceived(message);
         return;
     }
@@ -176,6 +196,25 @@ void PLWindow::SetMessage(const char* text, const char* toolTip)
         return;
     messageView_->SetToolTip(toolTip); // in place of that of the message before
     messageView_->SetMessage(text);
+}
+
+void PLWindow::showNotice(Notice notice)
+{
+    const WindowLock lock(*this);
+    if (lock.isHeld())
+        noticeLine_->show(std::move(notice));
+}
+
+void PLWindow::dropNotice(const std::string& key)
+{
+    const WindowLock lock(*this);
+    if (lock.isHeld())
+        noticeLine_->drop(key);
+}
+
+void PLWindow::pressNotice(BMessage* message)
+{
+    noticeLine_->press(message);
 }
 
 bool PLWindow::confirm(const char* question)

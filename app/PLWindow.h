@@ -2,6 +2,7 @@
 
 #include "app/DataFiles.h"
 #include "app/EventEditor.h"
+#include "app/Notice.h"
 #include "app/OperationEditor.h"
 #include "app/QuoteEditor.h"
 #include "market/Catalogue.h"
@@ -12,6 +13,7 @@
 #include <memory>
 
 class MessageView;
+class NoticeLine;
 class ParameterView;
 class Shortcuts;
 class State;
@@ -41,6 +43,11 @@ public:
 
     /// Shows `text` in the status line, at once; `toolTip` says more of it.
     void SetMessage(const char* text, const char* toolTip = "");
+    /// Shows `notice` in the line above the status line, or lets it wait until those before it are dismissed.
+    void showNotice(Notice notice);
+    /// Takes the notice of that key away, shown or waiting; its reason is gone.
+    void dropNotice(const std::string& key);
+    void pressNotice(BMessage* message);
     /// Asks in an alert titled "Warning". @return true for "Continue".
     static bool confirm(const char* question);
 
@@ -164,6 +171,7 @@ private:
     State* state_ = nullptr; // in the wallet
     // The window's views own each other.
     MessageView* messageView_ = nullptr;
+    NoticeLine* noticeLine_ = nullptr;
     BTabView* tabView_ = nullptr;
     CompanyView* companyView_ = nullptr;
     CurrencyView* currencyView_ = nullptr;

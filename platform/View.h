@@ -66,6 +66,8 @@ public:
     virtual void FrameResized(float /*width*/, float /*height*/) {}
     /// Also while no button is held. `inside` is false once, when the pointer has left. Nothing is dragged and dropped.
     virtual void MouseMoved(BPoint /*where*/, bool /*inside*/) {}
+    /// The left button was pressed. The views around this one are not told.
+    virtual void MouseDown(BPoint /*where*/) {}
     /// `bytes` is the UTF-8 text of the key, or one of the control characters of InterfaceDefs.h.
     virtual void KeyDown(const char* /*bytes*/, int32 /*numBytes*/) {}
     /// The right mouse button was pressed, or the key for menus. The kits have no such hook.

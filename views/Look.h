@@ -19,7 +19,7 @@ constexpr rgb_color kTrend = {204, 98, 0, 255};   ///< its trend
 constexpr rgb_color kBand = {204, 98, 0, 48};     ///< what lies about the trend
 
 constexpr float kPageWidth = 800;
-constexpr float kPageHeight = 742; ///< what shows of a page, between the tabs and the status line
+constexpr float kPageHeight = 736; ///< what shows of a page, between the tabs and the line of notices
 constexpr float kMargin = 8;       ///< between the groups of a page, and around them
 constexpr float kBoxTop = 20;      ///< from the upper edge of a box to what is in it
 constexpr float kBoxSide = 10;     ///< from its other edges

@@ -9,6 +9,8 @@ BButton::BButton(BRect frame, const char* name, const char* label, BMessage* mes
 {
     auto* button = static_cast<QPushButton*>(widget());
     button->setAutoDefault(true);
+    if ((flags & B_NAVIGABLE) == 0)
+        button->setFocusPolicy(Qt::NoFocus);
     QObject::connect(button, &QPushButton::clicked, [this] { Invoke(); });
 }
 

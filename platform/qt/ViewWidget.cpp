@@ -28,6 +28,14 @@ void ViewWidget::paintEvent(QPaintEvent*)
     view_.paintOn(screen);
 }
 
+void ViewWidget::mousePressEvent(QMouseEvent* event)
+{
+    if (event->button() == Qt::LeftButton)
+        view_.MouseDown(at(*event));
+    else
+        QWidget::mousePressEvent(event);
+}
+
 void ViewWidget::mouseMoveEvent(QMouseEvent* event)
 {
     view_.MouseMoved(at(*event), rect().contains(event->position().toPoint()));

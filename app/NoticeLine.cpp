@@ -1,0 +1,168 @@
+#include "app/NoticeLine.h"
+
+#include "chart/ChartText.h"
+#include "platform/Button.h"
+#include "platform/Message.h"
+#include "views/Look.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+constexpr rgb_color kGround = {255, 244, 206, 255};
+constexpr rgb_color kEdge = {204, 178, 104, 255};
+constexpr float kInset = 8;     // of the text
+constexpr float kEdgeWidth = 2; // about a button
+
+} // namespace
+
+/// The text of a notice, shortened to the room there is. A click goes on to the line.
+class NoticeText final : public BView {
+public:
+    explicit NoticeText(BRect frame) : BView(frame, "txtNotice", B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW)
+    {
+        SetViewColor(B_TRANSPARENT_COLOR);
+    }
+
+    void setText(const std::string& text)
+    {
+        text_ = text;
+        std::ranges::replace(text_, '\n', ' ');
+        SetAccessibleName(text.c_str());
+        SetToolTip(text.empty() ? "" : (text + "\n(A click dismisses this.)").c_str());
+        Invalidate();
+    }
+
+    void Draw(BRect) override
+    {
+        BFont font;
+        GetFont(&font);
+        font_height height;
+        font.GetHeight(&height);
+        const BRect bounds = Bounds();
+        const TextWidth width = [this](const std::string& text) { return StringWidth(text.c_str()); };
+        DrawString(fitText(text_, width, bounds.Width()).c_str(),
+                   {0, std::round((bounds.Height() + height.ascent - height.descent) / 2)});
+    }
+
+    void MouseDown(BPoint where) override { Parent()->MouseDown(where); }
+
+private:
+    std::string text_;
+};
+
+NoticeLine::NoticeLine(BRect frame) : BView(frame, "NoticeLine", B_FOLLOW_LEFT | B_FOLLOW_BOTTOM, B_WILL_DRAW)
+{
+    SetViewColor(kGround);
+    const float height = frame.Height();
+    AddChild(text_ = new NoticeText({kInset, 0, frame.Width() - kInset, height}));
+    for (const char* name : {"btnNotice1", "btnNotice2"}) {
+        buttons_.push_back(new BButton({0, kEdgeWidth, 0, height - kEdgeWidth}, name, "", nullptr,
+                                       B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW));
+        AddChild(buttons_.back());
+    }
+    Hide();
+}
+
+void NoticeLine::show(Notice notice)
+{
+    passing_.reset(); // what is new is seen at once, or it takes its place in the queue
+    if (notice.isPassing) {
+        passing_ = std::move(notice);
+    } else {
+        const auto same = std::ranges::find(waiting_, notice.key, &Notice::key);
+        if (same != waiting_.end())
+            *same = std::move(notice);
+        else
+            waiting_.push_back(std::move(notice));
+    }
+    update();
+}
+
+void NoticeLine::drop(const std::string& key)
+{
+    if (passing_ && passing_->key == key)
+        passing_.reset();
+    std::erase_if(waiting_, [&](const Notice& notice) { return notice.key == key; });
+    update();
+}
+
+void NoticeLine::press(BMessage* message)
+{
+    int32 button = 0, shown = 0;
+    if (message->FindInt32("button", &button) != B_OK || message->FindInt32("shown", &shown) != B_OK ||
+        shown != shown_ || front() == nullptr)
+        return;
+    // The notice goes first: what the button does may show another one, also of the same key.
+    const auto action = front()->buttons[static_cast<std::size_t>(button)].press;
+    removeFront();
+    if (action)
+        action();
+}
+
+void NoticeLine::Draw(BRect)
+{
+    SetHighColor(kEdge);
+    StrokeRect(Bounds());
+}
+
+void NoticeLine::MouseDown(BPoint)
+{
+    removeFront();
+}
+
+const Notice* NoticeLine::front() const
+{
+    if (passing_)
+        return &*passing_;
+    return waiting_.empty() ? nullptr : &waiting_.front();
+}
+
+void NoticeLine::removeFront()
+{
+    if (passing_)
+        passing_.reset();
+    else if (!waiting_.empty())
+        waiting_.pop_front();
+    update();
+}
+
+void NoticeLine::update()
+{
+    ++shown_;
+    const Notice* notice = front();
+    if (notice == nullptr) {
+        Hide();
+        text_->setText("");
+        return;
+    }
+    text_->ResizeTo(placeButtons(*notice) - kInset, Bounds().Height());
+    text_->setText(notice->text);
+    Show();
+}
+
+float NoticeLine::placeButtons(const Notice& notice)
+{
+    constexpr float kPadding = 12; // on both sides of a label
+    float right = Bounds().Width() - kEdgeWidth;
+    for (std::size_t i = buttons_.size(); i-- > 0;) {
+        BButton& button = *buttons_[i];
+        if (i >= notice.buttons.size()) {
+            button.Hide();
+            continue;
+        }
+        const char* label = notice.buttons[i].label.c_str();
+        const float width = std::ceil(StringWidth(label)) + 2 * kPadding;
+        button.SetLabel(label);
+        auto* message = new BMessage(kPressed);
+        message->AddInt32("button", static_cast<int32>(i));
+        message->AddInt32("shown", shown_);
+        button.SetMessage(message);
+        button.MoveTo(right - width, kEdgeWidth);
+        button.ResizeTo(width, Bounds().Height() - 2 * kEdgeWidth);
+        button.Show();
+        right -= width + look::kGap;
+    }
+    return right;
+}

@@ -1,0 +1,49 @@
+#pragma once
+
+#include "app/Notice.h"
+#include "platform/View.h"
+
+#include <deque>
+#include <optional>
+
+class BButton;
+class BMessage;
+class NoticeText;
+
+/// The line of notices above the status line; hidden while there is none. It shows one, and the others wait behind it.
+/// A click on it dismisses the one that is shown.
+///
+/// It never takes the keyboard: a person who types goes on typing when a notice comes or goes.
+class NoticeLine final : public BView {
+public:
+    /// The code that its buttons send to the window, which hands the message back to `press`.
+    static constexpr uint32 kPressed = 'NtBt';
+
+    explicit NoticeLine(BRect frame);
+
+    /// A passing notice stands before the others until it goes; any other one waits for its turn.
+    void show(Notice notice);
+    /// Takes the notice of that key away, shown or waiting, if there is one.
+    void drop(const std::string& key);
+    /// Runs the button that `message` comes from, and takes its notice away before. Does nothing when that was no
+    /// longer shown.
+    void press(BMessage* message);
+
+    void Draw(BRect updateRect) override;
+    void MouseDown(BPoint where) override;
+
+private:
+    /// Null without one.
+    const Notice* front() const;
+    void removeFront();
+    /// Shows what stands in front now.
+    void update();
+    /// The buttons at the right, each as wide as its label. @return where the text has to end.
+    float placeButtons(const Notice& notice);
+
+    std::deque<Notice> waiting_; // the first one is shown unless `passing_` is
+    std::optional<Notice> passing_;
+    int32 shown_ = 0; // counts what was shown, so that a late press does not meet another notice
+    NoticeText* text_ = nullptr;
+    std::vector<BButton*> buttons_;
+};
