@@ -4,6 +4,7 @@
 #include "platform/GraphicsDefs.h"
 #include "platform/Message.h"
 #include "platform/Window.h"
+#include "platform/qt/EndSignals.h"
 
 #include <QApplication>
 #include <QDir>
@@ -77,6 +78,12 @@ BApplication::~BApplication()
 
 int BApplication::Run()
 {
+    // At once, and not by the queue: a command that waits for an answer would hold it up, and the session does not
+    // wait.
+    const EndSignals ending([this] {
+        BMessage quit(B_QUIT_REQUESTED);
+        DispatchMessage(&quit, this);
+    });
     const int status = QApplication::exec();
     BWindow::closeAll();
     return status;
