@@ -36,24 +36,25 @@ DataFiles::DataFiles(PLWindow& window, const BTabView& tabs, const DataFolder& f
       savePanel_(makePanel(B_SAVE_PANEL, window))
 {}
 
-std::optional<DataFiles::Kind> DataFiles::kindInFront() const
+std::optional<FileKind> DataFiles::kindInFront() const
 {
     // The order of the tabs is that of `PLWindow::makePages`.
     switch (tabs_.Selection()) {
     case 0:
     case 1:
-        return Kind::kMarkets;
+        return FileKind::kMarkets;
     case 2:
-        return Kind::kWallet;
+        return FileKind::kWallet;
     default:
         return std::nullopt;
     }
 }
 
-void DataFiles::showFolder(BFilePanel& panel, Kind kind)
+void DataFiles::showFolder(BFilePanel& panel, FileKind kind)
 {
     std::string error;
-    panel.SetPanelDirectory((kind == Kind::kMarkets ? folder_.companies(&error) : folder_.portoFolios(&error)).c_str());
+    panel.SetPanelDirectory(
+        (kind == FileKind::kMarkets ? folder_.companies(&error) : folder_.portoFolios(&error)).c_str());
     if (!error.empty())
         window_.SetMessage(error.c_str());
 }
@@ -66,7 +67,7 @@ void DataFiles::askForLoad()
             const auto kind = kindInFront();
             if (!kind)
                 return;
-            const bool isMarkets = kind == Kind::kMarkets;
+            const bool isMarkets = kind == FileKind::kMarkets;
             const char* question = isMarkets ? "This will delete all unsaved changes to the wallet and the markets..."
                                              : "This will delete all unsaved changes to the wallet...";
             // A portfolio is always asked for, even an empty one.
@@ -96,7 +97,7 @@ void DataFiles::load(BMessage* message)
         return;
     // The portfolio refers to markets and companies by name, so new markets take it along.
     window_.replaceWallet();
-    if (kind == Kind::kMarkets)
+    if (kind == FileKind::kMarkets)
         loadMarkets(file->stream(), path.Path());
     else
         loadWallet(file->stream(), path.Path());
@@ -111,9 +112,11 @@ void DataFiles::loadMarkets(FILE* file, const char* path)
     const bool isWhole = window_.catalogue().rd(file) == 0;
     window_.showCatalogue(before);
     // A save must not put what could be read in the place of a damaged file, nor in that of the one loaded before.
-    markets_.isAsked = !isWhole;
-    if (isWhole)
-        markets_.path = path;
+    names_.markets.isAsked = !isWhole;
+    if (isWhole) {
+        names_.markets.path = path;
+        window_.noteFile(FileKind::kMarkets);
+    }
     window_.SetMessage(isWhole ? "Markets successfully loaded..." : "Failed to load the markets");
 }
 
@@ -124,7 +127,8 @@ void DataFiles::loadWallet(FILE* file, const char* path)
         window_.replaceWallet(); // a part of a portfolio would pass for the whole
     }
     window_.showWallet();
-    wallet_.path = path;
+    names_.wallet.path = path;
+    window_.noteFile(FileKind::kWallet);
     // Intended: it follows the failure's message, too, and the path is the failed file's. What a save writes over is
     // kept among the versions.
     window_.SetMessage("Wallet successfully loaded...");
@@ -135,7 +139,7 @@ void DataFiles::saveOrAsk()
     const auto kind = kindInFront();
     if (!kind)
         return;
-    const Remembered& file = remembered(*kind);
+    const Remembered& file = names_.of(*kind);
     if (!file.path.isUndefined() && !file.isAsked) {
         save(file.path);
         return;
@@ -162,7 +166,7 @@ status_t DataFiles::save(BMessage* message)
     if (status != B_OK || !kind)
         return status;
     // Remembered before it is written: after a save that fails, the next one tries the same file again.
-    remembered(*kind) = {path.Path()};
+    names_.of(*kind) = {path.Path()};
     save(String(path.Path()));
     return B_OK;
 }
@@ -177,18 +181,20 @@ void DataFiles::save(const String& path)
         return;
     const Wallet* wallet = window_.getWallet();
     const auto write = [&](FILE* file) {
-        if (kind == Kind::kMarkets)
+        if (kind == FileKind::kMarkets)
             return window_.catalogue().wrt(file, today());
         return wallet != nullptr ? wallet->wrt(file, today()) : 0; // without a wallet the file is left empty
     };
     // Whatever fails, the path is that of the old file or of the new one, and never of a part.
     const auto result = DurableSave(folder_).save(path.getCharacterArray(), write);
+    if (result.outcome == DurableSave::Outcome::kSaved && path == names_.of(*kind).path)
+        window_.noteFile(*kind);
     const char* text = "Currencies successfully saved...";
     if (result.outcome == DurableSave::Outcome::kOpenFailed)
         text = "Failed to open the file.";
     else if (result.outcome == DurableSave::Outcome::kWriteFailed)
         text = "Failed to write the file.";
-    else if (kind == Kind::kWallet)
+    else if (kind == FileKind::kWallet)
         text = wallet != nullptr ? "Wallet successfully saved..." : "No wallet to save...";
     window_.SetMessage(text, result.reason.c_str());
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "app/FileKind.h"
 #include "foundation/String.h"
 #include "platform/FilePanel.h"
 #include "storage/DataFolder.h"
@@ -31,28 +32,42 @@ public:
     status_t save(BMessage* message);
     void save(const String& path);
     /// The next save of the portfolio asks for a name.
-    void forgetWallet() { wallet_ = {}; }
+    void forgetWallet() { names_.wallet = {}; }
+
+    struct Remembered {
+        String path;          ///< undefined before the first file
+        bool isAsked = false; ///< the next save asks for a name, whatever the path
+
+        bool operator==(const Remembered& other) const
+        {
+            return path.bytes() == other.path.bytes() && isAsked == other.isAsked;
+        }
+    };
+    /// The file of each kind that was loaded or saved last.
+    struct Names {
+        Remembered markets;
+        Remembered wallet;
+
+        Remembered& of(FileKind kind) { return kind == FileKind::kMarkets ? markets : wallet; }
+        const Remembered& of(FileKind kind) const { return kind == FileKind::kMarkets ? markets : wallet; }
+        bool operator==(const Names&) const = default;
+    };
+    const Names& names() const { return names_; }
+    /// For an undo of a load: from here on these are the files that are saved to.
+    void setNames(const Names& names) { names_ = names; }
 
 private:
-    enum class Kind { kMarkets, kWallet };
-    struct Remembered {
-        String path;          // undefined before the first file
-        bool isAsked = false; // the next save asks for a name, whatever the path
-    };
-
     /// That of the tab in front; the operation and the parameter page have none.
-    std::optional<Kind> kindInFront() const;
-    Remembered& remembered(Kind kind) { return kind == Kind::kMarkets ? markets_ : wallet_; }
+    std::optional<FileKind> kindInFront() const;
     /// Has the panel open in the folder of that kind.
-    void showFolder(BFilePanel& panel, Kind kind);
+    void showFolder(BFilePanel& panel, FileKind kind);
     void loadMarkets(std::FILE* file, const char* path);
     void loadWallet(std::FILE* file, const char* path);
 
     PLWindow& window_;
     const BTabView& tabs_;
     DataFolder folder_;
-    Remembered markets_;
-    Remembered wallet_;
+    Names names_;
     BFilePanel openPanel_;
     BFilePanel savePanel_;
 };

@@ -97,11 +97,15 @@ void PLWindow::MarketSelection()
 {
     // Without a selection the company list becomes empty, while the fields keep what they hold.
     Market* market = companyView_->GetSelectedMarket();
-    if (market != nullptr) {
-        companyView_->setMarketName(market->getName());
-        companyView_->setMarketCurrencyRepresentation(market->getCurrencyRepresentation());
-    }
+    if (market != nullptr)
+        showFields(*market);
     companyView_->SetCompanyList(market);
+}
+
+void PLWindow::showFields(const Market& market)
+{
+    companyView_->setMarketName(market.getName());
+    companyView_->setMarketCurrencyRepresentation(market.getCurrencyRepresentation());
 }
 
 void PLWindow::AddCompany()

@@ -23,6 +23,7 @@ namespace {
 struct Command {
     uint32 code;
     void (*run)(PLWindow& window, BMessage* message);
+    const char* step = ""; // what an undo calls it, in front of what it was about; empty for one that changes nothing
 };
 
 /// While a key is held in the date field, each day would be valued long after it has gone by: only the last one is.
@@ -34,49 +35,49 @@ void valueAtDate(PLWindow& window)
 
 constexpr Command kCommands[] = {
     // The company page.
-    {'CBAm', [](PLWindow& w, BMessage*) { w.AddMarket(); }},
-    {'CBUm', [](PLWindow& w, BMessage*) { w.UpdateMarket(); }},
-    {'CBRm', [](PLWindow& w, BMessage*) { w.RemoveMarket(nullptr, true); }},
+    {'CBAm', [](PLWindow& w, BMessage*) { w.AddMarket(); }, "Add market"},
+    {'CBUm', [](PLWindow& w, BMessage*) { w.UpdateMarket(); }, "Update market"},
+    {'CBRm', [](PLWindow& w, BMessage*) { w.RemoveMarket(nullptr, true); }, "Remove market"},
     {'MSel', [](PLWindow& w, BMessage*) { w.MarketSelection(); }},
-    {'CBAc', [](PLWindow& w, BMessage*) { w.AddCompany(); }},
-    {'CBUc', [](PLWindow& w, BMessage*) { w.UpdateCompany(); }},
-    {'CBRc', [](PLWindow& w, BMessage*) { w.RemoveCompany(nullptr, true); }},
+    {'CBAc', [](PLWindow& w, BMessage*) { w.AddCompany(); }, "Add company"},
+    {'CBUc', [](PLWindow& w, BMessage*) { w.UpdateCompany(); }, "Update company"},
+    {'CBRc', [](PLWindow& w, BMessage*) { w.RemoveCompany(nullptr, true); }, "Remove company"},
     {'CSel', [](PLWindow& w, BMessage*) { w.CompanySelection(); }},
     {'CMSp', [](PLWindow& w, BMessage*) { w.ChangeCompanyEventType(1); }},
     {'CMNo', [](PLWindow& w, BMessage*) { w.ChangeCompanyEventType(2); }},
-    {'CBEa', [](PLWindow& w, BMessage*) { w.AddCompanyEvent(); }},
-    {'CBEu', [](PLWindow& w, BMessage*) { w.UpdateCompanyEvent(); }},
-    {'CBEr', [](PLWindow& w, BMessage*) { w.RemoveCompanyEvent(); }},
+    {'CBEa', [](PLWindow& w, BMessage*) { w.AddCompanyEvent(); }, "Add event"},
+    {'CBEu', [](PLWindow& w, BMessage*) { w.UpdateCompanyEvent(); }, "Update event"},
+    {'CBEr', [](PLWindow& w, BMessage*) { w.RemoveCompanyEvent(); }, "Remove event"},
     {'CEse', [](PLWindow& w, BMessage*) { w.CompanyEventSelection(); }},
-    {'CBAq', [](PLWindow& w, BMessage*) { w.AddCompanyQuote(); }},
-    {'CBUq', [](PLWindow& w, BMessage*) { w.UpdateCompanyQuote(); }},
-    {'CBRq', [](PLWindow& w, BMessage*) { w.RemoveCompanyQuote(); }},
+    {'CBAq', [](PLWindow& w, BMessage*) { w.AddCompanyQuote(); }, "Add quote"},
+    {'CBUq', [](PLWindow& w, BMessage*) { w.UpdateCompanyQuote(); }, "Update quote"},
+    {'CBRq', [](PLWindow& w, BMessage*) { w.RemoveCompanyQuote(); }, "Remove quotes"},
     {'CQSe', [](PLWindow& w, BMessage*) { w.CompanyQuoteSelection(); }},
-    {'CBSq', [](PLWindow& w, BMessage*) { w.SplitQuotes(); }},
+    {'CBSq', [](PLWindow& w, BMessage*) { w.SplitQuotes(); }, "Split quotes"},
     {'CCWs', [](PLWindow& w, BMessage*) { w.UpdateCompanyQuotesChart(); }},
-    {'CB3M', [](PLWindow& w, BMessage*) { w.SetThreeMonthsCompanyQuotes(); }},
+    {'CB3M', [](PLWindow& w, BMessage*) { w.SetThreeMonthsCompanyQuotes(); }, "Set last three months"},
     {'CBLd', [](PLWindow& w, BMessage*) { w.LoadSomething(); }}, // of the currency page, too
     {'CBSv', [](PLWindow& w, BMessage*) { w.SaveSomething(); }}, // and this
     // The currency page.
-    {'RBAd', [](PLWindow& w, BMessage*) { w.AddCurrency(); }},
-    {'RBUp', [](PLWindow& w, BMessage*) { w.UpdateCurrency(); }},
-    {'RBRe', [](PLWindow& w, BMessage*) { w.RemoveCurrency(); }},
+    {'RBAd', [](PLWindow& w, BMessage*) { w.AddCurrency(); }, "Add currency"},
+    {'RBUp', [](PLWindow& w, BMessage*) { w.UpdateCurrency(); }, "Update currency"},
+    {'RBRe', [](PLWindow& w, BMessage*) { w.RemoveCurrency(); }, "Remove currency"},
     {'Crsl', [](PLWindow& w, BMessage*) { w.CurrencySelection(); }},
-    {'RBSr', [](PLWindow& w, BMessage*) { w.SetCurrencyRef(); }},
-    {'RBAq', [](PLWindow& w, BMessage*) { w.AddCurrencyQuote(); }},
-    {'RBUq', [](PLWindow& w, BMessage*) { w.UpdateCurrencyQuote(); }},
-    {'RBRq', [](PLWindow& w, BMessage*) { w.RemoveCurrencyQuote(); }},
+    {'RBSr', [](PLWindow& w, BMessage*) { w.SetCurrencyRef(); }, "Set reference currency"},
+    {'RBAq', [](PLWindow& w, BMessage*) { w.AddCurrencyQuote(); }, "Add rate"},
+    {'RBUq', [](PLWindow& w, BMessage*) { w.UpdateCurrencyQuote(); }, "Update rate"},
+    {'RBRq', [](PLWindow& w, BMessage*) { w.RemoveCurrencyQuote(); }, "Remove rates"},
     {'RQSe', [](PLWindow& w, BMessage*) { w.CurrencyQuoteSelection(); }},
     // The portfolio page.
     {'WTDa', [](PLWindow& w, BMessage*) { valueAtDate(w); }},
     {'WCCe', [](PLWindow& w, BMessage*) { w.UpdateState(); }},
     {'WBLd', [](PLWindow& w, BMessage*) { w.LoadSomething(); }},
     {'WBSv', [](PLWindow& w, BMessage*) { w.SaveSomething(); }},
-    {'WBRe', [](PLWindow& w, BMessage*) { w.ReinitWallet(); }},
-    {'WBUp', [](PLWindow& w, BMessage*) { w.UpdatePortoFolioQuotes(); }},
-    {'WBAa', [](PLWindow& w, BMessage*) { w.AddAccount(); }},
-    {'WBUa', [](PLWindow& w, BMessage*) { w.UpdateAccount(); }},
-    {'WBRa', [](PLWindow& w, BMessage*) { w.RemoveAccount(); }},
+    {'WBRe', [](PLWindow& w, BMessage*) { w.ReinitWallet(); }, "Reinit"},
+    {'WBUp', [](PLWindow& w, BMessage*) { w.UpdatePortoFolioQuotes(); }, "Update quotes"},
+    {'WBAa', [](PLWindow& w, BMessage*) { w.AddAccount(); }, "Add account"},
+    {'WBUa', [](PLWindow& w, BMessage*) { w.UpdateAccount(); }, "Update account"},
+    {'WBRa', [](PLWindow& w, BMessage*) { w.RemoveAccount(); }, "Remove account"},
     {'Acsl', [](PLWindow& w, BMessage*) { w.AccountSelection(); }},
     // The operation page.
     {'OCPr', [](PLWindow& w, BMessage*) { w.UpdateState(); }},
@@ -86,26 +87,29 @@ constexpr Command kCommands[] = {
     {'OPSe', [](PLWindow& w, BMessage*) { w.ChangeOperationType("SELL"); }},
     {'OTQy', [](PLWindow& w, BMessage*) { w.UpdateOperationTotal(); }},
     {'OTQo', [](PLWindow& w, BMessage*) { w.UpdateOperationTotal(); }},
-    {'OBAd', [](PLWindow& w, BMessage*) { w.AddOperation(); }},
-    {'OBUp', [](PLWindow& w, BMessage*) { w.UpdateOperation(); }},
-    {'OBRe', [](PLWindow& w, BMessage*) { w.RemoveOperation(); }},
+    {'OBAd', [](PLWindow& w, BMessage*) { w.AddOperation(); }, "Add operation"},
+    {'OBUp', [](PLWindow& w, BMessage*) { w.UpdateOperation(); }, "Update operation"},
+    {'OBRe', [](PLWindow& w, BMessage*) { w.RemoveOperation(); }, "Remove operation"},
     {'OSel', [](PLWindow& w, BMessage*) { w.SelectOperation(); }},
     // The parameter page.
-    {'PTBc', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBc'); }},
-    {'PTSc', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTSc'); }},
-    {'PTBr', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBr'); }},
-    {'PTSr', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTSr'); }},
-    {'PTIn', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTIn'); }},
-    {'PTBp', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBp'); }},
-    {'PTEp', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTEp'); }},
-    {'PTBl', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBl'); }},
-    {'PTEl', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTEl'); }},
-    {'PTRe', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTRe'); }},
+    {'PTBc', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBc'); }, "Change parameter"},
+    {'PTSc', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTSc'); }, "Change parameter"},
+    {'PTBr', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBr'); }, "Change parameter"},
+    {'PTSr', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTSr'); }, "Change parameter"},
+    {'PTIn', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTIn'); }, "Change parameter"},
+    {'PTBp', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBp'); }, "Change parameter"},
+    {'PTEp', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTEp'); }, "Change parameter"},
+    {'PTBl', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTBl'); }, "Change parameter"},
+    {'PTEl', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTEl'); }, "Change parameter"},
+    {'PTRe', [](PLWindow& w, BMessage*) { w.ChangeParameter('PTRe'); }, "Change parameter"},
     // The file panels.
     {'SAVE', [](PLWindow& w, BMessage* m) { w.Save(m); }},
-    {B_REFS_RECEIVED, [](PLWindow& w, BMessage* m) { w.RefsReceived(m); }},
+    {B_REFS_RECEIVED, [](PLWindow& w, BMessage* m) { w.RefsReceived(m); }, "Load"},
+    // The window.
+    {'HUnd', [](PLWindow& w, BMessage*) { w.Undo(); }},
+    {'HRed', [](PLWindow& w, BMessage*) { w.Redo(); }},
 };
-static_assert(std::size(kCommands) == 65);
+static_assert(std::size(kCommands) == 67);
 
 /// Beside the vocabulary.
 constexpr Command kOwnCommands[] = {
@@ -144,6 +148,8 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     walletView_->setDate(today());
     ReinitWallet(); // from here on there is a wallet, always
+    history_ = std::make_unique<History>(moment(), files_->names());
+    showHistory();
 }
 
 PLWindow::~PLWindow() = default;
@@ -166,6 +172,7 @@ void PLWindow::makePages()
     messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
+    makeUndoButtons();
     AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // last: in front of the edges of both
 }
 
@@ -179,8 +186,11 @@ void PLWindow::MessageReceived(BMessage* message)
     }
     // A command that asks in an alert keeps the lock while it waits for the answer.
     const WindowLock lock(*this);
-    if (lock.isHeld())
-        command->run(*this, message);
+    if (!lock.isHeld())
+        return;
+    command_ = command->step;
+    command->run(*this, message);
+    noteStep(std::exchange(command_, {}));
 }
 
 bool PLWindow::QuitRequested()

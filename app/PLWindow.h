@@ -2,6 +2,7 @@
 
 #include "app/DataFiles.h"
 #include "app/EventEditor.h"
+#include "app/History.h"
 #include "app/Notice.h"
 #include "app/OperationEditor.h"
 #include "app/QuoteEditor.h"
@@ -12,6 +13,7 @@
 
 #include <memory>
 
+class BButton;
 class MessageView;
 class NoticeLine;
 class ParameterView;
@@ -81,6 +83,17 @@ public:
     void replaceWallet();
     /// Shows and values the portfolio after it was replaced or read.
     void showWallet();
+
+    // Undo, and what is not saved (UndoCommands.cpp).
+    /// Take the last step back, and do it again: a command with all that it has changed.
+    void Undo();
+    void Redo();
+    /// What is here of that kind is what its file has: it was just loaded, saved or begun.
+    void noteFile(FileKind kind);
+    /// Steps between what the file of that kind has and what is here.
+    unsigned unsavedChanges(FileKind kind) const { return history_->unsavedChanges(kind); }
+    /// Another number after every change of the model by a command.
+    std::uint64_t changeSerial() const { return history_->serial(); }
 
     // Files.
     void LoadSomething() { files_->askForLoad(); }
@@ -157,6 +170,16 @@ private:
     friend class StateHold;
 
     void makePages();
+    void makeUndoButtons();
+    /// Compares what is here with what there was after the last command, and keeps what has changed. `command` names
+    /// the step; commands know nothing of it, so that none can forget it.
+    void noteStep(const std::string& command);
+    Moment moment() const;
+    void restore(const Moment& moment);
+    void restoreFiles(const std::optional<DataFiles::Names>& names);
+    void showFields(const Market& market);
+    /// Says what can be taken back, which files are open, and how much of them is not saved.
+    void showHistory();
     /// Tells the wallet of the currencies and markets that there are now; to be called whenever they have changed.
     /// Names are looked up among them, so between two commands they are those of the catalogue.
     void refreshWalletCatalogue();
@@ -178,6 +201,12 @@ private:
     WalletView* walletView_ = nullptr;
     OperationView* operationView_ = nullptr;
     ParameterView* parameterView_ = nullptr;
+    BButton* undoButton_ = nullptr;
+    BButton* redoButton_ = nullptr;
+    std::unique_ptr<History> history_;        // null while the window is made
+    std::string command_;                     // that runs; empty when it has no name for a step
+    std::vector<const Operation*> simulated_; // sales that the last valuation made up; sorted, never looked into
+    bool isValued_ = false;                   // there was a valuation since the wallet came
     std::unique_ptr<DataFiles> files_;
     std::unique_ptr<QuoteEditor<Company>> companyQuotes_;
     std::unique_ptr<QuoteEditor<Currency>> currencyQuotes_;

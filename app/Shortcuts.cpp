@@ -15,6 +15,8 @@ constexpr uint32 kShowTab = 'KyTb';
 constexpr uint32 kLoad = 'KyLd';
 constexpr uint32 kSave = 'KySv';
 constexpr uint32 kAdd = 'KyAd';
+constexpr uint32 kUndo = 'KyUn';
+constexpr uint32 kRedo = 'KyRe';
 
 void press(BView* button)
 {
@@ -60,6 +62,8 @@ Shortcuts::Shortcuts(BWindow& window, BTabView& tabs) : window_(window), tabs_(t
     window.AddShortcut('O', B_CONTROL_KEY, new BMessage(kLoad), this);
     window.AddShortcut('S', B_CONTROL_KEY, new BMessage(kSave), this);
     window.AddShortcut('N', B_CONTROL_KEY, new BMessage(kAdd), this);
+    window.AddShortcut('Z', B_CONTROL_KEY, new BMessage(kUndo), this);
+    window.AddShortcut('Z', B_CONTROL_KEY | B_SHIFT_KEY, new BMessage(kRedo), this);
 }
 
 BLooper* Shortcuts::Looper() const
@@ -83,6 +87,12 @@ void Shortcuts::MessageReceived(BMessage* message)
         break;
     case kAdd:
         pressAdd();
+        break;
+    case kUndo:
+        press(window_.FindView("btnUndo"));
+        break;
+    case kRedo:
+        press(window_.FindView("btnRedo"));
         break;
     default:
         BHandler::MessageReceived(message);

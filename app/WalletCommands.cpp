@@ -10,6 +10,25 @@
 #include "views/ParameterView.h"
 #include "views/WalletView.h"
 
+#include <algorithm>
+#include <iterator>
+
+namespace {
+
+/// All that simulations have left in the holdings, by address.
+std::vector<const Operation*> automaticSales(const Wallet& wallet)
+{
+    std::vector<const Operation*> sales;
+    for (const Share* share : wallet.shares())
+        std::ranges::copy_if(share->shareOperations(), std::back_inserter(sales), [](const Operation* operation) {
+            return operation->isAutomatic() && operation->account() == nullptr;
+        });
+    std::ranges::sort(sales);
+    return sales;
+}
+
+} // namespace
+
 void PLWindow::AddAccount()
 {
     const String name = walletView_->getAccountName();
@@ -147,6 +166,7 @@ void PLWindow::ReinitWallet()
     replaceWallet();
     files_->forgetWallet();
     showWallet();
+    noteFile(FileKind::kWallet);
 }
 
 void PLWindow::UpdateState()
@@ -165,7 +185,11 @@ void PLWindow::UpdateState()
     const Date date = walletView_->getDate();
     const bool isEvolutionAsked = walletView_->isComputeEvolution();
     EvolutionOutcome outcome = EvolutionOutcome::kBuilt;
+    const auto earlierSales = automaticSales(*wallet_);
     State* state = refreshStates(*wallet_, date, operationView_->isPrevision(), isEvolutionAsked ? &outcome : nullptr);
+    isValued_ = state != nullptr;
+    simulated_.clear();
+    std::ranges::set_difference(automaticSales(*wallet_), earlierSales, std::back_inserter(simulated_));
     if (state == nullptr) {
         // Without a day there is no value. The page stays empty, and the operations stay listed but for those removed.
         walletView_->ClearEvolution();

@@ -89,11 +89,17 @@ void Catalogue::removeCurrency(Currency* currency)
     }
     // Nobody may be left with a pointer to what its new owner may destroy.
     for (Currency* other : currencies_) {
-        Currency* stored = nullptr;
-        other->getReferenceCurrency(&stored);
-        if (stored == currency)
+        if (other->storedReference() == currency)
             other->setReferenceCurrency(reference_);
     }
+}
+
+void Catalogue::dropLastCurrency()
+{
+    if (currencies_.back() == reference_)
+        reference_ = nullptr;
+    delete currencies_.back();
+    currencies_.pop_back();
 }
 
 void Catalogue::clear()

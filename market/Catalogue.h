@@ -34,6 +34,9 @@ public:
     /// reference, the currency then first becomes that, by `rebaseOn`. No other currency goes on storing it as its own
     /// reference.
     void removeCurrency(Currency* currency);
+    /// Destroys the last currency; nothing else changes, and no rate is divided. When it was the reference, there is
+    /// none until the next `setReferenceCurrency`.
+    void dropLastCurrency();
     /// Destroys all currencies; there is no reference any more.
     void clear();
     unsigned getNbrCurrencies() const;

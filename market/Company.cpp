@@ -45,8 +45,11 @@ int Company::wrt(FILE* file) const
 {
     name_.wrt(file);
     abbreviation_.wrt(file);
-    if (writeQuotes(file) != 0)
-        return -1;
+    return writeQuotes(file) == 0 ? writeEvents(file) : -1;
+}
+
+int Company::writeEvents(FILE* file) const
+{
     fwriteint(file, static_cast<int>(getNbrEvents()));
     for (const CompanyEvent* event : events()) {
         fwriteshort(file, static_cast<unsigned short>(event->getType()));

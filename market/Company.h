@@ -44,6 +44,10 @@ public:
     unsigned getNbrEvents() const { return events_.getNbr(); }
     CompanyEvent** getAllEvents(unsigned* n) const { return events_.getAll(n); }
     std::span<CompanyEvent* const> events() const { return events_.all(); }
+    /// File: count (i32), then of each event its type (u16) and its record, in the order of the list. `readEvents` adds
+    /// what it reads. @return 0; -1 when a write failed or the file ended early.
+    int writeEvents(FILE* file) const;
+    int readEvents(FILE* file);
 
     // Defined in net/, with the transfers:
 
@@ -58,8 +62,6 @@ private:
     friend class CompanyEventsToCompany;
     friend class SharesToCompany;
     friend class MarketToCompanies;
-
-    int readEvents(FILE* file);
 
     String name_;
     String abbreviation_;

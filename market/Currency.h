@@ -33,6 +33,8 @@ public:
     void setRepresentation(const String& representation) { representation_ = representation; }
 
     int setReferenceCurrency(Currency* reference);
+    /// The stored reference, null when there is none.
+    Currency* storedReference() const { return reference_; }
     /// `*out` becomes the stored reference, or this currency when there is none. Always 0.
     int getReferenceCurrency(Currency** out);
 

@@ -5,8 +5,7 @@
 int Quote::wrt(FILE* file) const
 {
     unsigned char bytes[kFileSize];
-    getDate().encode(bytes);
-    encodeFloat(bytes + Date::kFileSize, value_);
+    encode(bytes);
     return std::fwrite(bytes, sizeof bytes, 1, file) == 1 ? 0 : -1;
 }
 
@@ -25,6 +24,12 @@ void Quote::decode(const unsigned char* bytes)
     // Nobody is told: a quote is decoded before it is linked, or by `rd`, which tells.
     date_.decode(bytes);
     value_ = decodeFloat(bytes + Date::kFileSize);
+}
+
+void Quote::encode(unsigned char* bytes) const
+{
+    getDate().encode(bytes);
+    encodeFloat(bytes + Date::kFileSize, value_);
 }
 
 void Quote::setDate(const Date& date)

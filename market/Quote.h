@@ -18,6 +18,7 @@ public:
     static constexpr int kFileSize = Date::kFileSize + 4;
     /// Takes date and value from the `kFileSize` bytes of a record, without notice to an owner.
     void decode(const unsigned char* bytes);
+    void encode(unsigned char* bytes) const;
 
     Date getDate() const { return date_.date(); }
     /// The same, to compare.

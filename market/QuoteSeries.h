@@ -7,6 +7,8 @@
 #include <cmath>
 #include <cstdint>
 #include <span>
+#include <string>
+#include <string_view>
 #include <vector>
 
 /// The next number for `QuoteSeries::revision`: one that no series of the program has had. 0 is never given.
@@ -92,6 +94,11 @@ public:
         PackedDate day_;                       // asked for last
         std::size_t next_ = 0;                 // the first quote on or after it
     };
+
+    /// The quotes as their records in the file, by date.
+    std::string quoteRecords() const;
+    /// Replaces all quotes by those of `records`, from `quoteRecords`: two of one day are two again.
+    void setQuoteRecords(std::string_view records);
 
     /// Date of the earliest and of the latest quote; the undefined date without quotes.
     Date getFirstQuote() const { return quotes_.getNbr() > 0 ? quotes_.at(0)->getDate() : Date(); }
@@ -300,6 +307,33 @@ int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
     }
     replaceWith(late);
     return missing == 0 && !reachedEnd(file) ? 0 : -1;
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+std::string QuoteSeries<Owner, SeriesQuote, ManyEnd>::quoteRecords() const
+{
+    std::string records(std::size_t{getNbrQuotes()} * SeriesQuote::kFileSize, '\0');
+    auto* bytes = reinterpret_cast<unsigned char*>(records.data());
+    for (const SeriesQuote* quote : quotes()) {
+        quote->encode(bytes);
+        bytes += SeriesQuote::kFileSize;
+    }
+    return records;
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+void QuoteSeries<Owner, SeriesQuote, ManyEnd>::setQuoteRecords(std::string_view records)
+{
+    deleteQuotes();
+    const auto* bytes = reinterpret_cast<const unsigned char*>(records.data());
+    const auto* end = bytes + records.size();
+    quotes_.reserve(static_cast<std::uint32_t>(records.size() / SeriesQuote::kFileSize));
+    for (; bytes != end; bytes += SeriesQuote::kFileSize) {
+        auto* quote = new SeriesQuote;
+        quote->decode(bytes);
+        quotes_.addNew(quote); // past `addQuote`, which keeps one a day
+    }
+    updatePrevisions();
 }
 
 /// Adds quotes that did not come in date order, with the outcome of one `addQuote` after the other: of each day the

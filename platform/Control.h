@@ -12,6 +12,9 @@ public:
     virtual void SetLabel(const char* label) { label_ = label; }
     virtual void SetValue(int32 value) { value_ = value; }
     int32 Value() const { return value_; }
+    /// One that is not enabled shows in grey and is of no use.
+    void SetEnabled(bool enabled);
+    bool IsEnabled() const;
 
     /// The target is the window, unless another one was set.
     void AttachedToWindow() override;

@@ -24,7 +24,7 @@ enum button_width { B_WIDTH_AS_USUAL };
 enum alignment { B_ALIGN_LEFT, B_ALIGN_RIGHT, B_ALIGN_CENTER };
 
 /// Keys that are held while another one is pressed.
-enum : uint32 { B_COMMAND_KEY = 2, B_CONTROL_KEY = 4 };
+enum : uint32 { B_SHIFT_KEY = 1, B_COMMAND_KEY = 2, B_CONTROL_KEY = 4 };
 
 constexpr int32 B_CONTROL_OFF = 0;
 constexpr int32 B_CONTROL_ON = 1;

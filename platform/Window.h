@@ -40,6 +40,10 @@ public:
     /// field that is being typed in sends its text before. Ctrl+Q, which closes the window, is there from the start.
     void AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHandler* target = nullptr);
 
+    /// The text in the field that has the keyboard counts as typed before: Ctrl+Z is the window's from here on. Until
+    /// then, and as soon as more is typed, it takes back what was typed in the field. The kits leave it to the window.
+    void ForgetTyping();
+
     void Show();
     void Hide();
     /// Destroys the window, which has been made with `new`, and its views.

@@ -243,3 +243,34 @@ void CompanyView::SetCompanyEventList(Company* company)
         events.assign(company->events().begin(), company->events().end());
     events_->list().showAll(events);
 }
+
+CompanyView::Places CompanyView::places(const std::vector<Market*>& markets) const
+{
+    Places places;
+    places.markets = markets_->places(markets);
+    const auto shown = std::ranges::find(markets, shownMarket_);
+    if (shown != markets.end()) {
+        places.shownMarket = static_cast<std::size_t>(shown - markets.begin());
+        places.companies = companies_->places((*shown)->companies());
+    }
+    if (const Company* company = GetSelectedCompany(); company != nullptr && company == eventsOf_)
+        places.events = events_->list().places(company->events());
+    places.quotes = quoteSelection();
+    return places;
+}
+
+void CompanyView::restore(const Places& places, const std::vector<Market*>& markets)
+{
+    markets_->restore(places.markets, markets);
+    if (!places.shownMarket)
+        return;
+    // Quotes and events follow the company that is selected, each list with what was selected in it.
+    shownMarket_ = markets[*places.shownMarket];
+    companies_->restore(places.companies, shownMarket_->companies());
+    if (Company* company = GetSelectedCompany()) {
+        SetQuoteList(company);
+        restoreQuoteSelection(places.quotes);
+        eventsOf_ = company;
+        events_->list().restore(places.events, company->events());
+    }
+}

@@ -7,6 +7,7 @@
 #include "views/MarketListView.h"
 #include "views/SeriesPage.h"
 
+#include <optional>
 #include <vector>
 
 /// The page of markets and companies, with the quotes and events of the selected company.
@@ -90,6 +91,18 @@ public:
     void DeleteCompanyEvents(std::span<CompanyEvent* const> events);
     /// Shows the events of `company`; null shows none.
     void SetCompanyEventList(Company* company);
+
+    /// What the lists show. `markets` are those of the catalogue, in its order.
+    struct Places {
+        ListPlaces markets;
+        std::optional<std::size_t> shownMarket; // whose companies are listed
+        ListPlaces companies;
+        ListPlaces quotes;
+        ListPlaces events;
+    };
+    Places places(const std::vector<Market*>& markets) const;
+    /// Brings back the rows and what was selected, in lists that show nothing; sends no message.
+    void restore(const Places& places, const std::vector<Market*>& markets);
 
 private:
     void makeMarkets(BRect frame);

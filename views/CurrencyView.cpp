@@ -134,3 +134,30 @@ void CurrencyView::fillChart(QuoteChart& chart, const Currency& currency) const
     const std::string reference = textOf(referenceName_->Text());
     chart.showSeries(currency, textOf(currency.getRepresentation()), reference.empty() ? "???" : reference, false);
 }
+
+CurrencyView::Places CurrencyView::places() const
+{
+    Places places{currencies_->selection(), {}, quoteSelection()};
+    if (const Currency* currency = GetSelectedCurrency(); currency != nullptr && currency == marketsOf_)
+        places.markets = markets_->places(currency->markets());
+    return places;
+}
+
+void CurrencyView::restore(const Places& places, const std::vector<Currency*>& currencies)
+{
+    currencies_->addAll(currencies);
+    currencies_->restoreSelection(places.currencies);
+    if (Currency* currency = GetSelectedCurrency()) {
+        marketsOf_ = currency;
+        markets_->restore(places.markets, currency->markets());
+        SetQuoteList(currency);
+        restoreQuoteSelection(places.quotes);
+    }
+}
+
+void CurrencyView::DeleteAllCurrencies()
+{
+    currencies_->clear();
+    SetMarketList(nullptr);
+    SetQuoteList(nullptr);
+}

@@ -36,6 +36,18 @@ public:
     void ModifyMarket(Market* market) { markets_->modify(market); }
     void DeleteMarket(Market* market) { markets_->remove(market); }
 
+    /// What the lists show.
+    struct Places {
+        ListPlaces currencies;
+        ListPlaces markets;
+        ListPlaces quotes;
+    };
+    Places places() const;
+    /// Fills the lists, which show nothing, and brings back what was selected; sends no message.
+    void restore(const Places& places, const std::vector<Currency*>& currencies);
+    /// Shows no currency any more.
+    void DeleteAllCurrencies();
+
 private:
     void makeCurrencies(BRect frame);
     void makeMarkets(BRect frame);

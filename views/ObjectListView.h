@@ -2,8 +2,10 @@
 
 #include "views/ColumnItem.h"
 #include "views/ColumnListView.h"
+#include "views/ListPlaces.h"
 
 #include <algorithm>
+#include <span>
 #include <unordered_map>
 #include <vector>
 
@@ -183,6 +185,46 @@ public:
         SetTopRow(rememberedTop_);
         SetQuiet(false);
         forget();
+    }
+
+    /// What is selected and in view; without the rows.
+    ListPlaces selection() const
+    {
+        ListPlaces places;
+        for (int32 i = 0; i < CountSelected(); ++i)
+            places.selected.push_back(CurrentSelection(i));
+        places.top = TopRow();
+        return places;
+    }
+    /// The same with the rows; all of them stand for one of `objects`.
+    ListPlaces places(std::span<Object* const> objects) const
+    {
+        std::unordered_map<const Object*, std::size_t> placeOf;
+        for (Object* object : objects)
+            placeOf.emplace(object, placeOf.size());
+        ListPlaces places = selection();
+        for (int32 i = 0; i < CountItems(); ++i)
+            places.rows.push_back(placeOf.at(objectAt(i)));
+        return places;
+    }
+    /// Brings back selection and view in rows that are as they were then. Sends no message.
+    void restoreSelection(const ListPlaces& places)
+    {
+        SetQuiet(true);
+        for (const int32 row : places.selected)
+            Select(row, true);
+        SetTopRow(places.top);
+        SetQuiet(false);
+    }
+    /// The same, and brings back the rows, with `objects` in the places of those of then.
+    void restore(const ListPlaces& places, std::span<Object* const> objects)
+    {
+        std::vector<Object*> rows;
+        for (const std::size_t place : places.rows)
+            rows.push_back(objects[place]);
+        clear();
+        addAll(rows);
+        restoreSelection(places);
     }
 
 private:

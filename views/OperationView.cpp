@@ -75,6 +75,7 @@ OperationView::OperationView(BRect frame, const char* name, BWindow*) : PageView
 {
     prevision_ = addCheckBox(this, {kMargin, kMargin, kMargin + 150, kMargin + kFieldHeight}, "cbxPrevision",
                              "With Previsions", 'OCPr');
+    addOpenFile(this, {kMargin + 160, kMargin, kRight - 160, kMargin + kFieldHeight});
     prevision_->SetToolTip("Simulates the sales that the parameters ask for");
     makeList();
     makeFields();

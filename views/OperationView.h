@@ -43,6 +43,10 @@ public:
     void RemoveOperation(const Operation* operation) { operations_->release(operation); }
     void RemoveAccountOperation(AccountOperation* operation) { RemoveOperation(operation); }
     void RemoveShareOperation(ShareOperation* operation) { RemoveOperation(operation); }
+    /// What is selected and in view.
+    ListPlaces selection() const { return operations_->selection(); }
+    /// Sends no message.
+    void restoreSelection(const ListPlaces& places) { operations_->restoreSelection(places); }
     /// Takes the rows of removed operations out of a list that is not filled again.
     void DropRemovedOperations() { operations_->dropReleased(); }
     /// Draws the operation's row again.

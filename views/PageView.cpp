@@ -1,8 +1,10 @@
 #include "views/PageView.h"
 
+#include "foundation/NumberText.h"
 #include "platform/Box.h"
 #include "platform/Button.h"
 #include "platform/CheckBox.h"
+#include "platform/StringView.h"
 #include "platform/TextControl.h"
 #include "views/DateControl.h"
 #include "views/Look.h"
@@ -78,6 +80,8 @@ void PageView::addLoadAndSave(BView* page)
     constexpr float kRight = look::kPageWidth - look::kMargin;
     addButtons(page, {kRight - 2 * kWidth - look::kGap, look::kMargin, kRight, look::kMargin + look::kButtonHeight},
                {{"btnLoadMarket", "Load", 'CBLd'}, {"btnSaveMarket", "Save", 'CBSv'}});
+    addOpenFile(page, {look::kMargin, look::kMargin, kRight - 2 * kWidth - 3 * look::kGap,
+                       look::kMargin + look::kButtonHeight});
     explain(*page, {{"btnLoadMarket", "Loads currencies, markets and companies from a file.  Ctrl+O"},
                     {"btnSaveMarket", "Saves all currencies, markets and companies to a file.  Ctrl+S"}});
 }
@@ -86,6 +90,26 @@ void PageView::explain(BView& page, std::initializer_list<Tip> tips)
 {
     for (const Tip& tip : tips)
         page.FindView(tip.control)->SetToolTip(tip.text);
+}
+
+void PageView::addOpenFile(BView* page, BRect frame)
+{
+    auto* line = new BStringView(frame, "txtOpenFile", "");
+    line->SetAlignment(B_ALIGN_RIGHT);
+    page->AddChild(line);
+}
+
+void PageView::SetOpenFile(const String& path, unsigned changes)
+{
+    constexpr std::size_t kLongestName = 40; // bytes; the tool tip has the whole path
+    const std::string_view whole = path.bytes();
+    const std::string name(whole.substr(whole.rfind('/') + 1)); // all of it without a slash
+    std::string text = whole.empty() ? "No file" : shortened(name, kLongestName);
+    if (changes > 0)
+        text += " - " + countText(static_cast<int>(changes)) + (changes == 1 ? " change" : " changes") + " not saved";
+    auto* line = static_cast<BStringView*>(FindView("txtOpenFile"));
+    line->SetText(text.c_str());
+    line->SetToolTip(whole.empty() ? "" : wholeTextOf(path));
 }
 
 BCheckBox* PageView::addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code)

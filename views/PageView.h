@@ -52,6 +52,10 @@ public:
     };
     /// Gives controls of the page their tool tips.
     static void explain(BView& page, std::initializer_list<Tip> tips);
+    /// A line that says which file the page is about, at the right of `frame`; `SetOpenFile` fills it.
+    static void addOpenFile(BView* page, BRect frame);
+    /// `path` is undefined before there is a file; `changes` is how many are not saved to it.
+    void SetOpenFile(const String& path, unsigned changes);
     static BCheckBox* addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code);
 
     /// Shows a text of the model; nothing for a String without text.

@@ -83,6 +83,7 @@ float number(const std::string& token, double unit)
 
 ParameterView::ParameterView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
 {
+    addOpenFile(this, {kRight, 2, look::kPageWidth - look::kMargin, 2 + kHeight});
     for (std::size_t i = 0; i < fields_.size(); ++i) {
         const float top = kTop + kPitch * static_cast<float>(i);
         fields_[i] = addNumber(this, {kLeft, top, kRight, top + kHeight}, kPlan[i].name, kPlan[i].label, kPlan[i].code,

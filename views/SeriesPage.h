@@ -84,6 +84,10 @@ public:
             chart_->showNothing();
     }
 
+    /// What is selected and in view in the list of quotes.
+    ListPlaces quoteSelection() const { return quotes_->list().selection(); }
+    void restoreQuoteSelection(const ListPlaces& places) { quotes_->list().restoreSelection(places); }
+
 protected:
     using PageView::PageView;
 

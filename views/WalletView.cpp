@@ -21,7 +21,8 @@ using namespace look;
 // Where the groups of the page begin and end.
 constexpr float kRight = kPageWidth - kMargin;
 constexpr float kTopEnd = kMargin + kButtonHeight;
-constexpr float kTotalsTop = kTopEnd + kMargin;
+constexpr float kFileEnd = kTopEnd + 18;
+constexpr float kTotalsTop = kFileEnd;
 constexpr float kTotalsEnd = kTotalsTop + 54;
 constexpr float kAccountsTop = kTotalsEnd + kMargin;
 constexpr float kAccountsEnd = kAccountsTop + 148;
@@ -54,11 +55,12 @@ void WalletView::makeTop()
                 {"btnSavePortoFolio", "Save to File", 'WBSv'},
                 {"btnReinitPortoFolio", "Reinit", 'WBRe'},
                 {"btnUpdateAllQuotes", "Update Quotes", 'WBUp'}});
+    addOpenFile(this, {kMargin, kTopEnd, kRight, kFileEnd});
     explain(*this, {{"txtDate", "The day to value at.  Up and Down: a day on and back; Page Up and Page Down: a month"},
                     {"cbxComputeEvolution", "Draws the value of every day since the first operation"},
                     {"btnLoadPortoFolio", "Loads the portfolio from a file.  Ctrl+O"},
                     {"btnSavePortoFolio", "Saves the portfolio to a file.  Ctrl+S"},
-                    {"btnReinitPortoFolio", "Begins an empty portfolio. Asks nothing: save before"},
+                    {"btnReinitPortoFolio", "Begins an empty portfolio. Asks nothing; Undo brings the former one back"},
                     {"btnUpdateAllQuotes", "Fetches the latest quote of every company that is or was held"}});
 }
 
@@ -226,4 +228,15 @@ void WalletView::SetAccountStateList(const State* state)
 AccountState* WalletView::GetSelectedAccountState() const
 {
     return accounts_->selected();
+}
+
+std::pair<ListPlaces, ListPlaces> WalletView::selections() const
+{
+    return {accounts_->selection(), shares_->selection()};
+}
+
+void WalletView::restoreSelections(const std::pair<ListPlaces, ListPlaces>& selections)
+{
+    accounts_->restoreSelection(selections.first);
+    shares_->restoreSelection(selections.second);
 }

@@ -5,7 +5,10 @@
 #include "foundation/String.h"
 #include "platform/CheckBox.h"
 #include "views/DateControl.h"
+#include "views/ListPlaces.h"
 #include "views/PageView.h"
+
+#include <utility>
 
 class AccountState;
 class BStringView;
@@ -48,6 +51,10 @@ public:
     void setAccountCurrency(const String& representation) { showText(*accountCurrency_, representation); }
     bool isDefaultTransferAccount() const { return defaultTransferAccount_->Value() == B_CONTROL_ON; }
     void setDefaultTransferAccount(bool isDefault) { defaultTransferAccount_->SetValue(isDefault); }
+    /// What is selected and in view in the lists of accounts and of holdings.
+    std::pair<ListPlaces, ListPlaces> selections() const;
+    /// Sends no message.
+    void restoreSelections(const std::pair<ListPlaces, ListPlaces>& selections);
     /// Null when no account is selected.
     AccountState* GetSelectedAccountState() const;
     /// Fills the account list; null empties it.

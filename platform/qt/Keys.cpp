@@ -20,3 +20,15 @@ std::string keyBytes(const QKeyEvent& event)
     }
     return event.text().toStdString();
 }
+
+bool isForWindow(QEvent& event, bool isModified, bool hasRedo)
+{
+    if (event.type() != QEvent::ShortcutOverride)
+        return false;
+    const auto& key = static_cast<const QKeyEvent&>(event);
+    const bool isFree =
+        (key.matches(QKeySequence::Undo) && !isModified) || (key.matches(QKeySequence::Redo) && !hasRedo);
+    if (isFree)
+        event.ignore();
+    return isFree;
+}

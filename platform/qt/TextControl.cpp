@@ -22,6 +22,11 @@ public:
 
     BView* view = nullptr;
 
+    bool event(QEvent* event) override
+    {
+        return isForWindow(*event, isModified(), isRedoAvailable()) || QLineEdit::event(event);
+    }
+
 protected:
     void keyPressEvent(QKeyEvent* event) override
     {

@@ -1,6 +1,7 @@
 #include "platform/TextView.h"
 
 #include "platform/qt/FieldText.h"
+#include "platform/qt/Keys.h"
 
 #include <QPlainTextEdit>
 
@@ -8,10 +9,19 @@ namespace {
 
 constexpr std::size_t kLongestShown = 65536; // bytes: some twenty pages
 
+class Note final : public QPlainTextEdit {
+public:
+    bool event(QEvent* event) override
+    {
+        return isForWindow(*event, document()->isModified(), document()->isRedoAvailable()) ||
+               QPlainTextEdit::event(event);
+    }
+};
+
 } // namespace
 
 BTextView::BTextView(BRect frame, const char* name, uint32 resizingMode, uint32 flags)
-    : BView(frame, name, resizingMode, flags, new QPlainTextEdit), text_(std::make_unique<FieldText>(kLongestShown))
+    : BView(frame, name, resizingMode, flags, new Note), text_(std::make_unique<FieldText>(kLongestShown))
 {
     field().setTabChangesFocus(true);
     SetAccessibleName(name);

@@ -6,6 +6,8 @@
 #include "platform/qt/WindowWidget.h"
 
 #include <QApplication>
+#include <QLineEdit>
+#include <QPlainTextEdit>
 #include <QPoint>
 #include <QSize>
 
@@ -70,6 +72,14 @@ void BWindow::AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHand
     const std::shared_ptr<const BMessage> sent(message);
     const BMessenger messenger(target != nullptr ? target : this);
     widget_->addShortcut(static_cast<int>(key), modifiers, [messenger, sent] { messenger.SendMessage(sent.get()); });
+}
+
+void BWindow::ForgetTyping()
+{
+    if (auto* field = qobject_cast<QLineEdit*>(widget_->focusWidget()))
+        field->setModified(false);
+    if (auto* field = qobject_cast<QPlainTextEdit*>(widget_->focusWidget()))
+        field->document()->setModified(false);
 }
 
 void BWindow::Show()

@@ -21,7 +21,8 @@ void WindowWidget::addShortcut(int key, uint32 modifiers, const std::function<vo
     constexpr struct {
         uint32 modifier;
         Qt::KeyboardModifier ours;
-    } kModifiers[] = {{B_COMMAND_KEY, Qt::AltModifier}, {B_CONTROL_KEY, Qt::ControlModifier}};
+    } kModifiers[] = {
+        {B_SHIFT_KEY, Qt::ShiftModifier}, {B_COMMAND_KEY, Qt::AltModifier}, {B_CONTROL_KEY, Qt::ControlModifier}};
     int combination = key;
     for (const auto& m : kModifiers)
         combination |= (modifiers & m.modifier) != 0 ? static_cast<int>(m.ours) : 0;

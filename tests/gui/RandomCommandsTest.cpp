@@ -12,7 +12,6 @@
 #include "valuation/Totals.h"
 
 #include <cmath>
-#include <cstdlib>
 
 namespace {
 
@@ -179,13 +178,6 @@ TEST_P(RandomCommandsTest, LinksListsAndFileAgreeAfterEachCommand)
     if (areNamesUnique()) {
         EXPECT_GT(valuesCompared(), 4);
     }
-}
-
-/// For longer runs, which take other seeds each time: see CONTRIBUTING.md.
-unsigned firstSeed()
-{
-    const char* text = std::getenv("PELORIN_FIRST_SEED");
-    return text != nullptr ? static_cast<unsigned>(std::strtoul(text, nullptr, 10)) : 1;
 }
 
 INSTANTIATE_TEST_SUITE_P(Seeds, RandomCommandsTest, testing::Range(firstSeed(), firstSeed() + 4));

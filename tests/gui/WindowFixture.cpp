@@ -57,7 +57,7 @@ void WindowTest::restart()
 
 void WindowTest::open()
 {
-    window_ = new PLWindow({50, 50, 850, 850}, DataFolder(folder_));
+    window_ = make_({50, 50, 850, 850}, DataFolder(folder_));
     window_->Show();
     activate();
 }

@@ -4,6 +4,7 @@
 
 #include <QString>
 #include <QWidget>
+#include <functional>
 #include <gtest/gtest.h>
 #include <memory>
 #include <string>
@@ -91,6 +92,9 @@ protected:
     /// Both files through the buttons and panels.
     void loadSample();
 
+    /// What `restart` makes: another kind of window.
+    void setMaker(const std::function<PLWindow*(BRect, const DataFolder&)>& make) { make_ = make; }
+
 private:
     void open();
     void activate();
@@ -100,6 +104,9 @@ private:
 
     std::unique_ptr<QTemporaryDir> temporary_;
     std::string folder_;
+    std::function<PLWindow*(BRect, const DataFolder&)> make_ = [](BRect frame, const DataFolder& folder) {
+        return new PLWindow(frame, folder);
+    };
     PLWindow* window_; // owns itself
     std::string alertAnswer_;
     std::vector<std::string> alerts_;

@@ -1,0 +1,94 @@
+#pragma once
+
+#include "app/DataFiles.h"
+#include "app/FileKind.h"
+#include "history/CatalogueImage.h"
+#include "history/WalletImage.h"
+#include "views/CompanyView.h"
+#include "views/CurrencyView.h"
+
+#include <array>
+#include <cstdint>
+#include <deque>
+#include <map>
+#include <memory>
+#include <optional>
+#include <string>
+#include <utility>
+
+/// The model and what the lists show of it, at one moment.
+struct Moment {
+    std::shared_ptr<const CatalogueImage> catalogue;
+    std::shared_ptr<const WalletImage> wallet;
+    CompanyView::Places companyPage;
+    CurrencyView::Places currencyPage;
+    std::pair<ListPlaces, ListPlaces> portfolioPage;
+    ListPlaces operations;
+};
+
+/// The moments between the user's steps, from the oldest that is remembered to the newest that was taken back: what
+/// undo and redo go along. It also counts what is not in the files.
+///
+/// A step is a change of the model but for what a valuation makes up, or of the files that are remembered by a command
+/// that has a name. The moment now is always up to date: what is no step replaces it. A new step forgets those that
+/// were taken back.
+class History {
+public:
+    /// How much is remembered, whichever is more; the last step in any case.
+    static constexpr std::size_t kMostSteps = 1000;
+    static constexpr std::size_t kMostBytes = std::size_t{256} << 20;
+
+    History(Moment first, DataFiles::Names names);
+
+    /// Takes note of what is there after a command; `command` is its name, empty for one that is no step by itself.
+    void note(Moment now, const DataFiles::Names& names, const std::string& command);
+
+    bool canUndo() const { return now_ > 0; }
+    bool canRedo() const { return now_ + 1 < entries_.size(); }
+    /// What the step is, to be told: "Remove company ALP".
+    const std::string& undoLabel() const { return entries_[now_].label; }
+    const std::string& redoLabel() const { return entries_[now_ + 1].label; }
+    /// Go back or on by one step. The moment to be restored is `now()` then.
+    /// @return the files to be remembered from now on, when the step changed them.
+    std::optional<DataFiles::Names> undo();
+    std::optional<DataFiles::Names> redo();
+    const Moment& now() const { return entries_[now_].moment; }
+
+    /// What is there now is what the remembered file of that kind has.
+    void noteFile(FileKind kind);
+    /// The steps between what the remembered file has and what is there; 0 when they are the same.
+    unsigned unsavedChanges(FileKind kind) const;
+    /// Another number after every step, undo and redo.
+    std::uint64_t serial() const { return serial_; }
+    /// Bytes that the steps hold besides what is there now.
+    std::size_t bytes() const { return bytes_; }
+
+private:
+    using Counts = std::array<long, 2>; // by kind
+    /// A moment, and the step that led to it.
+    struct Entry {
+        Moment moment;
+        std::string label;
+        std::optional<std::pair<DataFiles::Names, DataFiles::Names>> files; // before and after, when they changed
+        Counts steps{};                                                     // that changed what is of that kind
+        std::size_t bytes = 0;                                              // in the moment before, and not in this one
+    };
+    /// What a file has.
+    struct Mark {
+        long step;
+        std::shared_ptr<const CatalogueImage> catalogue;
+        std::shared_ptr<const WalletImage> wallet;
+    };
+
+    bool isSame(FileKind kind, const Moment& a, const Moment& b) const;
+    void forgetUndone();
+    void forgetOldest();
+    std::string pathOf(FileKind kind) const;
+
+    std::deque<Entry> entries_;
+    std::size_t now_ = 0;
+    DataFiles::Names names_;
+    std::map<std::pair<FileKind, std::string>, Mark> marks_; // by path, empty for no file yet
+    std::size_t bytes_ = 0;
+    std::uint64_t serial_ = 0;
+};

@@ -1,0 +1,161 @@
+// Undo and redo: whatever a person did, the way back passes the same moments, and the way on again.
+
+#include "platform/Button.h"
+#include "platform/CheckBox.h"
+#include "platform/Entry.h"
+#include "platform/ListItem.h"
+#include "platform/Message.h"
+#include "platform/TabView.h"
+#include "tests/gui/RandomCommands.h"
+#include "tests/support/Bytes.h"
+
+#include <cstdlib>
+#include <map>
+
+namespace {
+
+/// Tells of each message that was handled.
+class WatchedWindow final : public PLWindow {
+public:
+    using PLWindow::PLWindow;
+
+    void MessageReceived(BMessage* message) override
+    {
+        PLWindow::MessageReceived(message);
+        if (handled)
+            handled();
+    }
+
+    std::function<void()> handled;
+};
+
+class UndoTest : public RandomCommands, public testing::WithParamInterface<unsigned> {
+protected:
+    UndoTest() : RandomCommands(GetParam())
+    {
+        setMaker([](BRect frame, const DataFolder& folder) { return new WatchedWindow(frame, folder); });
+        restart();
+        watched().handled = [this] { noteMoment(); };
+    }
+    ~UndoTest() override { watched().handled = nullptr; }
+
+    WatchedWindow& watched() { return dynamic_cast<WatchedWindow&>(window()); }
+
+    /// All that shall come back: both files, all lists with what is selected, the totals, the lists of holdings.
+    std::string fingerprint()
+    {
+        const Date stamp(1, 1, 2024);
+        std::string print = written([&](FILE* file) { window().catalogue().wrt(file, stamp); });
+        print += "\n--\n" + written([&](FILE* file) { wallet().wrt(file, stamp); });
+        for (const auto& [page, name] : kLists) {
+            const BListView& rows = listOf(page, name);
+            print += std::string("\n-- ") + page + ' ' + name;
+            for (int32 i = 0; i < rows.CountItems(); ++i)
+                print += (rows.IsItemSelected(i) ? "\n* " : "\n") + rows.ItemAt(i)->Text();
+        }
+        print += "\n--";
+        for (const char* field : {"txtTotalDeposit", "txtTotalValue", "txtProfit", "txtAnnualRevenu"})
+            print += std::string(" ") + dynamic_cast<BTextControl&>(*window().FindView(field)).Text();
+        for (const Market* market : window().catalogue().getMarkets())
+            for (const Company* company : market->companies())
+                for (const Share* share : company->shares()) {
+                    unsigned place = 0;
+                    while (wallet().shares()[place] != share)
+                        ++place;
+                    print += "\nholding " + std::to_string(place) + ' ';
+                    for (const ShareOperation* operation : share->shareOperations())
+                        print += dateOf(operation->getDate(), 0) + (operation->isAutomatic() ? "a " : " ");
+                }
+        return print;
+    }
+
+    /// Of the moments between two steps the last one counts: it is what the next step is taken back to.
+    void noteMoment()
+    {
+        if (isGoing_)
+            return;
+        moments_[window().changeSerial() - begin_] = fingerprint();
+    }
+
+    void loadAndReinit()
+    {
+        settle();
+        const auto load = [this](int32 tab, const std::string& name) {
+            dynamic_cast<BTabView&>(*window().FindView("TabView")).Select(tab);
+            settle();
+            if (under(2) == 0)
+                window().Save((folder() + '/' + name).c_str());
+            BMessage answer(B_REFS_RECEIVED);
+            const entry_ref ref{folder(), name};
+            answer.AddRef("refs", &ref);
+            window().PostMessage(&answer);
+            settle();
+        };
+        switch (under(4)) {
+        case 0:
+            return load(0, "market" + std::to_string(under(2)));
+        case 1:
+            return send({'WBRe'});
+        default:
+            return load(2, "wallet" + std::to_string(under(2)));
+        }
+    }
+
+    void removeMuch()
+    {
+        for (const uint32 removal : {'CBRm', 'CBRc', 'RBRe', 'WBRa'})
+            if (under(30) == 0)
+                send({removal});
+    }
+
+    /// Along the steps by a button, and at each moment all is as it was.
+    void go(const char* button, long from, long to)
+    {
+        isGoing_ = true;
+        for (long step = from; step != to && !HasFailure();) {
+            step += to > from ? 1 : -1;
+            dynamic_cast<BButton&>(*window().FindView(button)).Invoke();
+            settle();
+            ASSERT_EQ(fingerprint(), moments_[static_cast<std::uint64_t>(step)]) << button << " to step " << step;
+        }
+        isGoing_ = false;
+    }
+    long stepCount() { return static_cast<long>(window().changeSerial() - begin_); }
+    bool isEnabled(const char* button) { return dynamic_cast<BButton&>(*window().FindView(button)).IsEnabled(); }
+
+    std::uint64_t begin_ = 0;
+    bool isGoing_ = false;
+    std::map<std::uint64_t, std::string> moments_;
+};
+
+TEST_P(UndoTest, TheWayBackAndOnPassesTheSameMoments)
+{
+    // What is valued, and how, is no part of a step: it stays the same here. Some runs simulate sales.
+    dynamic_cast<BCheckBox&>(*window().FindView("cbxPrevision")).SetValue(GetParam() % 4 < 2);
+    send({'OCPr'});
+    settle();
+    noteMoment();
+    const char* text = std::getenv("PELORIN_UNDO_STEPS");
+    const int steps = text != nullptr ? std::atoi(text) : 300;
+    for (int i = 0; i < steps; ++i) {
+        if (under(25) == 0)
+            loadAndReinit();
+        else if (const Action& action = anyAction(); std::string(action.name) != "revalue")
+            (this->*action.run)();
+        settle(); // else a step may end while a list still waits to follow the selection in another one
+        removeMuch();
+        settle();
+        send({'WTDa'}); // some commands leave the former totals there until the next valuation, an undo does not
+        settle();
+    }
+    const long last = stepCount();
+    EXPECT_GT(last, steps / 5);
+    go("btnUndo", last, 0);
+    EXPECT_FALSE(isEnabled("btnUndo"));
+    go("btnRedo", 0, last);
+    EXPECT_FALSE(isEnabled("btnRedo"));
+}
+
+INSTANTIATE_TEST_SUITE_P(Seeds, UndoTest, testing::Range(firstSeed(), firstSeed() + 4));
+
+} // namespace

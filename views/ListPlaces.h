@@ -1,0 +1,13 @@
+#pragma once
+
+#include "platform/SupportDefs.h"
+
+#include <cstddef>
+#include <vector>
+
+/// What a list shows, in numbers that outlive its objects: for an undo, which makes new ones.
+struct ListPlaces {
+    std::vector<std::size_t> rows; // of each row the place of its object among those of the model
+    std::vector<int32> selected;   // rows
+    int32 top = 0;                 // the first row in view
+};
