@@ -7,6 +7,7 @@
 
 #include <cstdio>
 #include <optional>
+#include <string>
 
 class BMessage;
 class BTabView;
@@ -19,21 +20,6 @@ class PLWindow;
 /// part could be read is not: the next save of the markets then asks.
 class DataFiles {
 public:
-    /// The panels open in `folder`, and it keeps the files that are replaced. Window and tabs outlive this.
-    DataFiles(PLWindow& window, const BTabView& tabs, const DataFolder& folder);
-
-    /// Asks whether what is here may go, and shows the open panel; while the window closes, without a question.
-    void askForLoad();
-    /// The answer of the open panel: loads the file. When it can be opened the portfolio goes, whichever kind it is.
-    void load(BMessage* message);
-    /// Saves to the file that is remembered, or shows the save panel.
-    void saveOrAsk();
-    /// The answer of the save panel. @return `B_OK`; what is missing in the message.
-    status_t save(BMessage* message);
-    void save(const String& path);
-    /// The next save of the portfolio asks for a name.
-    void forgetWallet() { names_.wallet = {}; }
-
     struct Remembered {
         String path;          ///< undefined before the first file
         bool isAsked = false; ///< the next save asks for a name, whatever the path
@@ -52,6 +38,34 @@ public:
         const Remembered& of(FileKind kind) const { return kind == FileKind::kMarkets ? markets : wallet; }
         bool operator==(const Names&) const = default;
     };
+    /// What is to be read of a kind of file in place of what is here.
+    struct Restored {
+        std::string source; ///< the file to be read; empty when there was none
+        Remembered name;    ///< of the file that is saved to from then on
+        bool isCopy;        ///< of what was not saved: `source` is not that file
+    };
+    struct Restoring {
+        bool isComplete;     ///< all copies were read
+        std::string problem; ///< what could not be read, as one line for the user; empty when all was
+    };
+
+    /// The panels open in `folder`, and it keeps the files that are replaced. Window and tabs outlive this.
+    DataFiles(PLWindow& window, const BTabView& tabs, const DataFolder& folder);
+
+    /// Asks whether what is here may go, and shows the open panel; while the window closes, without a question.
+    void askForLoad();
+    /// The answer of the open panel: loads the file. When it can be opened the portfolio goes, whichever kind it is.
+    void load(BMessage* message);
+    /// Reads both in place of all that is here. When a copy, or the market data, cannot be opened, nothing changes.
+    Restoring restore(const Restored& markets, const Restored& wallet);
+    /// Saves to the file that is remembered, or shows the save panel.
+    void saveOrAsk();
+    /// The answer of the save panel. @return `B_OK`; what is missing in the message.
+    status_t save(BMessage* message);
+    void save(const String& path);
+    /// The next save of the portfolio asks for a name.
+    void forgetWallet() { names_.wallet = {}; }
+
     const Names& names() const { return names_; }
     /// For an undo of a load: from here on these are the files that are saved to.
     void setNames(const Names& names) { names_ = names; }

@@ -24,7 +24,7 @@ std::size_t bytesBeside(const Moment& moment, const Moment& next)
 
 History::History(Moment first, DataFiles::Names names) : names_(std::move(names))
 {
-    entries_.push_back({std::move(first), {}, {}, {}, 0});
+    entries_.push_back({std::move(first), {}, {}, {}, 0, 0});
     for (const FileKind kind : kKinds)
         noteFile(kind);
 }
@@ -48,7 +48,7 @@ void History::note(Moment now, const DataFiles::Names& names, const std::string&
     }
     forgetUndone();
     const Entry& former = entries_.back();
-    Entry entry{std::move(now), {}, {}, former.steps, 0};
+    Entry entry{std::move(now), {}, {}, former.steps, 0, 0};
     entry.label = stepLabel(command, former.moment, entry.moment);
     entry.steps[indexOf(FileKind::kMarkets)] += isMarketStep ? 1 : 0;
     entry.steps[indexOf(FileKind::kWallet)] += isWalletStep ? 1 : 0;
@@ -59,7 +59,7 @@ void History::note(Moment now, const DataFiles::Names& names, const std::string&
     bytes_ += entry.bytes;
     entries_.push_back(std::move(entry));
     ++now_;
-    ++serial_;
+    entries_[now_].step = ++serial_;
     forgetOldest();
 }
 
@@ -107,6 +107,12 @@ std::optional<DataFiles::Names> History::redo()
     return names_ = step.files->second;
 }
 
+bool History::isDone(std::uint64_t step) const
+{
+    const auto end = entries_.begin() + static_cast<std::ptrdiff_t>(now_) + 1;
+    return step <= entries_.front().step || std::ranges::find(entries_.begin(), end, step, &Entry::step) != end;
+}
+
 std::string History::pathOf(FileKind kind) const
 {
     return std::string(names_.of(kind).path.bytes());
@@ -121,7 +127,7 @@ unsigned History::unsavedChanges(FileKind kind) const
 {
     const auto found = marks_.find({kind, pathOf(kind)});
     if (found == marks_.end())
-        return 0;
+        return 1; // what was restored, and its file was not looked at
     const Mark& mark = found->second;
     Moment saved;
     saved.catalogue = mark.catalogue;

@@ -3,6 +3,7 @@
 #include "app/Holds.h"
 #include "app/MessageView.h"
 #include "app/NoticeLine.h"
+#include "app/Rescue.h"
 #include "app/Shortcuts.h"
 #include "foundation/Today.h"
 #include "platform/Alert.h"
@@ -150,6 +151,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     ReinitWallet(); // from here on there is a wallet, always
     history_ = std::make_unique<History>(moment(), files_->names());
     showHistory();
+    rescue_ = std::make_unique<Rescue>(*this, *files_, folder);
 }
 
 PLWindow::~PLWindow() = default;
