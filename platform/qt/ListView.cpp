@@ -88,15 +88,12 @@ BListItem* BListView::RemoveItem(int32 index)
     firstUnnumbered_ = std::min(firstUnnumbered_, index);
     selectionStale_ = true;
     listWidget().rows().endRemove();
-    // Qt selects a neighbour in the place of the row; here a row that is gone leaves nothing selected.
-    const bool wasSelected = item->selected_;
     item->selected_ = false;
     item->index_ = -1;
-    if (wasSelected) {
-        for (const auto& row : listWidget().selectionModel()->selectedIndexes()) {
-            if (!items_[static_cast<std::size_t>(row.row())]->selected_)
-                listWidget().selectionModel()->select(row, QItemSelectionModel::Deselect);
-        }
+    // Qt selects a neighbour in the place of the row that the keyboard was at; here nothing comes to be selected.
+    for (const auto& row : listWidget().selectionModel()->selectedIndexes()) {
+        if (!items_[static_cast<std::size_t>(row.row())]->selected_)
+            listWidget().selectionModel()->select(row, QItemSelectionModel::Deselect);
     }
     return item;
 }
