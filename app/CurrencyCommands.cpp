@@ -90,7 +90,7 @@ void PLWindow::CurrencySelection()
     currencyView_->setCurrencyRepresentation(currency->getRepresentation());
     // On the company page, until that is refreshed. Intended, as is that the chart is not drawn here: it
     // shows the rates of the currency that is named in it until a rate is selected.
-    companyView_->showTrend(*currency);
+    companyView_->showTrend(*currency, currency->getRepresentation());
 }
 
 void PLWindow::SetCurrencyRef()

@@ -1,36 +1,13 @@
 // Markets, their companies, and the quotes that are fetched for these.
 
 #include "app/Holds.h"
-#include "net/QuoteServers.h"
-#include "net/StoreQuote.h"
+#include "app/QuoteFetcher.h"
 #include "portfolio/Wallet.h"
 #include "views/CompanyView.h"
 #include "views/CurrencyView.h"
 #include "views/OperationView.h"
 
 #include <memory>
-
-namespace {
-
-/// Fetches the company's price of today from the quote server and stores it. `view`, which may be null, is told of a
-/// quote that is new or has changed. Blocks until the server has answered.
-/// @return false when there is no price to be had, and nothing has changed then.
-bool fetchLatestQuote(Company& company, CompanyView* view)
-{
-    float price = 0;
-    Date date;
-    if (company.getInternetLastQuote(quoteServers().latestHost, QuoteServers::kLatestPath, &price, &date) != 0)
-        return false;
-    CompanyQuote* quote = nullptr;
-    const StoreOutcome outcome = storeQuote(&company, date, price, &quote);
-    if (view != nullptr && outcome == StoreOutcome::kAdded)
-        view->AddQuote(quote);
-    if (view != nullptr && outcome == StoreOutcome::kChanged)
-        view->ModifyQuote(quote);
-    return true;
-}
-
-} // namespace
 
 void PLWindow::AddMarket()
 {
@@ -128,7 +105,9 @@ void PLWindow::UpdateCompany()
 {
     if (Company* company = companyView_->GetSelectedCompany()) {
         SetMessage("Getting the latest quote on the Internet... Please stand by.");
-        const bool isFetched = fetchLatestQuote(*company, companyView_);
+        QuoteFetcher fetcher(*this, *companyView_);
+        const bool isFetched = fetcher.fetchLatest(*company);
+        fetcher.report();
         SetMessage(isFetched ? "Successful update to the latest quote on the Internet"
                              : "Error Getting the latest quote on the Internet");
         // After the fetch, which asks for the ticker as it was. Intended: one button renames and brings up to date.
@@ -199,7 +178,10 @@ void PLWindow::SetThreeMonthsCompanyQuotes()
     if (company == nullptr)
         return;
     SetMessage("Getting the last three months of quotes on the Internet (only for NASDAQ and NYSE)");
-    if (company->setInternetLastThreeMonthsQuote() != 0) {
+    QuoteFetcher fetcher(*this, *companyView_);
+    const bool isFetched = fetcher.fetchHistory(*company);
+    fetcher.report();
+    if (!isFetched) {
         // Quotes may have been stored all the same. Intended: they show at the next refresh.
         SetMessage("Error getting the last three months of quotes");
         return;
@@ -212,13 +194,14 @@ void PLWindow::SetThreeMonthsCompanyQuotes()
 void PLWindow::UpdatePortoFolioQuotes()
 {
     SetMessage("Getting the latest quote on the Internet... Please stand by.");
-    const Company* shown = companyView_->GetSelectedCompany();
+    QuoteFetcher fetcher(*this, *companyView_);
     for (const Share* share : wallet_->shares()) {
         // A company that several holdings are of is fetched for each of them.
         Company* company = share->company();
-        if (company != nullptr && !fetchLatestQuote(*company, company == shown ? companyView_ : nullptr))
+        if (company != nullptr && !fetcher.fetchLatest(*company))
             SetMessage("Error Getting the latest quote on the Internet for a company");
     }
     // The portfolio is not valued anew here. Intended: the next command that does so takes the quotes into account.
-    SetMessage("All portofolio quotes are up-to-date.");
+    SetMessage("All portofolio quotes are up-to-date."); // Intended: also when some are not, which the notice tells.
+    fetcher.report();
 }

@@ -3,6 +3,8 @@
 #include "chart/ChartText.h"
 #include "platform/Button.h"
 #include "platform/Message.h"
+#include "platform/MessageRunner.h"
+#include "platform/Window.h"
 #include "views/Look.h"
 
 #include <algorithm>
@@ -10,6 +12,10 @@
 
 namespace {
 
+constexpr uint32 kExpired = 'NtEx';
+constexpr uint32 kKeyPressed = 'NtKy';
+constexpr uint32 kDismissed = 'NtDs';
+constexpr bigtime_t kPassingTime = 6000000;
 constexpr rgb_color kGround = {255, 244, 206, 255};
 constexpr rgb_color kEdge = {204, 178, 104, 255};
 constexpr float kInset = 8;     // of the text
@@ -30,7 +36,7 @@ public:
         text_ = text;
         std::ranges::replace(text_, '\n', ' ');
         SetAccessibleName(text.c_str());
-        SetToolTip(text.empty() ? "" : (text + "\n(A click dismisses this.)").c_str());
+        SetToolTip(text.empty() ? "" : (text + "\n(A click dismisses this, or Alt+0)").c_str());
         Invalidate();
     }
 
@@ -60,9 +66,43 @@ NoticeLine::NoticeLine(BRect frame) : BView(frame, "NoticeLine", B_FOLLOW_LEFT |
     for (const char* name : {"btnNotice1", "btnNotice2"}) {
         buttons_.push_back(new BButton({0, kEdgeWidth, 0, height - kEdgeWidth}, name, "", nullptr,
                                        B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW));
+        buttons_.back()->SetToolTip(buttons_.size() == 1 ? "Alt+6" : "Alt+7");
         AddChild(buttons_.back());
     }
     Hide();
+}
+
+NoticeLine::~NoticeLine() = default;
+
+void NoticeLine::AttachedToWindow()
+{
+    for (int32 button = 0; button < 2; ++button) {
+        auto* message = new BMessage(kKeyPressed);
+        message->AddInt32("button", button);
+        Window()->AddShortcut('6' + static_cast<uint32>(button), B_COMMAND_KEY, message, this);
+    }
+    Window()->AddShortcut('0', B_COMMAND_KEY, new BMessage(kDismissed), this);
+}
+
+void NoticeLine::MessageReceived(BMessage* message)
+{
+    int32 button = 0;
+    switch (message->what) {
+    case kExpired:
+        passing_.reset();
+        update();
+        break;
+    case kDismissed:
+        removeFront();
+        break;
+    case kKeyPressed:
+        message->FindInt32("button", &button);
+        if (front() != nullptr && button < static_cast<int32>(front()->buttons.size()))
+            buttons_[static_cast<std::size_t>(button)]->Invoke();
+        break;
+    default:
+        BView::MessageReceived(message);
+    }
 }
 
 void NoticeLine::show(Notice notice)
@@ -70,6 +110,8 @@ void NoticeLine::show(Notice notice)
     passing_.reset(); // what is new is seen at once, or it takes its place in the queue
     if (notice.isPassing) {
         passing_ = std::move(notice);
+        const BMessage expired(kExpired);
+        expiry_ = std::make_unique<BMessageRunner>(BMessenger(this), &expired, kPassingTime);
     } else {
         const auto same = std::ranges::find(waiting_, notice.key, &Notice::key);
         if (same != waiting_.end())
@@ -131,6 +173,8 @@ void NoticeLine::removeFront()
 void NoticeLine::update()
 {
     ++shown_;
+    if (!passing_)
+        expiry_.reset();
     const Notice* notice = front();
     if (notice == nullptr) {
         Hide();

@@ -4,10 +4,12 @@
 #include "platform/View.h"
 
 #include <deque>
+#include <memory>
 #include <optional>
 
 class BButton;
 class BMessage;
+class BMessageRunner;
 class NoticeText;
 
 /// The line of notices above the status line; hidden while there is none. It shows one, and the others wait behind it.
@@ -20,6 +22,7 @@ public:
     static constexpr uint32 kPressed = 'NtBt';
 
     explicit NoticeLine(BRect frame);
+    ~NoticeLine() override;
 
     /// A passing notice stands before the others until it goes; any other one waits for its turn.
     void show(Notice notice);
@@ -29,6 +32,9 @@ public:
     /// longer shown.
     void press(BMessage* message);
 
+    /// Gives the notice keys: Alt+6 and Alt+7 press its buttons, Alt+0 dismisses it.
+    void AttachedToWindow() override;
+    void MessageReceived(BMessage* message) override;
     void Draw(BRect updateRect) override;
     void MouseDown(BPoint where) override;
 
@@ -43,7 +49,8 @@ private:
 
     std::deque<Notice> waiting_; // the first one is shown unless `passing_` is
     std::optional<Notice> passing_;
-    int32 shown_ = 0; // counts what was shown, so that a late press does not meet another notice
+    std::unique_ptr<BMessageRunner> expiry_; // of `passing_`
+    int32 shown_ = 0;                        // counts what was shown, so that a late press does not meet another notice
     NoticeText* text_ = nullptr;
     std::vector<BButton*> buttons_;
 };

@@ -115,6 +115,8 @@ static_assert(std::size(kCommands) == 67);
 /// Beside the vocabulary.
 constexpr Command kOwnCommands[] = {
     {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
+    {'WBGd', [](PLWindow& w, BMessage*) { w.valueAtLastQuotes(); }}, // the portfolio page
+    {'NtSm', [](PLWindow& w, BMessage*) { w.takeBackSimulation(); }},
 };
 
 /// Null when the code is no command.
@@ -232,7 +234,9 @@ void PLWindow::pressNotice(BMessage* message)
 bool PLWindow::confirm(const char* question)
 {
     constexpr int32 kContinue = 1;
-    return (new BAlert("Warning", question, "Cancel", "Continue"))->Go() == kContinue;
+    auto* alert = new BAlert("Warning", question, "Cancel", "Continue"); // gone after `Go`
+    alert->SetDefaultButton(0); // Enter, pressed without reading, destroys nothing
+    return alert->Go() == kContinue;
 }
 
 Market** PLWindow::getMarkets(int* n) const

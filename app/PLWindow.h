@@ -51,7 +51,7 @@ public:
     /// Takes the notice of that key away, shown or waiting; its reason is gone.
     void dropNotice(const std::string& key);
     void pressNotice(BMessage* message);
-    /// Asks in an alert titled "Warning". @return true for "Continue".
+    /// Asks in an alert titled "Warning", in which Enter and Escape cancel. @return true for "Continue".
     static bool confirm(const char* question);
 
     // The model.
@@ -80,6 +80,10 @@ public:
     /// Starts a new, empty portfolio, which has no file yet.
     void ReinitWallet();
     void ChangeParameter(uint32 code);
+    /// Goes to the last day with all quotes of what is held.
+    void valueAtLastQuotes();
+    /// Ends the simulation, and removes the sales that it has left in the portfolio.
+    void takeBackSimulation();
     /// Puts an empty portfolio, without a value, in the place of the one that is here.
     void replaceWallet();
     /// Shows and values the portfolio after it was replaced or read.
@@ -194,6 +198,8 @@ private:
     void removeMarkets(const Currency& currency);
     void showParameters();
     void showAccounts();
+    /// Tells in a notice that there are simulated sales, or no longer.
+    void tellSimulation();
     /// Null, after a message, when there is none.
     Account* selectedAccount();
 
@@ -224,4 +230,5 @@ private:
     std::unique_ptr<Rescue> rescue_; // the last one to come and the first to go: its last copy needs all of the above
     int holds_ = 0;                  // of the valuation; 0 between two commands
     bool isUpdateDue_ = false;       // it was asked for meanwhile
+    std::string simulationTold_;     // of simulated sales; what a person has dismissed does not come again
 };

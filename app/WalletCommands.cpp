@@ -1,9 +1,13 @@
 // The portfolio: its accounts, its parameters, its value.
 
 #include "app/Holds.h"
+#include "foundation/DateText.h"
+#include "market/Currency.h"
 #include "portfolio/Wallet.h"
 #include "valuation/AccountState.h"
+#include "valuation/AutomaticSale.h"
 #include "valuation/Evolution.h"
+#include "valuation/QuoteCoverage.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
 #include "views/OperationView.h"
@@ -156,6 +160,7 @@ void PLWindow::replaceWallet()
     walletView_->ForgetSelection();
     operationView_->ForgetSelection();
     wallet_ = std::make_unique<Wallet>();
+    simulationTold_.clear();
     releaseStateMemory(); // the next portfolio may be a small one
     refreshWalletCatalogue();
     showAccounts();
@@ -195,6 +200,7 @@ void PLWindow::UpdateState()
         walletView_->ClearEvolution();
         operationView_->DropRemovedOperations();
         operations_->renewOffers();
+        tellSimulation();
         return;
     }
     if (isEvolutionAsked)
@@ -202,6 +208,39 @@ void PLWindow::UpdateState()
     else
         walletView_->ClearEvolution();
     SetState(state);
+    tellSimulation();
+}
+
+void PLWindow::tellSimulation()
+{
+    constexpr const char* kNotice = "simulation";
+    const Date first = firstSimulatedSale(*wallet_);
+    std::string text = first.isUndefined() ? "" : "simulated sales are in these figures";
+    if (!first.isUndefined() && first > walletView_->getDate())
+        text += " from " + dateText(first) + " on";
+    if (text == simulationTold_)
+        return;
+    simulationTold_ = text;
+    if (text.empty())
+        dropNotice(kNotice);
+    else
+        showNotice({kNotice, text, {{"Take Back", [this] { PostMessage('NtSm'); }}}});
+}
+
+void PLWindow::takeBackSimulation()
+{
+    operationView_->setPrevision(false); // else the next valuation would simulate again
+    removeSimulatedSales(*wallet_);
+    UpdateState();
+}
+
+void PLWindow::valueAtLastQuotes()
+{
+    const Date day = walletView_->lastQuotedDay();
+    if (day.isUndefined())
+        return;
+    walletView_->setDate(day);
+    UpdateState();
 }
 
 void PLWindow::SetState(State* state)
@@ -210,7 +249,10 @@ void PLWindow::SetState(State* state)
     if (!lock.isHeld())
         return;
     state_ = state;
-    walletView_->SetState(state, state != nullptr ? Totals(*state, catalogue_) : Totals());
+    const Totals totals = state != nullptr ? Totals(*state, catalogue_) : Totals();
+    walletView_->SetState(state, totals);
+    if (totals.isKnown && totals.reference->getNbrQuotes() > 0) // otherwise no total rests on a quote
+        walletView_->showCoverage(state->getDate(), quoteCoverage(*state), rateCoverage(*state, catalogue_));
     // The list is emptied and filled: automatic operations have come and gone with the valuation. A portfolio that is
     // not shown has no operations to show either.
     operationView_->ClearAllOperations();

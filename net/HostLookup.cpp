@@ -37,17 +37,25 @@ Answer search(const std::string& host)
 }
 
 /// A name server that is silent holds a search for many seconds, and nothing interrupts it. So a thread searches, which
-/// is left to itself when the time is over; it owns all that it touches.
-Answer searchUntil(std::chrono::steady_clock::time_point deadline, const char* host)
+/// is left to itself when the wait is over; it owns all that it touches.
+/// @return 0, `kTimedOut` or `kStopped`.
+int searchUntil(std::chrono::steady_clock::time_point deadline, const StopCheck& stop, const char* host, Answer* answer)
 {
     std::packaged_task<Answer()> task([name = std::string(host)] { return search(name); });
-    std::future<Answer> answer = task.get_future();
+    std::future<Answer> found = task.get_future();
     try {
         std::thread(std::move(task)).detach();
     } catch (const std::system_error&) {
-        return {}; // no thread can be had, and without one nothing would keep the deadline
+        return 0; // no thread can be had, and without one nothing would keep the deadline
     }
-    return answer.wait_until(deadline) == std::future_status::ready ? answer.get() : Answer{};
+    constexpr int kFound = 1;
+    const int result = waitInSlices(deadline, stop, [&](std::chrono::steady_clock::time_point until) {
+        return found.wait_until(until) == std::future_status::ready ? kFound : 0;
+    });
+    if (result != kFound)
+        return result;
+    *answer = found.get();
+    return 0;
 }
 
 /// A dotted address is never asked for elsewhere.
@@ -58,9 +66,14 @@ bool isNumeric(std::string_view host)
 
 } // namespace
 
-int lookUpHost(const char* host, std::optional<std::chrono::steady_clock::time_point> deadline, in_addr* address)
+int lookUpHost(const char* host, std::optional<std::chrono::steady_clock::time_point> deadline, const StopCheck& stop,
+               in_addr* address)
 {
-    const Answer answer = deadline && !isNumeric(host) ? searchUntil(*deadline, host) : search(host);
+    Answer answer;
+    if (!deadline || isNumeric(host))
+        answer = search(host);
+    else if (const int result = searchUntil(*deadline, stop, host, &answer))
+        return result;
     if (!answer.isHost)
         return -1;
     *address = answer.first.value_or(*address);

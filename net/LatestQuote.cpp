@@ -80,19 +80,25 @@ bool isLatestQuoteCertain(std::string_view beginning)
     return cutPrice(beginning, &price) == Cut::kCertain;
 }
 
-int Company::getInternetLastQuote(const String& host, const String& path, float* value, Date* date) const
+FetchEnd fetchLatestQuote(const Company& company, const String& host, const String& path, const StopCheck& stop,
+                          float* value, Date* date)
 {
     *date = today();
     // Its destructor closes it: closing it here, too, would close the number twice, which a thread of the user
     // interface may have been given in between.
     Socket socket;
-    if (connectToQuotes(&socket, host) != 0)
-        return -1;
+    if (const FetchEnd end = connectToQuotes(&socket, host, stop); end != FetchEnd::kFetched)
+        return end;
     *value = 0;
     String request(path);
-    request += getAbbreviation();
+    request += company.getAbbreviation();
     ReceivedPage page(kPageLimit);
-    if (requestPage(&socket, request, isLatestQuoteCertain, &page) != 0)
-        return -1;
-    return parseLatestQuotePage(page.received(), value);
+    if (const FetchEnd end = requestPage(&socket, request, isLatestQuoteCertain, &page); end != FetchEnd::kFetched)
+        return end;
+    return parseLatestQuotePage(page.received(), value) == 0 ? FetchEnd::kFetched : FetchEnd::kNoPrice;
+}
+
+int Company::getInternetLastQuote(const String& host, const String& path, float* value, Date* date) const
+{
+    return fetchLatestQuote(*this, host, path, {}, value, date) == FetchEnd::kFetched ? 0 : -1;
 }

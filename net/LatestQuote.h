@@ -1,6 +1,13 @@
 #pragma once
 
+#include "net/FetchEnd.h"
+#include "net/Wait.h"
+
 #include <string_view>
+
+class Company;
+class Date;
+class String;
 
 /// Cuts the price out of a latest-quote page: out of the first cell "<td nowrap><b>", where it stands as a whole
 /// number, followed perhaps by a fraction as in "112 <sup>3</sup>/<sub>8</sub>". Without a denominator, or with 0 for
@@ -14,3 +21,7 @@ int parseLatestQuotePage(std::string_view page, float* price);
 
 /// Whether `parseLatestQuotePage` gives the same for every page that begins so.
 bool isLatestQuoteCertain(std::string_view beginning);
+
+/// What `Company::getInternetLastQuote` does, and how it ended. `stop` ends its waits.
+FetchEnd fetchLatestQuote(const Company& company, const String& host, const String& path, const StopCheck& stop,
+                          float* value, Date* date);

@@ -4,18 +4,40 @@
 
 #include <algorithm>
 
-int connectToQuotes(Socket* socket, const String& host)
+namespace {
+
+/// Of a wait that has failed.
+FetchEnd endOf(int result, FetchEnd otherwise)
 {
-    socket->setTimeLimit(quoteServers().limit);
-    return socket->connectToName(host, quoteServers().port);
+    switch (result) {
+    case kTimedOut:
+        return FetchEnd::kSilent;
+    case kStopped:
+        return FetchEnd::kStopped;
+    case Socket::kNoHost:
+        return FetchEnd::kNoHost;
+    default:
+        return otherwise;
+    }
 }
 
-int requestPage(Socket* socket, const String& path, const IsEnough& isEnough, ReceivedPage* page)
+} // namespace
+
+FetchEnd connectToQuotes(Socket* socket, const String& host, const StopCheck& stop)
+{
+    socket->setTimeLimit(quoteServers().limit);
+    socket->setStopCheck(stop);
+    if (socket->connectToName(host, quoteServers().port) == 0)
+        return FetchEnd::kFetched;
+    return endOf(socket->connectFailure(), FetchEnd::kRefused);
+}
+
+FetchEnd requestPage(Socket* socket, const String& path, const IsEnough& isEnough, ReceivedPage* page)
 {
     String request("GET ");
     request += path;
     if (socket->writeLine(request) != 0)
-        return -1;
+        return FetchEnd::kClosed;
     constexpr int kLongestTransfer = 10; // time limits: a server that trickles would take a day for a page
     const auto end = Socket::Clock::now() + kLongestTransfer * quoteServers().limit;
     char bytes[256];
@@ -25,20 +47,17 @@ int requestPage(Socket* socket, const String& path, const IsEnough& isEnough, Re
         std::size_t count = 0;
         const int result = socket->receive(bytes, room, deadline, &count);
         // What has come until now is a page cut anywhere, not one that the server has ended.
-        if (result == Socket::kTimedOut)
-            return -1;
-        if (result != 0) {
-            page->endWithBreak();
-            return 0;
-        }
-        if (count == 0) {
-            page->endWithClose();
-            return 0;
+        if (result == kTimedOut || result == kStopped)
+            return endOf(result, FetchEnd::kClosed);
+        if (result != 0 || count == 0) {
+            const FetchEnd outcome = page->received().empty() ? FetchEnd::kClosed : FetchEnd::kFetched;
+            result != 0 ? page->endWithBreak() : page->endWithClose();
+            return outcome;
         }
         page->add({bytes, count});
         if (page->text().size() > known && isEnough(page->text()))
-            return 0;
+            break;
         known = page->text().size();
     }
-    return 0;
+    return FetchEnd::kFetched;
 }

@@ -185,19 +185,20 @@ bool isHistoryCertain(std::string_view beginning)
     return readTable(beginning, &rows) == RowReader::Outcome::kTableEnds;
 }
 
-int Market::setInternetLastThreeMonthsQuote(Company* company) const
+FetchEnd fetchQuoteHistory(const Market& market, Company* company, const StopCheck& stop)
 {
-    if (name_ != "NASDAQ" && name_ != "NYSE" && name_ != "AMEX")
-        return -1;
+    const String& name = market.getName();
+    if (name != "NASDAQ" && name != "NYSE" && name != "AMEX")
+        return FetchEnd::kNoHistory;
     Socket socket; // its destructor closes it, and only that
-    if (connectToQuotes(&socket, quoteServers().historyHost) != 0)
-        return -1;
+    if (const FetchEnd end = connectToQuotes(&socket, quoteServers().historyHost, stop); end != FetchEnd::kFetched)
+        return end;
     String path(QuoteServers::kHistoryPath);
     path += company->getAbbreviation();
     path += QuoteServers::kHistoryPathEnd;
     ReceivedPage page(kPageLimit);
-    if (requestPage(&socket, path, isHistoryCertain, &page) != 0)
-        return -1;
+    if (const FetchEnd end = requestPage(&socket, path, isHistoryCertain, &page); end != FetchEnd::kFetched)
+        return end;
     // The result is that of the whole text, as ever; but a price in a repetition, or one that runs into it, has not
     // been sent.
     std::vector<DatedPrice> rows, repeated;
@@ -206,7 +207,12 @@ int Market::setInternetLastThreeMonthsQuote(Company* company) const
     CompanyQuote* quote;
     for (const auto& [date, price] : rows)
         storeQuote(company, date, price, &quote);
-    return result;
+    return result == 0 ? FetchEnd::kFetched : FetchEnd::kNoPrice;
+}
+
+int Market::setInternetLastThreeMonthsQuote(Company* company) const
+{
+    return fetchQuoteHistory(*this, company, {}) == FetchEnd::kFetched ? 0 : -1;
 }
 
 int Company::setInternetLastThreeMonthsQuote()

@@ -1,9 +1,14 @@
 #pragma once
 
 #include "foundation/Date.h"
+#include "net/FetchEnd.h"
+#include "net/Wait.h"
 
 #include <string_view>
 #include <vector>
+
+class Company;
+class Market;
 
 struct DatedPrice {
     Date date;
@@ -23,3 +28,6 @@ int parseHistoryPage(std::string_view page, std::vector<DatedPrice>* rows);
 
 /// Whether the '<' that ends the table is in there: `parseHistoryPage` gives the same for every page that begins so.
 bool isHistoryCertain(std::string_view beginning);
+
+/// What `Market::setInternetLastThreeMonthsQuote` does, and how it ended. `stop` ends its waits.
+FetchEnd fetchQuoteHistory(const Market& market, Company* company, const StopCheck& stop);

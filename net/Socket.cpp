@@ -4,35 +4,14 @@
 #include "foundation/FieldIO.h"
 #include "net/HostLookup.h"
 
-#include <algorithm>
 #include <arpa/inet.h>
 #include <cerrno>
 #include <cstring>
+#include <fcntl.h>
 #include <poll.h>
 #include <string>
 #include <sys/socket.h>
 #include <unistd.h>
-
-namespace {
-
-/// 0 when it has passed.
-std::chrono::milliseconds millisecondsUntil(Socket::Clock::time_point deadline)
-{
-    return std::max(std::chrono::ceil<std::chrono::milliseconds>(deadline - Socket::Clock::now()),
-                    std::chrono::milliseconds(0));
-}
-
-/// What `poll` gives; 0 at once when the deadline has passed.
-int waitToReceive(int descriptor, Socket::Clock::time_point deadline)
-{
-    const auto left = millisecondsUntil(deadline);
-    if (left.count() == 0)
-        return 0;
-    pollfd waiting{descriptor, POLLIN, 0};
-    return poll(&waiting, 1, static_cast<int>(left.count()));
-}
-
-} // namespace
 
 char Socket::SOCKETString[8];
 short Socket::SOCKETCounter;
@@ -63,9 +42,10 @@ int Socket::connectToName(const String& host, unsigned short port)
 {
     closePrevious();
     const auto deadline = connectDeadline();
-    if (lookUpHost(host.getCharacterArray(), deadline, &address_.sin_addr) != 0)
-        return -1;
-    return connectToAddress(port, deadline);
+    connectFailure_ = lookUpHost(host.getCharacterArray(), deadline, stop_, &address_.sin_addr);
+    if (connectFailure_ == -1)
+        connectFailure_ = kNoHost;
+    return connectFailure_ == 0 ? connectToAddress(port, deadline) : -1;
 }
 
 int Socket::serverOn(unsigned short port)
@@ -190,10 +170,9 @@ int Socket::getCharacterArray(char* bytes, int count)
 int Socket::receive(char* bytes, std::size_t count, Clock::time_point deadline, std::size_t* received)
 {
     for (;;) {
-        const int ready = waitToReceive(descriptor_, deadline);
-        if (ready == 0)
-            return kTimedOut;
-        const ssize_t n = ready > 0 ? recv(descriptor_, bytes, count, MSG_DONTWAIT) : ready;
+        if (const int result = waitFor(descriptor_, POLLIN, deadline, stop_))
+            return result;
+        const ssize_t n = recv(descriptor_, bytes, count, MSG_DONTWAIT);
         if (n >= 0) {
             *received = static_cast<std::size_t>(n);
             return 0;
@@ -259,15 +238,31 @@ int Socket::connectToAddress(unsigned short port, std::optional<Clock::time_poin
 {
     address_.sin_family = AF_INET;
     address_.sin_port = htons(port);
-    if (open() != 0)
+    connectFailure_ = -1;
+    if (open() == 0)
+        connectFailure_ = deadline
+                              ? connectBefore(*deadline)
+                              : connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_);
+    return connectFailure_ == 0 ? 0 : -1;
+}
+
+/// Begins to connect, and waits. Whatever comes of it, later transfers block again.
+/// @return 0, -1, `kTimedOut` or `kStopped`.
+int Socket::connectBefore(Clock::time_point deadline) const
+{
+    const int flags = fcntl(descriptor_, F_GETFL);
+    if (flags < 0 || fcntl(descriptor_, F_SETFL, flags | O_NONBLOCK) != 0)
         return -1;
-    // The search for the host has used up a part of the time. At least a millisecond is left: 0 would stand for ever.
-    if (deadline)
-        applyTimeLimit(std::max(millisecondsUntil(*deadline), std::chrono::milliseconds(1)));
-    const int result = connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_);
-    // Whatever came of it, later transfers have the whole limit again.
-    applyTimeLimit(timeLimit_);
-    return result == 0 ? 0 : -1;
+    int result = connect(descriptor_, reinterpret_cast<const sockaddr*>(&address_), sizeof address_);
+    if (result != 0 && errno == EINPROGRESS)
+        result = waitFor(descriptor_, POLLOUT, deadline, stop_);
+    int error = 0;
+    socklen_t size = sizeof error;
+    if (result == 0 && (getsockopt(descriptor_, SOL_SOCKET, SO_ERROR, &error, &size) != 0 || error != 0))
+        result = -1;
+    if (fcntl(descriptor_, F_SETFL, flags) != 0)
+        return -1;
+    return result;
 }
 
 void Socket::applyTimeLimit(std::chrono::milliseconds limit) const
@@ -275,14 +270,14 @@ void Socket::applyTimeLimit(std::chrono::milliseconds limit) const
     constexpr int kThousand = 1000; // milliseconds a second, microseconds a millisecond
     const timeval value{limit.count() / kThousand, limit.count() % kThousand * kThousand};
     setsockopt(descriptor_, SOL_SOCKET, SO_RCVTIMEO, &value, sizeof value);
-    setsockopt(descriptor_, SOL_SOCKET, SO_SNDTIMEO, &value, sizeof value); // a connect, too
+    setsockopt(descriptor_, SOL_SOCKET, SO_SNDTIMEO, &value, sizeof value);
 }
 
 /// Receives a byte of a line. A signal ends the wait as the deadline does.
 /// @return 0; `kTimedOut`, or -1 at the end of the connection and on an error.
 int Socket::readBefore(Clock::time_point deadline, char* c) const
 {
-    const int ready = waitToReceive(descriptor_, deadline);
+    const int ready = pollUntil(descriptor_, POLLIN, deadline);
     if (ready == 0)
         return kTimedOut;
     const int received = ready > 0 ? sgetc(c, descriptor_) : ready;

@@ -1,8 +1,8 @@
 #pragma once
 
 #include "foundation/String.h"
+#include "net/Wait.h"
 
-#include <chrono>
 #include <netinet/in.h>
 #include <optional>
 
@@ -15,7 +15,9 @@ public:
     using Clock = std::chrono::steady_clock;
 
     /// The result of reading a line that did not end in time, and of a `receive` to which nothing came.
-    static constexpr int kTimedOut = 8;
+    static constexpr int kTimedOut = ::kTimedOut;
+    /// The reason of a connect that found no such host.
+    static constexpr int kNoHost = 10;
     static constexpr std::chrono::milliseconds kLineLimit{5000};
 
     Socket() = default;
@@ -28,6 +30,8 @@ public:
     /// The longest wait of each connect, the search for the host included, of each receive and each send from now on;
     /// what exceeds it fails. 0, as it is at first, stands for ever.
     void setTimeLimit(std::chrono::milliseconds limit);
+    /// Lets `stop` end the waits of connects that have a time limit, and those of `receive`.
+    void setStopCheck(const StopCheck& stop) { stop_ = stop; }
     /// The longest wait for a whole line, from the call on; at first `kLineLimit`.
     void setLineLimit(std::chrono::milliseconds limit) { lineLimit_ = limit; }
 
@@ -35,6 +39,8 @@ public:
     /// program ends with "Error closing previous connection.", since `closeConnection` fails.
     int connectTo(const String& address, unsigned short port);
     int connectToName(const String& host, unsigned short port);
+    /// Why the last connect failed: `kNoHost`, `kTimedOut`, `kStopped`, otherwise -1; 0 when it did not.
+    int connectFailure() const { return connectFailure_; }
 
     /// Listens on all local addresses, or on one. Port 0 lets the system choose; `getLocalPort` tells the choice.
     int serverOn(unsigned short port);
@@ -63,7 +69,7 @@ public:
     int getCharacterArray(char* bytes, int count);
     /// Receives what comes first, up to `count` bytes; `*received` is their number, and 0 at the end of the connection.
     /// A signal does not end the wait.
-    /// @return 0; `kTimedOut` when nothing has come until the deadline, and -1.
+    /// @return 0; `kTimedOut` when nothing has come until the deadline, `kStopped`, and -1.
     int receive(char* bytes, std::size_t count, Clock::time_point deadline, std::size_t* received);
     int putChar(char c);
     int getChar(char* c);
@@ -93,6 +99,7 @@ private:
     int open();
     std::optional<Clock::time_point> connectDeadline() const;
     int connectToAddress(unsigned short port, std::optional<Clock::time_point> deadline);
+    int connectBefore(Clock::time_point deadline) const;
     void applyTimeLimit(std::chrono::milliseconds limit) const;
     bool canTransferLines() const { return descriptor_ >= 0 && !isServer_; }
     int readBefore(Clock::time_point deadline, char* c) const;
@@ -108,4 +115,6 @@ private:
     sockaddr_in address_{}; // of the peer; of this end for a server
     std::chrono::milliseconds timeLimit_{0};
     std::chrono::milliseconds lineLimit_ = kLineLimit;
+    StopCheck stop_;
+    int connectFailure_ = 0;
 };

@@ -9,6 +9,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <iterator>
+#include <vector>
 
 namespace {
 
@@ -57,7 +59,36 @@ bool canExceed(double a0, double a1, double b0, double b1)
     return isUnknown || std::max(a0, a1) > std::min(b0, b1);
 }
 
+/// What is marked as automatic by hand has an account, which the next valuation takes it from.
+bool isSimulated(const ShareOperation* operation)
+{
+    return operation->isAutomatic() && operation->account() == nullptr;
+}
+
 } // namespace
+
+Date firstSimulatedSale(const Wallet& wallet)
+{
+    Date first;
+    for (const Share* share : wallet.shares()) {
+        // By date, so the first one of each holding is enough.
+        const auto operations = share->shareOperations();
+        const auto found = std::ranges::find_if(operations, isSimulated);
+        if (found != operations.end() && (first.isUndefined() || (*found)->getDate() < first))
+            first = (*found)->getDate();
+    }
+    return first;
+}
+
+void removeSimulatedSales(Wallet& wallet)
+{
+    for (const Share* share : wallet.shares()) {
+        std::vector<ShareOperation*> simulated;
+        std::ranges::copy_if(share->shareOperations(), std::back_inserter(simulated), isSimulated);
+        for (ShareOperation* sale : simulated)
+            delete sale;
+    }
+}
 
 AutomaticSale::AutomaticSale(Share& share, Wallet& wallet, const Holding& holding)
     : share_(share), wallet_(wallet), holding_(holding)

@@ -7,6 +7,11 @@ class Account;
 class Share;
 class Wallet;
 
+/// Day of the earliest simulated sale that valuations have left in the holdings; undefined without any.
+Date firstSimulatedSale(const Wallet& wallet);
+/// Destroys these sales. No row refers to one.
+void removeSimulatedSales(Wallet& wallet);
+
 /// The simulated sale of a holding by the wallet's investment rule, on the company's trend line.
 ///
 /// From the state's day to the end date E of the holding, with n days left of a period of P days, the limits are

@@ -58,7 +58,7 @@ void CompanyView::makeMarkets(BRect frame)
 
 void CompanyView::makeCompanies(BRect frame)
 {
-    BBox* box = addBox(this, frame, "Companies");
+    BBox* box = companiesBox_ = addBox(this, frame, "Companies");
     const float right = frame.Width() - kBoxSide;
     const float bottom = frame.Height() - kBoxSide;
     constexpr float kListEnd = kBoxSide + 66 + 176 + kScrollBar;
@@ -139,6 +139,13 @@ void CompanyView::SetMarketList(const std::vector<Market*>& markets)
     markets_->setAll(markets);
     // The market whose companies were shown may be gone, and another one at its address.
     SetCompanyList(nullptr);
+}
+
+void CompanyView::nameTrend(const String& currency)
+{
+    const std::string title = "Companies";
+    companiesBox_->SetLabel(currency.hasText() ? (title + " - trend of the currency " + textOf(currency)).c_str()
+                                               : title.c_str());
 }
 
 void CompanyView::setRelativeDailyChange(float change)

@@ -45,10 +45,11 @@ public:
     void setDiffWithAverage(float difference);
     /// Puts into these two how much the trend line of `series` rises in a day, and how far the last quote stands above
     /// it, both in proportion to the line on the day of that quote. A trend of 0 is not guarded against: the fields
-    /// then say that there is no number.
+    /// then say that there is no number. `currency` is its symbol when it is a currency: the page says so.
     template <class Series>
-    void showTrend(const Series& series)
+    void showTrend(const Series& series, const String& currency = {})
     {
+        nameTrend(currency);
         const Date last = series.getLastQuote();
         const double trend = series.getPrevisionQuote(last);
         setRelativeDailyChange(static_cast<float>(series.getPente() / trend));
@@ -107,12 +108,14 @@ public:
 private:
     void makeMarkets(BRect frame);
     void makeCompanies(BRect frame);
+    void nameTrend(const String& currency);
     void makeQuotes(BRect frame);
     void fillChart(QuoteChart& chart, const Company& company) const override;
 
     MarketListView* markets_ = nullptr;
     BTextControl* marketName_ = nullptr;
     BTextControl* marketCurrency_ = nullptr;
+    BBox* companiesBox_ = nullptr;
     CompanyListView* companies_ = nullptr;
     BTextControl* abbreviation_ = nullptr;
     BTextControl* companyName_ = nullptr;

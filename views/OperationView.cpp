@@ -17,7 +17,7 @@ using namespace look;
 // Where the groups of the page begin and end.
 constexpr float kRight = kPageWidth - kMargin;
 constexpr float kEditorEnd = kPageHeight - kMargin;
-constexpr float kEditorTop = kEditorEnd - kBoxTop - 3 * kRow - kGap - kButtonHeight - kBoxSide;
+constexpr float kEditorTop = kEditorEnd - kBoxTop - 3 * kRow - kButtonHeight - kBoxSide;
 constexpr float kListEnd = kEditorTop - kMargin;
 constexpr float kListTop = kMargin + kFieldHeight + 1; // the list then ends with a whole row
 

@@ -29,6 +29,7 @@ public:
 
     /// Whether automatic sales are searched.
     bool isPrevision() const { return prevision_->Value() == B_CONTROL_ON; }
+    void setPrevision(bool isOn) { prevision_->SetValue(isOn); }
 
     // The list.
     /// Empties the list, keeping in mind what was selected.

@@ -2,11 +2,14 @@
 
 #include "chart/GraphPoint.h"
 #include "chart/GraphView.h"
+#include "foundation/DateText.h"
 #include "foundation/NumberText.h"
 #include "market/Currency.h"
 #include "platform/Box.h"
+#include "platform/Button.h"
 #include "platform/StringView.h"
 #include "valuation/Evolution.h"
+#include "valuation/QuoteCoverage.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
 #include "views/AccountStateListView.h"
@@ -30,12 +33,23 @@ constexpr float kHoldingsTop = kAccountsEnd + kMargin;
 constexpr float kHoldingsEnd = kHoldingsTop + 210;
 constexpr float kChartTop = kHoldingsEnd + kMargin;
 
+/// "11 of 12 quotes are older than 21/11/2026"; empty when there is none to tell of.
+std::string coverageText(const QuoteCoverage& coverage, const char* what, const Date& day)
+{
+    const unsigned missing = coverage.older + coverage.unknown;
+    if (missing == 0)
+        return {};
+    return std::to_string(missing) + " of " + std::to_string(coverage.needed) + ' ' + what +
+           (missing == 1 ? " is " : " are ") + (coverage.unknown > 0 ? "not of " : "older than ") + dateText(day);
+}
+
 } // namespace
 
 WalletView::WalletView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
 {
     makeTop();
     makeTotals();
+    makeCoverage();
     makeAccounts();
     makeHoldings();
     makeChart();
@@ -81,6 +95,21 @@ void WalletView::makeTotals()
     totalValue_ = add("txtTotalValue", "Total Value", 'WTTv', 74, kAmount);
     profit_ = add("txtProfit", "Profit", 'WTPr', 42, kAmount);
     annualRevenue_ = add("txtAnnualRevenu", "Annual Revenu", 'WTAr', 96, kPercent);
+}
+
+/// On the upper edge of the totals' box, as its title.
+void WalletView::makeCoverage()
+{
+    constexpr float kTop = kTotalsTop - 2;
+    AddChild(coverage_ = new BStringView({0, kTop, 0, kTop + 18}, "txtEstimated", ""));
+    coverage_->SetViewColor(kGenerated);
+    coverage_->SetAlignment(B_ALIGN_CENTER);
+    constexpr float kWidth = 72;
+    constexpr float kButtonRight = kRight - kBoxSide;
+    goToLastQuotes_ =
+        addButton(this, {kButtonRight - kWidth, kTop, kButtonRight, kTop + 18}, "btnLastQuotes", "Go There", 'WBGd');
+    goToLastQuotes_->SetToolTip("Values the portfolio on the last day with all quotes");
+    hideCoverage();
 }
 
 void WalletView::makeAccounts()
@@ -140,6 +169,7 @@ void WalletView::SetState(const State* state, const Totals& totals)
     // `ClearState` has kept in mind is selected.
     SetAccountStateList(state);
     shares_->clear();
+    hideCoverage();
     if (state != nullptr) {
         const auto shares = state->shareStates();
         shares_->addAll({shares.begin(), shares.end()});
@@ -147,6 +177,40 @@ void WalletView::SetState(const State* state, const Totals& totals)
         shares_->recall();
     }
     showTotals(totals);
+}
+
+void WalletView::showCoverage(const Date& day, const QuoteCoverage& quotes, const QuoteCoverage& rates)
+{
+    // Where no quote is missing a rate may be: these are fetched from nowhere.
+    const std::string ofQuotes = coverageText(quotes, "quotes", day);
+    const std::string ofRates = coverageText(rates, "rates", day);
+    const char* what = ofQuotes.empty() ? "rates" : "quotes";
+    if (ofQuotes.empty() && ofRates.empty())
+        return hideCoverage();
+    lastQuotedDay_ = ofQuotes.empty() ? rates.lastFullDay : quotes.lastFullDay;
+    const bool isDay = !lastQuotedDay_.isUndefined();
+    const std::string text = "estimated: " + (ofQuotes.empty() ? ofRates : ofQuotes) + ", " +
+                             (isDay ? std::string("the last day with all ") + what + " is " + dateText(lastQuotedDay_)
+                                    : std::string("no day has all ") + what);
+    coverage_->SetText(text.c_str());
+    coverage_->SetToolTip((ofRates.empty() || ofQuotes.empty() ? "" : "Also, " + ofRates + ".").c_str());
+    const float right = kRight - kBoxSide - (isDay ? 72 + kGap : 0);
+    const float width = coverage_->StringWidth(text.c_str()) + 2 * kGap;
+    coverage_->MoveTo(right - width, kTotalsTop - 2);
+    coverage_->ResizeTo(width, 18);
+    coverage_->Show();
+    if (isDay)
+        goToLastQuotes_->Show();
+    else
+        goToLastQuotes_->Hide();
+}
+
+void WalletView::hideCoverage()
+{
+    lastQuotedDay_ = Date();
+    coverage_->SetText("");
+    coverage_->Hide();
+    goToLastQuotes_->Hide();
 }
 
 void WalletView::ClearState()
@@ -158,6 +222,7 @@ void WalletView::ClearState()
     accounts_->clear();
     shares_->clear();
     showTotals({});
+    hideCoverage();
 }
 
 void WalletView::ForgetSelection()
@@ -212,7 +277,7 @@ void WalletView::ClearEvolution()
     line_.clearAll();
     evolution_->removeAllGraphPoints();
     evolution_->setXLegend(String());
-    noEvolution_->SetText("");
+    noEvolution_->SetText(isComputeEvolution() ? "" : "tick Compute Evolution");
     evolution_->Invalidate();
 }
 

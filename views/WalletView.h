@@ -11,6 +11,7 @@
 #include <utility>
 
 class AccountState;
+class BButton;
 class BStringView;
 class AccountStateListView;
 class Currency;
@@ -19,6 +20,7 @@ class ShareStateListView;
 class State;
 enum class EvolutionOutcome;
 struct EvolutionPoint;
+struct QuoteCoverage;
 struct Totals;
 
 /// The page of the portfolio as it stands on a day: totals, accounts, holdings, and how its value came about.
@@ -35,6 +37,10 @@ public:
     /// Shows `state` and its totals; null empties the page. What was selected before `ClearState` is selected again,
     /// where it still is.
     void SetState(const State* state, const Totals& totals);
+    /// Says beside the totals how many of the quotes that they rest on are not of `day`, or else of the rates.
+    void showCoverage(const Date& day, const QuoteCoverage& quotes, const QuoteCoverage& rates);
+    /// The last day with all quotes, where the page speaks of one; otherwise undefined.
+    Date lastQuotedDay() const { return lastQuotedDay_; }
     /// Empties the page before its state is destroyed, keeping in mind what was selected.
     void ClearState();
     /// What was selected belongs to a portfolio that is gone.
@@ -66,6 +72,8 @@ private:
     void makeAccounts();
     void makeHoldings();
     void makeChart();
+    void makeCoverage();
+    void hideCoverage();
     void showTotals(const Totals& totals);
 
     DateControl* date_ = nullptr;
@@ -75,6 +83,9 @@ private:
     BTextControl* totalValue_ = nullptr;
     BTextControl* profit_ = nullptr;
     BTextControl* annualRevenue_ = nullptr;
+    BStringView* coverage_ = nullptr;
+    BButton* goToLastQuotes_ = nullptr;
+    Date lastQuotedDay_;
     AccountStateListView* accounts_ = nullptr;
     BTextControl* accountName_ = nullptr;
     BTextControl* accountCurrency_ = nullptr;

@@ -19,6 +19,7 @@ BAlert::BAlert(const char* title, const char* text, const char* button0, const c
         if (button != nullptr)
             buttons_.emplace_back(button);
     }
+    default_ = buttons_.size() - 1;
 }
 
 int32 BAlert::Go()
@@ -57,11 +58,11 @@ int32 BAlert::ask() const
         auto* button = new QPushButton(labelText(buttons_[i].c_str()));
         button->setObjectName(QString::fromStdString(buttons_[i]));
         button->setAccessibleName(QString::fromStdString(buttons_[i]));
-        button->setDefault(i + 1 == buttons_.size());
+        button->setDefault(i == default_);
         button->setAutoDefault(true);
         QObject::connect(button, &QPushButton::clicked, [&dialog, i] { dialog.done(static_cast<int>(i)); });
         answers->addWidget(button);
-        if (i + 1 == buttons_.size())
+        if (i == default_)
             button->setFocus();
     }
     rows->addLayout(answers);

@@ -59,6 +59,13 @@ TEST_F(CatalogueTest, CatalogueByHandIsSavedAndComesBackTheSame)
     select("lstCurrencies", 1);
     show(kCompanyPage);
     EXPECT_EQ(text("txtRelativeDailyChange"), "3.3333 %") << "of the currency that was selected last";
+    const auto hasTitle = [&](const char* title) {
+        const auto parts = find<QWidget>("lstCompanies").parentWidget();
+        return parts->accessibleName() == title;
+    };
+    EXPECT_TRUE(hasTitle("Companies - trend of the currency USD"));
+    window().CompanySelection();
+    EXPECT_TRUE(hasTitle("Companies"));
 }
 
 TEST_F(CatalogueTest, EventFieldsFollowTheKindAndAnUpdateTakesItFromTheMenu)

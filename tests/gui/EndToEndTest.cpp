@@ -111,7 +111,7 @@ protected:
         showInProgram(kPortoFolioPage);
         fillIn(kPortoFolioPage, {}, "btnLoadPortoFolio");
         program_->awaitWindow("Warning");
-        program_->key("Return"); // Continue
+        program_->key("Tab Return"); // Continue
         answerPanelIn("Load");
     }
     /// The portfolio's value when it is not `before`.

@@ -5,10 +5,13 @@
 #include "chart/GraphView.h"
 #include "net/QuoteServers.h"
 #include "platform/ListItem.h"
+#include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/Peer.h"
 #include "tests/support/SmallPortfolio.h"
 
+#include <QKeyEvent>
+#include <QWindow>
 #include <gmock/gmock.h>
 #include <sstream>
 
@@ -193,6 +196,37 @@ TEST_F(FetchCommandTest, PortfolioQuotesComeInWithoutAValuation)
     EXPECT_EQ(message(), "All portofolio quotes are up-to-date.") << "also after a failure";
     show(kCompanyPage);
     EXPECT_EQ(rows("lstQuotes").back(), "21/11/2024\t45.00") << "the page of the selected company was told";
+}
+
+TEST_F(FetchCommandTest, ASilentServerIsAskedOnceAndEscapeEndsTheWait)
+{
+    addTwoMarkets();
+    for (const Market* market : window().catalogue().getMarkets())
+        buy(market->companies().front());
+    show(kPortoFolioPage);
+    QWidget& notice = *window().widget().findChild<QWidget*>("txtNotice");
+    QWindow* handle = window().widget().windowHandle();
+    for (const bool isEscaped : {false, true}) {
+        const Peer server([&](int client) {
+            Peer::receiveLine(client);
+            if (isEscaped) {
+                using Key = QKeyEvent;
+                QCoreApplication::postEvent(handle, new Key(QEvent::KeyPress, Qt::Key_1, Qt::AltModifier));
+                QCoreApplication::postEvent(handle, new Key(QEvent::KeyPress, Qt::Key_Escape, Qt::NoModifier));
+            }
+            Peer::waitForEnd(client);
+        });
+        const std::chrono::milliseconds limit(isEscaped ? 20000 : 400);
+        quoteServers() = {"localhost", "localhost", server.port(), limit};
+        const auto start = std::chrono::steady_clock::now();
+        click("btnUpdateAllQuotes");
+        EXPECT_LT(std::chrono::steady_clock::now() - start, isEscaped ? limit / 4 : 2 * limit);
+        EXPECT_EQ(message(), "All portofolio quotes are up-to-date.");
+        EXPECT_EQ(notice.accessibleName().toStdString(),
+                  std::string("0 of 2 quotes came; none for AAA, BBB: ") +
+                      (isEscaped ? "Escape has ended it" : "the server localhost was silent, and not asked again"));
+    }
+    EXPECT_TRUE(isVisible("lstCompanies")) << "what was pressed besides has come in its turn";
 }
 
 TEST_F(QuoteTest, ManyRowsAreFoundSelectedAndRemovedTogether)

@@ -220,12 +220,15 @@ void WindowTest::watchForAlert()
     auto timer = std::make_unique<QTimer>();
     QObject::connect(timer.get(), &QTimer::timeout, [this] {
         auto* alert = qobject_cast<QDialog*>(QApplication::activeModalWidget());
-        if (alert == nullptr || alert->objectName() != "Alert")
+        if (alert == nullptr || alert->objectName() != "Alert" || alert->property("isAnswered").toBool())
             return;
+        alert->setProperty("isAnswered", true);
         alerts_.push_back(alert->findChild<QLabel*>("AlertText")->text().toStdString());
         EXPECT_EQ(alert->windowTitle().toStdString(), "Warning");
         EXPECT_FALSE(alertAnswer_.empty()) << "nobody expected: " << alerts_.back();
         const std::string answer = std::exchange(alertAnswer_, "");
+        if (answer == "Enter" || answer == "Escape")
+            QTest::keyClick(alert->focusWidget(), answer == "Enter" ? Qt::Key_Return : Qt::Key_Escape);
         for (auto* button : alert->findChildren<QAbstractButton*>()) {
             if (button->text().toStdString() == answer || (answer.empty() && button->text() == "Cancel"))
                 QTest::mouseClick(button, Qt::LeftButton);

@@ -79,8 +79,8 @@ protected:
     /// Handles all that waits.
     static void settle();
 
-    /// The button of the next alert that a person clicks; the alert's text is noted. Without it an alert fails the
-    /// test.
+    /// The button of the next alert that a person clicks, or "Enter" or "Escape" for the key; the alert's text is
+    /// noted. Without it an alert fails the test.
     void answerNextAlert(const char* button) { alertAnswer_ = button; }
     /// The texts of the alerts since the last call.
     std::vector<std::string> alerts() { return std::exchange(alerts_, {}); }

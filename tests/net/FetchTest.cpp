@@ -1,4 +1,5 @@
 #include "foundation/Today.h"
+#include "net/LatestQuote.h"
 #include "net/QuoteServers.h"
 #include "net/StoreQuote.h"
 #include "tests/support/Peer.h"
@@ -33,6 +34,12 @@ protected:
         const Peer peer(talk);
         quoteServers() = {"localhost", "127.0.0.1", peer.port(), limit_};
         return company_->setInternetLastThreeMonthsQuote();
+    }
+    FetchEnd end(const Peer::Talk& talk, const StopCheck& stop = {}, const char* host = "localhost")
+    {
+        const Peer peer(talk);
+        quoteServers() = {host, host, peer.port(), limit_};
+        return fetchLatestQuote(*company_, host, QuoteServers::kLatestPath, stop, &value_, &date_);
     }
     /// A talk that takes the request and sends `page` in pieces, every other one of them shorter.
     Peer::Talk sending(const std::string& page, std::size_t piece = 99999, std::chrono::milliseconds pause = 0ms)
@@ -149,16 +156,18 @@ TEST_F(FetchTest, PeersThatGiveNoPageFailInTime)
     const struct {
         Peer::Talk talk;
         const char* why;
+        FetchEnd end;
     } cases[] = {
-        {[](int) {}, "closes at once"},
-        {[](int client) { Peer::receiveLine(client); }, "closes after the request"},
-        {[](int client) { Peer::waitForEnd(client); }, "is silent"},
-        {silentAfter("<html>"), "goes silent after some text"},
-        {silentAfter("<td nowrap><b>45</b>\n"), "goes silent where a fraction may follow"},
-        {silentAfter("(00s)</b>\n5/3/1999 45 46 100\n"), "goes silent in a table, of which nothing is stored"},
-        {sending("<html>no marker</html>"), "has no marker"},
-        {endless("<td nowrap>", 0ms), "never ends"},
-        {endless("x", 20ms), "never ends, but trickles"},
+        {[](int) {}, "closes at once", FetchEnd::kClosed},
+        {[](int client) { Peer::receiveLine(client); }, "closes after the request", FetchEnd::kClosed},
+        {[](int client) { Peer::waitForEnd(client); }, "is silent", FetchEnd::kSilent},
+        {silentAfter("<html>"), "goes silent after some text", FetchEnd::kSilent},
+        {silentAfter("<td nowrap><b>45</b>\n"), "goes silent where a fraction may follow", FetchEnd::kSilent},
+        {silentAfter("(00s)</b>\n5/3/1999 45 46 100\n"), "goes silent in a table, of which nothing is stored",
+         FetchEnd::kSilent},
+        {sending("<html>no marker</html>"), "has no marker", FetchEnd::kNoPrice},
+        {endless("<td nowrap>", 0ms), "never ends", FetchEnd::kNoPrice},
+        {endless("x", 20ms), "never ends, but trickles", FetchEnd::kSilent},
     };
     for (const auto& c : cases) {
         const auto start = std::chrono::steady_clock::now();
@@ -166,6 +175,7 @@ TEST_F(FetchTest, PeersThatGiveNoPageFailInTime)
         EXPECT_EQ(date_, kToday) << c.why;
         EXPECT_EQ(value_, 0) << c.why << ": set once the connection is there";
         EXPECT_EQ(history(c.talk), -1) << c.why;
+        EXPECT_EQ(end(c.talk), c.end) << c.why;
         EXPECT_LT(std::chrono::steady_clock::now() - start, 10s) << c.why;
     }
     value_ = -7; // the port is closed by now
@@ -173,6 +183,40 @@ TEST_F(FetchTest, PeersThatGiveNoPageFailInTime)
     EXPECT_EQ(value_, -7);
     EXPECT_EQ(date_, kToday);
     EXPECT_EQ(company_->getNbrQuotes(), 0U);
+}
+
+TEST_F(FetchTest, AWaitCanBeStoppedAndNoHostToldFromNoServer)
+{
+    const auto start = std::chrono::steady_clock::now();
+    int asked = 0;
+    const StopCheck third = [&asked] { return ++asked == 3; };
+    EXPECT_EQ(end(silentAfter("<html>"), third), FetchEnd::kStopped);
+    EXPECT_EQ(end(silentAfter(kLatestPage), [] { return true; }), FetchEnd::kFetched) << "there is no wait to stop";
+    EXPECT_EQ(end([](int) {}, {}, "256.0.0.1"), FetchEnd::kNoHost);
+    quoteServers().port = 1;
+    EXPECT_EQ(fetchLatestQuote(*company_, "127.0.0.1", "/", {}, &value_, &date_), FetchEnd::kRefused);
+
+    const int full = socket(AF_INET, SOCK_STREAM, 0); // that takes no more connections
+    sockaddr_in address{};
+    address.sin_family = AF_INET;
+    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+    socklen_t size = sizeof address;
+    ASSERT_EQ(bind(full, reinterpret_cast<sockaddr*>(&address), size) + listen(full, 0), 0);
+    getsockname(full, reinterpret_cast<sockaddr*>(&address), &size);
+    std::vector<int> clients;
+    for (int i = 0; i < 4; ++i) {
+        clients.push_back(socket(AF_INET, SOCK_STREAM | SOCK_NONBLOCK, 0));
+        connect(clients.back(), reinterpret_cast<sockaddr*>(&address), size);
+    }
+    quoteServers().port = ntohs(address.sin_port);
+    asked = 0;
+    EXPECT_EQ(fetchLatestQuote(*company_, "127.0.0.1", "/", third, &value_, &date_), FetchEnd::kStopped);
+    EXPECT_LT(std::chrono::steady_clock::now() - start, limit_ / 2);
+    quoteServers().limit = 100ms;
+    EXPECT_EQ(fetchLatestQuote(*company_, "127.0.0.1", "/", {}, &value_, &date_), FetchEnd::kSilent);
+    clients.push_back(full);
+    for (const int client : clients)
+        close(client);
 }
 
 TEST_F(FetchTest, APageEndsAtItsLimit)

@@ -1,5 +1,6 @@
 #include "valuation/Totals.h"
 #include "tests/support/SmallPortfolio.h"
+#include "valuation/QuoteCoverage.h"
 #include "valuation/State.h"
 
 #include <gtest/gtest.h>
@@ -101,4 +102,53 @@ TEST(TotalsTest, WithoutAReferenceOrItsRateNothingHasAValue)
         EXPECT_EQ(totals.totalDeposit, hasReference ? 200 : 0);
         EXPECT_EQ(totals.totalValue + totals.profit + totals.annualRevenue, 0);
     }
+}
+
+TEST(QuoteCoverageTest, CountsTheQuotesThatAreNotOfTheDay)
+{
+    const struct {
+        std::vector<int> alpha, beta; // days with quotes
+        int day;
+        unsigned older, unknown;
+        int last; // day with both, -1 for none
+        const char* why;
+    } cases[] = {
+        {{0, 5, 6}, {0, 4, 6, 9}, 6, 0, 0, 6, "both of the day"},
+        {{0, 5, 6}, {0, 4, 6, 9}, 9, 1, 0, 6, "one of the day, behind the other's last"},
+        {{0, 5, 6}, {0, 4, 6, 9}, 5, 1, 0, 0, "each has one between"},
+        {{0, 5, 6}, {0, 4, 6, 9}, 30, 2, 0, 6, "behind all"},
+        {{1, 3, 5}, {2, 4, 6}, 6, 1, 0, -1, "never on one day"},
+        {{7}, {0}, 6, 1, 1, -1, "one begins later"},
+        {{}, {6}, 6, 0, 1, -1, "one has none"},
+    };
+    for (const auto& c : cases) {
+        Portfolio p;
+        for (const int day : c.alpha)
+            new CompanyQuote(p.alpha, daysAfterStart(day), 1);
+        for (const int day : c.beta)
+            new CompanyQuote(p.beta, daysAfterStart(day), 1);
+        p.hold(p.alpha, 1);
+        p.hold(p.beta, -1);
+        p.hold(p.alpha, 0); // is not held
+        const QuoteCoverage coverage = quoteCoverage(State(&p.wallet, daysAfterStart(c.day), false));
+        EXPECT_EQ(coverage.needed, 2U) << c.why;
+        EXPECT_EQ(coverage.older, c.older) << c.why;
+        EXPECT_EQ(coverage.unknown, c.unknown) << c.why;
+        EXPECT_EQ(coverage.lastFullDay, c.last < 0 ? Date() : daysAfterStart(c.last)) << c.why;
+    }
+}
+
+TEST(QuoteCoverageTest, RatesAreThoseOfForeignMoneyAndHoldings)
+{
+    Portfolio p;
+    const auto older = [&](int day) {
+        return rateCoverage(State(&p.wallet, daysAfterStart(day), false), p.catalogue).older;
+    };
+    p.account(p.euro, 100);
+    p.account(p.dollar, 0);
+    EXPECT_EQ(older(3), 0U) << "the reference, and no money";
+    p.hold(p.beta, 1);
+    p.account(p.dollar, 10);
+    EXPECT_EQ(older(0), 0U);
+    EXPECT_EQ(older(3), 1U);
 }
