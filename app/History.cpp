@@ -1,6 +1,7 @@
 #include "app/History.h"
 
 #include "app/StepLabel.h"
+#include "views/PageView.h"
 
 #include <algorithm>
 #include <cstdlib>
@@ -29,6 +30,13 @@ History::History(Moment first, DataFiles::Names names) : names_(std::move(names)
         noteFile(kind);
 }
 
+std::string History::fileStepLabel(const std::string& command, const DataFiles::Names& names) const
+{
+    const FileKind kind = names.wallet == names_.wallet ? FileKind::kMarkets : FileKind::kWallet;
+    const std::string name = PageView::fileName(names.of(kind).path);
+    return name.empty() ? command : command + ' ' + name;
+}
+
 bool History::isSame(FileKind kind, const Moment& a, const Moment& b) const
 {
     if (kind == FileKind::kMarkets)
@@ -40,7 +48,7 @@ void History::note(Moment now, const DataFiles::Names& names, const std::string&
 {
     const bool isMarketStep = !isSame(FileKind::kMarkets, entries_[now_].moment, now);
     const bool isWalletStep = !isSame(FileKind::kWallet, entries_[now_].moment, now);
-    const bool isFileStep = !command.empty() && names != names_;
+    const bool isFileStep = !command.empty() && names != names_; // a load, or a new portfolio
     if (!isMarketStep && !isWalletStep && !isFileStep) {
         entries_[now_].moment = std::move(now);
         names_ = names; // a save gives a name, and an undo does not take it back
@@ -49,7 +57,7 @@ void History::note(Moment now, const DataFiles::Names& names, const std::string&
     forgetUndone();
     const Entry& former = entries_.back();
     Entry entry{std::move(now), {}, {}, former.steps, 0, 0};
-    entry.label = stepLabel(command, former.moment, entry.moment);
+    entry.label = isFileStep ? fileStepLabel(command, names) : stepLabel(command, former.moment, entry.moment);
     entry.steps[indexOf(FileKind::kMarkets)] += isMarketStep ? 1 : 0;
     entry.steps[indexOf(FileKind::kWallet)] += isWalletStep ? 1 : 0;
     entry.bytes = bytesBeside(former.moment, entry.moment);

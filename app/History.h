@@ -85,6 +85,7 @@ private:
         std::shared_ptr<const WalletImage> wallet;
     };
 
+    std::string fileStepLabel(const std::string& command, const DataFiles::Names& names) const;
     bool isSame(FileKind kind, const Moment& a, const Moment& b) const;
     void forgetUndone();
     void forgetOldest();

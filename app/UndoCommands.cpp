@@ -14,7 +14,7 @@ void PLWindow::makeUndoButtons()
 {
     constexpr float kWidth = 60;
     constexpr float kHeight = 22;
-    constexpr float kRight = 797;
+    constexpr float kRight = 792;
     const auto add = [this](float left, const char* name, const char* label, uint32 code) {
         auto* button = new BButton({left, 1, left + kWidth, 1 + kHeight}, name, label, new BMessage(code));
         AddChild(button); // which the window owns
@@ -120,6 +120,7 @@ void PLWindow::restore(const Moment& moment)
         AccountSelection();
     operationView_->restoreSelection(moment.operations);
     SelectOperation();
+    ForgetTyping();
 }
 
 void PLWindow::showHistory()

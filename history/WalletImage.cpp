@@ -10,6 +10,7 @@
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
 
+#include <algorithm>
 #include <cstring>
 #include <unordered_map>
 
@@ -25,14 +26,16 @@ std::uint32_t sizeOf(const auto& list)
 OperationImage imageOf(const Operation& operation)
 {
     OperationImage image{operation.getDate(), operation.getType(), operation.isAutomatic(), 0, {}};
-    if (const auto* trade = dynamic_cast<const ShareOperation*>(&operation)) {
-        image.quantity = trade->getQuantity();
-        image.numbers = {trade->getQuote(), trade->getOperationCost()};
-    } else if (const auto* transfer = dynamic_cast<const TransferAccountOperation*>(&operation)) {
-        image.numbers = {transfer->getAmount(), transfer->getRateCost(), transfer->getCost(),
-                         transfer->getFromCurrencyQuote(), transfer->getToCurrencyQuote()};
-    } else {
+    if (image.type == Operation::kDeposit) {
         image.numbers = {static_cast<const AccountOperation&>(operation).getAmount()};
+    } else if (image.type == Operation::kTransfer) {
+        const auto& transfer = static_cast<const TransferAccountOperation&>(operation);
+        image.numbers = {transfer.getAmount(), transfer.getRateCost(), transfer.getCost(),
+                         transfer.getFromCurrencyQuote(), transfer.getToCurrencyQuote()};
+    } else {
+        const auto& trade = static_cast<const ShareOperation&>(operation);
+        image.quantity = trade.getQuantity();
+        image.numbers = {trade.getQuote(), trade.getOperationCost()};
     }
     return image;
 }
@@ -117,18 +120,24 @@ WalletImage WalletImage::of(const Wallet& wallet, const Catalogue& catalogue,
 {
     WalletImage image;
     PlaceOf places;
-    const auto take = [&](auto operations) {
-        for (const Operation* operation : operations)
-            if (!places.contains(operation) && !(operation->isAutomatic() && isLeftOut(*operation))) {
-                places[operation] = sizeOf(image.operations);
-                image.operations.push_back(imageOf(*operation));
-            }
-    };
-    // All operations first: the lists then refer to them by their places.
+    std::size_t count = wallet.getNbrShares() + wallet.getNbrAccounts();
     for (const Account* account : wallet.accounts())
-        take(account->operations());
+        count += account->getNbrOperations();
+    places.reserve(count);
+    image.operations.reserve(count);
+    const auto take = [&](const Operation* operation) {
+        if (operation->isAutomatic() && isLeftOut(*operation))
+            return;
+        places.emplace(operation, sizeOf(image.operations));
+        image.operations.push_back(imageOf(*operation));
+    };
+    // All operations first: the lists then refer to them by their places. Holdings also list what no account has.
+    for (const Account* account : wallet.accounts())
+        std::ranges::for_each(account->operations(), take);
     for (const Share* share : wallet.shares())
-        take(share->shareOperations());
+        for (const ShareOperation* operation : share->shareOperations())
+            if (operation->account() == nullptr)
+                take(operation);
     for (const Account* account : wallet.accounts()) {
         places[account] = sizeOf(image.accounts);
         image.accounts.push_back({account->getName(), account->isDefaultTransferAccount(),

@@ -99,17 +99,21 @@ void PageView::addOpenFile(BView* page, BRect frame)
     page->AddChild(line);
 }
 
+std::string PageView::fileName(const String& path)
+{
+    constexpr std::size_t kLongest = 40; // bytes
+    const std::string_view whole = path.bytes();
+    return shortened(whole.substr(whole.rfind('/') + 1), kLongest); // all of it without a slash
+}
+
 void PageView::SetOpenFile(const String& path, unsigned changes)
 {
-    constexpr std::size_t kLongestName = 40; // bytes; the tool tip has the whole path
-    const std::string_view whole = path.bytes();
-    const std::string name(whole.substr(whole.rfind('/') + 1)); // all of it without a slash
-    std::string text = whole.empty() ? "No file" : shortened(name, kLongestName);
+    std::string text = path.isUndefined() ? "No file" : fileName(path);
     if (changes > 0)
         text += " - " + countText(static_cast<int>(changes)) + (changes == 1 ? " change" : " changes") + " not saved";
     auto* line = static_cast<BStringView*>(FindView("txtOpenFile"));
     line->SetText(text.c_str());
-    line->SetToolTip(whole.empty() ? "" : wholeTextOf(path));
+    line->SetToolTip(wholeTextOf(path));
 }
 
 BCheckBox* PageView::addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code)

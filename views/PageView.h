@@ -54,6 +54,8 @@ public:
     static void explain(BView& page, std::initializer_list<Tip> tips);
     /// A line that says which file the page is about, at the right of `frame`; `SetOpenFile` fills it.
     static void addOpenFile(BView* page, BRect frame);
+    /// The last part of a path, shortened to what a line has room for; empty for an undefined one.
+    static std::string fileName(const String& path);
     /// `path` is undefined before there is a file; `changes` is how many are not saved to it.
     void SetOpenFile(const String& path, unsigned changes);
     static BCheckBox* addCheckBox(BView* parent, BRect frame, const char* name, const char* label, uint32 code);

@@ -76,10 +76,15 @@ void BWindow::AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHand
 
 void BWindow::ForgetTyping()
 {
-    if (auto* field = qobject_cast<QLineEdit*>(widget_->focusWidget()))
-        field->setModified(false);
-    if (auto* field = qobject_cast<QPlainTextEdit*>(widget_->focusWidget()))
+    if (auto* field = qobject_cast<QLineEdit*>(widget_->focusWidget())) {
+        const int cursor = field->cursorPosition();
+        field->setText(field->text()); // which is what empties the field's own history
+        field->setCursorPosition(cursor);
+    }
+    if (auto* field = qobject_cast<QPlainTextEdit*>(widget_->focusWidget())) {
+        field->document()->clearUndoRedoStacks();
         field->document()->setModified(false);
+    }
 }
 
 void BWindow::Show()

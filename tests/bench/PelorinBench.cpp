@@ -6,6 +6,9 @@
 #include "chart/GraphPoint.h"
 #include "chart/GraphView.h"
 #include "foundation/Today.h"
+#include "history/CatalogueImage.h"
+#include "history/WalletImage.h"
+#include "market/Market.h"
 #include "market/Quote.h"
 #include "platform/Application.h"
 #include "platform/CheckBox.h"
@@ -32,6 +35,7 @@ using Files = GeneratedFiles::Files;
 std::unique_ptr<GeneratedFiles> folder; // of this run
 
 constexpr DataSize kLarge{1000, 20, 500, 20, 50000};
+constexpr DataSize kLong{4, 58, 4, 4, 100}; // companies with 15,000 quotes
 
 /// A portfolio with the same number of operations, spread over more or fewer years.
 constexpr DataSize small(int years)
@@ -140,6 +144,53 @@ bool replay(Portfolio& portfolio, const Files&)
     return true;
 }
 
+/// A portfolio with its images, as an undo keeps them.
+struct Remembered : Portfolio {
+    std::shared_ptr<const CatalogueImage> image;
+    std::shared_ptr<const CatalogueImage> changed;
+};
+
+bool note(Remembered& subject, const Files&)
+{
+    subject.changed = CatalogueImage::of(subject.catalogue, subject.image);
+    const auto wallet = WalletImage::of(subject.wallet, subject.catalogue, [](const Operation&) { return false; });
+    return wallet.operations.size() > 0;
+}
+
+bool loadAndNote(Remembered& subject, const Files& files)
+{
+    if (!load(subject, files))
+        return false;
+    subject.image = CatalogueImage::of(subject.catalogue, nullptr);
+    return true;
+}
+
+/// A quote of one company.
+bool changeQuote(Remembered& subject, const Files& files)
+{
+    Company& company = *subject.catalogue.getMarkets()[0]->companies()[0];
+    company.getQuote(company.getNbrQuotes() / 2)->setValue(1);
+    return note(subject, files) && subject.changed != subject.image;
+}
+
+bool removeMarkets(Remembered& subject, const Files& files)
+{
+    for (Market* market : subject.catalogue.getMarkets())
+        delete market;
+    return note(subject, files) || subject.changed != subject.image;
+}
+
+bool loadAndRemove(Remembered& subject, const Files& files)
+{
+    return loadAndNote(subject, files) && removeMarkets(subject, files);
+}
+
+bool undo(Remembered& subject, const Files&)
+{
+    subject.image->restore(subject.catalogue);
+    return !subject.catalogue.getMarkets().empty();
+}
+
 /// The window, with what is needed around it.
 struct Desktop {
     BApplication application{"application/x-vnd.Pelorin-bench"};
@@ -214,6 +265,7 @@ void measure(benchmark::State& state, const DataSize& size, double items, bool (
 }
 
 constexpr auto BM_Files = measure<Portfolio>;
+constexpr auto BM_Undo = measure<Remembered>;
 constexpr auto BM_Window = measure<Desktop>;
 
 #define PELORIN_BENCHMARK(subject, name, ...)                                                                          \
@@ -231,6 +283,10 @@ PELORIN_BENCHMARK(BM_Files, remove_20_years, small(20), shareStatesOf(small(20))
 PELORIN_BENCHMARK(BM_Files, remove_40_years, small(40), shareStatesOf(small(40)), loadAndEvolve, removeStates);
 PELORIN_BENCHMARK(BM_Files, chart_small, small(20), 1, doNothing, makeChart);
 PELORIN_BENCHMARK(BM_Files, chart_large, kLarge, 1, doNothing, makeChart);
+PELORIN_BENCHMARK(BM_Undo, note_nothing, kLarge, 1, loadAndNote, note);
+PELORIN_BENCHMARK(BM_Undo, note_a_quote_of_15000, kLong, 1, loadAndNote, changeQuote);
+PELORIN_BENCHMARK(BM_Undo, remove_markets, kLarge, quotesOf(kLarge), loadAndNote, removeMarkets);
+PELORIN_BENCHMARK(BM_Undo, bring_them_back, kLarge, quotesOf(kLarge), loadAndRemove, undo);
 PELORIN_BENCHMARK(BM_Window, open, small(20), 1, doNothing, openWindow);
 PELORIN_BENCHMARK(BM_Window, switch_page, small(20), 1, load, switchPages);
 PELORIN_BENCHMARK(BM_Window, load_market, kLarge, quotesOf(kLarge), openWindow, loadMarket);

@@ -5,11 +5,15 @@
 #include "platform/Entry.h"
 #include "platform/ListItem.h"
 #include "platform/Message.h"
+#include "platform/StringView.h"
 #include "platform/TabView.h"
 #include "tests/gui/RandomCommands.h"
 #include "tests/support/Bytes.h"
 
+#include <QApplication>
+
 #include <cstdlib>
+#include <filesystem>
 #include <map>
 
 namespace {
@@ -154,6 +158,99 @@ TEST_P(UndoTest, TheWayBackAndOnPassesTheSameMoments)
     EXPECT_FALSE(isEnabled("btnUndo"));
     go("btnRedo", 0, last);
     EXPECT_FALSE(isEnabled("btnRedo"));
+}
+
+class UndoStepTest : public WindowTest {
+protected:
+    std::string openFile() { return dynamic_cast<BStringView&>(*viewOf("txtOpenFile")).Text(); }
+    BView* viewOf(const char* name)
+    {
+        auto& tabs = dynamic_cast<BTabView&>(*window().FindView("TabView"));
+        return tabs.TabAt(tabs.Selection())->View()->FindView(name);
+    }
+    std::string tip(const char* button) { return window().FindView(button)->widget()->toolTip().toStdString(); }
+    void press(Qt::Key key, Qt::KeyboardModifiers modifiers = Qt::ControlModifier)
+    {
+        QTest::keyClick(QApplication::focusWidget(), key, modifiers);
+        settle();
+    }
+    void addMarket(const std::string& name)
+    {
+        enter("txtMarketName", name);
+        enter("txtMarketCurrencyRepresentation", "EUR");
+        click("btnAddMarket");
+    }
+};
+
+TEST_F(UndoStepTest, CountsWhatTheFilesDoNotHave)
+{
+    makeSample();
+    loadSample();
+    show(kCompanyPage);
+    EXPECT_EQ(openFile(), "Sample");
+    addMarket("Xetra");
+    EXPECT_EQ(openFile(), "Sample - 1 change not saved");
+    EXPECT_EQ(tip("btnUndo"), "Undo: Add market Xetra  Ctrl+Z");
+    addMarket("Milan");
+    press(Qt::Key_S);
+    EXPECT_EQ(openFile(), "Sample");
+    // Past a save the file has more than there is here.
+    press(Qt::Key_Z);
+    EXPECT_EQ(openFile(), "Sample - 1 change not saved");
+    EXPECT_EQ(tip("btnRedo"), "Redo: Add market Milan  Ctrl+Shift+Z");
+    press(Qt::Key_Z, Qt::ControlModifier | Qt::ShiftModifier);
+    EXPECT_EQ(openFile(), "Sample");
+    // Another way on from there: one step back and one on.
+    press(Qt::Key_Z);
+    addMarket("Zurich");
+    EXPECT_EQ(openFile(), "Sample - 2 changes not saved");
+    show(kParameterPage);
+    EXPECT_EQ(openFile(), "Sample"); // the portfolio's
+}
+
+TEST_F(UndoStepTest, TakesBackALoadAndAReinitWithTheirFiles)
+{
+    makeSample();
+    loadSample();
+    show(kPortoFolioPage);
+    click("btnReinitPortoFolio");
+    EXPECT_EQ(openFile(), "No file");
+    EXPECT_EQ(tip("btnUndo"), "Undo: Reinit  Ctrl+Z");
+    press(Qt::Key_Z);
+    EXPECT_EQ(openFile(), "Sample");
+    EXPECT_GT(wallet().getNbrAccounts(), 0U);
+    // A save after the undo of a load writes to the file of before.
+    std::filesystem::copy(walletFile(), folder() + "/PortoFolios/Other");
+    answerNextAlert("Continue");
+    click("btnLoadPortoFolio");
+    answerPanel("OpenPanel", folder() + "/PortoFolios/Other");
+    EXPECT_EQ(openFile(), "Other");
+    press(Qt::Key_Z);
+    EXPECT_EQ(openFile(), "Sample");
+    show(kParameterPage);
+    enter("txtBuyCost", "77");
+    EXPECT_EQ(openFile(), "Sample - 1 change not saved");
+    const auto other = std::filesystem::last_write_time(folder() + "/PortoFolios/Other");
+    press(Qt::Key_S);
+    EXPECT_EQ(message(), "Wallet successfully saved...");
+    EXPECT_EQ(std::filesystem::last_write_time(folder() + "/PortoFolios/Other"), other);
+}
+
+TEST_F(UndoStepTest, LeavesCtrlZToAFieldThatIsBeingTypedIn)
+{
+    show(kCurrencyPage);
+    enter("txtCurrencyRepresentation", "EUR");
+    type("txtCurrencyName", "Euro");
+    press(Qt::Key_N); // adds; the keyboard stays in the field
+    ASSERT_EQ(rows("lstCurrencies").size(), 1U);
+    QTest::keyClicks(QApplication::focusWidget(), "s");
+    press(Qt::Key_Z);
+    EXPECT_EQ(text("txtCurrencyName"), "Euro");
+    EXPECT_EQ(rows("lstCurrencies").size(), 1U);
+    press(Qt::Key_Z);
+    EXPECT_EQ(rows("lstCurrencies").size(), 0U);
+    press(Qt::Key_Z, Qt::ControlModifier | Qt::ShiftModifier);
+    EXPECT_EQ(rows("lstCurrencies").size(), 1U);
 }
 
 INSTANTIATE_TEST_SUITE_P(Seeds, UndoTest, testing::Range(firstSeed(), firstSeed() + 4));
