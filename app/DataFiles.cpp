@@ -223,6 +223,44 @@ std::string DataFiles::doubtAbout(FileKind kind) const
     return {};
 }
 
+DataFiles::Restoring DataFiles::restore(const Restored& markets, const Restored& wallet)
+{
+    std::unique_ptr<InputFile> marketFile, walletFile;
+    try {
+        // Nothing is thrown away before there is all that is to be read.
+        if (!markets.source.empty())
+            marketFile = std::make_unique<InputFile>(markets.source);
+        if (wallet.isCopy)
+            walletFile = std::make_unique<InputFile>(wallet.source);
+    } catch (const std::runtime_error& error) {
+        return {false, error.what()};
+    }
+    if (!wallet.isCopy && !wallet.source.empty())
+        walletFile = openFile(wallet.source.c_str());
+    window_.replaceWallet();
+    window_.RemoveAllCurrencies();
+    names_ = {markets.name, wallet.name};
+    Restoring done{true, ""};
+    if (marketFile != nullptr && window_.catalogue().rd(marketFile->stream()) != 0) {
+        names_.markets.failure = markets.source + " is damaged";
+        done = {!markets.isCopy, names_.markets.failure};
+    }
+    window_.showCatalogue(0);
+    const bool isThere = walletFile != nullptr;
+    if (isThere ? window_.getWallet()->rd(walletFile->stream(), nullptr) != 0 : !wallet.source.empty()) {
+        window_.replaceWallet(); // a part of a portfolio would pass for the whole
+        names_.wallet = {};
+        done = {done.isComplete && !wallet.isCopy,
+                wallet.source + (isThere ? " does not fit the market data" : " cannot be opened")};
+    }
+    window_.showWallet();
+    // What was read from its own file is as that has it.
+    for (const auto& [kind, part] : {std::pair(FileKind::kMarkets, &markets), std::pair(FileKind::kWallet, &wallet)})
+        if (!part->isCopy && names_.of(kind) == part->name)
+            window_.noteFile(kind);
+    return done;
+}
+
 void DataFiles::saveOrAsk()
 {
     const auto kind = kindInFront();
@@ -296,5 +334,5 @@ void DataFiles::save(const String& path)
     if (result.outcome != DurableSave::Outcome::kSaved || names_.of(*kind).path != path)
         return;
     names_.of(*kind) = {path, result.stamp};
-    window_.noteFile(*kind);
+    window_.noteSaved(*kind);
 }

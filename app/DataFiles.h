@@ -24,26 +24,14 @@ class PLWindow;
 /// changed the file since.
 class DataFiles {
 public:
-    /// The panels open in `folder`, and it keeps the files that are replaced. Window and tabs outlive this.
-    DataFiles(PLWindow& window, const BTabView& tabs, const DataFolder& folder);
-
-    /// Asks whether what is here may go, and shows the open panel; while the window closes, without a question.
-    void askForLoad();
-    /// The answer of the open panel: loads the file. When it can be opened the portfolio goes, whichever kind it is.
-    void load(BMessage* message);
-    /// Saves to the file that is remembered, or shows the save panel, with the file's name in it when there is one.
-    void saveOrAsk();
-    /// The answer of the save panel. @return `B_OK`; what is missing in the message.
-    status_t save(BMessage* message);
-    void save(const String& path);
-    /// The next save of the portfolio asks for a name.
-    void forgetWallet();
-
     struct Remembered {
         String path = {};                    ///< undefined before the first file
         std::optional<FileStamp> stamp = {}; ///< of the file as it was loaded or saved; nothing when that is not known
         std::string failure = {};            ///< why it could not be loaded; empty when it could
         bool isEmptied = false;              ///< the portfolio was thrown away by a market file
+
+        /// The next save asks for a name, whatever the file has.
+        bool isAsked() const { return !failure.empty(); }
 
         /// The same file, in the same trouble.
         bool operator==(const Remembered& other) const
@@ -60,6 +48,34 @@ public:
         const Remembered& of(FileKind kind) const { return kind == FileKind::kMarkets ? markets : wallet; }
         bool operator==(const Names&) const = default;
     };
+    /// What is to be read of a kind of file in place of what is here.
+    struct Restored {
+        std::string source; ///< the file to be read; empty when there was none
+        Remembered name;    ///< of the file that is saved to from then on
+        bool isCopy;        ///< of what was not saved: `source` is not that file
+    };
+    struct Restoring {
+        bool isComplete;     ///< all copies were read
+        std::string problem; ///< what could not be read, as one line for the user; empty when all was
+    };
+
+    /// The panels open in `folder`, and it keeps the files that are replaced. Window and tabs outlive this.
+    DataFiles(PLWindow& window, const BTabView& tabs, const DataFolder& folder);
+
+    /// Asks whether what is here may go, and shows the open panel; while the window closes, without a question.
+    void askForLoad();
+    /// The answer of the open panel: loads the file. When it can be opened the portfolio goes, whichever kind it is.
+    void load(BMessage* message);
+    /// Reads both in place of all that is here. When a copy, or the market data, cannot be opened, nothing changes.
+    Restoring restore(const Restored& markets, const Restored& wallet);
+    /// Saves to the file that is remembered, or shows the save panel, with the file's name in it when there is one.
+    void saveOrAsk();
+    /// The answer of the save panel. @return `B_OK`; what is missing in the message.
+    status_t save(BMessage* message);
+    void save(const String& path);
+    /// The next save of the portfolio asks for a name.
+    void forgetWallet();
+
     const Names& names() const { return names_; }
     /// For an undo of a load: from here on these are the files that are saved to.
     void setNames(const Names& names) { names_ = names; }

@@ -25,7 +25,7 @@ std::size_t bytesBeside(const Moment& moment, const Moment& next)
 
 History::History(Moment first, DataFiles::Names names) : names_(std::move(names))
 {
-    entries_.push_back({std::move(first), {}, {}, {}, 0});
+    entries_.push_back({std::move(first), {}, {}, {}, 0, 0});
     for (const FileKind kind : kKinds)
         noteFile(kind);
 }
@@ -56,7 +56,7 @@ void History::note(Moment now, const DataFiles::Names& names, const std::string&
     }
     forgetUndone();
     const Entry& former = entries_.back();
-    Entry entry{std::move(now), {}, {}, former.steps, 0};
+    Entry entry{std::move(now), {}, {}, former.steps, 0, 0};
     entry.label = isFileStep ? fileStepLabel(command, names) : stepLabel(command, former.moment, entry.moment);
     entry.steps[indexOf(FileKind::kMarkets)] += isMarketStep ? 1 : 0;
     entry.steps[indexOf(FileKind::kWallet)] += isWalletStep ? 1 : 0;
@@ -67,7 +67,7 @@ void History::note(Moment now, const DataFiles::Names& names, const std::string&
     bytes_ += entry.bytes;
     entries_.push_back(std::move(entry));
     ++now_;
-    ++serial_;
+    entries_[now_].step = ++serial_;
     // A file that could not be loaded: changes are counted from here.
     for (const FileKind kind : kKinds)
         if (!marks_.contains({kind, pathOf(kind)}))
@@ -119,6 +119,12 @@ std::optional<DataFiles::Names> History::redo()
     return names_ = step.files->second;
 }
 
+bool History::isDone(std::uint64_t step) const
+{
+    const auto end = entries_.begin() + static_cast<std::ptrdiff_t>(now_) + 1;
+    return step <= entries_.front().step || std::ranges::find(entries_.begin(), end, step, &Entry::step) != end;
+}
+
 std::string History::pathOf(FileKind kind) const
 {
     return std::string(names_.of(kind).path.bytes());
@@ -133,7 +139,7 @@ unsigned History::unsavedChanges(FileKind kind) const
 {
     const auto found = marks_.find({kind, pathOf(kind)});
     if (found == marks_.end())
-        return 0;
+        return 1; // what was restored, and its file was not looked at
     const Mark& mark = found->second;
     Moment saved;
     saved.catalogue = mark.catalogue;

@@ -60,6 +60,10 @@ public:
     unsigned unsavedChanges(FileKind kind) const;
     /// Another number after every step, undo and redo.
     std::uint64_t serial() const { return serial_; }
+    /// The step that led to what is there now: a number that no other step has or had. 0 before the first.
+    std::uint64_t lastStep() const { return entries_[now_].step; }
+    /// Whether what is there now came about with that step, which may be forgotten by now: it was not taken back.
+    bool isDone(std::uint64_t step) const;
     /// Bytes that the steps hold besides what is there now.
     std::size_t bytes() const { return bytes_; }
 
@@ -71,6 +75,7 @@ private:
         std::string label;
         std::optional<std::pair<DataFiles::Names, DataFiles::Names>> files; // before and after, when they changed
         Counts steps{};                                                     // that changed what is of that kind
+        std::uint64_t step = 0;                                             // its number
         std::size_t bytes = 0;                                              // in the moment before, and not in this one
     };
     /// What a file has.

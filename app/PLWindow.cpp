@@ -3,6 +3,7 @@
 #include "app/Holds.h"
 #include "app/MessageView.h"
 #include "app/NoticeLine.h"
+#include "app/Rescue.h"
 #include "app/Shortcuts.h"
 #include "foundation/Today.h"
 #include "platform/Alert.h"
@@ -151,6 +152,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     ReinitWallet(); // from here on there is a wallet, always
     history_ = std::make_unique<History>(moment(), files_->names());
     showHistory();
+    rescue_ = std::make_unique<Rescue>(*this, *files_, folder);
 }
 
 PLWindow::~PLWindow() = default;
@@ -173,8 +175,8 @@ void PLWindow::makePages()
     messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
-    AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // in front of the edges of both
     makeUndoButtons();
+    AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // last: in front of the edges of both
 }
 
 void PLWindow::MessageReceived(BMessage* message)

@@ -17,6 +17,7 @@ class BButton;
 class MessageView;
 class NoticeLine;
 class ParameterView;
+class Rescue;
 class Shortcuts;
 class State;
 class WalletView;
@@ -42,9 +43,6 @@ public:
     bool QuitRequested() override;
     /// Loads the file that the open panel was left with.
     virtual void RefsReceived(BMessage* message) { files_->load(message); }
-
-    /// What is here of that kind is what its file has: it was just loaded or saved.
-    void noteFile(FileKind) {}
 
     /// Shows `text` in the status line, at once; `toolTip` says more of it.
     void SetMessage(const char* text, const char* toolTip = "");
@@ -101,6 +99,13 @@ public:
     unsigned unsavedChanges(FileKind kind) const { return history_->unsavedChanges(kind); }
     /// Another number after every change of the model by a command.
     std::uint64_t changeSerial() const { return history_->serial(); }
+    const History& history() const { return *history_; }
+    /// From here on the command that runs is a step of that name.
+    void nameStep(const char* name) { command_ = name; }
+    /// Takes note of what the command has changed until now.
+    void noteStep() { noteStep(command_); }
+    /// What is here of that kind has just been saved.
+    void noteSaved(FileKind kind);
 
     // Files.
     void LoadSomething() { files_->askForLoad(); }
@@ -222,7 +227,8 @@ private:
     std::unique_ptr<EventEditor> events_;
     std::unique_ptr<OperationEditor> operations_;
     std::unique_ptr<Shortcuts> shortcuts_;
-    int holds_ = 0;              // of the valuation; 0 between two commands
-    bool isUpdateDue_ = false;   // it was asked for meanwhile
-    std::string simulationTold_; // of simulated sales; what a person has dismissed does not come again
+    std::unique_ptr<Rescue> rescue_; // the last one to come and the first to go: its last copy needs all of the above
+    int holds_ = 0;                  // of the valuation; 0 between two commands
+    bool isUpdateDue_ = false;       // it was asked for meanwhile
+    std::string simulationTold_;     // of simulated sales; what a person has dismissed does not come again
 };

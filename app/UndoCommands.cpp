@@ -1,6 +1,7 @@
 // Undo and redo, and what the window says of them and of what is not saved.
 
 #include "app/PLWindow.h"
+#include "app/Rescue.h"
 #include "platform/Button.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
@@ -60,6 +61,13 @@ void PLWindow::noteFile(FileKind kind)
     noteStep(command_);
     history_->noteFile(kind);
     showHistory();
+    rescue_->noteFile(kind);
+}
+
+void PLWindow::noteSaved(FileKind kind)
+{
+    noteFile(kind);
+    rescue_->noteSaved(kind);
 }
 
 void PLWindow::Undo()

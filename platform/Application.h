@@ -12,8 +12,8 @@ public:
     explicit BApplication(const char* signature);
     ~BApplication() override;
 
-    /// Handles events until the application is asked to quit (`B_QUIT_REQUESTED`); then closes the windows that are
-    /// left.
+    /// Handles events until the application is asked to quit (`B_QUIT_REQUESTED`, or SIGTERM, SIGHUP or SIGINT, which
+    /// take back what waits for an answer); then closes the windows that are left.
     int Run();
     /// Ends `Run` when the present message is done.
     void Quit();

@@ -26,6 +26,7 @@ public:
     static constexpr const char* kCompanies = "/Companies";
     static constexpr const char* kPortoFolios = "/PortoFolios";
     static constexpr const char* kBackups = "/Backups";
+    static constexpr const char* kUnsaved = "/Backups/Unsaved"; // copies of unsaved work
 
 private:
     static constexpr unsigned kOpenMode = 0777; // less the user's mask

@@ -4,7 +4,6 @@
 
 #include <algorithm>
 #include <cerrno>
-#include <csignal>
 #include <cstring>
 #include <fcntl.h>
 #include <memory>
@@ -13,33 +12,6 @@
 #include <unistd.h>
 
 namespace {
-
-/// A file that grows past the user's limit is to be a failed write, not the end of the program.
-class SizeSignalIgnored {
-public:
-    SizeSignalIgnored() = default;
-    ~SizeSignalIgnored() { std::signal(SIGXFSZ, former_); }
-    SizeSignalIgnored(const SizeSignalIgnored&) = delete;
-    SizeSignalIgnored& operator=(const SizeSignalIgnored&) = delete;
-
-private:
-    void (*former_)(int) = std::signal(SIGXFSZ, SIG_IGN);
-};
-
-[[noreturn]] void failWriting(const std::string& path)
-{
-    throw AtomicFile::WriteError(
-        path + ": cannot be written: " + (errno != 0 ? std::strerror(errno) : "not all of it can be saved"));
-}
-
-/// Lets `write` write; throws a WriteError when it fails.
-void fill(FILE* stream, const std::string& path, const DurableSave::Writer& write)
-{
-    // `write` tells only that it has failed. The reason is the one that its last call has left, if any.
-    errno = 0;
-    if (write(stream) != 0 || std::ferror(stream) != 0)
-        failWriting(path);
-}
 
 bool isDevice(const std::string& path)
 {

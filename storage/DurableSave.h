@@ -3,9 +3,8 @@
 #include "storage/FileStamp.h"
 #include "storage/KeptVersions.h"
 #include "storage/SaveLock.h"
+#include "storage/Writing.h"
 
-#include <cstdio>
-#include <functional>
 #include <optional>
 #include <string>
 
@@ -25,8 +24,7 @@ public:
         std::string reason;             // one line for the user, with the file's path; empty when it is saved
         std::optional<FileStamp> stamp; // of the new file; nothing when it is not saved, and for a device
     };
-    /// Writes the contents, perhaps none. @return 0, or -1 when that failed.
-    using Writer = std::function<int(FILE*)>;
+    using Writer = FileWriter;
 
     /// @param patience how long a save waits for another program that saves in the same folder.
     explicit DurableSave(const DataFolder& folder, SaveLock::Patience patience = kPatience)

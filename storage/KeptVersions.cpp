@@ -1,6 +1,7 @@
 #include "storage/KeptVersions.h"
 
 #include "storage/AtomicFile.h"
+#include "storage/Checksum.h"
 #include "storage/Descriptor.h"
 #include "storage/Folders.h"
 
@@ -31,11 +32,8 @@ std::string stemFor(const std::string& name)
     constexpr std::size_t kLongest = 110; // encrypting file systems have names of 143 bytes
     if (name.size() <= kLongest)
         return name;
-    std::uint64_t hash = 14695981039346656037U; // FNV-1a
-    for (const char c : name)
-        hash = (hash ^ static_cast<unsigned char>(c)) * 1099511628211U;
     char number[18];
-    std::snprintf(number, sizeof number, "~%016llx", static_cast<unsigned long long>(hash));
+    std::snprintf(number, sizeof number, "~%016llx", static_cast<unsigned long long>(checksumOf(name)));
     std::size_t length = kLongest - std::strlen(number);
     while (length > 0 && (static_cast<unsigned char>(name[length]) & 0xC0) == 0x80)
         --length; // not within a UTF-8 character

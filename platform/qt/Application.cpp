@@ -4,6 +4,7 @@
 #include "platform/GraphicsDefs.h"
 #include "platform/Message.h"
 #include "platform/Window.h"
+#include "platform/qt/EndSignals.h"
 
 #include <QApplication>
 #include <QDir>
@@ -80,6 +81,12 @@ BApplication::~BApplication()
 
 int BApplication::Run()
 {
+    // At once, and not by the queue: a command that waits for an answer would hold it up, and the session does not
+    // wait.
+    const EndSignals ending([this] {
+        BMessage quit(B_QUIT_REQUESTED);
+        DispatchMessage(&quit, this);
+    });
     const int status = QApplication::exec();
     // `exec` has been left, so no more messages are handled. The windows are not asked again: whoever ended the program
     // has done so.

@@ -9,9 +9,13 @@
 
 #include <QTabBar>
 
+#include <csignal>
+#include <filesystem>
 #include <optional>
 
 namespace {
+
+namespace fs = std::filesystem;
 
 /// A window of the test tells where the controls stand in that of the program, which has a home of its own.
 class EndToEndTest : public WindowTest {
@@ -154,6 +158,24 @@ TEST_F(EndToEndTest, EmptyWindowToAPortfolioThatIsThereAfterARestartAndGetsQuote
     fillIn(kPortoFolioPage, {}, "cbxComputeEvolution"); // values it anew
     EXPECT_EQ(program_->textOtherThan(before, place(kPortoFolioPage, "txtTotalValue")), "15,467.48 EUR");
     EXPECT_EQ(program_->quit(), 0);
+}
+
+TEST_F(EndToEndTest, HoweverTheSessionEndsThereIsACopyOfWhatIsNotSaved)
+{
+    std::ptrdiff_t ends = 0;
+    for (const int signal : {SIGTERM, SIGHUP, SIGINT, 0}) {
+        SCOPED_TRACE(signal);
+        start();
+        showInProgram(kCurrencyPage);
+        fillIn(kCurrencyPage, {{"txtCurrencyName", "Euro"}, {"txtCurrencyRepresentation", "EUR"}}, "btnAddCurrency");
+        if (signal == SIGHUP) { // nobody is left to answer
+            fillIn(kCurrencyPage, {}, "btnLoadMarket");
+            program_->awaitWindow("Warning");
+        }
+        program_->end(signal);
+        const fs::directory_iterator copies(home_.path / "Documents/Pelorin/Backups/Unsaved/Companies");
+        EXPECT_EQ(std::distance(begin(copies), end(copies)), ++ends) << "and the others stay";
+    }
 }
 
 } // namespace

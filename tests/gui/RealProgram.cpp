@@ -133,3 +133,13 @@ int RealProgram::quit()
         throw std::runtime_error("waited in vain for the end of the program");
     return program_.exitStatus() == QProcess::NormalExit ? program_.exitCode() : -1;
 }
+
+void RealProgram::end(int signal)
+{
+    if (signal != 0)
+        kill(static_cast<pid_t>(program_.processId()), signal);
+    else
+        server_.terminate();
+    if (!program_.waitForFinished(kPatience.count()))
+        throw std::runtime_error("waited in vain for the end of the program");
+}

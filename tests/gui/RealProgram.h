@@ -25,6 +25,8 @@ public:
     std::string textOtherThan(const std::string& other, QPoint place);
     /// Closes the window by its key. @return the program's exit status.
     int quit();
+    /// Ends the program from outside: by a signal or, if that is 0, by taking its display away.
+    void end(int signal);
     /// Runs a shell command on the program's display, and pauses. @return what it writes.
     std::string run(const std::string& command) const;
 

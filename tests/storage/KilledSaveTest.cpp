@@ -1,4 +1,5 @@
 #include "storage/DurableSave.h"
+#include "storage/RescueCopies.h"
 #include "tests/support/ToolRun.h"
 
 #include <algorithm>
@@ -173,6 +174,54 @@ TEST(KilledSaveTest, AKillBetweenAnyTwoSystemCallsLeavesTheOldFileOrTheNewOne)
         EXPECT_GT(found[0], 20);
         EXPECT_GT(found[1], 3);
     }
+}
+
+TEST(KilledSaveTest, AKillBetweenAnyTwoSystemCallsLeavesTheLastRescueOrTheNextOneWhole)
+{
+    const TemporaryFolder folder("KilledSaveTest");
+    const DataFolder data(folder / "Pelorin");
+    const auto save = [&](int number) {
+        const auto write = [number](FILE* file) {
+            return std::fputs(contentOfSave(number).c_str(), file) < 0 ? -1 : 0;
+        };
+        const auto left = RescueCopies::takeLeftBehind(data);
+        const auto copies = left.empty() ? std::make_shared<RescueCopies>(data) : left.front();
+        copies->write({{{"m", false, write, false}, {"p", false, write, false}}});
+        return 0;
+    };
+    int number = -1, found[2] = {}; // -1: there is none yet
+    for (const int first : {-1, 0}) {
+        for (int call = 0, status = 0;; ++call) {
+            SCOPED_TRACE("call " + std::to_string(call));
+            const pid_t child = startUntilCall(
+                call, [&] { return save(number + 1); }, &status);
+            if (WIFEXITED(status) && WEXITSTATUS(status) == kNotTraced)
+                GTEST_SKIP() << "processes cannot be traced here";
+            const bool isKilled = WIFSTOPPED(status);
+            if (isKilled)
+                killChild(child);
+            auto left = RescueCopies::takeLeftBehind(data);
+            ASSERT_LE(left.size(), 1U);
+            const int now = left.empty() ? -1 : numberOf(contentOf(left.front()->copyOf(RescueNote::kMarkets)));
+            const int other = left.empty() ? -1 : numberOf(contentOf(left.front()->copyOf(RescueNote::kPortfolio)));
+            ASSERT_TRUE(now == other && (now == number || now == number + 1)) << now << ' ' << other;
+            ++found[now - number];
+            number = now;
+            if (!isKilled)
+                break;
+            if (first < 0 && now >= 0) { // from the beginning again
+                left.front()->remove();
+                number = -1;
+            }
+        }
+    }
+    EXPECT_GT(found[0], 100);
+    EXPECT_GT(found[1], 10);
+    RescueCopies::takeLeftBehind(data).front()->remove();
+    const auto isFile = [](const fs::directory_entry& entry) { return entry.is_regular_file(); };
+    EXPECT_EQ(std::count_if(fs::recursive_directory_iterator(folder.path), fs::recursive_directory_iterator(), isFile),
+              0)
+        << "what killed ones have left is cleared away";
 }
 
 TEST(KilledSaveTest, AnErrorOfAnySystemCallFailsTheSaveWithAReasonOrDoesNoHarm)
