@@ -64,8 +64,7 @@ NoticeLine::NoticeLine(BRect frame) : BView(frame, "NoticeLine", B_FOLLOW_LEFT |
     const float height = frame.Height();
     AddChild(text_ = new NoticeText({kInset, 0, frame.Width() - kInset, height}));
     for (const char* name : {"btnNotice1", "btnNotice2"}) {
-        buttons_.push_back(new BButton({0, kEdgeWidth, 0, height - kEdgeWidth}, name, "", nullptr,
-                                       B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW));
+        buttons_.push_back(new BButton({0, kEdgeWidth, 0, height - kEdgeWidth}, name, "", nullptr, B_WILL_DRAW));
         buttons_.back()->SetToolTip(buttons_.size() == 1 ? "Alt+6" : "Alt+7");
         AddChild(buttons_.back());
     }

@@ -6,7 +6,8 @@
 /// where it is.
 class BButton : public BControl {
 public:
-    BButton(BRect frame, const char* name, const char* label, BMessage* message);
+    BButton(BRect frame, const char* name, const char* label, BMessage* message,
+            uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
 
     void SetLabel(const char* label) override;
 };

@@ -4,8 +4,8 @@
 
 #include <QPushButton>
 
-BButton::BButton(BRect frame, const char* name, const char* label, BMessage* message)
-    : BControl(frame, name, label, message, new QPushButton(labelText(label)))
+BButton::BButton(BRect frame, const char* name, const char* label, BMessage* message, uint32 flags)
+    : BControl(frame, name, label, message, new QPushButton(labelText(label)), flags)
 {
     auto* button = static_cast<QPushButton*>(widget());
     // Enter presses the button that has the keyboard, as the space bar does.
