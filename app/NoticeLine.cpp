@@ -180,7 +180,7 @@ void NoticeLine::update()
         text_->setText("");
         return;
     }
-    text_->ResizeTo(placeButtons(*notice) - kInset, Bounds().Height());
+    text_->ResizeTo(placeButtons(*notice) - 2 * kInset, Bounds().Height());
     text_->setText(notice->text);
     Show();
 }

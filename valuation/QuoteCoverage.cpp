@@ -20,8 +20,8 @@ void makeUnique(std::vector<const Series*>& series)
 
 /// The last day up to `day` on which all of `series` have a quote; undefined when there is none.
 ///
-/// A series without a quote of the day moves it back to its own last one. It is asked first from then on, so that two
-/// that never agree do not have all others asked between them.
+/// A series without a quote of the day moves it back to its own last one. It is asked first from then on, and the one
+/// that was so before comes next: two that never agree do not have all others asked between them.
 template <class Series>
 Date lastCommonDay(std::vector<const Series*> series, Date day)
 {
@@ -33,7 +33,8 @@ Date lastCommonDay(std::vector<const Series*> series, Date day)
         if (quoted.isUndefined())
             return {};
         day = quoted;
-        std::swap(series.front(), series[agreeing]);
+        const auto moved = series.begin() + static_cast<std::ptrdiff_t>(agreeing);
+        std::rotate(series.begin(), moved, moved + 1);
         agreeing = 0; // the one in front
     }
     return day;

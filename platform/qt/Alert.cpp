@@ -56,6 +56,7 @@ int32 BAlert::ask() const
 
     // From left to right as they were given, at the right.
     auto* answers = new QHBoxLayout;
+    rows->addLayout(answers); // before the buttons, which then are the dialog's when one of them gets the keyboard
     answers->addStretch(1);
     for (std::size_t i = 0; i < buttons_.size(); ++i) {
         auto* button = new QPushButton(labelText(buttons_[i].c_str()));
@@ -69,6 +70,5 @@ int32 BAlert::ask() const
         if (i == default_)
             button->setFocus();
     }
-    rows->addLayout(answers);
     return dialog.exec(); // Escape gives 0, as the first button does
 }

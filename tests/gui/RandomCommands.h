@@ -263,7 +263,7 @@ protected:
     void revalue()
     {
         put("WalletView", "txtDate", under(3) == 0 ? "" : "21/11/2024");
-        send({'WTDa', 'WTDa', 'WCCe', 'OCPr'});
+        send({'WTDa', 'WTDa', 'WCCe', 'OCPr', 'WBGd'});
     }
     bool areNamesUnique() const { return areNamesUnique_; }
 

@@ -116,7 +116,8 @@ protected:
         Wallet loaded;
         loaded.setCatalogue(catalogue);
         EXPECT_EQ(loaded.rd(BytesFile(saved), nullptr), 0);
-        const Totals expected(*refreshStates(loaded, kDay, false, nullptr), catalogue);
+        const Date day = window().getState()->getDate();
+        const Totals expected(*refreshStates(loaded, day, false, nullptr), catalogue);
         const Totals shown(*window().getState(), window().catalogue());
         EXPECT_EQ(shown.isKnown, expected.isKnown);
         // Transfers of a day and of several senders change places in a file, and then round in another order.

@@ -19,6 +19,7 @@
 #include <QTabBar>
 #include <QTemporaryDir>
 #include <QTest>
+#include <QThread>
 #include <QTimer>
 
 namespace {
@@ -220,7 +221,8 @@ void WindowTest::watchForAlert()
     auto timer = std::make_unique<QTimer>();
     QObject::connect(timer.get(), &QTimer::timeout, [this] {
         auto* alert = qobject_cast<QDialog*>(QApplication::activeModalWidget());
-        if (alert == nullptr || alert->objectName() != "Alert" || alert->property("isAnswered").toBool())
+        const bool isWaiting = QThread::currentThread()->loopLevel() > 0; // and not just being shown
+        if (alert == nullptr || alert->objectName() != "Alert" || !isWaiting || alert->property("isAnswered").toBool())
             return;
         alert->setProperty("isAnswered", true);
         alerts_.push_back(alert->findChild<QLabel*>("AlertText")->text().toStdString());
@@ -228,7 +230,7 @@ void WindowTest::watchForAlert()
         EXPECT_FALSE(alertAnswer_.empty()) << "nobody expected: " << alerts_.back();
         const std::string answer = std::exchange(alertAnswer_, "");
         if (answer == "Enter" || answer == "Escape")
-            QTest::keyClick(alert->focusWidget(), answer == "Enter" ? Qt::Key_Return : Qt::Key_Escape);
+            QTest::keyClick(alert, answer == "Enter" ? Qt::Key_Return : Qt::Key_Escape);
         for (auto* button : alert->findChildren<QAbstractButton*>()) {
             if (button->text().toStdString() == answer || (answer.empty() && button->text() == "Cancel"))
                 QTest::mouseClick(button, Qt::LeftButton);
