@@ -321,6 +321,7 @@ void DataFiles::save(const String& path)
             return window_.catalogue().wrt(file, today());
         return wallet != nullptr ? wallet->wrt(file, today()) : 0; // without a wallet the file is left empty
     };
+    window_.prepareSave(*kind);
     // Whatever fails, the path is that of the old file or of the new one, and never of a part.
     const auto result = DurableSave(folder_).save(path.getCharacterArray(), write);
     const char* text = "Currencies successfully saved...";

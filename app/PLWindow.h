@@ -104,7 +104,8 @@ public:
     void nameStep(const char* name) { command_ = name; }
     /// Takes note of what the command has changed until now.
     void noteStep() { noteStep(command_); }
-    /// What is here of that kind has just been saved.
+    /// To be told before and after a file of that kind is saved.
+    void prepareSave(FileKind kind);
     void noteSaved(FileKind kind);
 
     // Files.

@@ -77,8 +77,9 @@ Rescue::Pace& Rescue::pace()
 }
 
 Rescue::Rescue(PLWindow& window, DataFiles& files, const DataFolder& folder)
-    : window_(window), files_(files), folder_(folder), copied_(window.changeSerial()), savedWallet_(walletSum())
+    : window_(window), files_(files), folder_(folder), copied_(window.changeSerial())
 {
+    noteFile(FileKind::kWallet);
     [[maybe_unused]] static const int registered = std::atexit(endAll);
     living().push_back(this);
     const BMessage tick(kTick);
@@ -133,18 +134,25 @@ std::uint64_t Rescue::walletSum() const
     return checksumOf(bytesWritten([this](FILE* file) { window_.getWallet()->wrt(file, Date()); }));
 }
 
+std::string Rescue::pathOf(FileKind kind) const
+{
+    return std::string(files_.names().of(kind).path.bytes());
+}
+
 bool Rescue::isUnsaved(FileKind kind) const
 {
     if (window_.unsavedChanges(kind) > 0)
         return true;
     // A portfolio's file has names of the market data, and would not fit any more when one of them has changed.
-    return kind == FileKind::kWallet && window_.unsavedChanges(FileKind::kMarkets) > 0 && walletSum() != savedWallet_;
+    if (kind != FileKind::kWallet || window_.unsavedChanges(FileKind::kMarkets) == 0)
+        return false;
+    const auto saved = savedWallets_.find(pathOf(kind));
+    return saved == savedWallets_.end() || saved->second != walletSum();
 }
 
 RescueCopies::Source Rescue::source(FileKind kind) const
 {
-    const DataFiles::Remembered& file = files_.names().of(kind);
-    RescueCopies::Source source{std::string(file.path.bytes()), file.isAsked(), nullptr, false};
+    RescueCopies::Source source{pathOf(kind), files_.names().of(kind).isAsked(), nullptr, false};
     if (!isUnsaved(kind))
         return source;
     if (kind == FileKind::kWallet)
@@ -224,10 +232,16 @@ void Rescue::giveBackWhatWasUndone()
     forgetOwn();
 }
 
+void Rescue::prepareSave(FileKind kind)
+{
+    if (isUnsaved(kind == FileKind::kMarkets ? FileKind::kWallet : FileKind::kMarkets))
+        update();
+}
+
 void Rescue::noteFile(FileKind kind)
 {
     if (kind == FileKind::kWallet)
-        savedWallet_ = walletSum();
+        savedWallets_[pathOf(kind)] = walletSum();
 }
 
 void Rescue::noteSaved(FileKind kind)

@@ -10,6 +10,7 @@
 #include <array>
 #include <chrono>
 #include <cstdint>
+#include <map>
 #include <memory>
 #include <string>
 
@@ -41,6 +42,9 @@ public:
     BLooper* Looper() const override;
     void MessageReceived(BMessage* message) override;
 
+    /// The file of that kind is about to be written. What is not saved of the other one gets a copy that fits it, since
+    /// the program may be killed before `noteSaved`.
+    void prepareSave(FileKind kind);
     /// What is here of that kind is what its file has.
     void noteFile(FileKind kind);
     /// And that is so because it was just saved: no copy of it is needed.
@@ -57,6 +61,8 @@ private:
     /// @param problem why they were not restored when that was tried.
     void offer(const Copies& copies, const std::string& problem = "");
     void restore(const Copies& copies);
+    /// Of the remembered file; empty while it has no name.
+    std::string pathOf(FileKind kind) const;
     bool isUnsaved(FileKind kind) const;
     /// Of what the portfolio's file would hold.
     std::uint64_t walletSum() const;
@@ -77,7 +83,7 @@ private:
     Copies own_;                                        // null while there is nothing to copy
     std::uint64_t copied_ = 0;                          // the change that they are of
     std::weak_ptr<const CatalogueImage> market_;        // the market data that they have
-    std::uint64_t savedWallet_ = 0;                     // the `walletSum` of the portfolio's file
+    std::map<std::string, std::uint64_t> savedWallets_; // the `walletSum` of each file, by path
     std::uint64_t restoring_ = 0;                       // the step that has restored them; 0 when they began here
     std::array<bool, RescueNote::kKinds> isOnlyHere_{}; // they were restored, and never saved since
     std::string failure_;                               // that was told last

@@ -64,6 +64,11 @@ void PLWindow::noteFile(FileKind kind)
     rescue_->noteFile(kind);
 }
 
+void PLWindow::prepareSave(FileKind kind)
+{
+    rescue_->prepareSave(kind);
+}
+
 void PLWindow::noteSaved(FileKind kind)
 {
     noteFile(kind);
