@@ -68,10 +68,6 @@ void History::note(Moment now, const DataFiles::Names& names, const std::string&
     entries_.push_back(std::move(entry));
     ++now_;
     entries_[now_].step = ++serial_;
-    // A file that could not be loaded: changes are counted from here.
-    for (const FileKind kind : kKinds)
-        if (!marks_.contains({kind, pathOf(kind)}))
-            noteFile(kind);
     forgetOldest();
 }
 
@@ -137,14 +133,21 @@ void History::noteFile(FileKind kind)
 
 unsigned History::unsavedChanges(FileKind kind) const
 {
+    const long here = entries_[now_].steps[indexOf(kind)];
     const auto found = marks_.find({kind, pathOf(kind)});
-    if (found == marks_.end())
-        return 1; // what was restored, and its file was not looked at
+    if (found == marks_.end()) {
+        // What was restored, or could not be loaded, is not what the file has. The step that led to it counts, and
+        // those behind it.
+        std::size_t i = now_;
+        while (i > 0 && !entries_[i].files)
+            --i;
+        return static_cast<unsigned>(std::max(1L, here - entries_[i].steps[indexOf(kind)] + 1));
+    }
     const Mark& mark = found->second;
     Moment saved;
     saved.catalogue = mark.catalogue;
     saved.wallet = mark.wallet;
     if (isSame(kind, saved, now()))
         return 0;
-    return static_cast<unsigned>(std::max(1L, std::labs(entries_[now_].steps[indexOf(kind)] - mark.step)));
+    return static_cast<unsigned>(std::max(1L, std::labs(here - mark.step)));
 }
