@@ -22,7 +22,7 @@ using namespace look;
 // Where the groups of the page begin and end.
 constexpr float kRight = kPageWidth - kMargin;
 constexpr float kTopEnd = kMargin + kButtonHeight;
-constexpr float kFileEnd = kTopEnd + 18;
+constexpr float kFileEnd = kTopEnd + 22;
 constexpr float kTotalsTop = kFileEnd;
 constexpr float kTotalsEnd = kTotalsTop + 54;
 constexpr float kAccountsTop = kTotalsEnd + kMargin;
@@ -67,7 +67,7 @@ void WalletView::makeTop()
                 {"btnSavePortoFolio", "Save to File", 'WBSv'},
                 {"btnReinitPortoFolio", "Reinit", 'WBRe'},
                 {"btnUpdateAllQuotes", "Update Quotes", 'WBUp'}});
-    addOpenFile(this, {kMargin, kTopEnd, kRight, kFileEnd});
+    addOpenFile(this, {kMargin, kTopEnd, kRight, kTopEnd + 18});
     explain(*this, {{"txtDate", "The day to value at.  Up and Down: a day on and back; Page Up and Page Down: a month"},
                     {"cbxComputeEvolution", "Draws the value of every day since the first operation"},
                     {"btnLoadPortoFolio", "Loads the portfolio from a file.  Ctrl+O"},

@@ -147,6 +147,29 @@ void showMistakes(TourHand& hand)
 
 } // namespace
 
+void tourSafety(TourHand& hand)
+{
+    hand.turnTo(kPortoFolio);
+    hand.press("btnLoadPortoFolio"); // without its market file
+    hand.picture("guide-not-loaded", {0, 0, 800, 800});
+    hand.turnTo(kCompany);
+    hand.press("btnLoadMarket");
+    hand.turnTo(kPortoFolio);
+    hand.press("btnLoadPortoFolio");
+    hand.press("btnReinitPortoFolio");
+    hand.picture("guide-reinit", {0, 0, 800, 140});
+}
+
+void leaveUnsaved(TourHand& hand)
+{
+    addCurrency(hand, "Euro", "EUR", {});
+}
+
+void tourRescue(TourHand& hand)
+{
+    hand.picture("guide-rescue", {0, 740, 800, 800});
+}
+
 void tourGuide(TourHand& hand)
 {
     makeFirstPortfolio(hand);

@@ -58,15 +58,17 @@ void tourPages(TourHand& hand)
 }
 
 /// Lets `tour` have a new window for itself.
-void inNewWindow(const DataFolder& folder, const std::string& pictures, const std::function<void(TourHand&)>& tour)
+/// @return the window, which is the application's.
+PLWindow* inNewWindow(const DataFolder& folder, const std::string& pictures, const std::function<void(TourHand&)>& tour)
 {
     auto* window = new PLWindow({50, 50, 850, 850}, folder); // the application closes it
     window->Show();
     handle_pending_messages();
     TourHand hand(*window, pictures);
     tour(hand);
-    // It stays the application's. The next tour has a window of its own.
+    // The next tour has a window of its own.
     window->Hide();
+    return window;
 }
 
 } // namespace
@@ -86,6 +88,9 @@ int main(int argc, char** argv)
     try {
         inNewWindow(folder, argv[2], tourGuide);
         inNewWindow(folder, argv[2], tourPages);
+        inNewWindow(folder, argv[2], tourSafety);
+        inNewWindow(folder, argv[2], leaveUnsaved)->Quit(); // which leaves a copy
+        inNewWindow(folder, argv[2], tourRescue);
     } catch (const std::runtime_error& error) {
         std::cerr << "pelorin-tour: " << error.what() << '\n';
         return 1;
