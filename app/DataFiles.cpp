@@ -198,6 +198,15 @@ void DataFiles::forgetWallet()
     tell(FileKind::kWallet, "");
 }
 
+void DataFiles::setNames(const Names& names)
+{
+    const Names former = std::exchange(names_, names);
+    // What the notices say is about the files of before.
+    for (const FileKind kind : {FileKind::kMarkets, FileKind::kWallet})
+        if (former.of(kind).failure != names.of(kind).failure)
+            tell(kind, names.of(kind).failure);
+}
+
 bool DataFiles::isWalletEmpty() const
 {
     const Wallet* wallet = window_.getWallet();
@@ -218,7 +227,7 @@ std::string DataFiles::doubtAbout(FileKind kind) const
         if (saved == nullptr || !isEmptyPortfolioFile(saved->stream()))
             return "the portfolio is empty since a market file was loaded, and " + name + " is not";
     }
-    if (file.stamp && file.stamp != stamp)
+    if (file.stamp && file.stamp != stamp && written_[static_cast<std::size_t>(kind)] != stamp)
         return name + " was changed by another program or window since it was loaded or saved here";
     return {};
 }
@@ -240,6 +249,8 @@ DataFiles::Restoring DataFiles::restore(const Restored& markets, const Restored&
     window_.replaceWallet();
     window_.RemoveAllCurrencies();
     names_ = {markets.name, wallet.name};
+    tell(FileKind::kMarkets, "");
+    tell(FileKind::kWallet, "");
     Restoring done{true, ""};
     if (marketFile != nullptr && window_.catalogue().rd(marketFile->stream()) != 0) {
         names_.markets.failure = markets.source + " is damaged";
@@ -335,5 +346,6 @@ void DataFiles::save(const String& path)
     if (result.outcome != DurableSave::Outcome::kSaved || names_.of(*kind).path != path)
         return;
     names_.of(*kind) = {path, result.stamp};
+    written_[static_cast<std::size_t>(*kind)] = result.stamp;
     window_.noteSaved(*kind);
 }

@@ -6,6 +6,7 @@
 #include "storage/DataFolder.h"
 #include "storage/FileStamp.h"
 
+#include <array>
 #include <cstdio>
 #include <optional>
 #include <string>
@@ -78,7 +79,7 @@ public:
 
     const Names& names() const { return names_; }
     /// For an undo of a load: from here on these are the files that are saved to.
-    void setNames(const Names& names) { names_ = names; }
+    void setNames(const Names& names);
 
 private:
     /// That of the tab in front; the operation and the parameter page have none.
@@ -99,6 +100,8 @@ private:
     const BTabView& tabs_;
     DataFolder folder_;
     Names names_;
+    std::array<std::optional<FileStamp>, 2>
+        written_; // by this window last, of each kind: an undo may remember an older one
     BFilePanel openPanel_;
     BFilePanel savePanel_;
 };

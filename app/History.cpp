@@ -128,7 +128,10 @@ std::string History::pathOf(FileKind kind) const
 
 void History::noteFile(FileKind kind)
 {
-    marks_[{kind, pathOf(kind)}] = {entries_[now_].steps[indexOf(kind)], now().catalogue, now().wallet};
+    // Only what is of that kind: a mark stays, and holds it.
+    const bool isMarkets = kind == FileKind::kMarkets;
+    marks_[{kind, pathOf(kind)}] = {entries_[now_].steps[indexOf(kind)], isMarkets ? now().catalogue : nullptr,
+                                    isMarkets ? nullptr : now().wallet};
 }
 
 unsigned History::unsavedChanges(FileKind kind) const

@@ -64,8 +64,6 @@ public:
     std::uint64_t lastStep() const { return entries_[now_].step; }
     /// Whether what is there now came about with that step, which may be forgotten by now: it was not taken back.
     bool isDone(std::uint64_t step) const;
-    /// Bytes that the steps hold besides what is there now.
-    std::size_t bytes() const { return bytes_; }
 
 private:
     using Counts = std::array<long, 2>; // by kind
@@ -78,7 +76,7 @@ private:
         std::uint64_t step = 0;                                             // its number
         std::size_t bytes = 0;                                              // in the moment before, and not in this one
     };
-    /// What a file has.
+    /// What a file has; what it is not about is null.
     struct Mark {
         long step;
         std::shared_ptr<const CatalogueImage> catalogue;
@@ -95,6 +93,6 @@ private:
     std::size_t now_ = 0;
     DataFiles::Names names_;
     std::map<std::pair<FileKind, std::string>, Mark> marks_; // by path, empty for no file yet
-    std::size_t bytes_ = 0;
+    std::size_t bytes_ = 0;                                  // that the steps hold besides what is there now
     std::uint64_t serial_ = 0;
 };

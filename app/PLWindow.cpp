@@ -166,7 +166,7 @@ void PLWindow::makePages()
         tab->SetToolTip(("Alt+" + std::to_string(tabView_->CountTabs() + 1)).c_str());
         tabView_->AddTab(page, tab);
     };
-    // `DataFiles` goes by this order.
+    // `DataFiles` and `showHistory` go by this order.
     add(companyView_ = new CompanyView(kPageFrame, "CompanyView", this), "Company");
     add(currencyView_ = new CurrencyView(kPageFrame, "CurrencyView", this), "Currency");
     add(walletView_ = new WalletView(kPageFrame, "WalletView", this), "PortoFolio");

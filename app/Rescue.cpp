@@ -144,10 +144,16 @@ bool Rescue::isUnsaved(FileKind kind) const
     if (window_.unsavedChanges(kind) > 0)
         return true;
     // A portfolio's file has names of the market data, and would not fit any more when one of them has changed.
-    if (kind != FileKind::kWallet || window_.unsavedChanges(FileKind::kMarkets) == 0)
+    if (kind != FileKind::kWallet || (window_.unsavedChanges(FileKind::kMarkets) == 0 && !isWalletBehind_))
         return false;
     const auto saved = savedWallets_.find(pathOf(kind));
     return saved == savedWallets_.end() || saved->second != walletSum();
+}
+
+bool Rescue::canWriteWallet() const
+{
+    return std::ranges::none_of(window_.getWallet()->accounts(),
+                                [](const Account* account) { return account->getCurrencyName().isUndefined(); });
 }
 
 RescueCopies::Source Rescue::source(FileKind kind) const
@@ -155,7 +161,9 @@ RescueCopies::Source Rescue::source(FileKind kind) const
     RescueCopies::Source source{pathOf(kind), files_.names().of(kind).isAsked(), nullptr, false};
     if (!isUnsaved(kind))
         return source;
-    if (kind == FileKind::kWallet)
+    if (kind == FileKind::kWallet && !canWriteWallet())
+        source.isKept = own_ != nullptr && own_->note().parts[RescueNote::kPortfolio].isCopied();
+    else if (kind == FileKind::kWallet)
         source.write = [this](FILE* out) { return window_.getWallet()->wrt(out, today()); };
     else if (own_ != nullptr && own_->note().parts[RescueNote::kMarkets].isCopied() &&
              market_.lock() == window_.history().now().catalogue)
@@ -201,6 +209,11 @@ void Rescue::update()
         copied_ = now;
         market_ = window_.history().now().catalogue;
     }
+    // That must not cost the market data their copy.
+    const bool isWalletLeftOut = isUnsaved(FileKind::kWallet) && !canWriteWallet();
+    if (isWalletLeftOut && !isWalletLeftOut_)
+        tell({kFailed, "There is no copy of the portfolio: an account has no currency", {}});
+    isWalletLeftOut_ = isWalletLeftOut;
     const auto pause = std::max<Clock::duration>(pace().interval, pace().share * (Clock::now() - start));
     if (runner_ != nullptr)
         runner_->SetInterval(std::chrono::duration_cast<std::chrono::microseconds>(pause).count());
@@ -234,14 +247,19 @@ void Rescue::giveBackWhatWasUndone()
 
 void Rescue::prepareSave(FileKind kind)
 {
-    if (isUnsaved(kind == FileKind::kMarkets ? FileKind::kWallet : FileKind::kMarkets))
+    const bool isOtherUnsaved = isUnsaved(kind == FileKind::kMarkets ? FileKind::kWallet : FileKind::kMarkets);
+    if (isOtherUnsaved)
         update();
+    if (kind == FileKind::kMarkets)
+        isWalletBehind_ = isOtherUnsaved;
 }
 
 void Rescue::noteFile(FileKind kind)
 {
-    if (kind == FileKind::kWallet)
-        savedWallets_[pathOf(kind)] = walletSum();
+    if (kind != FileKind::kWallet)
+        return;
+    savedWallets_[pathOf(kind)] = walletSum();
+    isWalletBehind_ = false;
 }
 
 void Rescue::noteSaved(FileKind kind)
@@ -259,7 +277,7 @@ void Rescue::restore(const Copies& copies)
 {
     // What is here and not saved is left behind in turn, with the copies that were made until now.
     update();
-    forgetOwn();
+    const std::uint64_t before = window_.changeSerial();
     const RescueNote& note = copies->note();
     const auto file = [&](FileKind kind) {
         const RescueNote::Part& part = note.parts[noteKind(kind)];
@@ -272,11 +290,13 @@ void Rescue::restore(const Copies& copies)
     };
     window_.nameStep("Restore");
     const DataFiles::Restoring done = files_.restore(file(FileKind::kMarkets), file(FileKind::kWallet));
+    window_.noteStep();
+    if (window_.changeSerial() != before)
+        forgetOwn(); // what was here is gone
     if (!done.isComplete)
         return offer(copies, done.problem);
     // From here on the copies are this window's own: the next ones take their place.
     own_ = copies;
-    window_.noteStep();
     copied_ = window_.changeSerial();
     restoring_ = window_.history().lastStep();
     market_ = window_.history().now().catalogue;

@@ -64,6 +64,8 @@ private:
     /// Of the remembered file; empty while it has no name.
     std::string pathOf(FileKind kind) const;
     bool isUnsaved(FileKind kind) const;
+    /// Not while an account has no currency.
+    bool canWriteWallet() const;
     /// Of what the portfolio's file would hold.
     std::uint64_t walletSum() const;
     RescueCopies::Source source(FileKind kind) const;
@@ -86,5 +88,8 @@ private:
     std::map<std::string, std::uint64_t> savedWallets_; // the `walletSum` of each file, by path
     std::uint64_t restoring_ = 0;                       // the step that has restored them; 0 when they began here
     std::array<bool, RescueNote::kKinds> isOnlyHere_{}; // they were restored, and never saved since
-    std::string failure_;                               // that was told last
+    // Names that the portfolio's file has were changed in the market data, and these were saved.
+    bool isWalletBehind_ = false;
+    bool isWalletLeftOut_ = false; // it cannot be written
+    std::string failure_;          // that was told last
 };

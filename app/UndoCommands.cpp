@@ -9,6 +9,7 @@
 #include "views/WalletView.h"
 
 #include <algorithm>
+#include <array>
 
 void PLWindow::makeUndoButtons()
 {
@@ -138,10 +139,11 @@ void PLWindow::showHistory()
          history_->canUndo() ? "Undo: " + history_->undoLabel() + "  Ctrl+Z" : "Nothing to undo");
     show(*redoButton_, history_->canRedo(),
          history_->canRedo() ? "Redo: " + history_->redoLabel() + "  Ctrl+Shift+Z" : "Nothing to redo");
+    const std::array unsaved{unsavedChanges(FileKind::kMarkets), unsavedChanges(FileKind::kWallet)};
     for (int32 i = 0; i < tabView_->CountTabs(); ++i) {
         // The first two pages are about the market data; see `makePages`.
         const FileKind kind = i < 2 ? FileKind::kMarkets : FileKind::kWallet;
         static_cast<PageView*>(tabView_->TabAt(i)->View())
-            ->SetOpenFile(files_->names().of(kind).path, unsavedChanges(kind));
+            ->SetOpenFile(files_->names().of(kind).path, unsaved[static_cast<std::size_t>(kind)]);
     }
 }

@@ -8,6 +8,7 @@
 /// What a list shows, in numbers that outlive its objects: for an undo, which makes new ones.
 struct ListPlaces {
     std::vector<std::size_t> rows; // of each row the place of its object among those of the model
-    std::vector<int32> selected;   // rows
+    std::vector<int32> selected;   // rows, ascending
+    int32 count = 0;               // of all rows
     int32 top = 0;                 // the first row in view
 };

@@ -199,6 +199,7 @@ public:
         for (int32 i = 0; i < CountSelected(); ++i)
             places.selected.push_back(CurrentSelection(i));
         places.top = TopRow();
+        places.count = CountItems();
         return places;
     }
     /// The same with the rows; all of them stand for one of `objects`.
@@ -209,15 +210,24 @@ public:
             placeOf.emplace(object, placeOf.size());
         ListPlaces places = selection();
         for (int32 i = 0; i < CountItems(); ++i)
-            places.rows.push_back(placeOf.at(objectAt(i)));
+            if (const auto place = placeOf.find(objectAt(i)); place != placeOf.end())
+                places.rows.push_back(place->second);
         return places;
     }
-    /// Brings back selection and view in rows that are as they were then. Sends no message.
+    /// Brings back selection and view, where the rows are as many as then: those that a valuation makes up may be
+    /// others. Sends no message.
     void restoreSelection(const ListPlaces& places)
     {
+        if (CountItems() != places.count)
+            return;
         SetQuiet(true);
-        for (const int32 row : places.selected)
-            Select(row, true);
+        for (std::size_t i = 0; i < places.selected.size();) {
+            const int32 first = places.selected[i]; // of a run, which is selected at once
+            int32 last = first;
+            while (++i < places.selected.size() && places.selected[i] == last + 1)
+                ++last;
+            Select(first, last, true);
+        }
         SetTopRow(places.top);
         SetQuiet(false);
     }

@@ -19,6 +19,7 @@
 namespace {
 
 namespace fs = std::filesystem;
+using testing::EndsWith;
 using testing::HasSubstr;
 using testing::MatchesRegex;
 
@@ -169,6 +170,25 @@ TEST_F(RescueTest, OnlyWhatChangedIsCopiedAndTheRestComesFromItsFile)
     EXPECT_THAT(notice(), HasSubstr("market data Sample, portfolio Sample")) << "else it would not fit any more";
     restoreUnsaved();
     EXPECT_EQ(model() == renamed, true);
+    // Saved market data leave the portfolio's file behind, with the old name.
+    show(kCompanyPage);
+    click("btnSaveMarket");
+    restart();
+    EXPECT_THAT(notice(), HasSubstr(": portfolio Sample"));
+    restoreUnsaved();
+    EXPECT_EQ(model() == renamed, true);
+}
+
+TEST_F(RescueTest, AnAccountWithoutCurrencyCostsOnlyThePortfolioItsCopy)
+{
+    makeSample();
+    loadSample();
+    show(kCurrencyPage);
+    select("lstCurrencies", 1);
+    answerNextAlert("Continue");
+    click("btnRemoveCurrency");
+    restart();
+    EXPECT_THAT(notice(), EndsWith(": market data Sample"));
 }
 
 TEST_F(RescueTest, CopiesComeAtIntervalsAndOnlyOfChanges)
