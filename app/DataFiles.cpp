@@ -264,6 +264,8 @@ DataFiles::Restoring DataFiles::restore(const Restored& markets, const Restored&
         done = {done.isComplete && !wallet.isCopy,
                 wallet.source + (isThere ? " does not fit the market data" : " cannot be opened")};
     }
+    if (wallet.isCopy)
+        names_.wallet.isEmptied = isWalletEmpty();
     window_.showWallet();
     // What was read from its own file is as that has it.
     for (const auto& [kind, part] : {std::pair(FileKind::kMarkets, &markets), std::pair(FileKind::kWallet, &wallet)})
@@ -347,5 +349,5 @@ void DataFiles::save(const String& path)
         return;
     names_.of(*kind) = {path, result.stamp};
     written_[static_cast<std::size_t>(*kind)] = result.stamp;
-    window_.noteSaved(*kind);
+    window_.noteFile(*kind, true);
 }

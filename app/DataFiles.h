@@ -77,6 +77,7 @@ public:
     /// The next save of the portfolio asks for a name.
     void forgetWallet();
 
+    bool isWalletEmpty() const;
     const Names& names() const { return names_; }
     /// For an undo of a load: from here on these are the files that are saved to.
     void setNames(const Names& names);
@@ -94,7 +95,6 @@ private:
     void tell(FileKind kind, const std::string& text);
     /// Why the file that is remembered must not be written over without asking; empty when it may be.
     std::string doubtAbout(FileKind kind) const;
-    bool isWalletEmpty() const;
 
     PLWindow& window_;
     const BTabView& tabs_;

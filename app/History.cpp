@@ -25,9 +25,9 @@ std::size_t bytesBeside(const Moment& moment, const Moment& next)
 
 History::History(Moment first, DataFiles::Names names) : names_(std::move(names))
 {
-    entries_.push_back({std::move(first), {}, {}, {}, 0, 0});
+    entries_.push_back({std::move(first), {}});
     for (const FileKind kind : kKinds)
-        noteFile(kind);
+        noteFile(kind, false);
 }
 
 std::string History::fileStepLabel(const std::string& command, const DataFiles::Names& names) const
@@ -37,17 +37,18 @@ std::string History::fileStepLabel(const std::string& command, const DataFiles::
     return name.empty() ? command : command + ' ' + name;
 }
 
-bool History::isSame(FileKind kind, const Moment& a, const Moment& b) const
+bool History::isSame(const Mark& mark, FileKind kind, const Moment& moment)
 {
     if (kind == FileKind::kMarkets)
-        return a.catalogue == b.catalogue;
-    return a.wallet == b.wallet || a.wallet->hasWorkOf(*b.wallet);
+        return mark.catalogue == moment.catalogue;
+    return mark.wallet == moment.wallet || mark.wallet->hasFileOf(*moment.wallet);
 }
 
 void History::note(Moment now, const DataFiles::Names& names, const std::string& command)
 {
-    const bool isMarketStep = !isSame(FileKind::kMarkets, entries_[now_].moment, now);
-    const bool isWalletStep = !isSame(FileKind::kWallet, entries_[now_].moment, now);
+    const Moment& before = entries_[now_].moment;
+    const bool isMarketStep = before.catalogue != now.catalogue;
+    const bool isWalletStep = before.wallet != now.wallet && !before.wallet->hasWorkOf(*now.wallet);
     const bool isFileStep = !command.empty() && names != names_; // a load, or a new portfolio
     if (!isMarketStep && !isWalletStep && !isFileStep) {
         entries_[now_].moment = std::move(now);
@@ -56,13 +57,16 @@ void History::note(Moment now, const DataFiles::Names& names, const std::string&
     }
     forgetUndone();
     const Entry& former = entries_.back();
-    Entry entry{std::move(now), {}, {}, former.steps, 0, 0};
+    Entry entry{std::move(now), {}};
     entry.label = isFileStep ? fileStepLabel(command, names) : stepLabel(command, former.moment, entry.moment);
+    entry.steps = former.steps;
     entry.steps[indexOf(FileKind::kMarkets)] += isMarketStep ? 1 : 0;
-    entry.steps[indexOf(FileKind::kWallet)] += isWalletStep ? 1 : 0;
+    entry.steps[indexOf(FileKind::kWallet)] += former.moment.wallet->hasFileOf(*entry.moment.wallet) ? 0 : 1;
     entry.bytes = bytesBeside(former.moment, entry.moment);
-    if (isFileStep)
-        entry.files = {names_, names};
+    entry.before = names_;
+    entry.after = names;
+    for (const FileKind kind : kKinds)
+        entry.hasOtherFile[indexOf(kind)] = isFileStep && names.of(kind) != names_.of(kind);
     names_ = names;
     bytes_ += entry.bytes;
     entries_.push_back(std::move(entry));
@@ -76,10 +80,11 @@ void History::forgetUndone()
 {
     // What a file has may be among it. From there the way leads back to this moment and on from here; counted from the
     // mirrored place, it is as long.
-    for (auto& [file, mark] : marks_) {
+    for (auto& [file, marks] : marks_) {
         const long here = entries_[now_].steps[indexOf(file.first)];
-        if (mark.step > here)
-            mark.step = 2 * here - mark.step;
+        for (Mark& mark : marks)
+            if (mark.step > here)
+                mark.step = 2 * here - mark.step;
     }
     for (std::size_t i = now_ + 1; i < entries_.size(); ++i)
         bytes_ -= entries_[i].bytes;
@@ -97,22 +102,28 @@ void History::forgetOldest()
     }
 }
 
-std::optional<DataFiles::Names> History::undo()
+void History::turn(const Entry& step, DataFiles::Names& from, const DataFiles::Names& to)
 {
-    const Entry& step = entries_[now_--];
+    for (const FileKind kind : kKinds)
+        if (step.hasOtherFile[indexOf(kind)]) {
+            from.of(kind) = names_.of(kind);
+            names_.of(kind) = to.of(kind);
+        }
     ++serial_;
-    if (!step.files)
-        return std::nullopt;
-    return names_ = step.files->first;
 }
 
-std::optional<DataFiles::Names> History::redo()
+const DataFiles::Names& History::undo()
 {
-    const Entry& step = entries_[++now_];
-    ++serial_;
-    if (!step.files)
-        return std::nullopt;
-    return names_ = step.files->second;
+    Entry& step = entries_[now_--];
+    turn(step, step.after, step.before);
+    return names_;
+}
+
+const DataFiles::Names& History::redo()
+{
+    Entry& step = entries_[++now_];
+    turn(step, step.before, step.after);
+    return names_;
 }
 
 bool History::isDone(std::uint64_t step) const
@@ -126,12 +137,21 @@ std::string History::pathOf(FileKind kind) const
     return std::string(names_.of(kind).path.bytes());
 }
 
-void History::noteFile(FileKind kind)
+void History::noteFile(FileKind kind, bool isSaved)
 {
     // Only what is of that kind: a mark stays, and holds it.
     const bool isMarkets = kind == FileKind::kMarkets;
-    marks_[{kind, pathOf(kind)}] = {entries_[now_].steps[indexOf(kind)], isMarkets ? now().catalogue : nullptr,
-                                    isMarkets ? nullptr : now().wallet};
+    Mark mark{entries_[now_].steps[indexOf(kind)], isMarkets ? now().catalogue : nullptr,
+              isMarkets ? nullptr : now().wallet};
+    std::vector<Mark>& marks = marks_[{kind, pathOf(kind)}];
+    // A save leaves nothing of what the file had. After a load an undo may lead back to what the former one gave, as
+    // long as that is remembered.
+    std::erase_if(marks, [&](const Mark& former) {
+        return isSaved || std::ranges::none_of(entries_, [&](const Entry& entry) {
+                   return isMarkets ? entry.moment.catalogue == former.catalogue : entry.moment.wallet == former.wallet;
+               });
+    });
+    marks.push_back(std::move(mark));
 }
 
 unsigned History::unsavedChanges(FileKind kind) const
@@ -142,15 +162,12 @@ unsigned History::unsavedChanges(FileKind kind) const
         // What was restored, or could not be loaded, is not what the file has. The step that led to it counts, and
         // those behind it.
         std::size_t i = now_;
-        while (i > 0 && !entries_[i].files)
+        while (i > 0 && !entries_[i].hasOtherFile[indexOf(kind)])
             --i;
         return static_cast<unsigned>(std::max(1L, here - entries_[i].steps[indexOf(kind)] + 1));
     }
-    const Mark& mark = found->second;
-    Moment saved;
-    saved.catalogue = mark.catalogue;
-    saved.wallet = mark.wallet;
-    if (isSame(kind, saved, now()))
+    const std::vector<Mark>& marks = found->second;
+    if (std::ranges::any_of(marks, [&](const Mark& mark) { return isSame(mark, kind, now()); }))
         return 0;
-    return static_cast<unsigned>(std::max(1L, std::labs(here - mark.step)));
+    return static_cast<unsigned>(std::max(1L, std::labs(here - marks.back().step)));
 }

@@ -15,6 +15,7 @@
 #include <optional>
 #include <string>
 #include <utility>
+#include <vector>
 
 /// The model and what the lists show of it, at one moment.
 struct Moment {
@@ -34,7 +35,7 @@ struct Moment {
 /// were taken back.
 class History {
 public:
-    /// How much is remembered, whichever is more; the last step in any case.
+    /// How much is remembered, whichever is less; the last step in any case.
     static constexpr std::size_t kMostSteps = 1000;
     static constexpr std::size_t kMostBytes = std::size_t{256} << 20;
 
@@ -49,13 +50,13 @@ public:
     const std::string& undoLabel() const { return entries_[now_].label; }
     const std::string& redoLabel() const { return entries_[now_ + 1].label; }
     /// Go back or on by one step. The moment to be restored is `now()` then.
-    /// @return the files to be remembered from now on, when the step changed them.
-    std::optional<DataFiles::Names> undo();
-    std::optional<DataFiles::Names> redo();
+    /// @return the files to be remembered from now on.
+    const DataFiles::Names& undo();
+    const DataFiles::Names& redo();
     const Moment& now() const { return entries_[now_].moment; }
 
-    /// What is there now is what the remembered file of that kind has.
-    void noteFile(FileKind kind);
+    /// What is there now is what the remembered file of that kind has: it was loaded, or saved.
+    void noteFile(FileKind kind, bool isSaved);
     /// The steps between what the remembered file has and what is there; 0 when they are the same.
     unsigned unsavedChanges(FileKind kind) const;
     /// Another number after every step, undo and redo.
@@ -71,10 +72,13 @@ private:
     struct Entry {
         Moment moment;
         std::string label;
-        std::optional<std::pair<DataFiles::Names, DataFiles::Names>> files; // before and after, when they changed
-        Counts steps{};                                                     // that changed what is of that kind
-        std::uint64_t step = 0;                                             // its number
-        std::size_t bytes = 0;                                              // in the moment before, and not in this one
+        // Of the kinds whose files the step changed: those that come back with an undo, and with a redo.
+        std::array<bool, 2> hasOtherFile{};
+        DataFiles::Names before = {};
+        DataFiles::Names after = {};
+        Counts steps{};         // that changed what is of that kind
+        std::uint64_t step = 0; // its number
+        std::size_t bytes = 0;  // in the moment before, and not in this one
     };
     /// What a file has; what it is not about is null.
     struct Mark {
@@ -83,8 +87,11 @@ private:
         std::shared_ptr<const WalletImage> wallet;
     };
 
+    static bool isSame(const Mark& mark, FileKind kind, const Moment& moment);
     std::string fileStepLabel(const std::string& command, const DataFiles::Names& names) const;
-    bool isSame(FileKind kind, const Moment& a, const Moment& b) const;
+    /// Remembers the files `to` of the kinds that the step changed, and keeps the present ones in `from` for the way
+    /// back. Those of the other kind stay: a save may have named them since.
+    void turn(const Entry& step, DataFiles::Names& from, const DataFiles::Names& to);
     void forgetUndone();
     void forgetOldest();
     std::string pathOf(FileKind kind) const;
@@ -92,7 +99,8 @@ private:
     std::deque<Entry> entries_;
     std::size_t now_ = 0;
     DataFiles::Names names_;
-    std::map<std::pair<FileKind, std::string>, Mark> marks_; // by path, empty for no file yet
-    std::size_t bytes_ = 0;                                  // that the steps hold besides what is there now
+    // By path, empty for no file yet: what each load of it gave, or what was saved to it.
+    std::map<std::pair<FileKind, std::string>, std::vector<Mark>> marks_;
+    std::size_t bytes_ = 0; // that the steps hold besides what is there now
     std::uint64_t serial_ = 0;
 };

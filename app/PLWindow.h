@@ -93,8 +93,8 @@ public:
     /// Take the last step back, and do it again: a command with all that it has changed.
     void Undo();
     void Redo();
-    /// What is here of that kind is what its file has: it was just loaded, saved or begun.
-    void noteFile(FileKind kind);
+    /// What is here of that kind is what its file has: it was just loaded, begun or saved.
+    void noteFile(FileKind kind, bool isSaved = false);
     /// Steps between what the file of that kind has and what is here.
     unsigned unsavedChanges(FileKind kind) const { return history_->unsavedChanges(kind); }
     /// Another number after every change of the model by a command.
@@ -104,9 +104,8 @@ public:
     void nameStep(const char* name) { command_ = name; }
     /// Takes note of what the command has changed until now.
     void noteStep() { noteStep(command_); }
-    /// To be told before and after a file of that kind is saved.
+    /// To be told before a file of that kind is saved.
     void prepareSave(FileKind kind);
-    void noteSaved(FileKind kind);
 
     // Files.
     void LoadSomething() { files_->askForLoad(); }
@@ -189,7 +188,6 @@ private:
     void noteStep(const std::string& command);
     Moment moment() const;
     void restore(const Moment& moment);
-    void restoreFiles(const std::optional<DataFiles::Names>& names);
     void showFields(const Market& market);
     /// Says what can be taken back, which files are open, and how much of them is not saved.
     void showHistory();

@@ -79,7 +79,6 @@ Rescue::Pace& Rescue::pace()
 Rescue::Rescue(PLWindow& window, DataFiles& files, const DataFolder& folder)
     : window_(window), files_(files), folder_(folder), copied_(window.changeSerial())
 {
-    noteFile(FileKind::kWallet);
     [[maybe_unused]] static const int registered = std::atexit(endAll);
     living().push_back(this);
     const BMessage tick(kTick);
@@ -129,11 +128,6 @@ void Rescue::offer(const Copies& copies, const std::string& problem)
           {{"Restore", [this, copies] { restore(copies); }}, {"Throw away", [copies] { copies->remove(); }}}});
 }
 
-std::uint64_t Rescue::walletSum() const
-{
-    return checksumOf(bytesWritten([this](FILE* file) { window_.getWallet()->wrt(file, Date()); }));
-}
-
 std::string Rescue::pathOf(FileKind kind) const
 {
     return std::string(files_.names().of(kind).path.bytes());
@@ -141,13 +135,11 @@ std::string Rescue::pathOf(FileKind kind) const
 
 bool Rescue::isUnsaved(FileKind kind) const
 {
-    if (window_.unsavedChanges(kind) > 0)
-        return true;
-    // A portfolio's file has names of the market data, and would not fit any more when one of them has changed.
-    if (kind != FileKind::kWallet || (window_.unsavedChanges(FileKind::kMarkets) == 0 && !isWalletBehind_))
-        return false;
-    const auto saved = savedWallets_.find(pathOf(kind));
-    return saved == savedWallets_.end() || saved->second != walletSum();
+    // An empty portfolio in the place of one that could not be loaded, or that a market file has thrown away, is no
+    // work.
+    const DataFiles::Remembered& file = files_.names().of(kind);
+    const bool isNoWork = kind == FileKind::kWallet && (file.isAsked() || file.isEmptied) && files_.isWalletEmpty();
+    return !isNoWork && window_.unsavedChanges(kind) > 0;
 }
 
 bool Rescue::canWriteWallet() const
@@ -243,23 +235,13 @@ void Rescue::giveBackWhatWasUndone()
         return;
     offer(own_);
     forgetOwn();
+    own_ = std::exchange(left_, nullptr); // of what is here again
 }
 
 void Rescue::prepareSave(FileKind kind)
 {
-    const bool isOtherUnsaved = isUnsaved(kind == FileKind::kMarkets ? FileKind::kWallet : FileKind::kMarkets);
-    if (isOtherUnsaved)
+    if (isUnsaved(kind == FileKind::kMarkets ? FileKind::kWallet : FileKind::kMarkets))
         update();
-    if (kind == FileKind::kMarkets)
-        isWalletBehind_ = isOtherUnsaved;
-}
-
-void Rescue::noteFile(FileKind kind)
-{
-    if (kind != FileKind::kWallet)
-        return;
-    savedWallets_[pathOf(kind)] = walletSum();
-    isWalletBehind_ = false;
 }
 
 void Rescue::noteSaved(FileKind kind)
@@ -282,8 +264,9 @@ void Rescue::restore(const Copies& copies)
     const auto file = [&](FileKind kind) {
         const RescueNote::Part& part = note.parts[noteKind(kind)];
         DataFiles::Remembered name{part.path.c_str()};
-        if (!part.isCopied())
-            name.stamp = FileStamp::of(part.path.c_str());
+        name.stamp = FileStamp::of(part.path.c_str());
+        if (part.isCopied() && name.stamp && name.stamp->seconds > note.time)
+            name.stamp = FileStamp{}; // it was written since: no file is in that state, so the next save asks
         if (part.isAsked)
             name.failure = part.path + " could not be loaded";
         return DataFiles::Restored{part.isCopied() ? copies->copyOf(noteKind(kind)) : part.path, name, part.isCopied()};
@@ -291,8 +274,10 @@ void Rescue::restore(const Copies& copies)
     window_.nameStep("Restore");
     const DataFiles::Restoring done = files_.restore(file(FileKind::kMarkets), file(FileKind::kWallet));
     window_.noteStep();
-    if (window_.changeSerial() != before)
-        forgetOwn(); // what was here is gone
+    if (window_.changeSerial() != before) { // what was here is gone
+        left_ = own_;
+        forgetOwn();
+    }
     if (!done.isComplete)
         return offer(copies, done.problem);
     // From here on the copies are this window's own: the next ones take their place.

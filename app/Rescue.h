@@ -45,9 +45,7 @@ public:
     /// The file of that kind is about to be written. What is not saved of the other one gets a copy that fits it, since
     /// the program may be killed before `noteSaved`.
     void prepareSave(FileKind kind);
-    /// What is here of that kind is what its file has.
-    void noteFile(FileKind kind);
-    /// And that is so because it was just saved: no copy of it is needed.
+    /// What is here of that kind was just saved: no copy of it is needed.
     void noteSaved(FileKind kind);
     /// Makes the last copy. Nothing is shown from here on.
     void end();
@@ -66,8 +64,6 @@ private:
     bool isUnsaved(FileKind kind) const;
     /// Not while an account has no currency.
     bool canWriteWallet() const;
-    /// Of what the portfolio's file would hold.
-    std::uint64_t walletSum() const;
     RescueCopies::Source source(FileKind kind) const;
     /// Writes the next generation of this window's copies, or tells why not. @return whether it did.
     bool write(const RescueCopies::Sources& sources);
@@ -82,14 +78,12 @@ private:
     DataFiles& files_;
     DataFolder folder_;
     std::unique_ptr<BMessageRunner> runner_;
-    Copies own_;                                        // null while there is nothing to copy
-    std::uint64_t copied_ = 0;                          // the change that they are of
-    std::weak_ptr<const CatalogueImage> market_;        // the market data that they have
-    std::map<std::string, std::uint64_t> savedWallets_; // the `walletSum` of each file, by path
-    std::uint64_t restoring_ = 0;                       // the step that has restored them; 0 when they began here
+    Copies own_;                                 // null while there is nothing to copy
+    Copies left_;                                // of what was here before a restore, for when that is taken back
+    std::uint64_t copied_ = 0;                   // the change that they are of
+    std::weak_ptr<const CatalogueImage> market_; // the market data that they have
+    std::uint64_t restoring_ = 0;                // the step that has restored them; 0 when they began here
     std::array<bool, RescueNote::kKinds> isOnlyHere_{}; // they were restored, and never saved since
-    // Names that the portfolio's file has were changed in the market data, and these were saved.
-    bool isWalletBehind_ = false;
-    bool isWalletLeftOut_ = false; // it cannot be written
-    std::string failure_;          // that was told last
+    bool isWalletLeftOut_ = false;                      // it cannot be written
+    std::string failure_;                               // that was told last
 };

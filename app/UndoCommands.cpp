@@ -55,14 +55,15 @@ void PLWindow::noteStep(const std::string& command)
     showHistory();
 }
 
-void PLWindow::noteFile(FileKind kind)
+void PLWindow::noteFile(FileKind kind, bool isSaved)
 {
     if (history_ == nullptr)
         return;
     noteStep(command_);
-    history_->noteFile(kind);
+    history_->noteFile(kind, isSaved);
     showHistory();
-    rescue_->noteFile(kind);
+    if (isSaved)
+        rescue_->noteSaved(kind);
 }
 
 void PLWindow::prepareSave(FileKind kind)
@@ -70,18 +71,13 @@ void PLWindow::prepareSave(FileKind kind)
     rescue_->prepareSave(kind);
 }
 
-void PLWindow::noteSaved(FileKind kind)
-{
-    noteFile(kind);
-    rescue_->noteSaved(kind);
-}
-
 void PLWindow::Undo()
 {
     noteStep(command_); // what has changed by no command would be lost
     if (!history_->canUndo())
         return;
-    restoreFiles(history_->undo());
+    files_->setNames(history_->undo());
+    restore(history_->now());
 }
 
 void PLWindow::Redo()
@@ -89,13 +85,7 @@ void PLWindow::Redo()
     noteStep(command_);
     if (!history_->canRedo())
         return;
-    restoreFiles(history_->redo());
-}
-
-void PLWindow::restoreFiles(const std::optional<DataFiles::Names>& names)
-{
-    if (names)
-        files_->setNames(*names);
+    files_->setNames(history_->redo());
     restore(history_->now());
 }
 

@@ -108,11 +108,16 @@ bool WalletImage::AccountImage::operator==(const AccountImage& other) const
            received == other.received;
 }
 
-bool WalletImage::operator==(const WalletImage& other) const
+bool WalletImage::isSameFile(const WalletImage& other) const
 {
     return accounts == other.accounts && holdings == other.holdings && operations == other.operations &&
-           accountLinks == other.accountLinks && holdingLinks == other.holdingLinks &&
+           fileNames == other.fileNames &&
            std::memcmp(parameters.data(), other.parameters.data(), sizeof parameters) == 0;
+}
+
+bool WalletImage::operator==(const WalletImage& other) const
+{
+    return isSameFile(other) && accountLinks == other.accountLinks && holdingLinks == other.holdingLinks;
 }
 
 WalletImage WalletImage::of(const Wallet& wallet, const Catalogue& catalogue,
@@ -143,10 +148,13 @@ WalletImage WalletImage::of(const Wallet& wallet, const Catalogue& catalogue,
         image.accounts.push_back({account->getName(), account->isDefaultTransferAccount(),
                                   placesOf(account->operations(), places),
                                   placesOf(account->transferOperations(), places)});
+        image.fileNames.emplace_back(account->getCurrencyName().bytes());
     }
     for (const Share* share : wallet.shares()) {
         places[share] = sizeOf(image.holdings);
         image.holdings.push_back(placesOf(share->shareOperations(), places));
+        image.fileNames.emplace_back(share->getMarketName().bytes());
+        image.fileNames.emplace_back(share->getCompanyAbbreviation().bytes());
     }
     takeLinks(catalogue, places, image);
     for (std::size_t i = 0; i < image.parameters.size(); ++i)
@@ -215,9 +223,21 @@ WalletImage WalletImage::withoutAutomatic() const
     return image;
 }
 
+bool WalletImage::hasAutomatic() const
+{
+    return std::ranges::any_of(operations, &OperationImage::isAutomatic);
+}
+
 bool WalletImage::hasWorkOf(const WalletImage& other) const
 {
-    return *this == other || withoutAutomatic() == other.withoutAutomatic();
+    const bool mayDiffer = hasAutomatic() || other.hasAutomatic();
+    return *this == other || (mayDiffer && withoutAutomatic() == other.withoutAutomatic());
+}
+
+bool WalletImage::hasFileOf(const WalletImage& other) const
+{
+    const bool mayDiffer = hasAutomatic() || other.hasAutomatic();
+    return isSameFile(other) || (mayDiffer && withoutAutomatic().isSameFile(other.withoutAutomatic()));
 }
 
 std::size_t WalletImage::bytes() const
@@ -227,6 +247,8 @@ std::size_t WalletImage::bytes() const
     for (const AccountImage& account : accounts)
         total += sizeof account + static_cast<std::size_t>(account.name.getLength()) +
                  (account.operations.size() + account.received.size()) * sizeof(std::uint32_t);
+    for (const std::string& name : fileNames)
+        total += sizeof name + name.size();
     for (const Places& holding : holdings)
         total += sizeof holding + holding.size() * sizeof(std::uint32_t);
     return total;

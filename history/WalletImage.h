@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <functional>
 #include <memory>
+#include <string>
 #include <vector>
 
 class Catalogue;
@@ -53,6 +54,9 @@ struct WalletImage {
     std::vector<OperationImage> operations; // account by account, then those without account, which are automatic
     std::vector<Link> accountLinks;         // in the order of the currencies' lists
     std::vector<Link> holdingLinks;         // and in that of the companies' lists
+    // What a file has in the place of the links: of each account the name of its currency, then of each holding market
+    // and ticker. Not needed to make a wallet.
+    std::vector<std::string> fileNames;
     std::array<float, Wallet::kParameterCount> parameters;
 
     /// @param isLeftOut says which automatic operations are no part of the image.
@@ -62,10 +66,15 @@ struct WalletImage {
     std::unique_ptr<Wallet> make(const Catalogue& catalogue) const;
     /// Whether nothing but automatic operations differs.
     bool hasWorkOf(const WalletImage& other) const;
+    /// Whether, apart from these, the files of both are the same: what they are linked to may stand elsewhere by now,
+    /// under the same names.
+    bool hasFileOf(const WalletImage& other) const;
     std::size_t bytes() const;
 
     bool operator==(const WalletImage& other) const;
 
 private:
+    bool hasAutomatic() const;
     WalletImage withoutAutomatic() const;
+    bool isSameFile(const WalletImage& other) const;
 };

@@ -81,7 +81,7 @@ BApplication::~BApplication()
 
 int BApplication::Run()
 {
-    // At once, and not by the queue: a command that waits for an answer would hold it up, and the session does not
+    // At once, and not by the queue: a command that waits for an answer would hold it up, and the desktop does not
     // wait.
     const EndSignals ending([this] {
         BMessage quit(B_QUIT_REQUESTED);

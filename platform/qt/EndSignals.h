@@ -4,7 +4,7 @@
 
 #include <functional>
 
-/// Calls a function from the event loop when the session or the person ends the program from outside: by SIGTERM,
+/// Calls a function from the event loop when the desktop or a person ends the program from outside: by SIGTERM,
 /// SIGHUP or SIGINT. There is one, for the process.
 ///
 /// A signal may come in the middle of anything, so its handler only writes a byte into a pipe. What was told to ignore

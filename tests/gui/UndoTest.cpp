@@ -236,6 +236,45 @@ TEST_F(UndoStepTest, TakesBackALoadAndAReinitWithTheirFiles)
     EXPECT_EQ(std::filesystem::last_write_time(folder() + "/PortoFolios/Other"), other);
 }
 
+TEST_F(UndoStepTest, ASaveGivesANameThatStaysOnTheWayBackAndOn)
+{
+    makeSample();
+    show(kCompanyPage);
+    click("btnLoadMarket");
+    answerPanel("OpenPanel", marketFile());
+    show(kPortoFolioPage);
+    fill({{"txtAccountName", "Main"}, {"txtAccountCurrency", "EUR"}});
+    click("btnAddAccount");
+    click("btnSavePortoFolio");
+    answerPanel("SavePanel", "Named");
+    EXPECT_EQ(openFile(), "Named");
+    for (const auto modifiers : {Qt::ControlModifier | Qt::NoModifier, Qt::ControlModifier | Qt::ShiftModifier}) {
+        press(Qt::Key_Z, modifiers);
+        press(Qt::Key_Z, modifiers);
+    }
+    EXPECT_EQ(openFile(), "Named");
+    clearMessage();
+    press(Qt::Key_S);
+    EXPECT_EQ(message(), "Wallet successfully saved...") << "and nothing is asked: the file is as this window wrote it";
+
+    // The portfolio's file has names of the market data, and no places in it.
+    show(kCompanyPage);
+    select("lstMarkets", 1);
+    select("lstCompanies", 0);
+    answerNextAlert("Continue");
+    click("btnRemoveCompany");
+    EXPECT_EQ(openFile(), "Sample - 1 change not saved");
+    show(kParameterPage);
+    EXPECT_EQ(openFile(), "Named");
+    show(kCurrencyPage);
+    select("lstCurrencies", 0);
+    enter("txtCurrencyName", "Other");
+    click("btnUpdateCurrency");
+    EXPECT_EQ(openFile(), "Sample - 2 changes not saved");
+    show(kParameterPage);
+    EXPECT_EQ(openFile(), "Named - 1 change not saved");
+}
+
 TEST_F(UndoStepTest, LeavesCtrlZToAFieldThatIsBeingTypedIn)
 {
     show(kCurrencyPage);
