@@ -179,6 +179,22 @@ TEST_F(RescueTest, OnlyWhatChangedIsCopiedAndTheRestComesFromItsFile)
     EXPECT_EQ(model() == renamed, true);
 }
 
+TEST_F(RescueTest, ARestoredPortfolioIsNotSavedOverANewerFileUnasked)
+{
+    makeSample();
+    loadSample();
+    addAccount();
+    restart();
+    fs::last_write_time(walletFile(), fs::file_time_type::clock::now() + std::chrono::hours(1));
+    const std::string newer = contentOf(walletFile());
+    restoreUnsaved();
+    show(kPortoFolioPage);
+    click("btnSavePortoFolio");
+    EXPECT_EQ(panelFolder("SavePanel"), folder() + "/PortoFolios");
+    answerPanel("SavePanel", "");
+    EXPECT_EQ(contentOf(walletFile()) == newer, true);
+}
+
 TEST_F(RescueTest, AnAccountWithoutCurrencyCostsOnlyThePortfolioItsCopy)
 {
     makeSample();

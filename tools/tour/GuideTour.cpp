@@ -145,6 +145,15 @@ void showMistakes(TourHand& hand)
     hand.picture("guide-mistakes", kOperationFields);
 }
 
+/// All quotes of a company at once, by mistake.
+void removeQuotes(TourHand& hand)
+{
+    hand.turnTo(kCompany);
+    hand.select("lstQuotes", 0, 3);
+    hand.press("btnRemoveQuote");
+    hand.picture("guide-removed", {0, 0, 800, 540});
+}
+
 } // namespace
 
 void tourSafety(TourHand& hand)
@@ -177,4 +186,5 @@ void tourGuide(TourHand& hand)
     showPrevisions(hand);
     split(hand);
     showMistakes(hand);
+    removeQuotes(hand);
 }
