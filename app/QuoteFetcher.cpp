@@ -75,11 +75,11 @@ std::string QuoteFetcher::reason() const
     case FetchEnd::kRefused:
         return "the server " + host + " takes no connections";
     case FetchEnd::kSilent:
-        return "the server " + host + " was silent" + (asked_ > 1 ? ", and not asked again" : "");
+        return "the server " + host + " did not answer" + (asked_ > 1 ? ", and not asked again" : "");
     case FetchEnd::kStopped:
         return "Escape has ended it";
     case FetchEnd::kClosed:
-        return "the server " + host + " gave no answer";
+        return "the server " + host + " closed without an answer";
     default:
         return "the server " + host + " has no price";
     }

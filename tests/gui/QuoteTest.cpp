@@ -224,7 +224,7 @@ TEST_F(FetchCommandTest, ASilentServerIsAskedOnceAndEscapeEndsTheWait)
         EXPECT_EQ(message(), "All portofolio quotes are up-to-date.");
         EXPECT_EQ(notice.accessibleName().toStdString(),
                   std::string("0 of 2 quotes came: ") +
-                      (isEscaped ? "Escape has ended it" : "the server localhost was silent, and not asked again") +
+                      (isEscaped ? "Escape has ended it" : "the server localhost did not answer, and not asked again") +
                       "; none for AAA, BBB");
     }
     EXPECT_TRUE(isVisible("lstCompanies")) << "what was pressed besides has come in its turn";
