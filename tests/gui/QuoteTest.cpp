@@ -10,6 +10,7 @@
 #include "tests/support/Peer.h"
 #include "tests/support/SmallPortfolio.h"
 
+#include <QInputDevice>
 #include <QKeyEvent>
 #include <QWindow>
 #include <gmock/gmock.h>
@@ -206,6 +207,8 @@ TEST_F(FetchCommandTest, ASilentServerIsAskedOnceAndEscapeEndsTheWait)
     show(kPortoFolioPage);
     QWidget& notice = *window().widget().findChild<QWidget*>("txtNotice");
     QWindow* handle = window().widget().windowHandle();
+    // Keys belong to a keyboard, which Qt makes with the first of them: here, and not in the server's thread.
+    QInputDevice::primaryKeyboard();
     for (const bool isEscaped : {false, true}) {
         const Peer server([&](int client) {
             Peer::receiveLine(client);
