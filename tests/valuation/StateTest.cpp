@@ -1,4 +1,6 @@
 #include "valuation/State.h"
+#include "portfolio/CashMove.h"
+#include "portfolio/OperationKind.h"
 #include "tests/support/SmallPortfolio.h"
 #include "valuation/AccountState.h"
 #include "valuation/ShareState.h"
@@ -67,10 +69,50 @@ TEST(StateTest, TradesMoveTheCashWithFixedAndProportionalCosts)
     EXPECT_FLOAT_EQ(p.cash(6), 5000 - 1031.65F + 1966.65F) << "only the quantity follows trades of foreign accounts";
     EXPECT_EQ(p.cash(4, 1), 0);
     EXPECT_FLOAT_EQ(p.cash(6, 1), -7.0102F);
+    const auto trades = p.share->shareOperations();
+    EXPECT_FLOAT_EQ(static_cast<float>(cashMove(*trades[0], *p.account)), -1031.65F);
+    EXPECT_FLOAT_EQ(static_cast<float>(cashMove(*trades[1], *p.account)), 1966.65F);
+    EXPECT_EQ(cashMove(*trades[0], *other), 0);
     EXPECT_EQ(p.at(4).getShareState(0)->getQuote(), 12);
     EXPECT_EQ(p.quantity(5), 3) << "a sale of the state's day counts";
     EXPECT_EQ(p.quantity(6), 9);
     EXPECT_EQ(p.at(5).getTotalDeposit(), 5000);
+}
+
+TEST(StateTest, ATransferWithinAnAccountIsIncomeOrChargeWhenItsValuesSaySo)
+{
+    constexpr auto kTransfer = OperationKind::kTransfer;
+    const struct {
+        float amount, rateCost, cost, from, to;
+        OperationKind kind;
+        float move;
+    } cases[] = {{0, 0, -37.5F, 1, 1, OperationKind::kIncome, 37.5F},
+                 {12.25F, 1, 0, 1, 1, OperationKind::kCharge, -12.25F},
+                 {0, 0, 0, 1, 1, kTransfer, 0},
+                 {0, 0, 5, 1, 1, kTransfer, -10},
+                 {0, 0, -5, 2, 1, kTransfer, 10},
+                 {0, 0.5F, -5, 1, 1, kTransfer, 5},
+                 {-5, 1, 0, 1, 1, kTransfer, 0},
+                 {5, 1, 1, 1, 1, kTransfer, -6},
+                 {5, 0.5F, 0, 1, 1, kTransfer, -2.5F},
+                 {5, 1, 0, 1, 2, kTransfer, -5}};
+    for (const auto& c : cases)
+        for (const bool isWithin : {true, false}) {
+            OneHolding p;
+            Account* other = addAccount(p.wallet, "Other", p.dollar);
+            auto* sent = transfer(p.account, isWithin ? p.account : other, 1, c.amount);
+            sent->setRateCost(c.rateCost);
+            sent->setCost(c.cost);
+            sent->setFromCurrencyQuote(c.from);
+            sent->setToCurrencyQuote(c.to);
+            EXPECT_EQ(kindOf(*sent), isWithin ? c.kind : kTransfer) << c.amount << ' ' << c.cost;
+            if (isWithin) {
+                EXPECT_EQ(cashMove(*sent, *p.account), c.move) << c.amount << ' ' << c.cost;
+            }
+            EXPECT_EQ(cashMove(*sent, *p.account), p.cash(1, 0)) << "as the replay has it";
+            EXPECT_EQ(cashMove(*sent, *other), p.cash(1, 1)) << "as the replay has it";
+            EXPECT_EQ(p.at(1).getTotalDeposit(), 0);
+        }
 }
 
 TEST(StateTest, BalancesAreRoundedAfterEveryMove)
