@@ -4,6 +4,7 @@
 #include "market/Currency.h"
 #include "portfolio/Account.h"
 #include "portfolio/DepositAccountOperation.h"
+#include "portfolio/OperationKind.h"
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
@@ -12,6 +13,7 @@
 #include "valuation/ShareState.h"
 #include "valuation/State.h"
 
+#include <cctype>
 #include <nlohmann/json.hpp>
 #include <ranges>
 
@@ -128,12 +130,20 @@ Json describe(const ShareOperation& trade)
             {"operationCost", trade.getOperationCost()}};
 }
 
+std::string kindText(const Operation& operation)
+{
+    std::string kind = nameOf(kindOf(operation));
+    kind[0] = static_cast<char>(std::tolower(kind[0]));
+    return kind;
+}
+
 /// An operation that an account lists.
 Json describeOperation(const Operation* operation)
 {
     constexpr const char* kTypes[] = {"", "deposit", "transfer", "buy", "sell"}; // by type code
     Json json = {{"account", text(operation->account()->getName())},
                  {"type", kTypes[operation->getType()]},
+                 {"kind", kindText(*operation)},
                  {"date", day(operation->getDate())},
                  {"automatic", operation->isAutomatic()}};
     if (const auto* deposit = dynamic_cast<const DepositAccountOperation*>(operation))

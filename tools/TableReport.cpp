@@ -5,6 +5,8 @@
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "portfolio/Account.h"
+#include "portfolio/CashMove.h"
+#include "portfolio/OperationKind.h"
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
@@ -15,10 +17,12 @@
 #include "valuation/State.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstdio>
 #include <string>
 #include <string_view>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 namespace {
@@ -30,15 +34,15 @@ std::string plain(const String& text)
     return printable(text.bytes());
 }
 
-/// An operation that the valuation has generated.
-struct AutomaticLine {
+/// An operation that a part of the report lists.
+struct OperationLine {
     Date date;
     const char* type;
     std::string amount;
     std::string text;
 };
 
-void takeSales(const Share& share, std::vector<AutomaticLine>* lines)
+void takeSales(const Share& share, std::vector<OperationLine>* lines)
 {
     const Company* company = share.company();
     if (company == nullptr)
@@ -52,7 +56,7 @@ void takeSales(const Share& share, std::vector<AutomaticLine>* lines)
     }
 }
 
-void takeTransfers(const Account& account, std::vector<AutomaticLine>* lines)
+void takeTransfers(const Account& account, std::vector<OperationLine>* lines)
 {
     for (const Operation* operation : account.operations()) {
         const auto* transfer = dynamic_cast<const TransferAccountOperation*>(operation);
@@ -62,6 +66,31 @@ void takeTransfers(const Account& account, std::vector<AutomaticLine>* lines)
                                  " to " + plain(transfer->recipient()->getName());
         lines->push_back({transfer->getDate(), "transfer", amountText(transfer->getAmount()), text});
     }
+}
+
+/// Income and charges up to that day: they make the profit without a trade.
+void takeMoves(const Account& account, const Date& day, std::vector<OperationLine>* lines)
+{
+    for (const Operation* operation : account.operations()) {
+        const OperationKind kind = kindOf(*operation);
+        if (operation->getDate() > day || (kind != OperationKind::kIncome && kind != OperationKind::kCharge))
+            continue;
+        const bool isIncome = kind == OperationKind::kIncome;
+        const std::string text =
+            plain(account.getCurrencyRepresentation()) + (isIncome ? " to " : " from ") + plain(account.getName());
+        lines->push_back({operation->getDate(), isIncome ? "income" : "charge",
+                          amountText(std::abs(cashMove(*operation, account))), text});
+    }
+}
+
+/// By date, below a heading; empty without lines.
+std::string listed(const char* heading, std::vector<OperationLine> lines)
+{
+    std::ranges::stable_sort(lines, {}, &OperationLine::date);
+    TextTable table({{heading}, {""}, {"", kRight}, {""}});
+    for (const OperationLine& line : lines)
+        table.addRow({dateText(line.date), line.type, line.amount, line.text});
+    return table.isEmpty() ? "" : '\n' + table.toString();
 }
 
 /// Writes each part as text. What cannot be told, because there is no reference currency or none of an amount's symbol,
@@ -79,7 +108,7 @@ public:
 
     std::string make() const
     {
-        std::string text = header() + totals() + accounts() + holdings() + automaticOperations();
+        std::string text = header() + totals() + accounts() + holdings() + moves() + automaticOperations();
         return valuation_.hasEvolution() ? text + evolution() : text;
     }
 
@@ -157,21 +186,23 @@ private:
         return table.isEmpty() ? "" : '\n' + table.toString();
     }
 
+    std::string moves() const
+    {
+        std::vector<OperationLine> lines;
+        for (const Account* account : valuation_.wallet().accounts())
+            takeMoves(*account, valuation_.state().getDate(), &lines);
+        return listed("Income and charges", std::move(lines));
+    }
+
     /// What the search for automatic sales came to: the sales, and the transfers of their gains.
     std::string automaticOperations() const
     {
-        std::vector<AutomaticLine> lines;
+        std::vector<OperationLine> lines;
         for (const Share* share : valuation_.wallet().shares())
             takeSales(*share, &lines);
         for (const Account* account : valuation_.wallet().accounts())
             takeTransfers(*account, &lines);
-        const auto isEarlier = [](const AutomaticLine& a, const AutomaticLine& b) { return a.date < b.date; };
-        std::stable_sort(lines.begin(), lines.end(), isEarlier);
-
-        TextTable table({{"Automatic"}, {""}, {"", kRight}, {""}});
-        for (const AutomaticLine& line : lines)
-            table.addRow({dateText(line.date), line.type, line.amount, line.text});
-        return table.isEmpty() ? "" : '\n' + table.toString();
+        return listed("Automatic", std::move(lines));
     }
 
     std::string evolution() const

@@ -19,11 +19,12 @@ const char* const kOutput = R"(The JSON is one object; dates are DD/MM/YYYY, and
   {"date", "reference", "totalDeposit", "totalValue", "profit", "annualRevenue", "firstOperationDate",
    "accounts": [{"name", "currency", "cash", "defaultTransfer"}],
    "shares": [{"market", "ticker", "name", "quantity", "buyQuote", "quote", "endDate", "currency"}],
-   "operations": [{"account", "type", "date", "automatic", and by type
+   "operations": [{"account", "type", "kind", "date", "automatic", and by type
        deposit:   "amount"
        transfer:  "recipient", "amount", "rateCost", "cost", "fromCurrencyQuote", "toCurrencyQuote"
        buy, sell: "market", "ticker", "quantity", "quote", "operationCost"}],
    "evolution": [{"date", "totalValue"}]}
+A kind is "deposit", "transfer", "buy", "sell", "income" or "charge"; of the last two the type is "transfer".
 The totals are in the reference currency, annualRevenue is a fraction per year; reference and currency
 are symbols. Transfers that --previsions has suggested are gone again with --evolution.
 

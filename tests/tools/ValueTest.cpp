@@ -94,11 +94,11 @@ TEST_F(ValueTest, JsonIsWhatTheSumsByHandGive)
     {"market": "York", "ticker": "AC", "name": "Beta", "quantity": 0, "buyQuote": 0.0, "quote": 0.0, "endDate": null, "currency": "USD"}
   ],
   "operations": [
-    {"account": "Cash", "type": "deposit", "date": "01/01/1999", "automatic": false, "amount": 5000.0},
-    {"account": "Cash", "type": "transfer", "date": "03/01/1999", "automatic": false, "recipient": "Café \"�", "amount": 200.0, "rateCost": 0.00999999978, "cost": 5.0, "fromCurrencyQuote": 1.0, "toCurrencyQuote": 2.0},
-    {"account": "Cash", "type": "buy", "date": "04/01/1999", "automatic": false, "market": "Paris", "ticker": "AC", "quantity": 100, "quote": 10.0, "operationCost": 29.9500008},
-    {"account": "Cash", "type": "sell", "date": "11/01/1999", "automatic": false, "market": "Paris", "ticker": "AC", "quantity": 40, "quote": 12.0, "operationCost": 29.9500008},
-    {"account": "Café \"�", "type": "deposit", "date": "02/01/1999", "automatic": false, "amount": 1000.0}
+    {"account": "Cash", "type": "deposit", "kind": "deposit", "date": "01/01/1999", "automatic": false, "amount": 5000.0},
+    {"account": "Cash", "type": "transfer", "kind": "transfer", "date": "03/01/1999", "automatic": false, "recipient": "Café \"�", "amount": 200.0, "rateCost": 0.00999999978, "cost": 5.0, "fromCurrencyQuote": 1.0, "toCurrencyQuote": 2.0},
+    {"account": "Cash", "type": "buy", "kind": "buy", "date": "04/01/1999", "automatic": false, "market": "Paris", "ticker": "AC", "quantity": 100, "quote": 10.0, "operationCost": 29.9500008},
+    {"account": "Cash", "type": "sell", "kind": "sell", "date": "11/01/1999", "automatic": false, "market": "Paris", "ticker": "AC", "quantity": 40, "quote": 12.0, "operationCost": 29.9500008},
+    {"account": "Café \"�", "type": "deposit", "kind": "deposit", "date": "02/01/1999", "automatic": false, "amount": 1000.0}
   ]
 })");
     EXPECT_EQ(json("--date 11/01/1999"), expected);
@@ -134,6 +134,26 @@ Alpha    AC      Paris         60      10.00  12.00  EUR  +20.0%        720.00  
 Beta??   AC      York           0              0.00  USD
 Gamma    GA      Paris          5      10.00   0.00  EUR                  0.00  04/04/1999
 )");
+}
+
+TEST_F(ValueTest, IncomeAndChargesAreToldFromOtherTransfers)
+{
+    deposit(cash_, 0, 100);
+    transfer(cash_, cash_, 2, 0)->setCost(-37.5F);
+    transfer(cash_, cash_, 1, 12.25F)->setRateCost(1);
+    transfer(cash_, cash_, 3, 1)->setRateCost(1);
+    const auto report = json("--date 03/01/1999");
+    EXPECT_EQ(report["profit"], 25.25);
+    EXPECT_EQ(report["totalDeposit"], 100);
+    std::string kinds;
+    for (const auto& operation : report["operations"])
+        kinds += operation["type"].get<std::string>() + '/' + operation["kind"].get<std::string>() + ' ';
+    EXPECT_EQ(kinds, "deposit/deposit transfer/charge transfer/income transfer/charge ");
+    EXPECT_THAT(value("--date 03/01/1999").out, HasSubstr(R"(
+Income and charges
+02/01/1999          charge  12.25  EUR from Cash
+03/01/1999          income  37.50  EUR to Cash
+)"));
 }
 
 TEST_F(ValueTest, WhatHasNoValueIsNull)
