@@ -84,6 +84,7 @@ void PLWindow::CurrencySelection()
     Currency* currency = currencyView_->GetSelectedCurrency();
     currencyView_->SetMarketList(currency);
     currencyView_->SetQuoteList(currency);
+    currencyQuotes_->followSeries();
     if (currency == nullptr)
         return;
     currencyView_->setCurrencyName(currency->getName());

@@ -146,6 +146,7 @@ void PLWindow::CompanySelection()
     Company* company = companyView_->GetSelectedCompany();
     companyView_->SetQuoteList(company);
     companyView_->SetCompanyEventList(company);
+    companyQuotes_->followSeries();
     if (company == nullptr)
         return;
     companyView_->setCompanyName(company->getName());

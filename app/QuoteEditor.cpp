@@ -2,7 +2,24 @@
 
 #include "app/PLWindow.h"
 
+#include "views/ModelText.h"
+
 #include <memory>
+
+namespace {
+
+std::string nameOf(const Company& company)
+{
+    const Market* market = company.market();
+    return (market != nullptr ? textOf(market->getName()) : "") + '\n' + textOf(company.getAbbreviation());
+}
+
+std::string nameOf(const Currency& currency)
+{
+    return textOf(currency.getName());
+}
+
+} // namespace
 
 template <class Series>
 void QuoteEditor<Series>::showChange()
@@ -69,6 +86,19 @@ void QuoteEditor<Series>::showSelected()
         page_.setQuoteValue(quote->getValue());
     }
     page_.UpdateQuotesChart();
+}
+
+template <class Series>
+void QuoteEditor<Series>::followSeries()
+{
+    const Series* series = page_.selectedSeries();
+    if (series == nullptr)
+        return;
+    const std::string name = nameOf(*series);
+    if (series_ != nullptr && series != series_ && name != name_)
+        page_.clearQuoteFields();
+    series_ = series;
+    name_ = name;
 }
 
 template class QuoteEditor<Company>;

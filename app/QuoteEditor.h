@@ -2,6 +2,8 @@
 
 #include "views/SeriesPage.h"
 
+#include <string>
+
 class PLWindow;
 
 /// The commands on the quotes of the series that is selected on a page: of a company, or of a currency.
@@ -24,6 +26,8 @@ public:
     void remove();
     /// Puts the selected quote into the page's fields.
     void showSelected();
+    /// A series was selected, or the same one shown again: what the fields hold of another one is not its.
+    void followSeries();
 
 private:
     using SeriesQuote = typename SeriesPage<Series>::SeriesQuote;
@@ -33,4 +37,7 @@ private:
     PLWindow& window_;
     SeriesPage<Series>& page_;
     const char* unselected_;
+    // What the fields were for last. Never looked into: an undo makes the series anew, and a person may rename it.
+    const Series* series_ = nullptr;
+    std::string name_;
 };

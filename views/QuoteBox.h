@@ -44,6 +44,12 @@ public:
     /// Undefined while the text is no date.
     Date getDate() const { return date_->getDate(); }
     void setDate(const Date& date) { date_->setDate(date); }
+    void clearFields()
+    {
+        date_->setDate(Date());
+        value_->SetText("");
+        value_->MarkAsInvalid(nullptr);
+    }
     float getValue() const { return value_->getNumber(); }
     void setValue(float value) { value_->setNumber(value); }
 

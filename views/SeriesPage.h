@@ -45,6 +45,7 @@ public:
     void setQuoteDate(const Date& date) { quotes_->setDate(date); }
     float getQuoteValue() const { return quotes_->getValue(); }
     void setQuoteValue(float value) { quotes_->setValue(value); }
+    void clearQuoteFields() { quotes_->clearFields(); }
 
     // What is told of a quote that is not shown has no effect on the list.
     void AddQuote(SeriesQuote* quote)

@@ -55,6 +55,27 @@ TEST_F(QuoteTest, FieldsReadDatesAndNumbersAsTypedAndMarkWhatTheyCannot)
     EXPECT_THAT(rows("lstQuotes"), SizeIs(5)) << "the days of 2024, and one of the first century";
 }
 
+TEST_F(QuoteTest, AnotherSeriesEmptiesTheFieldsOfItsQuotes)
+{
+    addSmallCatalogue();
+    const auto fields = [this] { return text("txtQuoteDate") + ' ' + text("txtQuoteValue"); };
+    addCompany("BE", "Beta");
+    EXPECT_EQ(fields(), " ");
+    fill({{"txtQuoteDate", "2/3/2024"}, {"txtQuoteValue", "1x"}});
+    click("btnAddQuote");
+    post('HUnd');
+    EXPECT_EQ(fields(), "2/3/2024 1x") << "the same company, though it was made anew";
+    select("lstCompanies", 0);
+    EXPECT_EQ(fields(), " ");
+    EXPECT_TRUE(find<QLineEdit>("txtQuoteValue").toolTip().isEmpty());
+    show(kCurrencyPage);
+    type("txtQuoteValue", "3");
+    select("lstCurrencies", 1);
+    EXPECT_EQ(fields(), "1/1/2024 3") << "selected already";
+    select("lstCurrencies", 0);
+    EXPECT_EQ(fields(), " ");
+}
+
 TEST_F(QuoteTest, AQuoteIsReplacedMovedAndKeptBesideAnotherOfItsDay)
 {
     addSmallCatalogue();
