@@ -191,9 +191,17 @@ void PLWindow::MessageReceived(BMessage* message)
     const WindowLock lock(*this);
     if (!lock.isHeld())
         return;
+    if (repeats_.isRepeat(*message, front()))
+        return;
     command_ = command->step;
     command->run(*this, message);
+    repeats_.noteRun(*message, front());
     noteStep(std::exchange(command_, {}));
+}
+
+BView& PLWindow::front() const
+{
+    return *tabView_->TabAt(tabView_->Selection())->View();
 }
 
 bool PLWindow::QuitRequested()

@@ -6,6 +6,7 @@
 #include "app/Notice.h"
 #include "app/OperationEditor.h"
 #include "app/QuoteEditor.h"
+#include "app/RepeatGuard.h"
 #include "market/Catalogue.h"
 #include "platform/Window.h"
 #include "views/CompanyView.h"
@@ -182,6 +183,8 @@ private:
     friend class StateHold;
 
     void makePages();
+    /// The page in front.
+    BView& front() const;
     void makeUndoButtons();
     /// Compares what is here with what there was after the last command, and keeps what has changed. `command` names
     /// the step; commands know nothing of it, so that none can forget it.
@@ -216,7 +219,8 @@ private:
     ParameterView* parameterView_ = nullptr;
     BButton* undoButton_ = nullptr;
     BButton* redoButton_ = nullptr;
-    std::unique_ptr<History> history_;        // null while the window is made
+    std::unique_ptr<History> history_; // null while the window is made
+    RepeatGuard repeats_;
     std::string command_;                     // that runs; empty when it has no name for a step
     std::vector<const Operation*> simulated_; // sales that the last valuation made up; sorted, never looked into
     bool isValued_ = false;                   // there was a valuation since the wallet came

@@ -91,6 +91,7 @@ void PLWindow::Redo()
 
 void PLWindow::restore(const Moment& moment)
 {
+    repeats_.forget();
     // First no row, no selection and no portfolio refers to anything in the catalogue.
     replaceWallet();
     companyView_->SetMarketList({});

@@ -8,9 +8,6 @@
 class BMessage;
 class QTimer;
 
-/// A span of time in microseconds.
-using bigtime_t = std::int64_t;
-
 /// Sends a message over and over, as long as the runner is there.
 ///
 /// Unlike in the kits the message does not wait in the queue of its target's looper: it comes in time also while a

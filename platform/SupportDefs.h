@@ -4,6 +4,8 @@
 
 using int32 = std::int32_t;
 using uint32 = std::uint32_t;
+/// A span of time in microseconds.
+using bigtime_t = std::int64_t;
 
 /// Outcome of a call: `B_OK`, or a negative error.
 using status_t = int32;

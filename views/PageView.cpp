@@ -15,10 +15,13 @@ PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_
 
 BButton* PageView::addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code)
 {
-    auto* button = new BButton(frame, name, label, new BMessage(code));
+    auto* message = new BMessage(code);
+    auto* button = new BButton(frame, name, label, message);
     // `app/Shortcuts.cpp` finds the button that adds by the same label.
-    if (std::strcmp(label, kAddLabel) == 0)
+    if (std::strcmp(label, kAddLabel) == 0) {
+        message->AddInt32(kByHand, 1);
         button->SetToolTip("Adds what the fields of this box say.  Ctrl+N, while the keyboard is in the box");
+    }
     parent->AddChild(button);
     return button;
 }

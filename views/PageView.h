@@ -16,6 +16,8 @@ class PageView : public BView {
 public:
     /// The label of the button in a box that adds what the box's fields say.
     static constexpr const char* kAddLabel = "Add";
+    /// What the message of such a button has, and one that comes in another way has not.
+    static constexpr const char* kByHand = "byHand";
 
     PageView(BRect frame, const char* name);
 
