@@ -1,58 +1,32 @@
 #include "app/OperationEditor.h"
 
 #include "app/Holds.h"
-#include "portfolio/DepositAccountOperation.h"
+#include "app/OperationText.h"
+#include "market/NoteCompanyEvent.h"
+#include "portfolio/OperationKind.h"
 #include "portfolio/Wallet.h"
+#include "views/CompanyView.h"
 #include "views/OperationView.h"
 
-#include <optional>
-
-namespace {
-
-/// What a series says for a day; nothing when it is empty, or the day no day.
-template <class Series>
-std::optional<float> quoteAt(const Series* series, const Date& date)
-{
-    if (series == nullptr || series->getNbrQuotes() == 0 || date.isUndefined())
-        return std::nullopt;
-    return series->getRealQuote(date);
-}
-
-const Currency* currencyOf(const Account* account)
-{
-    return account != nullptr ? account->currency() : nullptr;
-}
-
-/// The fixed cost of a new operation of that type; nothing for one that is no trade.
-std::optional<float> shareCost(const Wallet& wallet, const String& type)
-{
-    if (type == "BUY")
-        return wallet.getBuyCost();
-    if (type == "SELL")
-        return wallet.getSellCost();
-    return std::nullopt;
-}
-
-} // namespace
-
-OperationEditor::OperationEditor(PLWindow& window, OperationView& page) : window_(window), page_(page)
+OperationEditor::OperationEditor(PLWindow& window, OperationView& page, CompanyView& companies)
+    : window_(window), page_(page), maker_(window, page), offers_(window, page, maker_), notes_(window, companies)
 {
     // Typing comes from the kits, not by way of a command, so the lock is taken here.
-    page_.SetTypingHook([this] {
-        const WindowLock lock(window_);
-        if (lock.isHeld())
-            renewOffers();
-    });
+    const auto locked = [this](void (OperationOffers::*follow)()) {
+        return [this, follow] {
+            const WindowLock lock(window_);
+            if (lock.isHeld())
+                (offers_.*follow)();
+        };
+    };
+    page_.SetTypingHook(locked(&OperationOffers::renew));
+    page_.SetFigureHook(locked(&OperationOffers::noteFigure));
 }
 
 OperationEditor::~OperationEditor()
 {
     page_.SetTypingHook({}); // the page outlives this
-}
-
-Wallet& OperationEditor::wallet() const
-{
-    return *window_.getWallet();
+    page_.SetFigureHook({});
 }
 
 void OperationEditor::updateTotal()
@@ -64,22 +38,47 @@ void OperationEditor::updateTotal()
 
 void OperationEditor::add()
 {
-    if (Operation* added = make())
-        showMade(added, nullptr);
+    book(nullptr);
 }
 
 void OperationEditor::update()
 {
-    Operation* former = selected();
-    if (Operation* added = make())
-        showMade(added, former);
+    book(selected());
 }
 
 void OperationEditor::remove()
 {
-    if (Operation* operation = selected())
+    Operation* operation = selected();
+    const std::string deed = operation != nullptr ? deedText(*operation) : "";
+    if (operation != nullptr) {
+        notes_.remove(notes_.of(*operation));
         destroy(operation);
+    }
     window_.UpdateState();
+    if (!deed.empty())
+        tell("Removed: " + deed);
+}
+
+void OperationEditor::book(Operation* former)
+{
+    // Before there is a new one, which may look the same.
+    NoteCompanyEvent* formerNote = former != nullptr ? notes_.of(*former) : nullptr;
+    Operation* made = maker_.make();
+    if (made == nullptr)
+        return;                               // the former one stays, and its note
+    const std::string deed = deedText(*made); // which may be gone after the valuation
+    offers_.noteUsed(*made->account());
+    notes_.remove(formerNote);
+    Company* payer = kindOf(*made) == OperationKind::kIncome ? maker_.company() : nullptr;
+    if (payer != nullptr && !made->isAutomatic())
+        notes_.add(*payer, *made);
+    showMade(made, former);
+    tell(former != nullptr ? "Updated: " + deed : deed);
+}
+
+void OperationEditor::tell(const std::string& deed)
+{
+    window_.showNotice({"operation", deed, {}, true});
 }
 
 void OperationEditor::showMade(Operation* made, Operation* former)
@@ -100,6 +99,7 @@ void OperationEditor::showMade(Operation* made, Operation* former)
     if (!stays)
         return;
     page_.ShowOperation(made);
+    page_.FlashOperation(made);
     updateTotal();
 }
 
@@ -107,67 +107,6 @@ void OperationEditor::destroy(Operation* operation)
 {
     page_.RemoveOperation(operation); // the row draws from the operation
     delete operation;
-}
-
-std::nullptr_t OperationEditor::refuse(const char* reason) const
-{
-    window_.SetMessage(reason);
-    return nullptr;
-}
-
-Operation* OperationEditor::make()
-{
-    const Date date = page_.getDate();
-    if (date.isUndefined())
-        return nullptr; // Intended: without a message, the field shows by its colour what is wrong.
-    const String name = page_.getBaseAccount();
-    if (name.isUndefined())
-        return refuse("Undefined account.");
-    Account* account = wallet().getAccountByName(name);
-    if (account == nullptr)
-        return refuse("Unknown account.");
-    const String type = page_.getType();
-    if (type == "DEPOSIT")
-        return new DepositAccountOperation(date, account, page_.getAmount(), page_.getAutomatic());
-    if (type == "TRANSFER")
-        return makeTransfer(date, account);
-    return makeTrade(date, account, type == "BUY");
-}
-
-Operation* OperationEditor::makeTransfer(const Date& date, Account* from)
-{
-    const String name = page_.getTransferAccount();
-    Account* to = name.isUndefined() ? nullptr : wallet().getAccountByName(name);
-    if (to == nullptr)
-        return nullptr; // without a message: the menu shows that nothing is chosen
-    auto* transfer = new TransferAccountOperation(date, from, to, page_.getAmount(), page_.getAutomatic());
-    transfer->setCost(page_.getTransferCost());
-    transfer->setRateCost(page_.getTransferRateCost());
-    transfer->setFromCurrencyQuote(page_.getTransferFromQuote());
-    transfer->setToCurrencyQuote(page_.getTransferToQuote());
-    return transfer;
-}
-
-Operation* OperationEditor::makeTrade(const Date& date, Account* account, bool isBuy)
-{
-    const String marketName = page_.getMarketName();
-    const String ticker = page_.getCompanyAbbreviation();
-    Company* company;
-    if (wallet().getCompany(marketName, ticker, &company) != 0)
-        return refuse("Unknown company.");
-    if (account->getCurrencyRepresentation() != company->getCurrencyRepresentation())
-        return refuse("Not the same currencies.");
-    Share* share;
-    if (wallet().getShare(marketName, ticker, &share) != 0)
-        share = new Share(&wallet(), company); // the wallet owns it, and so does the company
-    // A new holding stays even when its operation is refused: it is empty, and is found again the next time.
-    const int quantity = page_.getQuantity();
-    if (quantity <= 0)
-        return refuse("Quantity must be higher than 0.");
-    auto* trade =
-        new ShareOperation(date, share, isBuy, quantity, page_.getQuote(), page_.getAutomatic(), page_.getShareCost());
-    trade->setAccount(account); // from here on the account and the holding list it
-    return trade;
 }
 
 Operation* OperationEditor::selected() const
@@ -183,13 +122,23 @@ void OperationEditor::showSelected()
         showCash(*operation);
     else if (const ShareOperation* trade = page_.GetSelectedShareOperation())
         showTrade(*trade);
+    offers_.noteShown();
 }
 
 void OperationEditor::showCash(const AccountOperation& operation)
 {
-    const bool isTransfer = operation.getType() == Operation::kTransfer;
-    page_.SetType(isTransfer ? "TRANSFER" : "DEPOSIT");
-    if (isTransfer) {
+    page_.setAmount(operation.getAmount());
+    switch (kindOf(operation)) {
+    case OperationKind::kIncome:
+        page_.SetType("INCOME");
+        page_.setAmount(-static_cast<const TransferAccountOperation&>(operation).getCost());
+        showPayer(operation);
+        break;
+    case OperationKind::kCharge:
+        page_.SetType("CHARGE");
+        break;
+    case OperationKind::kTransfer: {
+        page_.SetType("TRANSFER");
         const auto& transfer = static_cast<const TransferAccountOperation&>(operation);
         const Account* to = transfer.recipient();
         page_.setTransferAccount(to != nullptr ? to->getName() : String());
@@ -197,9 +146,22 @@ void OperationEditor::showCash(const AccountOperation& operation)
         page_.setTransferRateCost(transfer.getRateCost());
         page_.setTransferFromQuote(transfer.getFromCurrencyQuote());
         page_.setTransferToQuote(transfer.getToCurrencyQuote());
+        break;
     }
-    page_.setAmount(operation.getAmount());
+    default:
+        page_.SetType("DEPOSIT");
+    }
     showCommonFields(operation);
+}
+
+void OperationEditor::showPayer(const Operation& income)
+{
+    // The file says nothing of it but by the note. What is shown is what an update will note again.
+    const NoteCompanyEvent* note = notes_.of(income);
+    const Company* payer = note != nullptr ? note->company() : nullptr;
+    const Market* market = payer != nullptr ? payer->market() : nullptr;
+    page_.setMarketName(market != nullptr ? market->getName() : String());
+    page_.setCompanyAbbreviation(payer != nullptr ? payer->getAbbreviation() : String());
 }
 
 void OperationEditor::showTrade(const ShareOperation& trade)
@@ -225,35 +187,8 @@ void OperationEditor::showCommonFields(const Operation& operation)
 
 void OperationEditor::changeType(const String& type)
 {
-    // The fields of that type show with what they held; each kind of trade has a fixed cost of its own to offer.
+    // The fields of that type show with what they held.
     page_.SetType(type);
-    if (const auto cost = shareCost(wallet(), type))
-        page_.offerShareCost(*cost);
-    renewOffers();
-}
-
-void OperationEditor::renewOffers()
-{
-    // Offers follow what they depend on until a person types over them: the page then leaves the field alone.
-    const Date date = page_.getDate();
-    const String type = page_.getType();
-    if (type == "TRANSFER")
-        offerTransferQuotes(date);
-    if (const auto cost = shareCost(wallet(), type)) {
-        page_.renewShareCost(*cost);
-        Company* company; // null when there is none
-        wallet().getCompany(page_.getMarketName(), page_.getCompanyAbbreviation(), &company);
-        page_.offerQuote(quoteAt(company, date));
-    }
-}
-
-void OperationEditor::offerTransferQuotes(const Date& date)
-{
-    const Currency* from = currencyOf(wallet().getAccountByName(page_.getBaseAccount()));
-    const Currency* to = currencyOf(wallet().getAccountByName(page_.getTransferAccount()));
-    // Within a currency there is nothing to exchange, and its rates may not be known.
-    if (from != nullptr && from == to)
-        page_.offerTransferQuotes(1, 1);
-    else
-        page_.offerTransferQuotes(quoteAt(from, date), quoteAt(to, date));
+    offers_.offerCost();
+    offers_.renew();
 }

@@ -1,27 +1,24 @@
 #pragma once
 
-#include "foundation/Date.h"
-#include "foundation/String.h"
+#include "app/DividendNotes.h"
+#include "app/OperationMaker.h"
+#include "app/OperationOffers.h"
 
-#include <cstddef>
+#include <string>
 
-class Account;
 class AccountOperation;
-class Operation;
-class OperationView;
-class PLWindow;
-class ShareOperation;
-class Wallet;
+class CompanyView;
 
-/// The commands on operations: making what the operation page says, putting the selected one into its fields, and
-/// offering values while a person types. The page puts an offer in only where nothing was typed.
+/// The commands on operations: booking what the operation page says, in place of the selected one or beside it, and
+/// putting the selected one into its fields. What is made is made by the `OperationMaker`, what is offered while a
+/// person types by the `OperationOffers`.
 ///
-/// It keeps nothing of its own: the operations are in the window's wallet, and their rows on the page. A row goes
-/// before its operation does.
+/// It keeps no operation: these are in the window's wallet, and their rows on the page. A row goes before its operation
+/// does.
 class OperationEditor {
 public:
-    /// Both outlive this.
-    OperationEditor(PLWindow& window, OperationView& page);
+    /// All outlive this.
+    OperationEditor(PLWindow& window, OperationView& page, CompanyView& companies);
     ~OperationEditor();
     OperationEditor(const OperationEditor&) = delete;
     OperationEditor& operator=(const OperationEditor&) = delete;
@@ -32,28 +29,29 @@ public:
     void update();
     void remove();
     void showSelected();
-    /// "DEPOSIT", "TRANSFER", "BUY" or "SELL".
+    /// "DEPOSIT", "TRANSFER", "BUY", "SELL", "INCOME" or "CHARGE".
     void changeType(const String& type);
-    /// Brings what is offered on the page up to date with its fields, the quotes and the parameters.
-    void renewOffers();
+    /// Brings what is offered on the page up to date with its fields, the quotes and the parameters; to be called when
+    /// one of these has changed, or a company was chosen, by other means than typing.
+    void renewOffers() { offers_.renew(); }
 
 private:
-    Wallet& wallet() const;
-    // These make an operation as the page says; null, after a message or in silence, when it says none.
-    Operation* make();
-    Operation* makeTransfer(const Date& date, Account* from);
-    Operation* makeTrade(const Date& date, Account* account, bool isBuy);
-    /// What they end with when they make none: tells the reason.
-    std::nullptr_t refuse(const char* reason) const;
+    /// `former`, which the new operation replaces, may be null.
+    void book(Operation* former);
     /// Values the portfolio with the operation just made, which replaces `former` unless that is null, and shows it.
     void showMade(Operation* made, Operation* former);
     void destroy(Operation* operation);
+    /// Says for some seconds what was done: the status line says nothing of a success.
+    void tell(const std::string& deed);
     Operation* selected() const;
     void showCash(const AccountOperation& operation);
+    void showPayer(const Operation& income);
     void showTrade(const ShareOperation& trade);
     void showCommonFields(const Operation& operation);
-    void offerTransferQuotes(const Date& date);
 
     PLWindow& window_;
     OperationView& page_;
+    OperationMaker maker_;
+    OperationOffers offers_;
+    DividendNotes notes_;
 };

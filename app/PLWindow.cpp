@@ -114,7 +114,9 @@ constexpr Command kOwnCommands[] = {
     {'HUnd', [](PLWindow& w, BMessage*) { w.Undo(); }},
     {'HRed', [](PLWindow& w, BMessage*) { w.Redo(); }},
     {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
-    {'WBGd', [](PLWindow& w, BMessage*) { w.valueAtLastQuotes(); }}, // the portfolio page
+    {'WBGd', [](PLWindow& w, BMessage*) { w.valueAtLastQuotes(); }},           // the portfolio page
+    {'OPIn', [](PLWindow& w, BMessage*) { w.ChangeOperationType("INCOME"); }}, // the operation page
+    {'OPCh', [](PLWindow& w, BMessage*) { w.ChangeOperationType("CHARGE"); }},
     {'NtSm', [](PLWindow& w, BMessage*) { w.takeBackSimulation(); }},
 };
 
@@ -146,7 +148,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     currencyQuotes_ =
         std::make_unique<QuoteEditor<Currency>>(*this, *currencyView_, "You must first select a currency");
     events_ = std::make_unique<EventEditor>(*this, *companyView_);
-    operations_ = std::make_unique<OperationEditor>(*this, *operationView_);
+    operations_ = std::make_unique<OperationEditor>(*this, *operationView_, *companyView_);
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     walletView_->setDate(today());
     ReinitWallet(); // from here on there is a wallet, always

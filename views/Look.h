@@ -12,6 +12,7 @@ constexpr rgb_color kText = {0, 0, 0, 255};
 constexpr rgb_color kFaint = {110, 110, 110, 255};     ///< what is there but old
 constexpr rgb_color kWarning = {176, 32, 16, 255};     ///< what is missing
 constexpr rgb_color kGenerated = {255, 240, 204, 255}; ///< ground of what the program made up
+constexpr rgb_color kNew = {255, 221, 102, 255};       ///< ground of what has just come
 constexpr rgb_color kGain = {0, 104, 44, 255};
 constexpr rgb_color kLoss = {176, 32, 16, 255};
 constexpr rgb_color kSeries = {24, 78, 148, 255}; ///< the line of a chart

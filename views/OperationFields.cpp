@@ -64,6 +64,21 @@ void OperationView::SetTypingHook(const std::function<void()>& hook)
     companyAbbreviation_->setTypingHook(hook);
 }
 
+void OperationView::SetFigureHook(const std::function<void()>& hook)
+{
+    for (OfferNumber* field : {amount_, transferCost_, transferRateCost_, transferFromQuote_, transferToQuote_,
+                               quantity_, quote_, shareCost_})
+        field->setTypingHook(hook);
+}
+
+void OperationView::replaceQuote(std::optional<float> quote)
+{
+    quote_->noteOffer(); // whatever stands there
+    offerQuote(quote);
+    if (!quote)
+        quote_->MarkAsInvalid(nullptr);
+}
+
 void OperationView::offerDate(const Date& date)
 {
     if (!date_->isOpen())

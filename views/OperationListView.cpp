@@ -4,6 +4,7 @@
 #include "foundation/NumberText.h"
 #include "platform/View.h"
 #include "portfolio/Account.h"
+#include "portfolio/OperationKind.h"
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
@@ -11,8 +12,6 @@
 #include "views/ModelText.h"
 
 namespace {
-
-constexpr const char* kTypeNames[] = {"?", "Deposit", "Transfer", "Buy", "Sell"}; // by type code
 
 bool isTrade(const Operation& operation)
 {
@@ -45,8 +44,8 @@ Cell what(const OperationItem& item)
             return {"no company", look::kWarning};
         return {textOf(share->getCompanyAbbreviation()) + "  " + textOf(share->getCompanyName())};
     }
-    if (operation.getType() != Operation::kTransfer)
-        return {};
+    if (kindOf(operation) != OperationKind::kTransfer)
+        return {}; // what comes in or goes is within the account
     const Account* recipient = asTransfer(operation).recipient();
     if (recipient == nullptr)
         return {"to no account", look::kWarning};
@@ -56,6 +55,8 @@ Cell what(const OperationItem& item)
 /// The quote of a trade, the amount of anything else.
 float price(const Operation& operation)
 {
+    if (kindOf(operation) == OperationKind::kIncome)
+        return -asTransfer(operation).getCost();
     return isTrade(operation) ? asTrade(operation).getQuote()
                               : static_cast<const AccountOperation&>(operation).getAmount();
 }
@@ -70,7 +71,7 @@ Cell cost(const OperationItem& item)
     const Operation& operation = *item.object();
     if (isTrade(operation))
         return {amountText(asTrade(operation).getOperationCost())};
-    return {operation.getType() == Operation::kTransfer ? amountText(asTransfer(operation).getTotalCost()) : ""};
+    return {kindOf(operation) == OperationKind::kTransfer ? amountText(asTransfer(operation).getTotalCost()) : ""};
 }
 
 /// What is traded or moved, before costs, in the account's currency.
@@ -86,7 +87,7 @@ Cell total(const OperationItem& item)
 const std::vector<ColumnOf<OperationItem>> OperationItem::kColumns = {
     {{"Date", 78}, [](const OperationItem& i) { return Cell{dateText(i.object()->getDate())}; }},
     {{"Account", 106}, accountName},
-    {{"Type", 58}, [](const OperationItem& i) { return Cell{kTypeNames[i.object()->getType()]}; }},
+    {{"Type", 58}, [](const OperationItem& i) { return Cell{nameOf(kindOf(*i.object()))}; }},
     {{"What", 128}, what},
     {{"Quantity", 64, B_ALIGN_RIGHT}, quantity},
     {{"Quote/Amount", 98, B_ALIGN_RIGHT}, [](const OperationItem& i) { return Cell{amountText(price(*i.object()))}; }},
@@ -103,6 +104,18 @@ void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
         owner->SetHighColor(look::kGenerated);
         owner->FillRect(frame);
         owner->SetHighColor(text);
+    }
+    if (light_ > 0) {
+        constexpr float kStrongest = 230;
+        constexpr float kDarkened = 0.5F; // from here on the text of a selected row can be read on the light only
+        const rgb_color text = owner->HighColor();
+        rgb_color ground = look::kNew;
+        ground.alpha = static_cast<std::uint8_t>(light_ * kStrongest);
+        owner->SetHighColor(ground);
+        owner->SetDrawingMode(B_OP_ALPHA);
+        owner->FillRect(frame);
+        owner->SetDrawingMode(B_OP_COPY);
+        owner->SetHighColor(light_ > kDarkened ? look::kText : text);
     }
     // The text has the colour again that the list has set.
     ColumnItem::DrawItem(owner, frame, complete);

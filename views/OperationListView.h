@@ -16,6 +16,8 @@ public:
     bool isAutomatic() const { return isAutomatic_; }
     /// Leaves the row without operation, and blank until it is dropped.
     void release() { operation_ = nullptr; }
+    /// How far the row stands out: 1 when it has just come, 0 when it looks as always.
+    void setLight(float light) { light_ = light; }
 
     Cell cell(std::size_t column) const override { return operation_ ? kColumns[column].cell(*this) : Cell(); }
     void DrawItem(BView* owner, BRect frame, bool complete) override;
@@ -23,6 +25,7 @@ public:
 private:
     Operation* operation_;
     bool isAutomatic_; // known also when the operation is gone
+    float light_ = 0;
 };
 
 /// The operations of all accounts, automatic ones on a ground of their own.

@@ -3,12 +3,16 @@
 #include "platform/Box.h"
 #include "platform/MenuField.h"
 #include "platform/MenuItem.h"
+#include "platform/Message.h"
+#include "platform/MessageRunner.h"
 #include "platform/PopUpMenu.h"
 #include "portfolio/Account.h"
 #include "portfolio/AccountOperation.h"
 #include "portfolio/ShareOperation.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
+
+#include <algorithm>
 
 namespace {
 
@@ -40,13 +44,21 @@ struct TypePlan {
 };
 
 // In the order of the menu, by which a type is a bit of the sets below.
-constexpr TypePlan kTypes[] = {
-    {"DEPOSIT", "Deposit", 'OPDe'}, {"TRANSFER", "Transfer", 'OPTr'}, {"BUY", "Buy", 'OPBu'}, {"SELL", "Sell", 'OPSe'}};
+constexpr TypePlan kTypes[] = {{"DEPOSIT", "Deposit", 'OPDe'}, {"TRANSFER", "Transfer", 'OPTr'},
+                               {"BUY", "Buy", 'OPBu'},         {"SELL", "Sell", 'OPSe'},
+                               {"INCOME", "Income", 'OPIn'},   {"CHARGE", "Charge", 'OPCh'}};
 
 // Sets of types, a bit for each.
 constexpr unsigned kDeposit = 1;
 constexpr unsigned kTransfer = 2;
 constexpr unsigned kTrade = 4 + 8;
+constexpr unsigned kIncome = 16;
+constexpr unsigned kCharge = 32;
+
+constexpr uint32 kFlash = 'OFla';
+constexpr bigtime_t kFlashStepTime = 50000;
+constexpr int kFlashSteps = 30;
+constexpr int kFlashHold = 14; // steps that are left when the light begins to go
 
 /// An account in a menu. Sends nothing when it is chosen, but calls the hook.
 class AccountMenuItem final : public BMenuItem {
@@ -83,6 +95,8 @@ OperationView::OperationView(BRect frame, const char* name, BWindow*) : PageView
     // All fields show until a type is set.
     SetType(kTypes[0].type);
 }
+
+OperationView::~OperationView() = default;
 
 void OperationView::makeList()
 {
@@ -127,9 +141,6 @@ void OperationView::makeTypedFields(BBox* box)
         return field;
     };
     const auto number = [&](int column, int row, const char* name, const char* label, uint32 code) {
-        return addTypedNumber(box, cell(column, row), name, label, code, kDivider);
-    };
-    const auto offered = [&](int column, int row, const char* name, const char* label, uint32 code) {
         return addFieldOf<OfferNumber>(box, cell(column, row), name, label, code, kDivider, B_ALIGN_RIGHT);
     };
     const auto word = [&](int column, int row, const char* name, const char* label) {
@@ -137,23 +148,24 @@ void OperationView::makeTypedFields(BBox* box)
                                                     B_ALIGN_LEFT);
     };
 
-    // Of the first two, a deposit has the amount only.
-    amount_ = of(kDeposit | kTransfer, number(0, 1, "txtAmount", "Amount", 'OTAm'));
+    // Only a transfer has more than the amount; the company of an income is below.
+    amount_ = of(kDeposit | kTransfer | kIncome | kCharge, number(0, 1, "txtAmount", "Amount", 'OTAm'));
     transferAccount_ = of(kTransfer, addMenu(box, cell(1, 1), "transferAccount", "To Account"));
     transferCost_ = of(kTransfer, number(2, 1, "txtTransferCost", "Cost", 'OTTc'));
-    transferFromQuote_ = of(kTransfer, offered(0, 2, "txtTransferFromQuote", "From Quote", 'OTFq'));
-    transferToQuote_ = of(kTransfer, offered(1, 2, "txtTransferToQuote", "To Quote", 'OTTq'));
+    transferFromQuote_ = of(kTransfer, number(0, 2, "txtTransferFromQuote", "From Quote", 'OTFq'));
+    transferToQuote_ = of(kTransfer, number(1, 2, "txtTransferToQuote", "To Quote", 'OTTq'));
     transferRateCost_ = of(kTransfer, number(2, 2, "txtTransferRateCost", "Rate Cost", 'OTTr'));
     transferFromQuote_->SetToolTip("Rate of the sending account's currency");
     transferToQuote_->SetToolTip("Rate of the receiving account's currency");
     transferRateCost_->SetToolTip("Cost in proportion to the amount, as a fraction: 0.01 for one percent");
 
-    // Purchase and sale. Whatever is typed into market or ticker sends the same code.
-    marketName_ = of(kTrade, word(0, 1, "txtMarketName", "Market"));
-    companyAbbreviation_ = of(kTrade, word(1, 1, "txtCompanyAbbreviation", "Ticker"));
+    // Purchase and sale, and who pays an income: `SetType` moves these. Whatever is typed into market or ticker sends
+    // the same code.
+    marketName_ = of(kTrade | kIncome, word(0, 1, "txtMarketName", "Market"));
+    companyAbbreviation_ = of(kTrade | kIncome, word(1, 1, "txtCompanyAbbreviation", "Ticker"));
     quantity_ = of(kTrade, number(2, 1, "txtQuantity", "Quantity", 'OTQy'));
-    quote_ = of(kTrade, offered(0, 2, "txtQuote", "Quote", 'OTQo'));
-    shareCost_ = of(kTrade, offered(1, 2, "txtShareCost", "Cost", 'OTSc'));
+    quote_ = of(kTrade, number(0, 2, "txtQuote", "Quote", 'OTQo'));
+    shareCost_ = of(kTrade, number(1, 2, "txtShareCost", "Cost", 'OTSc'));
     total_ = of(kTrade, addNumber(box, cell(2, 2), "txtTotal", "Total", 'OTTo', kDivider));
     total_->SetEditable(false);
     total_->SetToolTip("Quantity times quote, before costs");
@@ -163,10 +175,16 @@ void OperationView::makeButtons(BBox* box)
 {
     const float bottom = kEditorEnd - kEditorTop - kBoxSide;
     const float top = bottom - kButtonHeight;
-    automatic_ = addCheckBox(box, {kBoxSide + kDivider, top, kBoxSide + kColumnWidth, bottom}, "cbAutomatic",
-                             "Automatic", 'OCAu');
+    constexpr float kAutomaticWidth = 90;
+    automatic_ =
+        addCheckBox(box, {kBoxSide, top, kBoxSide + kAutomaticWidth, bottom}, "cbAutomatic", "Automatic", 'OCAu');
     automatic_->SetToolTip("As if a valuation had made it up: the next one takes it away");
-    const float left = kBoxSide + kColumnWidth + kColumnGap + kDivider;
+    const float left = cell(2, 0).left + kDivider - kColumnGap;
+    // A transfer has two ends to tell of.
+    charged_ = addField(box, {kBoxSide + kAutomaticWidth, top + 1, left - kColumnGap, bottom - 1}, "txtCharged",
+                        "Charged", 'OTCh', 64);
+    charged_->SetEditable(false);
+    charged_->SetToolTip("What the account pays or gets, with all costs");
     addButtons(box, {left, top, kRight - kMargin - kBoxSide, bottom},
                {{"btnAddOperation", "Add", 'OBAd'},
                 {"btnUpdateOperation", "Update", 'OBUp'},
@@ -201,6 +219,30 @@ void OperationView::ShowOperation(const Operation* operation)
     operations_->SetQuiet(true);
     operations_->select(operation);
     operations_->SetQuiet(false);
+}
+
+void OperationView::FlashOperation(const Operation* operation)
+{
+    flashed_ = operation;
+    flashStep_ = kFlashSteps;
+    const BMessage step(kFlash);
+    flashTimer_ = std::make_unique<BMessageRunner>(BMessenger(this), &step, kFlashStepTime);
+}
+
+void OperationView::MessageReceived(BMessage* message)
+{
+    if (message->what != kFlash)
+        return PageView::MessageReceived(message);
+    if (flashStep_ == 0)
+        return flashTimer_.reset();
+    --flashStep_;
+    // The row may have been made anew since the last step, or be gone.
+    const int32 index = operations_->indexOf(flashed_);
+    if (index < 0)
+        return;
+    const float light = static_cast<float>(flashStep_) / kFlashHold;
+    static_cast<OperationItem*>(operations_->ItemAt(index))->setLight(std::min(light, 1.0F));
+    operations_->InvalidateItem(index);
 }
 
 AccountOperation* OperationView::GetSelectedAccountOperation() const
@@ -262,4 +304,8 @@ void OperationView::SetType(const String& type)
         else
             field.view->Hide();
     }
+    // Below the amount, where a trade has its quote and cost.
+    const int row = (kIncome >> index & 1U) != 0 ? 2 : 1;
+    marketName_->MoveTo(cell(0, row).left, cell(0, row).top);
+    companyAbbreviation_->MoveTo(cell(1, row).left, cell(1, row).top);
 }

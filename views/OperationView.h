@@ -12,12 +12,14 @@
 #include "views/PageView.h"
 
 #include <functional>
+#include <memory>
 #include <optional>
 #include <vector>
 
 class Account;
 class BMenu;
 class BMenuField;
+class BMessageRunner;
 
 /// The page of the operations on the portfolio's accounts: a list of all of them, and the fields of one.
 ///
@@ -26,6 +28,7 @@ class BMenuField;
 class OperationView final : public PageView {
 public:
     OperationView(BRect frame, const char* name, BWindow* window);
+    ~OperationView() override;
 
     /// Whether automatic sales are searched.
     bool isPrevision() const { return prevision_->Value() == B_CONTROL_ON; }
@@ -54,6 +57,8 @@ public:
     void UpdateShareOperation(ShareOperation* operation) { operations_->modify(operation); }
     /// Selects the operation's row and brings it into view; the fields stay as they are.
     void ShowOperation(const Operation* operation);
+    /// Lights up the operation's row for a moment, where there is one.
+    void FlashOperation(const Operation* operation);
 
     /// False also when nothing is selected.
     bool IsSelectedAccountOperation() const { return GetSelectedAccountOperation() != nullptr; }
@@ -64,7 +69,7 @@ public:
     // The fields.
     /// Fills the account menus; the accounts that were chosen stay so, under a new name, too.
     void SetAccountsList(Account** accounts, int count);
-    /// "DEPOSIT", "TRANSFER", "BUY" or "SELL".
+    /// "DEPOSIT", "TRANSFER", "BUY", "SELL", "INCOME" or "CHARGE".
     String getType() const;
     void setType(const String& type);
     /// The same, and shows the fields of that type in place of those of another one.
@@ -101,20 +106,29 @@ public:
     float getShareCost() const { return shareCost_->getNumber(); }
     void setShareCost(float cost) { show(*shareCost_, cost); }
     void setTotal(float total);
+    /// What the account will be charged.
+    void setCharged(const std::string& text) { charged_->SetText(text.c_str()); }
 
     // Offers.
     /// `hook` is called when a person has changed what offers depend on: the date, an account, the market or the
     /// ticker.
     void SetTypingHook(const std::function<void()>& hook);
+    /// `hook` is called when a person has changed another figure of the operation.
+    void SetFigureHook(const std::function<void()>& hook);
     void offerDate(const Date& date);
     void offerShareCost(float cost) { offer(*shareCost_, cost); }
     /// Only where a former offer stands: a field emptied by hand says that there is no cost.
     void renewShareCost(float cost);
     /// Without a value what was offered before is taken back.
     void offerQuote(std::optional<float> quote) { offer(*quote_, quote); }
+    /// The same also where a quote was typed: it was that of something else.
+    void replaceQuote(std::optional<float> quote);
+    /// Whether nothing stands in the field but an offer.
+    bool isQuoteOffered() const { return quote_->isOpen(); }
     void offerTransferQuotes(std::optional<float> from, std::optional<float> to);
 
     void Draw(BRect updateRect) override;
+    void MessageReceived(BMessage* message) override;
 
 private:
     using OfferNumber = OfferField<NumberControl>;
@@ -139,18 +153,19 @@ private:
     BMenuField* baseAccount_ = nullptr;
     OfferField<DateControl>* date_ = nullptr;
     BCheckBox* automatic_ = nullptr;
-    NumberControl* amount_ = nullptr;
+    OfferNumber* amount_ = nullptr;
     BMenuField* transferAccount_ = nullptr;
-    NumberControl* transferCost_ = nullptr;
-    NumberControl* transferRateCost_ = nullptr;
+    OfferNumber* transferCost_ = nullptr;
+    OfferNumber* transferRateCost_ = nullptr;
     OfferNumber* transferFromQuote_ = nullptr;
     OfferNumber* transferToQuote_ = nullptr;
     OfferField<BTextControl>* marketName_ = nullptr;
     OfferField<BTextControl>* companyAbbreviation_ = nullptr;
-    NumberControl* quantity_ = nullptr;
+    OfferNumber* quantity_ = nullptr;
     OfferNumber* quote_ = nullptr;
     OfferNumber* shareCost_ = nullptr;
     BTextControl* total_ = nullptr;
+    BTextControl* charged_ = nullptr;
 
     /// A field that not all types have.
     struct TypedField {
@@ -159,4 +174,8 @@ private:
     };
     std::vector<TypedField> typedFields_;
     std::function<void()> typingHook_;
+
+    const Operation* flashed_ = nullptr; // may be gone: only to be compared
+    int flashStep_ = 0;                  // how many are left until the row looks as always
+    std::unique_ptr<BMessageRunner> flashTimer_;
 };

@@ -1,13 +1,18 @@
 // The operation commands, by their controls on the operation page.
 
+#include "market/NoteCompanyEvent.h"
 #include "platform/ListView.h"
 #include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/SmallPortfolio.h"
+#include "valuation/AccountState.h"
+#include "valuation/State.h"
 
+#include <QApplication>
 #include <QCheckBox>
 #include <QComboBox>
 #include <QLineEdit>
+#include <QTest>
 #include <gmock/gmock.h>
 
 namespace {
@@ -160,17 +165,26 @@ TEST_F(OperationTest, ASelectionFillsTheFieldsOfItsTypeAndHidesTheOthers)
     moved->setToCurrencyQuote(3);
     buy(Date(3, 2, 2024), 1234, 2.5F)->setAccount(cash_);
     (new ShareOperation(Date(4, 2, 2024), nullptr, false, 2, 3, false, 8))->setAccount(cash_);
+    auto* earned = new TransferAccountOperation(Date(5, 2, 2024), cash_, cash_, 0, false);
+    earned->setCost(-37.5F);
+    (new TransferAccountOperation(Date(6, 2, 2024), cash_, cash_, 5, false))->setRateCost(1);
     window().UpdateState();
     const std::pair<const char*, const char*> cases[] = {
-        {"Deposit", "txtDate=01/02/2024 txtAmount=-12.50"},
+        {"Deposit", "txtDate=01/02/2024 txtAmount=-12.50 txtCharged=12.50 EUR from Cash"},
         {"Transfer", "txtDate=02/02/2024 txtAmount=9.00 txtTransferCost=1.00 txtTransferFromQuote=2.00 "
-                     "txtTransferToQuote=3.00 txtTransferRateCost=0.0017"},
+                     "txtTransferToQuote=3.00 txtTransferRateCost=0.0017 "
+                     "txtCharged=9.00 EUR from Cash, 5.32 USD to Dollars"},
         {"Buy", "txtDate=03/02/2024 txtMarketName=Paris txtCompanyAbbreviation=BBB txtQuantity=1234 txtQuote=2.50 "
-                "txtShareCost=0.00 txtTotal=3,085.00"},
+                "txtShareCost=0.00 txtTotal=3,085.00 txtCharged=3,090.24 EUR from Cash"},
         {"Sell", "txtDate=04/02/2024 txtMarketName=ERROR txtCompanyAbbreviation=ERROR txtQuantity=2 txtQuote=3.00 "
-                 "txtShareCost=8.00 txtTotal=6.00"},
+                 "txtShareCost=8.00 txtTotal=6.00 txtCharged="},
+        {"Income", "txtDate=05/02/2024 txtAmount=37.50 txtMarketName= txtCompanyAbbreviation= "
+                   "txtCharged=37.50 EUR to Cash"},
+        {"Charge", "txtDate=06/02/2024 txtAmount=5.00 txtCharged=5.00 EUR from Cash"},
     };
-    for (int row = 3; row >= 0; --row) {
+    EXPECT_EQ(rows("lstOperations")[4], "05/02/2024\tCash\tIncome\t\t\t37.50\t\t37.50 EUR\t");
+    EXPECT_EQ(rows("lstOperations")[5], "06/02/2024\tCash\tCharge\t\t\t5.00\t\t5.00 EUR\t");
+    for (int row = 5; row >= 0; --row) {
         select("lstOperations", row);
         EXPECT_EQ(menuText("operationType"), cases[row].first);
         EXPECT_EQ(menuText("baseAccount"), "Cash");
@@ -294,8 +308,14 @@ TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
     EXPECT_EQ(text("txtDate") + " " + text("txtQuote"), "03/11/2024 12.00") << "the quote of the day that is offered";
     type("txtCompanyAbbreviation", "AAA");
     EXPECT_EQ(text("txtQuote"), "") << "it has no quotes, and BBB's is not its";
-    fill({{"txtQuote", "4"}, {"txtCompanyAbbreviation", "BBB"}});
-    EXPECT_EQ(text("txtQuote"), "4") << "typed";
+    fill({{"txtQuote", "4"}, {"txtCompanyAbbreviation", "BB"}});
+    EXPECT_EQ(text("txtQuote"), "4") << "typed, and there is no other company yet";
+    type("txtCompanyAbbreviation", "BBB");
+    EXPECT_EQ(text("txtQuote"), "12.00") << "what was typed was a quote of AAA";
+    fill({{"txtQuote", "5"}, {"txtMarketName", "Pari"}, {"txtMarketName", "Paris"}});
+    EXPECT_EQ(text("txtQuote"), "5") << "the same company again";
+    fill({{"txtCompanyAbbreviation", ""}, {"txtQuote", "6"}, {"txtCompanyAbbreviation", "BBB"}});
+    EXPECT_EQ(text("txtQuote"), "6") << "typed for no company yet";
 
     fill({{"operationType", "Transfer"}, {"baseAccount", "Cash"}, {"transferAccount", "Dollars"}});
     EXPECT_EQ(text("txtTransferFromQuote") + " " + text("txtTransferToQuote"), "1.00 0.50");
@@ -307,6 +327,136 @@ TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
     type("txtDate", "05/05/2024");
     valueOn("04/11/2024");
     EXPECT_EQ(text("txtDate"), "05/05/2024") << "typed";
+}
+
+TEST_F(OperationTest, ANewOperationStartsWithTheAccountThatIsLikely)
+{
+    const auto chosen = [this] { return menuText("baseAccount"); };
+    EXPECT_EQ(chosen(), "") << "any of three";
+    fill({{"operationType", "Buy"}, {"txtMarketName", "Paris"}, {"txtCompanyAbbreviation", "AAA"}});
+    EXPECT_EQ(chosen(), "Dollars") << "the first one in the currency of the share";
+    type("txtCompanyAbbreviation", "BBB");
+    EXPECT_EQ(chosen(), "Cash");
+    fill({{"baseAccount", "Dollars"}, {"txtQuantity", "2"}, {"txtDate", "20/11/2024"}});
+    EXPECT_EQ(chosen() + text("txtCharged"), "Dollars") << "chosen by hand after that, though it does not fit";
+    fill({{"baseAccount", "Broker"}, {"txtShareCost", "1"}});
+    EXPECT_EQ(text("txtCharged"), "21.03 EUR from Broker") << "2 * 10 * 1.0017 + 1";
+    click(kAdd);
+    fill({{"txtCompanyAbbreviation", "AAA"}, {"txtCompanyAbbreviation", "BBB"}});
+    EXPECT_EQ(chosen(), "Broker") << "used last";
+    restart();
+    addTwoMarkets();
+    addAccount(wallet(), "Only", window().catalogue().getCurrencies()[0]);
+    showAccounts();
+    show(kOperationPage);
+    EXPECT_EQ(chosen(), "Only");
+}
+
+TEST_F(OperationTest, ASuccessIsToldAndADoubleClickBooksOnce)
+{
+    const auto notice = [this] {
+        return window().widget().findChild<QWidget*>("txtNotice")->accessibleName().toStdString();
+    };
+    fill({{"operationType", "Buy"},
+          {"txtMarketName", "Paris"},
+          {"txtCompanyAbbreviation", "BBB"},
+          {"txtQuantity", "100"},
+          {"txtQuote", "40"}});
+    auto& add = find<QWidget>(kAdd);
+    QTest::mouseClick(&add, Qt::LeftButton);
+    QTest::mouseDClick(&add, Qt::LeftButton);
+    settle();
+    click(kAdd);
+    EXPECT_EQ(countOperations(), 1U);
+    EXPECT_EQ(notice(), "Bought 100 BBB, 4,036.75 EUR from Cash");
+    post('OBAd');
+    EXPECT_EQ(countOperations(), 2U) << "a code that no person sends is no double click";
+    post('HUnd');
+    click(kAdd);
+    EXPECT_EQ(countOperations(), 2U) << "taken back, and meant again";
+    QTest::qWait(QApplication::doubleClickInterval() + 50);
+    click(kAdd);
+    EXPECT_EQ(countOperations(), 3U);
+    const struct {
+        Fields fields;
+        const char* button;
+        const char* notice;
+    } cases[] = {
+        {{{"txtQuantity", "50"}}, kUpdate, "Updated: Bought 50 BBB, 2,033.35 EUR from Cash"},
+        {{{"operationType", "Sell"}}, kAdd, "Sold 50 BBB, 1,966.65 EUR to Cash"},
+        {{}, kRemove, "Removed: Sold 50 BBB, 1,966.65 EUR to Cash"},
+        {{{"operationType", "Deposit"}, {"txtAmount", "-5"}}, kAdd, "Withdrew 5.00 EUR from Cash"},
+        {{{"txtAmount", "1000"}}, kAdd, "Deposited 1,000.00 EUR to Cash"},
+        {{{"operationType", "Transfer"}, {"transferAccount", "Dollars"}},
+         kAdd,
+         "Transferred 1,000.00 EUR from Cash, 2,000.00 USD to Dollars"},
+        {{{"operationType", "Income"}, {"txtAmount", "0"}}, kAdd, "Please specify an amount above 0."},
+        {{{"operationType", "Charge"}, {"txtAmount", "-1"}}, kAdd, "Please specify an amount above 0."},
+        {{{"txtAmount", "2.5"}}, kAdd, "Charge of 2.50 EUR from Cash"},
+    };
+    for (const auto& c : cases) {
+        follow({{c.fields, c.button, ""}});
+        EXPECT_EQ(notice(), c.notice);
+    }
+}
+
+TEST_F(OperationTest, IncomeAndChargesMoveTheirSumsAndNoDeposits)
+{
+    const auto cashOf = [this](unsigned account) { return window().getState()->getAccountState(account)->getCash(); };
+    const auto expectCash = [&](float euros, float dollars, const char* when) {
+        EXPECT_EQ(cashOf(0), euros) << when;
+        EXPECT_EQ(cashOf(2), dollars) << when;
+        EXPECT_EQ(window().getState()->getTotalDeposit(), 1000) << when;
+    };
+    const auto notes = [this] {
+        std::vector<std::string> texts;
+        for (const CompanyEvent* event : beta()->events()) {
+            const auto& note = dynamic_cast<const NoteCompanyEvent&>(*event);
+            texts.push_back(std::string(event->getDate().toString().getCharacterArray()) + ' ' +
+                            note.getTitle().getCharacterArray() + ' ' + note.getText().getCharacterArray());
+        }
+        return texts;
+    };
+    follow({{{{"operationType", "Deposit"}, {"baseAccount", "Cash"}, {"txtAmount", "1000"}}, kAdd, ""},
+            {{{"operationType", "Charge"}, {"txtAmount", "12.25"}}, kAdd, ""},
+            {{{"operationType", "Income"}, {"txtAmount", "0.1"}}, kAdd, ""},
+            {{{"txtMarketName", "Paris"}, {"txtCompanyAbbreviation", "CCC"}}, kAdd, "Unknown company."},
+            {{{"txtCompanyAbbreviation", "BBB"}, {"baseAccount", "Dollars"}, {"txtAmount", "37.5"}}, kAdd, ""}});
+    const float euros = static_cast<float>(1000 - 12.25) + 0.1F;
+    expectCash(euros, 37.5F, "booked");
+    EXPECT_THAT(notes(), ElementsAre("21/11/2024 Dividend 37.50 USD to Dollars"));
+    post('HUnd');
+    expectCash(euros, 0, "one step back");
+    EXPECT_THAT(notes(), testing::IsEmpty());
+    post('HRed');
+    EXPECT_THAT(notes(), SizeIs(1));
+    select("lstOperations", 3);
+    EXPECT_EQ(text("txtMarketName") + ' ' + text("txtCompanyAbbreviation"), "Paris BBB") << "found by the note";
+    follow({{{{"txtAmount", "40"}}, kUpdate, ""}});
+    expectCash(euros, 40, "replaced");
+    EXPECT_THAT(notes(), ElementsAre("21/11/2024 Dividend 40.00 USD to Dollars"));
+
+    show(kCompanyPage);
+    click("btnSaveMarket");
+    answerPanel("SavePanel", "Mine");
+    show(kPortoFolioPage);
+    click("btnSavePortoFolio");
+    answerPanel("SavePanel", "Mine");
+    restart();
+    show(kCompanyPage);
+    click("btnLoadMarket");
+    answerPanel("OpenPanel", folder() + "/Companies/Mine");
+    show(kPortoFolioPage);
+    answerNextAlert("Continue");
+    click("btnLoadPortoFolio");
+    answerPanel("OpenPanel", folder() + "/PortoFolios/Mine");
+    show(kOperationPage);
+    expectCash(euros, 40, "saved and loaded");
+
+    select("lstOperations", 3);
+    click(kRemove);
+    expectCash(euros, 0, "removed");
+    EXPECT_THAT(notes(), testing::IsEmpty());
 }
 
 } // namespace
