@@ -49,6 +49,15 @@ const Account* lastUsed(const Wallet& wallet)
     return last;
 }
 
+/// The account of the company's latest trade in the wallet; null without any.
+const Account* lastUsedFor(const Wallet& wallet, const Company& company)
+{
+    for (const Share* share : company.shares())
+        if (share->wallet() == &wallet && !share->shareOperations().empty())
+            return share->shareOperations().back()->account();
+    return nullptr;
+}
+
 } // namespace
 
 Wallet& OperationOffers::wallet() const
@@ -140,11 +149,12 @@ void OperationOffers::chooseAccountFor(const Company& company)
     const Account* chosen = chosenAccount();
     if (chosen != nullptr && chosen->getCurrencyRepresentation() == symbol)
         return;
-    const Account* next = wallet().getAccountByName(used_);
-    if (next == nullptr || next->getCurrencyRepresentation() != symbol)
-        next = wallet().findDefaultTransferAccount(symbol);
-    if (next != nullptr)
-        page_.setBaseAccount(next->getName());
+    for (const Account* next :
+         {static_cast<const Account*>(wallet().getAccountByName(used_)), lastUsedFor(wallet(), company),
+          static_cast<const Account*>(wallet().findDefaultTransferAccount(symbol))}) {
+        if (next != nullptr && next->getCurrencyRepresentation() == symbol)
+            return page_.setBaseAccount(next->getName());
+    }
 }
 
 void OperationOffers::offerTransferQuotes()

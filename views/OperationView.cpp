@@ -179,7 +179,7 @@ void OperationView::makeButtons(BBox* box)
     automatic_ =
         addCheckBox(box, {kBoxSide, top, kBoxSide + kAutomaticWidth, bottom}, "cbAutomatic", "Automatic", 'OCAu');
     automatic_->SetToolTip("As if a valuation had made it up: the next one takes it away");
-    const float left = cell(2, 0).left + kDivider - kColumnGap;
+    const float left = cell(2, 0).left + kColumnGap;
     // A transfer has two ends to tell of.
     charged_ = addField(box, {kBoxSide + kAutomaticWidth, top + 1, left - kColumnGap, bottom - 1}, "txtCharged",
                         "Charged", 'OTCh', 64);

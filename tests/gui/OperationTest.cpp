@@ -344,6 +344,12 @@ TEST_F(OperationTest, ANewOperationStartsWithTheAccountThatIsLikely)
     click(kAdd);
     fill({{"txtCompanyAbbreviation", "AAA"}, {"txtCompanyAbbreviation", "BBB"}});
     EXPECT_EQ(chosen(), "Broker") << "used last";
+    fill({{"operationType", "Deposit"}, {"baseAccount", "Dollars"}, {"txtAmount", "1"}});
+    click(kAdd);
+    choose("operationType", "Buy");
+    EXPECT_EQ(chosen(), "Dollars") << "the ticker has not changed since";
+    fill({{"txtCompanyAbbreviation", "AAA"}, {"txtCompanyAbbreviation", "BBB"}});
+    EXPECT_EQ(chosen(), "Broker") << "used last for this company";
     restart();
     addTwoMarkets();
     addAccount(wallet(), "Only", window().catalogue().getCurrencies()[0]);
