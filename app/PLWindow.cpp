@@ -12,6 +12,7 @@
 #include "portfolio/Wallet.h"
 #include "views/OperationView.h"
 #include "views/ParameterView.h"
+#include "views/SplitWindow.h"
 #include "views/WalletView.h"
 
 #include <algorithm>
@@ -111,6 +112,8 @@ static_assert(std::size(kCommands) == 65);
 
 /// Beside the vocabulary.
 constexpr Command kOwnCommands[] = {
+    {'CBAs', [](PLWindow& w, BMessage*) { w.OpenSplit(); }}, // the company page
+    {SplitWindow::kApplied, [](PLWindow& w, BMessage* m) { w.ApplySplit(m); }, "Apply split"},
     {'HUnd', [](PLWindow& w, BMessage*) { w.Undo(); }},
     {'HRed', [](PLWindow& w, BMessage*) { w.Redo(); }},
     {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
@@ -149,6 +152,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
         std::make_unique<QuoteEditor<Currency>>(*this, *currencyView_, "You must first select a currency");
     events_ = std::make_unique<EventEditor>(*this, *companyView_);
     operations_ = std::make_unique<OperationEditor>(*this, *operationView_, *companyView_);
+    split_ = std::make_unique<SplitAssistant>(*this, *companyView_, *operationView_);
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     walletView_->setDate(today());
     ReinitWallet(); // from here on there is a wallet, always

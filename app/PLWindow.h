@@ -7,6 +7,7 @@
 #include "app/OperationEditor.h"
 #include "app/QuoteEditor.h"
 #include "app/RepeatGuard.h"
+#include "app/SplitAssistant.h"
 #include "market/Catalogue.h"
 #include "platform/Window.h"
 #include "views/CompanyView.h"
@@ -145,6 +146,8 @@ public:
     void AddCompanyEvent() { events_->add(); }
     void UpdateCompanyEvent() { events_->update(); }
     void RemoveCompanyEvent() { events_->remove(); }
+    void OpenSplit() { split_->open(); }
+    void ApplySplit(const BMessage* message) { split_->apply(message); }
     void CompanyEventSelection() { events_->showSelected(); }
 
     // Currencies (CurrencyCommands.cpp).
@@ -228,6 +231,7 @@ private:
     std::unique_ptr<QuoteEditor<Company>> companyQuotes_;
     std::unique_ptr<QuoteEditor<Currency>> currencyQuotes_;
     std::unique_ptr<EventEditor> events_;
+    std::unique_ptr<SplitAssistant> split_;
     std::unique_ptr<OperationEditor> operations_;
     std::unique_ptr<Shortcuts> shortcuts_;
     std::unique_ptr<Rescue> rescue_; // the last one to come and the first to go: its last copy needs all of the above

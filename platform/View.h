@@ -64,6 +64,8 @@ public:
 
     // Keyboard focus and what assistive tools say.
     bool IsFocus() const;
+    /// Gives the view the keyboard.
+    void MakeFocus();
     void SetAccessibleName(const char* text);
     void SetToolTip(const char* text);
 

@@ -9,8 +9,9 @@ class BView;
 class QWidget;
 class WindowWidget;
 
-/// There is one kind of window, and one workspace for it.
-enum window_type { B_TITLED_WINDOW };
+/// There is one workspace. While a modal window is open, the other ones answer to nothing that a person does; Escape
+/// closes it as by hand.
+enum window_type { B_TITLED_WINDOW, B_MODAL_WINDOW };
 
 enum : uint32 { B_NOT_RESIZABLE = 2 };
 
@@ -56,6 +57,8 @@ public:
     /// The window is asked to close, by the person or by a message. @return false to stay.
     bool askToClose();
     static void closeAll();
+    /// The window that was opened last; null without any.
+    static BWindow* newest();
     /// What a dialog comes up before: the window that has the keyboard, otherwise the one opened last; null without
     /// any.
     static QWidget* front();

@@ -2,6 +2,7 @@
 
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
+#include "platform/Button.h"
 #include "platform/MenuField.h"
 #include "platform/MenuItem.h"
 #include "platform/PopUpMenu.h"
@@ -42,7 +43,9 @@ EventBox::EventBox(BRect frame) : BBox(frame, "")
                          {{"btnAddCompanyEvent", "Add", 'CBEa'},
                           {"btnUpdateCompanyEvent", "Update", 'CBEu'},
                           {"btnRemoveCompanyEvent", "Remove", 'CBEr'}});
-    PageView::explain(*this, {{"companyEventType", "Events are notes: they change neither quotes nor holdings"}});
+    PageView::explain(*this, {{"companyEventType", "An event by itself changes neither quotes nor holdings"},
+                              {"btnApplySplit", "Shows what the selected split does to quotes, purchases and sales "
+                                                "before its day, and does it"}});
     // What a new event starts with. `type_` is set by the last call, which also hides the fields of the other kind.
     setNumerator(1);
     setDivider(2);
@@ -76,6 +79,9 @@ void EventBox::makeFields(BRect area)
                                           "Split", 'CTQv', kDivider);
     divider_ = PageView::addTypedNumber(this, {second, top, second + 24 + kNumberWidth, top + kFieldHeight},
                                         "txtEventSplitRangeDenum", "to", 'CTQv', 24);
+    apply_ =
+        PageView::addButton(this, {second + 24 + kNumberWidth + kGap, top - 1, area.right, top - 1 + kButtonHeight},
+                            "btnApplySplit", "Apply...", 'CBAs');
     title_ = PageView::addField(this, {area.left, top, area.right, top + kFieldHeight}, "txtCompanyEventTitle", "Title",
                                 'CTEt', kDivider);
     top += kRow;
@@ -98,6 +104,6 @@ void EventBox::setType(short type)
     menu_->Menu()->ItemAt(isNote ? 1 : 0)->SetMarked(true);
     for (BView* view : {static_cast<BView*>(title_), textLabel_, static_cast<BView*>(text_)})
         setVisible(*view, isNote);
-    for (BView* view : {numerator_, divider_})
+    for (BView* view : {static_cast<BView*>(numerator_), static_cast<BView*>(divider_), static_cast<BView*>(apply_)})
         setVisible(*view, !isNote);
 }

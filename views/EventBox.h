@@ -44,6 +44,7 @@ private:
     DateControl* date_ = nullptr;
     NumberControl* numerator_ = nullptr;
     NumberControl* divider_ = nullptr;
+    BView* apply_ = nullptr;
     BTextControl* title_ = nullptr;
     BView* textLabel_ = nullptr;
     BTextView* text_ = nullptr;

@@ -30,10 +30,12 @@ public:
 
 } // namespace
 
-BWindow::BWindow(BRect frame, const char* title, window_type, uint32 flags, uint32)
+BWindow::BWindow(BRect frame, const char* title, window_type type, uint32 flags, uint32)
     : BLooper(title), frame_(frame), widget_(std::make_unique<WindowWidget>(*this)),
       root_(std::make_unique<RootView>(frame.OffsetToCopy(0, 0)))
 {
+    if (type == B_MODAL_WINDOW)
+        widget_->makeModal(front());
     widget_->setWindowTitle(QString::fromUtf8(title));
     const QSize size(static_cast<int>(frame.Width()), static_cast<int>(frame.Height()));
     const QPoint place(static_cast<int>(frame.left), static_cast<int>(frame.top));
@@ -134,7 +136,13 @@ QWidget* BWindow::front()
     // Over a dialog that is open, where there is one.
     if (QWidget* active = QApplication::activeWindow())
         return active;
-    return windows().empty() ? nullptr : &windows().back()->widget();
+    BWindow* last = newest();
+    return last != nullptr ? &last->widget() : nullptr;
+}
+
+BWindow* BWindow::newest()
+{
+    return windows().empty() ? nullptr : windows().back();
 }
 
 void BWindow::closeAll()

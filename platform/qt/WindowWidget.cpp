@@ -8,6 +8,7 @@
 #include <QScreen>
 #include <QShortcut>
 #include <QStyle>
+#include <QWindow>
 
 #include <algorithm>
 
@@ -64,6 +65,17 @@ void WindowWidget::fitTo(QPoint place, QSize content, bool resizable)
         setFixedSize(size);
     move(std::max(room.left(), std::min(place.x(), room.right() + 1 - size.width())),
          std::max(room.top(), std::min(place.y(), room.bottom() + 1 - size.height())));
+}
+
+void WindowWidget::makeModal(const QWidget* below)
+{
+    setWindowFlags(Qt::Dialog);
+    setWindowModality(Qt::ApplicationModal);
+    addShortcut(Qt::Key_Escape, 0, [this] { close(); });
+    winId(); // from here on there is a window of the desktop
+    // No child of that window's widget, which would destroy this one along with itself.
+    if (below != nullptr)
+        windowHandle()->setTransientParent(below->window()->windowHandle());
 }
 
 void WindowWidget::closeEvent(QCloseEvent* event)

@@ -16,6 +16,8 @@ public:
     /// Gives the window the size `content` at `place`, or what of it fits on the screen, moved up and left until it
     /// does.
     void fitTo(QPoint place, QSize content, bool resizable);
+    /// To be called before the window shows. It stays in front of `below`, which may be null.
+    void makeModal(const QWidget* below);
     /// Calls `action` when the key is pressed with `modifiers` of InterfaceDefs.h, once however long it is held, after
     /// the field that is being typed in has sent its text.
     void addShortcut(int key, uint32 modifiers, const std::function<void()>& action);

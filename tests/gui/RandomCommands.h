@@ -4,6 +4,7 @@
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "market/Market.h"
+#include "platform/Button.h"
 #include "platform/DialogAnswers.h"
 #include "platform/ListView.h"
 #include "platform/TextControl.h"
@@ -206,6 +207,17 @@ protected:
         send({'CMSp', 'CMNo'});
         send({'CBEa', 'CBEa', 'CBEu', 'CBEr'});
     }
+    void applySplit()
+    {
+        ensureSelection("CompanyView", "lstCompanyEvents");
+        send({'CBAs'});
+        settle();
+        BWindow* asked = BWindow::newest();
+        if (asked == &window())
+            return;
+        dynamic_cast<BButton&>(*asked->FindView(under(3) > 0 ? "btnApply" : "btnCancel")).Invoke();
+        settle();
+    }
     void changeAccount()
     {
         settle();
@@ -284,6 +296,7 @@ inline const std::vector<RandomCommands::Action> RandomCommands::kActions = {
     {"quote", 4, &RandomCommands::changeQuotes},
     {"quotes", 1, &RandomCommands::removeOrSplitQuotes},
     {"event", 2, &RandomCommands::changeEvent},
+    {"split", 1, &RandomCommands::applySplit},
     {"account", 2, &RandomCommands::changeAccount},
     {"operation", 6, &RandomCommands::changeOperation},
     {"look", 1, &RandomCommands::lookAround},

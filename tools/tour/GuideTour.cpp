@@ -118,7 +118,7 @@ void showPrevisions(TourHand& hand)
     hand.turnTo(kOperations);
     hand.tick("cbxPrevision", true);
     hand.picture("guide-previsions", kFirstOperations);
-    hand.tick("cbxPrevision", false);
+    hand.pressInFront("btnNotice1"); // Take Back
 }
 
 void split(TourHand& hand)
@@ -130,11 +130,12 @@ void split(TourHand& hand)
     hand.press("btnAddQuote");
     hand.type({{"txtCompanyEventDate", "1/7/2026"}});
     hand.press("btnAddCompanyEvent");
-    hand.select("lstQuotes", 0, 2);
-    hand.type({{"txtSplitRangeNum", "1"}, {"txtSplitRangeDenum", "2"}});
     hand.picture("guide-split-before", kQuotesAndChart);
-    hand.press("btnSplitQuotes");
+    hand.press("btnApplySplit");
+    hand.pictureInFront("guide-split");
+    hand.pressInFront("btnApply");
     hand.picture("guide-split-after", kQuotesAndChart);
+    hand.dismissNotice();
 }
 
 void showMistakes(TourHand& hand)

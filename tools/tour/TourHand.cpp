@@ -85,12 +85,35 @@ void TourHand::select(const char* list, int32 first, int32 last)
     handle_pending_messages();
 }
 
+void TourHand::dismissNotice()
+{
+    window_.FindView("txtNotice")->MouseDown({});
+    handle_pending_messages();
+}
+
 void TourHand::picture(const char* name, BRect part)
+{
+    writePicture(window_, name, part);
+}
+
+void TourHand::pressInFront(const char* button)
+{
+    dynamic_cast<BButton&>(*BWindow::newest()->FindView(button)).Invoke();
+    handle_pending_messages();
+}
+
+void TourHand::pictureInFront(const char* name)
+{
+    const BWindow& front = *BWindow::newest();
+    writePicture(front, name, front.Bounds());
+}
+
+void TourHand::writePicture(const BWindow& window, const char* name, BRect part)
 {
     // What the last step has set going is to be seen on the picture.
     handle_pending_messages();
     const std::string path = pictures_ + '/' + name + ".png";
-    if (save_screenshot(window_, part, path.c_str()) != B_OK)
+    if (save_screenshot(window, part, path.c_str()) != B_OK)
         throw std::runtime_error(path + ": cannot be written");
     std::cout << path << '\n';
 }

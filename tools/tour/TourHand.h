@@ -30,10 +30,17 @@ public:
     /// Selects the rows of a list from `first` to `last`.
     void select(const char* list, int32 first, int32 last);
     void select(const char* list, int32 row) { select(list, row, row); }
+    /// Sends the notice away that is shown.
+    void dismissNotice();
     /// Writes what the window shows within `part` as NAME.png, and tells the path on standard output.
     void picture(const char* name, BRect part);
 
+    // The same of the window that has come up before the other one.
+    void pressInFront(const char* button);
+    void pictureInFront(const char* name);
+
 private:
+    void writePicture(const BWindow& window, const char* name, BRect part);
     template <class View>
     View& find(const char* name);
 

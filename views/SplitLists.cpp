@@ -1,0 +1,150 @@
+#include "views/SplitLists.h"
+
+#include "foundation/DateText.h"
+#include "foundation/NumberText.h"
+#include "portfolio/Account.h"
+#include "portfolio/Share.h"
+#include "portfolio/ShareOperation.h"
+#include "valuation/SplitPlan.h"
+#include "views/Look.h"
+#include "views/ModelText.h"
+
+#include <cmath>
+#include <numeric>
+
+namespace {
+
+// What is old stands in grey beside the new.
+
+Cell was(const std::string& text)
+{
+    return {text, look::kFaint};
+}
+
+Cell becomes(const std::string& text)
+{
+    return {text, look::kSeries};
+}
+
+std::string sharesText(std::int64_t shares)
+{
+    return countText(static_cast<int>(shares)); // a plan without problem has 32 bits of them
+}
+
+std::string accountText(const Account* account)
+{
+    return account != nullptr ? textOf(account->getName()) : "";
+}
+
+PlainRow* rowOf(const SplitPlan::Trade& trade)
+{
+    const ShareOperation& operation = *trade.operation;
+    return new PlainRow({{dateText(operation.getDate())},
+                         {accountText(operation.account())},
+                         {operation.isBuy() ? "Buy" : "Sell"},
+                         was(countText(operation.getQuantity())),
+                         becomes(countText(trade.quantity)),
+                         was(priceText(operation.getQuote())),
+                         becomes(priceText(trade.quote)),
+                         was(sharesText(trade.formerHolding)),
+                         becomes(sharesText(trade.holding))});
+}
+
+PlainRow* settlementOf(const SplitPlan::Holding& holding, const Date& day)
+{
+    return new PlainRow({{dateText(day)},
+                         {accountText(holding.account)},
+                         {"Sell"},
+                         {},
+                         becomes("1"),
+                         {},
+                         becomes(priceText(holding.saleQuote)),
+                         {},
+                         becomes(sharesText(holding.whole))},
+                        true);
+}
+
+} // namespace
+
+void PlainRow::DrawItem(BView* owner, BRect frame, bool complete)
+{
+    if (isMadeUp_ && !IsSelected()) {
+        const rgb_color text = owner->HighColor();
+        owner->SetHighColor(look::kGenerated);
+        owner->FillRect(frame);
+        owner->SetHighColor(text);
+    }
+    ColumnItem::DrawItem(owner, frame, complete);
+}
+
+SplitTradeListView::SplitTradeListView(const char* name)
+    : PlainListView(name, B_SINGLE_SELECTION_LIST,
+                    {{"Date", 78},
+                     {"Account", kRemainingWidth},
+                     {"Type", 42},
+                     {"Quantity", 66, B_ALIGN_RIGHT},
+                     {"becomes", 66, B_ALIGN_RIGHT},
+                     {"Quote", 78, B_ALIGN_RIGHT},
+                     {"becomes", 78, B_ALIGN_RIGHT},
+                     {"Holding", 66, B_ALIGN_RIGHT},
+                     {"becomes", 66, B_ALIGN_RIGHT}})
+{}
+
+void SplitTradeListView::show(const SplitPlan& plan)
+{
+    std::vector<ColumnItem*> rows; // the list owns them
+    for (const SplitPlan::Holding& holding : plan.holdings()) {
+        for (const SplitPlan::Trade& trade : holding.trades)
+            rows.push_back(rowOf(trade));
+        if (holding.fraction != 0)
+            rows.push_back(settlementOf(holding, plan.day()));
+    }
+    showRows(rows);
+}
+
+SplitHoldingListView::SplitHoldingListView(const char* name)
+    : PlainListView(name, B_SINGLE_SELECTION_LIST,
+                    {{"", kRemainingWidth},
+                     {"Shares", 86, B_ALIGN_RIGHT},
+                     {"Price", 92, B_ALIGN_RIGHT},
+                     {"Fraction", 72, B_ALIGN_RIGHT},
+                     {"Paid Out", 100, B_ALIGN_RIGHT},
+                     {"Total Value", 120, B_ALIGN_RIGHT}})
+{}
+
+void SplitHoldingListView::show(const SplitPlan& plan)
+{
+    std::vector<ColumnItem*> rows; // the list owns them
+    for (const SplitPlan::Holding& holding : plan.holdings()) {
+        const bool isSettled = holding.fraction != 0;
+        rows.push_back(new PlainRow({{"Before"},
+                                     was(sharesText(holding.former)),
+                                     was(priceText(plan.priceBefore())),
+                                     {},
+                                     {},
+                                     {amountText(holding.valueBefore)}}));
+        rows.push_back(
+            new PlainRow({{"After"},
+                          becomes(sharesText(holding.whole)),
+                          becomes(priceText(plan.priceAfter())),
+                          isSettled ? becomes(fractionText(static_cast<int>(holding.fraction), plan.from())) : Cell{},
+                          isSettled ? becomes(amountText(holding.paidOut)) : Cell{},
+                          {amountText(holding.valueAfter)}}));
+    }
+    showRows(rows);
+}
+
+std::string priceText(float price)
+{
+    constexpr float kSmall = 0.01F;
+    constexpr float kScale = 1e4F;
+    if (std::abs(price) < kSmall || std::abs(price) > kScale)
+        return exactText(price);
+    return exactText(std::round(price * kScale) / kScale);
+}
+
+std::string fractionText(int numerator, int denominator)
+{
+    const int divisor = std::gcd(numerator, denominator);
+    return std::to_string(numerator / divisor) + '/' + std::to_string(denominator / divisor);
+}
