@@ -26,6 +26,9 @@ enum alignment { B_ALIGN_LEFT, B_ALIGN_RIGHT, B_ALIGN_CENTER };
 /// Keys that are held while another one is pressed.
 enum : uint32 { B_SHIFT_KEY = 1, B_COMMAND_KEY = 2, B_CONTROL_KEY = 4 };
 
+/// Those that are held now.
+uint32 modifiers();
+
 constexpr int32 B_CONTROL_OFF = 0;
 constexpr int32 B_CONTROL_ON = 1;
 
@@ -38,3 +41,4 @@ constexpr char B_HOME = 0x01;
 constexpr char B_END = 0x04;
 constexpr char B_PAGE_UP = 0x0b;
 constexpr char B_PAGE_DOWN = 0x0c;
+constexpr char B_ESCAPE = 0x1b;
