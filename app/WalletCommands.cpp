@@ -201,6 +201,7 @@ void PLWindow::UpdateState()
         walletView_->ClearEvolution();
         operationView_->DropRemovedOperations();
         operations_->renewOffers();
+        UpdateCompanyQuotesChart(); // it marks the operations
         tellSimulation();
         return;
     }

@@ -40,7 +40,8 @@ public:
         // The top, the bottom and the left side of the plot are settled; the x axis may still move its sides inwards.
         placeXAxis();
         placeYLegend();
-        out_.marks = placeMarks(in_, out_.plot, out_.scale);
+        out_.flags = placeFlagMarks(in_, out_.scale);
+        out_.marks = placeMarks(in_, out_.plot, out_.scale, out_.flags);
         return out_;
     }
 
@@ -52,6 +53,8 @@ private:
                 x_.include(point.x);
                 values_.include(point.y);
             }
+        if (!in_.x.isEmpty())
+            x_ = in_.x;
         // `values_` stays as found; `x_` and `y_` have a length above 0 from here on, as a scale needs.
         y_ = values_;
         widenEmpty(x_, in_.isDateBased ? 1 : std::abs(x_.min) / 10);
@@ -71,66 +74,78 @@ private:
     /// The x legend, and the key beside it or, where there is no room, below.
     void placeHeader()
     {
-        const float top = in_.bounds.top + kLegendGap;
+        // At the height of the controls' labels, where there are any.
+        const float spare = in_.controls.bottom - in_.bounds.top - kLegendGap - in_.legendFont.height();
+        const float top = in_.bounds.top + kLegendGap + std::max(std::floor(spare / 2), 0.0F);
         float bottom = top;
         float left = in_.bounds.left + kMargin;
         // It names the values although it is called after x. Intended: the pages set it to the unit of the values,
         // so it stands above the value axis, where a reader looks for that.
-        const std::string legend = fitText(in_.xLegend, in_.legendFont.width, rightEnd() - left);
+        const std::string legend = fitText(in_.xLegend, in_.legendFont.width, headerEnd() - left);
         if (!legend.empty()) {
             const ChartText text = textAt(legend, in_.legendFont, left, top);
             out_.legends.push_back(text);
             bottom = text.box.bottom;
             left = text.box.right + kEntryGap;
         }
-        bottom = std::max(bottom, placeKey(left, top, bottom));
+        bottom = std::max({bottom, placeKey(left, top, bottom), in_.controls.bottom});
         out_.plot.top = std::ceil(bottom + kLegendGap);
     }
 
     float rightEnd() const { return in_.bounds.right - kMargin; }
+    /// In the uppermost row, which ends at the controls.
+    float headerEnd() const { return in_.controls.Width() > 0 ? in_.controls.left - kEntryGap : rightEnd(); }
 
     float entryWidth(const std::string& name) const
     {
         return std::ceil(kSampleWidth + kSampleGap + in_.legendFont.width(name));
     }
 
-    /// The series that have a name, one of each.
-    std::vector<const ChartSeries*> keySeries() const
+    /// An entry that has no place yet.
+    struct Named {
+        std::string name;
+        ChartKeyEntry entry;
+    };
+
+    /// The series that have a name, one of each, and the flags.
+    std::vector<Named> keyEntries() const
     {
         constexpr std::size_t kMostEntries = 12;
-        std::vector<const ChartSeries*> named;
-        for (const ChartSeries& series : in_.series) {
-            const bool isNew = std::none_of(named.begin(), named.end(),
-                                            [&](const ChartSeries* other) { return other->name == series.name; });
-            if (!series.name.empty() && isNew && named.size() < kMostEntries)
-                named.push_back(&series);
-        }
+        std::vector<Named> named;
+        for (const ChartSeries& series : in_.series)
+            if (!series.name.empty() && named.size() < kMostEntries &&
+                std::ranges::find(named, series.name, &Named::name) == named.end())
+                named.push_back({series.name, {series.shape, {}, series.color, series.penSize, {}, {}}});
+        for (std::size_t i = 0; i < in_.flagStyles.size(); ++i)
+            if (const auto& [color, name] = in_.flagStyles[i]; !name.empty())
+                named.push_back({name, {{}, static_cast<ChartFlag::Shape>(i), color, 1, {}, {}}});
         return named;
     }
 
     /// @return the lower end of the key.
     float placeKey(float left, float top, float below)
     {
-        const std::vector<const ChartSeries*> named = keySeries();
+        const std::vector<Named> named = keyEntries();
         if (named.empty())
             return top;
         // There is no gap behind the last entry.
         float width = -kEntryGap;
-        for (const ChartSeries* series : named)
-            width += entryWidth(series->name) + kEntryGap;
+        for (const Named& one : named)
+            width += entryWidth(one.name) + kEntryGap;
         // Beside the legend where all of it has room in one row; otherwise below, in as many rows as it takes.
-        if (left + width <= rightEnd())
-            return placeKeyRows(named, rightEnd() - width, top);
+        if (left + width <= headerEnd())
+            return placeKeyRows(named, headerEnd() - width, top);
+        below = std::max(below, in_.controls.bottom);
         return placeKeyRows(named, in_.bounds.left + kMargin, below > top ? below + kLegendGap / 2 : top);
     }
 
-    float placeKeyRows(const std::vector<const ChartSeries*>& named, float left, float top)
+    float placeKeyRows(const std::vector<Named>& named, float left, float top)
     {
         const float height = std::ceil(in_.legendFont.height());
         float x = left;
-        for (const ChartSeries* series : named) {
+        for (const Named& one : named) {
             const std::string name =
-                fitText(series->name, in_.legendFont.width, rightEnd() - left - kSampleWidth - kSampleGap);
+                fitText(one.name, in_.legendFont.width, rightEnd() - left - kSampleWidth - kSampleGap);
             // An entry that is alone in its row and still too long has been cut above.
             if (x > left && x + entryWidth(name) > rightEnd()) {
                 x = left;
@@ -139,9 +154,10 @@ private:
             // The key never takes the room of the plot: what is left of it is dropped.
             if (name.empty() || top + height > in_.bounds.top + in_.bounds.Height() * kKeyShare)
                 break;
-            out_.key.push_back({series->shape, series->color, series->penSize,
-                                BRect(x, top, x + kSampleWidth, top + height),
-                                textAt(name, in_.legendFont, x + kSampleWidth + kSampleGap, top)});
+            ChartKeyEntry entry = one.entry;
+            entry.sample = BRect(x, top, x + kSampleWidth, top + height);
+            entry.name = textAt(name, in_.legendFont, x + kSampleWidth + kSampleGap, top);
+            out_.key.push_back(entry);
             x += entryWidth(name) + kEntryGap;
         }
         return out_.key.empty() ? top : out_.key.back().sample.bottom;
@@ -169,10 +185,13 @@ private:
     }
 
     /// Where the data goes: within the plot, so that neither a line nor the numbers of its extremes touch an axis.
+    /// Where there is more of it beyond a side, it reaches up to there.
     BRect dataArea() const
     {
-        const float inset = marksInset(in_, out_.plot);
-        return out_.plot.InsetByCopy(kDataInset, inset);
+        BRect area = out_.plot.InsetByCopy(0, marksInset(in_, out_.plot));
+        area.left += in_.goesOnBefore ? 0 : kDataInset;
+        area.right -= in_.goesOnBehind ? 0 : kDataInset;
+        return area;
     }
 
     /// Finds the round values and makes room for the widest at the left.

@@ -56,8 +56,9 @@ void ChartPainter::drawNotice(const char* text, BPoint where, float size)
     view_.DrawString(text, where);
 }
 
-void ChartPainter::drawChart(const ChartLayout& layout, const std::vector<ChartSeries>& series)
+void ChartPainter::drawChart(const ChartLayout& layout, const ChartContents& contents)
 {
+    const std::vector<ChartSeries>& series = contents.series;
     // The elements keep their order: a later one covers an earlier one, whatever the two are.
     const auto isPolygon = [](const ChartSeries& one) { return one.shape == ChartSeries::Shape::kPolygon; };
     const auto front = std::ranges::find_if_not(series, isPolygon);
@@ -66,6 +67,8 @@ void ChartPainter::drawChart(const ChartLayout& layout, const std::vector<ChartS
     std::for_each(series.begin(), front, draw);
     drawAxes(layout);
     std::for_each(front, series.end(), draw);
+    for (const ChartFlagMark& flag : layout.flags)
+        drawFlag(flag.shape, flag.where, contents.flagStyles[static_cast<std::size_t>(flag.shape)].color);
     for (const ChartMark& mark : layout.marks)
         // Above all lines, since they are about the values themselves. The texts come last: nothing covers them.
         drawMark(mark);
@@ -84,18 +87,42 @@ void ChartPainter::drawFocus()
     view_.StrokeRect(view_.Bounds());
 }
 
-void ChartPainter::drawReadOut(const ChartReadOut& readOut)
+void ChartPainter::drawSelection(const BRect& plot, float left, float right)
 {
-    // Three discs of falling size: a dark ring, a light one, and the point in its colour.
-    fillDisc(readOut.where, kMarkRadius + 2, text_);
-    fillDisc(readOut.where, kMarkRadius + 1, background_);
-    fillDisc(readOut.where, kMarkRadius, readOut.color);
-    view_.SetHighColor(background_);
-    view_.FillRect(readOut.box);
+    rgb_color shade = text_;
+    shade.alpha = 32;
+    const BRect area(left, plot.top, right, plot.bottom);
+    setAreaColor(shade);
+    view_.FillRect(area);
+    view_.SetDrawingMode(B_OP_COPY);
     view_.SetPenSize(1);
     view_.SetHighColor(axis_);
+    view_.StrokeRect(area);
+}
+
+void ChartPainter::drawReadOut(const ChartReadOut& readOut, const BRect& plot)
+{
+    view_.SetPenSize(1);
+    view_.SetHighColor(axis_);
+    view_.StrokeLine({readOut.x, plot.top}, {readOut.x, plot.bottom});
+    for (const ChartReadOut::Disc& disc : readOut.discs)
+        drawDisc(disc);
+    view_.SetHighColor(background_);
+    view_.FillRect(readOut.box);
+    view_.SetHighColor(axis_);
     view_.StrokeRect(readOut.box);
-    drawText(readOut.text, text_);
+    for (const ChartReadOut::Disc& sample : readOut.samples)
+        fillDisc(sample.where, kMarkRadius, sample.color);
+    for (const ChartText& text : readOut.texts)
+        drawText(text, text_);
+}
+
+void ChartPainter::drawDisc(const ChartReadOut::Disc& disc)
+{
+    // Three discs of falling size: a dark ring, a light one, and the point in its colour.
+    fillDisc(disc.where, kMarkRadius + 2, text_);
+    fillDisc(disc.where, kMarkRadius + 1, background_);
+    fillDisc(disc.where, kMarkRadius, disc.color);
 }
 
 void ChartPainter::drawGrid(const ChartLayout& layout)
@@ -161,9 +188,35 @@ void ChartPainter::drawLine(const ChartSeries& series, const ChartScale& scale)
     }
     view_.SetPenSize(series.penSize);
     view_.BeginLineArray(static_cast<int32>(points.size() - 1));
-    for (std::size_t i = 1; i < points.size(); ++i)
-        view_.AddLine(points[i - 1], points[i], opaque(series.color));
+    for (std::size_t i = 1; i < points.size(); ++i) {
+        const BPoint from = points[i - 1];
+        // A level stretch in one piece: many short ones would be smoothed where they meet.
+        while (i + 1 < points.size() && points[i].y == from.y && points[i + 1].y == from.y)
+            ++i;
+        view_.AddLine(from, points[i], opaque(series.color));
+    }
     view_.EndLineArray();
+}
+
+void ChartPainter::drawFlag(ChartFlag::Shape shape, BPoint where, rgb_color color)
+{
+    // A shape of background below it, larger by a pixel or two, parts it from the lines that it is on.
+    for (const float ring : {1.5F, 0.0F}) {
+        std::vector<BPoint> corners;
+        if (shape == ChartFlag::Shape::kDiamond) {
+            const float half = 5 + ring;
+            corners = {{0, -half}, {half, 0}, {0, half}, {-half, 0}};
+        } else {
+            constexpr float kTip = 4; // off the line
+            constexpr float kFoot = 12;
+            const float half = 4.5F + ring;
+            corners = {{0, kTip - ring}, {half, kFoot + ring / 2}, {-half, kFoot + ring / 2}};
+        }
+        for (BPoint& corner : corners)
+            corner = {where.x + corner.x, where.y + (shape == ChartFlag::Shape::kDown ? -corner.y : corner.y)};
+        view_.SetHighColor(ring > 0 ? background_ : opaque(color));
+        view_.FillPolygon(corners.data(), static_cast<int32>(corners.size()));
+    }
 }
 
 void ChartPainter::drawMark(const ChartMark& mark)
@@ -190,6 +243,15 @@ void ChartPainter::drawKeyEntry(const ChartKeyEntry& entry)
 {
     const BRect& box = entry.sample;
     const float middle = std::round((box.top + box.bottom) / 2);
+    if (entry.flag) {
+        // A triangle stands off its line: the line would be above or below the sample.
+        constexpr float kHalfTriangle = 8;
+        const float line = *entry.flag == ChartFlag::Shape::kUp     ? middle - kHalfTriangle
+                           : *entry.flag == ChartFlag::Shape::kDown ? middle + kHalfTriangle
+                                                                    : middle;
+        drawFlag(*entry.flag, {(box.left + box.right) / 2, line}, entry.color);
+        return drawText(entry.name, text_);
+    }
     switch (entry.shape) {
     case ChartSeries::Shape::kLine:
         view_.SetPenSize(entry.penSize);

@@ -13,12 +13,14 @@ public:
     void fillBackground();
     /// A text in place of a chart.
     void drawNotice(const char* text, BPoint where, float size);
-    /// From back to front: grid, the elements in the order of `series`, lowest and highest value, texts. The axes come
-    /// before the first element that is no polygon: areas behind all else lie below them.
-    void drawChart(const ChartLayout& layout, const std::vector<ChartSeries>& series);
+    /// From back to front: grid, the elements in the order of their series, flags, lowest and highest value, texts. The
+    /// axes come before the first element that is no polygon: areas behind all else lie below them.
+    void drawChart(const ChartLayout& layout, const ChartContents& contents);
     /// A frame around the chart that has the keyboard.
     void drawFocus();
-    void drawReadOut(const ChartReadOut& readOut);
+    /// What is being selected, from `left` to `right`.
+    void drawSelection(const BRect& plot, float left, float right);
+    void drawReadOut(const ChartReadOut& readOut, const BRect& plot);
 
 private:
     void drawGrid(const ChartLayout& layout);
@@ -26,7 +28,9 @@ private:
     void drawElement(const ChartSeries& series, const ChartScale& scale);
     void drawPolygon(const ChartSeries& series, const ChartScale& scale);
     void drawLine(const ChartSeries& series, const ChartScale& scale);
+    void drawFlag(ChartFlag::Shape shape, BPoint where, rgb_color color);
     void drawMark(const ChartMark& mark);
+    void drawDisc(const ChartReadOut::Disc& disc);
     void drawKeyEntry(const ChartKeyEntry& entry);
     void drawText(const ChartText& text, rgb_color color);
     void drawOutlinedText(const ChartText& text);

@@ -1,19 +1,40 @@
 #pragma once
 
-#include "chart/ChartText.h"
-#include "platform/GraphicsDefs.h"
+#include "chart/ChartLayout.h"
 
-/// What a chart says of one point: the name of what it belongs to, its date or number, and its value.
-struct ChartReadOut {
-    BPoint where; // the point
-    rgb_color color;
-    BRect box; // beside it, within the chart
-    ChartText text;
+#include <optional>
+
+/// One line of what a chart says of a day: a name and a value, in the colour of what has it.
+struct ReadOutRow {
+    std::string name;
+    double value;
+    std::optional<rgb_color> color; // none for what is not drawn
 };
 
-class GraphPoint;
-class ChartScale;
+/// What a chart says of one day or number: an upright line there, a disc on each line that it crosses, and a box with
+/// the day, the values and what has happened.
+struct ChartReadOut {
+    struct Disc {
+        BPoint where;
+        rgb_color color;
+    };
+    float x = 0;
+    std::vector<Disc> discs;
+    BRect box; // beside the line, within the chart
+    std::vector<ChartText> texts;
+    std::vector<Disc> samples; // before the names, within the box
+};
 
-/// The read-out of `point`, which has a place on the chart.
-ChartReadOut layOutReadOut(const GraphPoint& point, bool isDateBased, const ChartScale& scale, const ChartFont& font,
-                           const BRect& bounds);
+/// The x that a read-out beside `x` is about: that of the flag that is nearest, if it is at most `reach` away, and
+/// otherwise that of the nearest point of the main series. Nothing where there is none.
+std::optional<double> readOutPlace(const ChartContents& contents, double x, double reach);
+
+/// The next x that a read-out can be about, before `x` when `isBack` is set, else behind it; `x` itself at the end.
+double nextReadOutPlace(const ChartContents& contents, double x, bool isBack);
+
+/// A row for each series that has a value at `x`.
+std::vector<ReadOutRow> readOutRows(const ChartContents& contents, double x);
+
+/// The read-out at `x` with these rows and the texts of the flags there.
+ChartReadOut layOutReadOut(const ChartContents& contents, const ChartLayout& layout, double x,
+                           const std::vector<ReadOutRow>& rows);

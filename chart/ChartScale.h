@@ -12,6 +12,7 @@ struct ChartRange {
 
     bool isEmpty() const { return min > max; }
     double length() const { return max - min; }
+    bool operator==(const ChartRange&) const = default;
     void include(double value)
     {
         min = std::min(min, value);

@@ -11,8 +11,15 @@ public:
     /// True with fewer than two points.
     bool isUndefined() const override { return getNbrGraphPoints() < 2; }
 
+    /// Whether a value stays the same up to the x of the next one, instead of going there in a straight line.
+    void setStepped(bool isStepped) { isStepped_ = isStepped; }
+    bool isStepped() const { return isStepped_; }
+
     float getMinX() const { return points().empty() ? 0 : points().front()->getX(); }
     float getMaxX() const { return points().empty() ? 0 : points().back()->getX(); }
     Date getMinDateX() const { return points().empty() ? Date() : points().front()->getDateX(); }
     Date getMaxDateX() const { return points().empty() ? Date() : points().back()->getDateX(); }
+
+private:
+    bool isStepped_ = false;
 };

@@ -1,12 +1,9 @@
 #include "chart/GraphView.h"
 
-#include "chart/ChartLayout.h"
 #include "chart/ChartPainter.h"
-#include "chart/ChartSeries.h"
-#include "chart/GraphElement.h"
 #include "chart/GraphLine.h"
 #include "chart/GraphPoint.h"
-#include "chart/GraphPolygon.h"
+#include "chart/RangeButtons.h"
 #include "platform/Alert.h"
 #include "platform/Entry.h"
 #include "platform/FilePanel.h"
@@ -23,7 +20,9 @@
 namespace {
 
 const BPoint kNoDataPlace(10, 20);
-constexpr float kPointerReach = 24; // of the read-out, in pixels
+constexpr float kFlagReach = 6;       // of the pointer, in pixels
+constexpr double kLeastDays = 4;      // a shorter range is not shown
+constexpr double kLeastShare = 0.001; // and no smaller part of an axis of numbers
 constexpr uint32 kPictureFile = 'GSav';
 
 ChartFont fontOf(short size)
@@ -66,15 +65,16 @@ void GraphView::Draw(BRect)
     ChartPainter painter(*this, backgroundColor_);
     painter.fillBackground();
     // The elements are read anew for each drawing: they do not tell of their changes.
-    const ChartContents contents = readContents();
+    ChartContents contents = readContents();
     if (contents.series.empty()) {
-        scale_.reset(); // there is nothing that the pointer could be near to
+        drawn_.reset(); // there is nothing to read out, and no range to change
         painter.drawNotice("No data", kNoDataPlace, contents.legendFont.size);
         return;
     }
-    const ChartLayout layout = layOutChart(contents);
-    scale_ = layout.scale; // stays until the next drawing, so that the pointer is matched with what is seen
-    painter.drawChart(layout, contents.series);
+    ChartLayout layout = layOutChart(contents);
+    painter.drawChart(layout, contents);
+    drawn_.emplace(Drawn{std::move(contents), std::move(layout)});
+    showRange(); // the data may have another end now
 }
 
 void GraphView::DrawOver(BRect)
@@ -82,17 +82,159 @@ void GraphView::DrawOver(BRect)
     ChartPainter painter(*this, backgroundColor_);
     if (IsFocus())
         painter.drawFocus();
-    if (!pointer_)
+    if (!drawn_)
         return;
-    // A pointer over a chart without data finds no point: `nearestPoint` needs the scale, and there is none.
-    if (const GraphPoint* point = nearestPoint(*pointer_, kPointerReach))
-        painter.drawReadOut(layOutReadOut(*point, xDateBased_, *scale_, fontOf(legendSize_), Bounds()));
+    const ChartLayout& layout = drawn_->layout;
+    if (const auto selected = drag_ ? drag_->selection() : std::nullopt)
+        painter.drawSelection(layout.plot, layout.scale.pixelX(selected->min), layout.scale.pixelX(selected->max));
+    if (const std::optional<ChartReadOut> shown = readOut())
+        painter.drawReadOut(*shown, layout.plot);
+}
+
+std::optional<ChartReadOut> GraphView::readOut() const
+{
+    if (!drawn_ || !readAt_ || (isReadByKeys_ && !IsFocus()))
+        return std::nullopt;
+    // The data may have changed under a pointer that rests.
+    const std::optional<double> x = readOutPlace(drawn_->contents, *readAt_, 0);
+    if (!x)
+        return std::nullopt;
+    std::vector<ReadOutRow> rows = readOutRows(drawn_->contents, *x);
+    addReadOutRows(rows);
+    return layOutReadOut(drawn_->contents, drawn_->layout, *x, rows);
 }
 
 void GraphView::MouseMoved(BPoint where, bool inside)
 {
-    pointer_ = inside ? std::optional(where) : std::nullopt;
+    if (drag_) {
+        const ChartRange before = zoom_.shown();
+        drag_->moveTo(where, zoom_);
+        if (zoom_.shown() != before)
+            rangeChanged();
+    }
+    isReadByKeys_ = false;
+    readAt_.reset();
+    if (inside && drawn_) {
+        const ChartScale& scale = drawn_->layout.scale;
+        readAt_ = readOutPlace(drawn_->contents, scale.x(where.x), kFlagReach / scale.pixelsPerX());
+    }
     RefreshOver(); // only the layer above the chart is drawn again
+}
+
+void GraphView::MouseDown(BPoint where)
+{
+    if (!drawn_)
+        return;
+    const bool isPan = (modifiers() & B_SHIFT_KEY) != 0;
+    drag_.emplace(isPan ? ChartDrag::Kind::kPan : ChartDrag::Kind::kSelect, where, drawn_->layout.scale, zoom_.shown());
+}
+
+void GraphView::DoubleClicked(BPoint)
+{
+    drag_.reset();
+    zoom_.showAll();
+    rangeChanged();
+}
+
+void GraphView::MouseUp(BPoint where)
+{
+    if (!drag_)
+        return;
+    drag_->moveTo(where, zoom_);
+    if (const auto selected = drag_->selection())
+        zoom_.show(*selected);
+    drag_.reset();
+    rangeChanged();
+}
+
+bool GraphView::WheelTurned(BPoint where, float right, float down)
+{
+    if (!drawn_)
+        return false;
+    constexpr double kStep = 1.25;
+    constexpr double kShare = 0.1;
+    if ((modifiers() & B_SHIFT_KEY) != 0)
+        right += std::exchange(down, 0.0F);
+    zoom_.zoom(drawn_->layout.scale.x(where.x), std::pow(kStep, down));
+    zoom_.pan(static_cast<double>(right) * kShare * zoom_.shown().length());
+    rangeChanged();
+    return true;
+}
+
+void GraphView::KeyDown(const char* bytes, int32)
+{
+    if (!drawn_)
+        return;
+    constexpr double kStep = 1.5;
+    constexpr double kShare = 0.2;
+    const ChartRange range = zoom_.shown();
+    const double middle = readAt_.value_or((range.min + range.max) / 2);
+    switch (bytes[0]) {
+    case '+':
+    case '=': // the same key without Shift
+        zoom_.zoom(middle, 1 / kStep);
+        break;
+    case '-':
+        zoom_.zoom(middle, kStep);
+        break;
+    case B_LEFT_ARROW:
+        zoom_.pan(-kShare * range.length());
+        break;
+    case B_RIGHT_ARROW:
+        zoom_.pan(kShare * range.length());
+        break;
+    case B_HOME:
+        zoom_.pan(-zoom_.bounds().length());
+        break;
+    case B_END:
+        zoom_.pan(zoom_.bounds().length());
+        break;
+    case B_UP_ARROW:
+    case B_DOWN_ARROW:
+        return readNext(bytes[0] == B_DOWN_ARROW);
+    case B_ESCAPE:
+        if (!drag_)
+            zoom_.showAll();
+        drag_.reset();
+        break;
+    default:
+        return;
+    }
+    rangeChanged();
+}
+
+void GraphView::readNext(bool isBack)
+{
+    isReadByKeys_ = true;
+    const ChartRange range = zoom_.shown();
+    // The first key begins at the last day that is shown.
+    const double next = readAt_ ? nextReadOutPlace(drawn_->contents, *readAt_, isBack) : range.max;
+    if (next == readAt_) {
+        // What is drawn ends here; the next key finds more when there is more.
+        zoom_.pan((isBack ? -1 : 1) * range.length() / 10);
+        rangeChanged();
+    }
+    readAt_ = next;
+    RefreshOver();
+}
+
+void GraphView::addRangeButtons()
+{
+    buttons_ = std::make_unique<RangeButtons>(*this);
+    showRange();
+}
+
+void GraphView::rangeChanged()
+{
+    showRange();
+    Invalidate();
+}
+
+void GraphView::showRange()
+{
+    constexpr int kOther = -1;
+    if (buttons_ != nullptr)
+        buttons_->show(zoom_.lastMonths() > 0 ? zoom_.lastMonths() : zoom_.isAll() ? 0 : kOther);
 }
 
 void GraphView::MenuRequested(BPoint where)
@@ -123,10 +265,18 @@ void GraphView::askForPictureFile()
 
 void GraphView::MessageReceived(BMessage* message)
 {
-    if (message->what == kPictureFile)
+    int32 months;
+    if (message->what == kPictureFile) {
         savePicture(*message);
-    else
+    } else if (message->what == RangeButtons::kPressed && message->FindInt32("months", &months) == B_OK) {
+        if (months > 0)
+            zoom_.showLast(months);
+        else
+            zoom_.showAll();
+        rangeChanged();
+    } else {
         BView::MessageReceived(message);
+    }
 }
 
 void GraphView::savePicture(const BMessage& answer)
@@ -145,36 +295,57 @@ void GraphView::savePicture(const BMessage& answer)
             ->Go();
 }
 
-ChartContents GraphView::readContents() const
+ChartContents GraphView::readContents()
 {
-    return {Bounds(),
-            seriesOf(graphElements(), xDateBased_),
-            xDateBased_,
-            std::string(xLegend_.bytes()),
-            std::string(yLegend_.bytes()),
-            fontOf(minMaxSize_),
-            fontOf(legendSize_)};
+    ChartContents contents;
+    contents.bounds = Bounds();
+    contents.series = seriesOf(graphElements(), xDateBased_);
+    contents.isDateBased = xDateBased_;
+    contents.xLegend = std::string(xLegend_.bytes());
+    contents.yLegend = std::string(yLegend_.bytes());
+    contents.labelFont = fontOf(minMaxSize_);
+    contents.legendFont = fontOf(legendSize_);
+    if (buttons_ != nullptr)
+        contents.controls = buttons_->frame();
+    if (contents.series.empty())
+        return contents;
+    placeFlagsOf(contents);
+    takeRange(contents);
+    return contents;
 }
 
-GraphPoint* GraphView::nearestPoint(BPoint where, float reach) const
+/// All flags, before anything is cut: the key is the same whatever part is shown.
+void GraphView::placeFlagsOf(ChartContents& contents) const
 {
-    if (!scale_)
-        return nullptr;
-    // From here on `reach` is the distance of the nearest point found: of equally near ones the first stays.
-    GraphPoint* nearest = nullptr;
-    for (GraphElement* element : graphElements()) {
-        if (element->getType() == GraphPolygon::kType || element->isUndefined())
-            continue; // the corners of a polygon are no values
-        GraphPoint* single;
-        for (GraphPoint* candidate : pointsOf(*element, single)) {
-            const ChartPoint point = chartPointOf(*candidate, xDateBased_);
-            const BPoint away = scale_->pixel(point) - where;
-            const float distance = std::hypot(away.x, away.y);
-            if (hasPlace(point) && distance <= reach && (nearest == nullptr || distance < reach)) {
-                nearest = candidate;
-                reach = distance;
-            }
-        }
+    if (!xDateBased_)
+        return;
+    contents.flags = placeFlags(flags_, *mainSeries(contents.series));
+    for (const PlacedFlag& flag : contents.flags) {
+        const auto shape = static_cast<std::size_t>(flag.shape);
+        contents.flagStyles[shape] = flagStyles_[shape];
     }
-    return nearest;
+}
+
+/// Cuts the contents down to what is to be shown.
+void GraphView::takeRange(ChartContents& contents)
+{
+    ChartRange all = rangeOf(contents.series);
+    for (const PlacedFlag& flag : contents.flags)
+        all.include(flag.where.x);
+    zoom_.setBounds(all, xDateBased_ ? kLeastDays : kLeastShare * all.length());
+    contents.x = zoom_.shown();
+    if (zoom_.isAll())
+        return;
+    std::vector<ChartSeries> part = cropped(contents.series, contents.x);
+    if (part.empty()) { // some flags are there, and no value
+        zoom_.showAll();
+        contents.x = all;
+        return;
+    }
+    contents.series = std::move(part);
+    contents.goesOnBefore = contents.x.min > all.min;
+    contents.goesOnBehind = contents.x.max < all.max;
+    std::erase_if(contents.flags, [&](const PlacedFlag& flag) {
+        return flag.where.x < contents.x.min || flag.where.x > contents.x.max;
+    });
 }

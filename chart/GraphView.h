@@ -1,6 +1,8 @@
 #pragma once
 
-#include "chart/ChartScale.h"
+#include "chart/ChartDrag.h"
+#include "chart/ChartReadOut.h"
+#include "chart/ChartZoom.h"
 #include "chart/GraphElement.h"
 #include "foundation/String.h"
 #include "platform/View.h"
@@ -9,16 +11,16 @@
 #include <optional>
 
 class BFilePanel;
-class GraphPoint;
-struct ChartContents;
+class RangeButtons;
 
 /// A chart of lines, polygons and points over a numeric or a calendar axis, scaled into its frame.
 ///
 /// Lines and polygons belong to whoever adds them; they outlive the chart or leave it when they die. Points that stand
 /// alone belong to the chart. A change of an element or of a setting shows at the next drawing.
 ///
-/// The point that the pointer is near to is shown with its date and value. A menu, by the right mouse button, saves the
-/// chart as a picture.
+/// The values of the day that the pointer is nearest to are read out. The wheel, dragging, keys and, where the page has
+/// them, buttons show a part of the x axis, and the values are scaled to that; it stays while the data changes, as
+/// `ChartZoom` says. A menu, by the right mouse button, saves the chart as a picture.
 class GraphView : public BView {
 public:
     GraphView(BRect frame, const char* name);
@@ -52,22 +54,46 @@ public:
     std::span<GraphElement* const> graphElements() const { return elements_.all(); }
     /// Destroys the points that stand alone; lines and polygons stay.
     void removeAllGraphPoints();
+    /// What is marked on the first line of a chart that goes by dates.
+    void setFlags(std::vector<ChartFlag> flags) { flags_ = std::move(flags); }
+    void setFlagStyles(const ChartFlagStyles& styles) { flagStyles_ = styles; }
+    /// Puts the buttons for the last months into the chart, once.
+    void addRangeButtons();
 
     void Draw(BRect updateRect) override;
     void DrawOver(BRect updateRect) override;
     void MouseMoved(BPoint where, bool inside) override;
+    void MouseDown(BPoint where) override;
+    void DoubleClicked(BPoint where) override;
+    void MouseUp(BPoint where) override;
+    bool WheelTurned(BPoint where, float right, float down) override;
+    void KeyDown(const char* bytes, int32 numBytes) override;
     void MenuRequested(BPoint where) override;
     void MessageReceived(BMessage* message) override;
 
     /// Maps pixels to data as last drawn; null when there was no data.
-    const ChartScale* scale() const { return scale_ ? &*scale_ : nullptr; }
-    /// The point of a line, or that stands alone, nearest to `where`, at most `reach` pixels away, as last drawn; null
-    /// when there is none.
-    GraphPoint* nearestPoint(BPoint where, float reach) const;
+    const ChartScale* scale() const { return drawn_ ? &drawn_->layout.scale : nullptr; }
+    /// The range that is shown, as last drawn.
+    ChartRange shownRange() const { return zoom_.shown(); }
+    /// What is read out now; nothing while neither pointer nor keys ask for it.
+    std::optional<ChartReadOut> readOut() const;
+
+protected:
+    /// Adds what follows from the rows of the lines, which stand in the order of the elements.
+    virtual void addReadOutRows(std::vector<ReadOutRow>& /*rows*/) const {}
 
 private:
     friend class GraphElementsToGraphView;
-    ChartContents readContents() const;
+    struct Drawn {
+        ChartContents contents;
+        ChartLayout layout;
+    };
+    ChartContents readContents();
+    void takeRange(ChartContents& contents);
+    void placeFlagsOf(ChartContents& contents) const;
+    void rangeChanged();
+    void showRange();
+    void readNext(bool isBack);
     void askForPictureFile();
     void savePicture(const BMessage& answer);
 
@@ -78,7 +104,13 @@ private:
     bool xDateBased_ = false;
     short legendSize_ = 12;
     short minMaxSize_ = 10;
-    std::optional<ChartScale> scale_; // of the last drawing
-    std::optional<BPoint> pointer_;   // while it is over the chart
+    std::vector<ChartFlag> flags_;
+    ChartFlagStyles flagStyles_;
+    std::unique_ptr<RangeButtons> buttons_;
+    ChartZoom zoom_;
+    std::optional<ChartDrag> drag_;
+    std::optional<Drawn> drawn_;   // so that the pointer is matched with what is seen; none without data
+    std::optional<double> readAt_; // the x that is read out
+    bool isReadByKeys_ = false;    // and only while the chart has the keyboard
     std::unique_ptr<BFilePanel> savePanel_;
 };

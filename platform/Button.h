@@ -10,4 +10,7 @@ public:
             uint32 flags = B_WILL_DRAW | B_NAVIGABLE);
 
     void SetLabel(const char* label) override;
+    /// One that is set to B_CONTROL_ON looks pressed and is told of as such, until it is set to something else. A click
+    /// sends its message and leaves that to whoever gets it.
+    void SetValue(int32 value) override;
 };

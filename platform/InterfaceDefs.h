@@ -28,6 +28,8 @@ enum : uint32 { B_SHIFT_KEY = 1, B_COMMAND_KEY = 2, B_CONTROL_KEY = 4 };
 
 /// `*speed` becomes the longest time between the two clicks of a double click, as the desktop has it. @return `B_OK`
 status_t get_click_speed(bigtime_t* speed);
+/// Those that are held now.
+uint32 modifiers();
 
 constexpr int32 B_CONTROL_OFF = 0;
 constexpr int32 B_CONTROL_ON = 1;
@@ -41,3 +43,4 @@ constexpr char B_HOME = 0x01;
 constexpr char B_END = 0x04;
 constexpr char B_PAGE_UP = 0x0b;
 constexpr char B_PAGE_DOWN = 0x0c;
+constexpr char B_ESCAPE = 0x1b;

@@ -80,6 +80,15 @@ public:
     virtual void MouseMoved(BPoint /*where*/, bool /*inside*/) {}
     /// The left button was pressed. The views around this one are not told.
     virtual void MouseDown(BPoint /*where*/) {}
+    /// The second press of a double click. The kits tell the number of clicks with the message.
+    virtual void DoubleClicked(BPoint where) { MouseDown(where); }
+    /// The left button was released, which was pressed in this view; that may be outside of it by now, as `MouseMoved`
+    /// has told.
+    virtual void MouseUp(BPoint /*where*/) {}
+    /// The wheel was turned by so many notches: downwards, and to the right, when above 0; fine ones turn by parts of
+    /// one. @return whether that was of use; otherwise the view around this one is asked. The kits have no such hook
+    /// but a message.
+    virtual bool WheelTurned(BPoint /*where*/, float /*right*/, float /*down*/) { return false; }
     /// `bytes` is the UTF-8 text of the key, or one of the control characters of InterfaceDefs.h.
     virtual void KeyDown(const char* /*bytes*/, int32 /*numBytes*/) {}
     /// The right mouse button was pressed, or the key for menus. The kits have no such hook.

@@ -61,6 +61,6 @@ std::vector<EvolutionPoint> evolutionPoints(const Wallet& wallet, const Catalogu
         return points;
     points.reserve(wallet.getNbrStates());
     for (const State* state : wallet.states())
-        points.push_back({state->getDate(), appraisal.totalValue(*state)});
+        points.push_back({state->getDate(), appraisal.totalValue(*state), state->getTotalDeposit()});
     return points;
 }

@@ -29,9 +29,10 @@ void releaseStateMemory();
 /// One point of the evolution chart.
 struct EvolutionPoint {
     Date date;
-    float totalValue; // in the reference currency
+    float totalValue;   // in the reference currency
+    float totalDeposit; // as the state has it: each deposit at the rate of its own day
 };
 
-/// The total value of every state of the wallet, in the order of its list: the current state first, then the daily
+/// The totals of every state of the wallet, in the order of its list: the current state first, then the daily
 /// ones. Empty without a reference currency.
 std::vector<EvolutionPoint> evolutionPoints(const Wallet& wallet, const Catalogue& catalogue);

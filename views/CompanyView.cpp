@@ -4,6 +4,7 @@
 #include "platform/Box.h"
 #include "platform/CheckBox.h"
 #include "platform/StringView.h"
+#include "views/CompanyFlags.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
 
@@ -32,7 +33,7 @@ CompanyView::CompanyView(BRect frame, const char* name, BWindow*) : SeriesPage(f
     makeQuotes({kMargin, kQuotesTop, kQuotesRight, kQuotesEnd});
     events_ = new EventBox({kQuotesRight + kMargin, kQuotesTop, kRight, kQuotesEnd});
     AddChild(events_);
-    addChart({kMargin, kChartTop, kRight, kPageHeight - kMargin});
+    addChart({kMargin, kChartTop, kRight, kPageHeight - kMargin})->setFlagStyles(companyFlagStyles());
 }
 
 void CompanyView::makeMarkets(BRect frame)
@@ -221,7 +222,7 @@ void CompanyView::fillChart(QuoteChart& chart, const Company& company) const
 {
     const String unit = company.getCurrencyRepresentation();
     chart.showSeries(company, textOf(company.getAbbreviation()), unit.isUndefined() ? "???" : textOf(unit),
-                     withSafe_->Value() == B_CONTROL_ON);
+                     withSafe_->Value() == B_CONTROL_ON, companyFlags(company, leavingEvents_));
 }
 
 CompanyEvent** CompanyView::GetAllSelectedCompanyEvents(int* n) const
@@ -237,11 +238,22 @@ void CompanyView::AddCompanyEvent(CompanyEvent* event, bool selected)
     events_->list().insert(event);
     if (selected)
         events_->list().select(event);
+    UpdateQuotesChart();
+}
+
+void CompanyView::ModifyCompanyEvent(CompanyEvent* event)
+{
+    events_->list().update(event);
+    UpdateQuotesChart();
 }
 
 void CompanyView::DeleteCompanyEvents(std::span<CompanyEvent* const> events)
 {
     events_->list().removeAll({events.begin(), events.end()});
+    // The company still has them; the chart, like the list, has them no more.
+    leavingEvents_ = events;
+    UpdateQuotesChart();
+    leavingEvents_ = {};
 }
 
 void CompanyView::SetCompanyEventList(Company* company)

@@ -84,7 +84,7 @@ public:
     /// @return a new array, by date; the caller deletes it.
     CompanyEvent** GetAllSelectedCompanyEvents(int* n) const;
     void AddCompanyEvent(CompanyEvent* event, bool selected);
-    void ModifyCompanyEvent(CompanyEvent* event) { events_->list().update(event); }
+    void ModifyCompanyEvent(CompanyEvent* event);
     void DeleteCompanyEvent(CompanyEvent* event) { DeleteCompanyEvents({&event, 1}); }
     /// The same for many at once.
     void DeleteCompanyEvents(std::span<CompanyEvent* const> events);
@@ -127,4 +127,6 @@ private:
     // Whose rows the lists show; never looked into when they are not selected.
     const Market* shownMarket_ = nullptr;
     const Company* eventsOf_ = nullptr;
+
+    std::span<CompanyEvent* const> leavingEvents_; // while the page takes out what is about to be destroyed
 };

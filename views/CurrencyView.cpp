@@ -135,7 +135,7 @@ void CurrencyView::fillChart(QuoteChart& chart, const Currency& currency) const
 {
     // Rates are shown in the reference currency, whose name the page has in its field.
     const std::string reference = textOf(referenceName_->Text());
-    chart.showSeries(currency, textOf(currency.getRepresentation()), reference.empty() ? "???" : reference, false);
+    chart.showSeries(currency, textOf(currency.getRepresentation()), reference.empty() ? "???" : reference, false, {});
 }
 
 CurrencyView::Places CurrencyView::places() const

@@ -16,6 +16,8 @@ constexpr rgb_color kNew = {255, 221, 102, 255};       ///< ground of what has j
 constexpr rgb_color kGain = {0, 104, 44, 255};
 constexpr rgb_color kLoss = {176, 32, 16, 255};
 constexpr rgb_color kSeries = {24, 78, 148, 255}; ///< the line of a chart
+constexpr rgb_color kPutIn = {204, 98, 0, 255};   ///< what was put in, beside what it is worth
+constexpr rgb_color kEvent = {112, 48, 144, 255}; ///< what a company's chart marks
 constexpr rgb_color kTrend = {204, 98, 0, 255};   ///< its trend
 constexpr rgb_color kBand = {204, 98, 0, 48};     ///< what lies about the trend
 

@@ -34,6 +34,7 @@ QuoteChart::QuoteChart(BRect frame) : GraphView(frame, "grvQuotes")
         e.element.setLegend(e.legend);
         addGraphElement(&e.element);
     }
+    addRangeButtons();
     showNothing();
 }
 
@@ -49,6 +50,7 @@ bool QuoteChart::changeTo(const Content& content)
     line_.clearAll();
     removeAllGraphPoints();
     setXLegend(("Value in " + shown_.unit).c_str());
+    setFlags(shown_.flags);
     line_.setLegend(shown_.name.empty() ? "Quotes" : shown_.name.c_str());
     Invalidate(); // what the caller fills in now shows with the next drawing
     return true;

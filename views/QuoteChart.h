@@ -18,11 +18,12 @@ public:
     /// Shows the quotes of a `QuoteSeries` under `name`, in the unit `unit`. The band reaches one standard deviation
     /// of the quotes from the trend to both sides:
     ///     sqrt(sum((p - trend)^2) / n), in the unit of the quotes.
-    /// What is shown already is not filled in again.
+    /// `flags` are marked on the quotes. What is shown already is not filled in again.
     template <class Series>
-    void showSeries(const Series& series, const std::string& name, const std::string& unit, bool withBand)
+    void showSeries(const Series& series, const std::string& name, const std::string& unit, bool withBand,
+                    std::vector<ChartFlag> flags)
     {
-        if (!changeTo({series.revision(), name, unit, withBand}))
+        if (!changeTo({series.revision(), name, unit, withBand, std::move(flags)}))
             return;
         std::vector<Day> days;
         days.reserve(series.getNbrQuotes());
@@ -33,7 +34,7 @@ public:
         fill(days);
     }
     /// Shows no quotes.
-    void showNothing() { changeTo({0, "", "???", false}); }
+    void showNothing() { changeTo({0, "", "???", false, {}}); }
 
 private:
     struct Day {
@@ -47,6 +48,7 @@ private:
         std::string name;
         std::string unit;
         bool withBand = false;
+        std::vector<ChartFlag> flags;
         bool operator==(const Content&) const = default;
     };
 

@@ -98,7 +98,11 @@ protected:
         AddChild(quotes_ = new QuoteBox(frame, title, codes));
         return quotes_;
     }
-    void addChart(BRect frame) { AddChild(chart_ = new QuoteChart(frame)); }
+    QuoteChart* addChart(BRect frame)
+    {
+        AddChild(chart_ = new QuoteChart(frame));
+        return chart_;
+    }
 
     /// Whether it is this series, not null, whose quotes are in the list.
     bool isShown(const Series* series) const { return quotes_->isOf(series); }

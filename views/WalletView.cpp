@@ -1,7 +1,5 @@
 #include "views/WalletView.h"
 
-#include "chart/GraphPoint.h"
-#include "chart/GraphView.h"
 #include "foundation/DateText.h"
 #include "foundation/NumberText.h"
 #include "market/Currency.h"
@@ -12,6 +10,7 @@
 #include "valuation/QuoteCoverage.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
+#include "views/EvolutionChart.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
 
@@ -148,13 +147,7 @@ void WalletView::makeHoldings()
 
 void WalletView::makeChart()
 {
-    evolution_ = new GraphView({kMargin, kChartTop, kRight, kPageHeight - kMargin}, "grvEvolution");
-    evolution_->SetAccessibleName("Evolution of the total value");
-    evolution_->setXDateBased(true);
-    line_.setDateBased(true);
-    line_.setColor(kSeries);
-    // Once and for all: from here on only the points change.
-    evolution_->addGraphElement(&line_);
+    evolution_ = new EvolutionChart({kMargin, kChartTop, kRight, kPageHeight - kMargin});
     // The chart draws its own notice when it is empty; this one says why it is.
     const BRect reasonPlace(10, 30, 700, 50); // below the chart's own "No data"
     noEvolution_ = new BStringView(reasonPlace, "txtNoEvolution", "");
@@ -256,25 +249,18 @@ void WalletView::UpdateEvolution(const std::vector<EvolutionPoint>& points, cons
                                  EvolutionOutcome outcome)
 {
     ClearEvolution();
-    const std::string symbol = reference != nullptr ? textOf(reference->getRepresentation()) : "???";
-    evolution_->setXLegend(("Value in " + symbol).c_str());
+    evolution_->showPoints(points, reference != nullptr ? textOf(reference->getRepresentation()) : "???");
     // What is too long to be drawn, or has no beginning, is said in the chart; there it is looked for.
     if (outcome != EvolutionOutcome::kBuilt)
         noEvolution_->SetText(outcome == EvolutionOutcome::kTooLong
                                   ? "The evolution would be too long: is the date of an operation mistyped?"
                                   : "The first operation has no real date.");
-    for (const EvolutionPoint& point : points)
-        line_.addGraphPoint(new GraphPoint(point.date, point.totalValue)); // the line owns it
 }
 
 void WalletView::ClearEvolution(bool isNotAsked)
 {
-    // The chart keeps the line, which has no points now, and so shows that there is no data.
-    line_.clearAll();
-    evolution_->removeAllGraphPoints();
-    evolution_->setXLegend(String());
+    evolution_->showNothing();
     noEvolution_->SetText(isNotAsked ? "tick Compute Evolution" : "");
-    evolution_->Invalidate();
 }
 
 void WalletView::SetAccountStateList(const State* state)

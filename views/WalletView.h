@@ -1,6 +1,5 @@
 #pragma once
 
-#include "chart/GraphLine.h"
 #include "foundation/Date.h"
 #include "foundation/String.h"
 #include "platform/CheckBox.h"
@@ -14,7 +13,7 @@
 class BButton;
 class BStringView;
 class Currency;
-class GraphView;
+class EvolutionChart;
 class State;
 enum class EvolutionOutcome;
 struct EvolutionPoint;
@@ -90,7 +89,6 @@ private:
     BTextControl* accountCurrency_ = nullptr;
     BCheckBox* defaultTransferAccount_ = nullptr;
     ShareStateListView* shares_ = nullptr;
-    GraphView* evolution_ = nullptr;
+    EvolutionChart* evolution_ = nullptr;
     BStringView* noEvolution_ = nullptr; // why there is none, in the chart
-    GraphLine line_;                     // in the chart
 };

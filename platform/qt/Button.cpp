@@ -12,7 +12,19 @@ BButton::BButton(BRect frame, const char* name, const char* label, BMessage* mes
     button->setAutoDefault(true);
     if ((flags & B_NAVIGABLE) == 0)
         button->setFocusPolicy(Qt::NoFocus);
-    QObject::connect(button, &QPushButton::clicked, [this] { Invoke(); });
+    QObject::connect(button, &QPushButton::clicked, [this, button] {
+        // Qt has turned what can be turned: back to what was set.
+        button->setChecked(Value() == B_CONTROL_ON);
+        Invoke();
+    });
+}
+
+void BButton::SetValue(int32 value)
+{
+    BControl::SetValue(value);
+    auto* button = static_cast<QPushButton*>(widget());
+    button->setCheckable(true);
+    button->setChecked(value == B_CONTROL_ON);
 }
 
 void BButton::SetLabel(const char* label)

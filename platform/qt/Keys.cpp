@@ -2,7 +2,17 @@
 
 #include "platform/InterfaceDefs.h"
 
+#include <QGuiApplication>
 #include <QKeyEvent>
+
+uint32 modifiers()
+{
+    const Qt::KeyboardModifiers held = QGuiApplication::keyboardModifiers();
+    uint32 keys = held.testFlag(Qt::ShiftModifier) ? B_SHIFT_KEY : 0U;
+    keys |= held.testFlag(Qt::AltModifier) ? B_COMMAND_KEY : 0U;
+    keys |= held.testFlag(Qt::ControlModifier) ? B_CONTROL_KEY : 0U;
+    return keys;
+}
 
 std::string keyBytes(const QKeyEvent& event)
 {

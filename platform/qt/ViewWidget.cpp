@@ -7,10 +7,11 @@
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPainter>
+#include <QWheelEvent>
 
 namespace {
 
-BPoint at(const QMouseEvent& event)
+BPoint at(const QSinglePointEvent& event)
 {
     return {static_cast<float>(event.position().x()), static_cast<float>(event.position().y())};
 }
@@ -35,6 +36,31 @@ void ViewWidget::mousePressEvent(QMouseEvent* event)
         view_.MouseDown(at(*event));
     else
         QWidget::mousePressEvent(event);
+}
+
+void ViewWidget::mouseDoubleClickEvent(QMouseEvent* event)
+{
+    if (event->button() == Qt::LeftButton)
+        view_.DoubleClicked(at(*event));
+    else
+        QWidget::mouseDoubleClickEvent(event);
+}
+
+void ViewWidget::mouseReleaseEvent(QMouseEvent* event)
+{
+    if (event->button() == Qt::LeftButton)
+        view_.MouseUp(at(*event));
+    else
+        QWidget::mouseReleaseEvent(event);
+}
+
+void ViewWidget::wheelEvent(QWheelEvent* event)
+{
+    // Qt counts upwards and to the left, in eighths of a degree.
+    constexpr float kNotch = QWheelEvent::DefaultDeltasPerStep;
+    const auto notches = [](int angle) { return static_cast<float>(-angle) / kNotch; };
+    event->setAccepted(
+        view_.WheelTurned(at(*event), notches(event->angleDelta().x()), notches(event->angleDelta().y())));
 }
 
 void ViewWidget::mouseMoveEvent(QMouseEvent* event)

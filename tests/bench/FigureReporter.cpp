@@ -41,6 +41,8 @@ constexpr Figure kFigures[] = {
     {"Load of a market file in the window / without", "BM_Window/load_market", "BM_Files/load_market", "", "about 1"},
     {"Evolution of 20 years in the window / without", "BM_Window/evolve_20_years", "BM_Files/evolve_20_years", "", ""},
     {"Drawing of a line, 100,000 / 5,000 points", "BM_DrawLine/100000", "BM_DrawLine/5000", "", "< 3"},
+    {"A zoom step in 20 years / drawing all of them", "BM_ZoomStep", "BM_DrawLine/7305", "", "< 1.5"},
+    {"A read-out in 20 years / drawing all of them", "BM_ReadOut", "BM_DrawLine/7305", "", "< 0.5"},
     {"Filling and clearing a line, a point, 4 n / n", "BM_FillLine/80000", "BM_FillLine/20000", "", "about 1"},
 };
 

@@ -305,28 +305,72 @@ void fill(GraphLine& line, std::int64_t count)
     }
 }
 
+/// A chart on the screen, with a line of so many days.
+class ShownLine {
+public:
+    explicit ShownLine(std::int64_t days) : application_("application/x-vnd.Pelorin-bench")
+    {
+        window_ = new BWindow(BRect(0, 0, 780, 360), "chart", B_TITLED_WINDOW, 0); // belongs to itself
+        chart_ = new GraphView(window_->Bounds(), "chart");
+        window_->AddChild(chart_);
+        line_.setDateBased(true);
+        fill(line_, days);
+        chart_->setXDateBased(true);
+        chart_->addGraphElement(&line_);
+        window_->Show();
+        handle_pending_messages();
+    }
+    ~ShownLine() { window_->Quit(); }
+    GraphView& chart() { return *chart_; }
+
+private:
+    BApplication application_;
+    BWindow* window_;
+    GraphView* chart_;
+    GraphLine line_;
+};
+
 void BM_DrawLine(benchmark::State& state)
 {
-    BApplication application("application/x-vnd.Pelorin-bench");
-    auto* window = new BWindow(BRect(0, 0, 780, 360), "chart", B_TITLED_WINDOW, 0); // belongs to itself
-    auto* chart = new GraphView(window->Bounds(), "chart");
-    window->AddChild(chart);
-    GraphLine line;
-    line.setDateBased(true);
-    fill(line, state.range());
-    chart->setXDateBased(true);
-    chart->addGraphElement(&line);
-    window->Show();
-    handle_pending_messages();
+    ShownLine shown(state.range());
     for (auto _ : state) {
-        chart->Invalidate();
-        chart->Sync();
+        shown.chart().Invalidate();
+        shown.chart().Sync();
     }
-    if (chart->scale() == nullptr)
+    if (shown.chart().scale() == nullptr)
         state.SkipWithError("nothing was drawn");
-    window->Quit();
 }
-BENCHMARK(BM_DrawLine)->Arg(5000)->Arg(100000)->Unit(benchmark::kMillisecond);
+constexpr int kDaysOf20Years = 7305;
+BENCHMARK(BM_DrawLine)->Arg(5000)->Arg(kDaysOf20Years)->Arg(100000)->Unit(benchmark::kMillisecond);
+
+/// Notches of the wheel, in and out again by turns, up to a few weeks.
+void BM_ZoomStep(benchmark::State& state)
+{
+    constexpr int kNotches = 25;
+    ShownLine shown(kDaysOf20Years);
+    int notch = 0;
+    for (auto _ : state) {
+        shown.chart().WheelTurned({390, 180}, 0, notch++ / kNotches % 2 == 0 ? -1 : 1);
+        shown.chart().Sync();
+        if (notch == kNotches && shown.chart().shownRange().length() > 60)
+            state.SkipWithError("nothing was zoomed");
+    }
+}
+BENCHMARK(BM_ZoomStep)->Unit(benchmark::kMillisecond);
+
+/// Movements of the pointer, each with its read-out.
+void BM_ReadOut(benchmark::State& state)
+{
+    ShownLine shown(kDaysOf20Years);
+    int x = 0;
+    for (auto _ : state) {
+        shown.chart().MouseMoved({static_cast<float>(x++ % 780), 180}, true);
+        shown.chart().Sync();
+    }
+    if (!shown.chart().readOut())
+        state.SkipWithError("nothing was read out");
+}
+BENCHMARK(BM_ReadOut)->Unit(benchmark::kMillisecond);
 
 void BM_FillLine(benchmark::State& state)
 {

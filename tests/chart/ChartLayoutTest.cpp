@@ -4,6 +4,7 @@
 #include "chart/DateTicks.h"
 #include "chart/GraphLine.h"
 #include "chart/GraphPoint.h"
+#include "chart/GraphPolygon.h"
 #include "chart/ValueFormat.h"
 
 #include <gtest/gtest.h>
@@ -11,7 +12,6 @@
 #include <cmath>
 #include <limits>
 #include <sstream>
-#include <tuple>
 
 namespace {
 
@@ -255,27 +255,86 @@ TEST(ChartLayoutTest, MarksTheExtremesOfTheFirstLine)
     EXPECT_GT(layout.marks[1].label.box.top, layout.marks[1].where.y);
 }
 
-TEST(ChartReadOutTest, SaysNameDateAndValueWithinTheChart)
+TEST(ChartSeriesTest, LinesStepsAndOutlinesAreCutAtTheRange)
 {
-    const BRect bounds(0, 0, 400, 200);
-    const ChartScale scale({0, 100}, {0, 50}, {20, 20, 380, 180});
-    GraphLine line;
-    line.setLegend("Trend");
-    const std::tuple<Date, float, const char*> cases[] = {
-        {{1, 1, 2000}, 0.0125F, "Trend   01/01/2000   0.0125"},
-        {{20, 2, 2000}, 49.99F, "Trend   20/02/2000   49.99"},
-        {{20, 2, 2000}, 127129.3F, "Trend   20/02/2000   127,129.30"},
-    };
-    for (const auto& [date, value, text] : cases) {
-        auto* point = new GraphPoint(7, value);
-        point->setDateX(date);
-        line.addGraphPoint(point);
-        const ChartReadOut shown = layOutReadOut(*point, true, scale, kFont, bounds);
-        EXPECT_EQ(shown.text.text, text);
-        EXPECT_TRUE(isWithin({shown.box.left, 0, shown.box.right, 0}, bounds)) << text;
-        EXPECT_FALSE(isWithin(shown.where, shown.box)) << "the point itself can be seen";
+    GraphLine line, steps;
+    GraphPolygon band;
+    steps.setStepped(true);
+    for (const BPoint p : {BPoint(0, 0), BPoint(10, 10), BPoint(20, 10), BPoint(30, 40)}) {
+        line.addGraphPoint(new GraphPoint(p.x, p.y));
+        steps.addGraphPoint(new GraphPoint(p.x, p.y));
     }
-    EXPECT_EQ(layOutReadOut(GraphPoint(3, 20), false, scale, kFont, bounds).text.text, "3.000   20.00");
+    for (const BPoint p : {BPoint(0, 0), BPoint(30, 0), BPoint(30, 3), BPoint(0, 3)})
+        band.addGraphPoint(new GraphPoint(p.x, p.y));
+    GraphElement* elements[] = {&line, &steps, &band};
+    const struct {
+        ChartRange range;
+        const char* points; // of each series, and how many of these are the first line's own
+    } cases[] = {
+        {{0, 30}, "0,0 10,10 20,10 30,40 | 0,0 10,0 10,10 20,10 30,10 30,40 | 0,0 30,0 30,3 0,3 | 4"},
+        {{5, 25}, "5,5 10,10 20,10 25,25 | 5,0 10,0 10,10 20,10 25,10 | 5,0 25,0 25,3 5,3 | 2"},
+        {{12, 14}, "12,10 14,10 | 12,10 14,10 | 12,0 14,0 14,3 12,3 | 0"},
+        {{10, 20}, "10,10 20,10 | 10,0 10,10 20,10 | 10,0 20,0 20,3 10,3 | 2"},
+        {{31, 40}, ""},
+    };
+    for (const auto& c : cases) {
+        std::ostringstream text;
+        const std::vector<ChartSeries> part = cropped(seriesOf(elements, false), c.range);
+        for (const ChartSeries& series : part) {
+            for (const ChartPoint& point : series.points)
+                text << point.x << ',' << point.y << ' ';
+            text << "| ";
+        }
+        if (!part.empty())
+            text << part[0].ownPoints().size();
+        EXPECT_EQ(text.str(), c.points) << c.range.min;
+    }
+    const std::vector<ChartSeries> all = seriesOf(elements, false);
+    EXPECT_EQ(valueAt(all[0], 25), 25);
+    EXPECT_EQ(valueAt(all[1], 25), 10);
+    EXPECT_EQ(valueAt(all[1], 30), 40) << "from its day on";
+    EXPECT_EQ(valueAt(all[0], 31), std::nullopt);
+}
+
+TEST(ChartReadOutTest, SaysDayValuesAndFlagsWithinTheChart)
+{
+    ChartContents contents = contentsOf({0, 0, 400, 200}, {{0, 0.0125}, {50, 49.99}, {100, 127129.3}}, true);
+    contents.series.pop_back();
+    contents.series.push_back({ChartSeries::Shape::kLine, {}, 2, "Trend", {{0, 10}, {100, 20}}});
+    const ChartFlag flags[] = {{ChartFlag::Shape::kDiamond, {24, 4, 2000}, "after the end"},
+                               {ChartFlag::Shape::kUp, {22, 2, 2000}, "Bought"},
+                               {ChartFlag::Shape::kUp, {22, 2, 2000}, "more"},
+                               {ChartFlag::Shape::kUp, {1, 1, 1999}, "too far away"}};
+    contents.flags = placeFlags(flags, contents.series[0]);
+    ASSERT_EQ(contents.flags.size(), 3U);
+    EXPECT_EQ(contents.flags.back().where.y, 127129.3);
+    contents.x = {0, 114};
+    const ChartLayout layout = layOutChart(contents);
+    const struct {
+        double pointer;
+        const char* texts;
+    } cases[] = {
+        {-90, "01/01/2000 Quotes 0.0125 Trend 10.00"},
+        {47, "20/02/2000 Quotes 49.99 Trend 15.00"},
+        {54, "22/02/2000 Quotes 5,133.16 Trend 15.20 Bought more"}, // a flag is near
+        {100, "10/04/2000 Quotes 127,129.30 Trend 20.00"},
+        {115, "24/04/2000 after the end"},
+    };
+    for (const auto& c : cases) {
+        const auto x = readOutPlace(contents, c.pointer, 3);
+        ASSERT_TRUE(x);
+        const ChartReadOut shown = layOutReadOut(contents, layout, *x, readOutRows(contents, *x));
+        std::string all;
+        for (const ChartText& text : shown.texts) {
+            all += (all.empty() ? "" : " ") + text.text;
+            EXPECT_TRUE(isWithin(text.box, shown.box)) << text.text;
+        }
+        EXPECT_EQ(all, c.texts);
+        EXPECT_TRUE(isWithin(shown.box, contents.bounds)) << all;
+        EXPECT_TRUE(shown.x < shown.box.left || shown.x > shown.box.right) << all;
+    }
+    EXPECT_EQ(nextReadOutPlace(contents, 50, false), 52) << "flags have their turn";
+    EXPECT_EQ(nextReadOutPlace(contents, 0, true), 0);
 }
 
 } // namespace

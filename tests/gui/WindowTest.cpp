@@ -118,7 +118,7 @@ TEST_F(PortoFolioPageTest, EvolutionIsBuiltAndEmptied)
     EXPECT_STREQ(chart->getXLegend().getCharacterArray(), "Value in ???");
     window().setReferenceCurrency(window().catalogue().getCurrencies()[0]);
     enter("txtDate", "31/12/32767");
-    EXPECT_THAT(static_cast<BStringView*>(chart->ChildAt(0))->Text(), HasSubstr("too long"));
+    EXPECT_THAT(static_cast<BStringView*>(chart->FindView("txtNoEvolution"))->Text(), HasSubstr("too long"));
     enter("txtDate", "20/11/2024");
     EXPECT_GT(line->getNbrGraphPoints(), 0U);
     click("cbxComputeEvolution");

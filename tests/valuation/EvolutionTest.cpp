@@ -19,6 +19,7 @@ TEST(EvolutionTest, TheCurrentStateComesFirstThenEveryDayBeforeIt)
 {
     SmallPortfolio p;
     deposit(addAccount(p.wallet, "Main", p.euro), 58, 100); // 28 February
+    new CurrencyQuote(p.euro, kStart, 2);                   // values are divided by it, and deposits are not
     new State(&p.wallet, kStart, false);
     EvolutionOutcome outcome = EvolutionOutcome::kTooLong;
     const State* current = refreshStates(p.wallet, Date(2, 3, 1999), true, &outcome);
@@ -31,6 +32,7 @@ TEST(EvolutionTest, TheCurrentStateComesFirstThenEveryDayBeforeIt)
     ASSERT_EQ(points.size(), 3U);
     EXPECT_EQ(points[0].date, Date(2, 3, 1999));
     EXPECT_EQ(points[0].totalValue, Totals(*current, p.catalogue).totalValue);
+    EXPECT_EQ(points[0].totalDeposit, Totals(*current, p.catalogue).totalDeposit);
     p.catalogue.setReferenceCurrency(nullptr);
     EXPECT_TRUE(evolutionPoints(p.wallet, p.catalogue).empty());
 
