@@ -26,10 +26,11 @@ enum alignment { B_ALIGN_LEFT, B_ALIGN_RIGHT, B_ALIGN_CENTER };
 /// Keys that are held while another one is pressed.
 enum : uint32 { B_SHIFT_KEY = 1, B_COMMAND_KEY = 2, B_CONTROL_KEY = 4 };
 
-/// `*speed` becomes the longest time between the two clicks of a double click, as the desktop has it. @return `B_OK`
-status_t get_click_speed(bigtime_t* speed);
 /// Those that are held now.
 uint32 modifiers();
+
+/// `*speed` becomes the longest time between the two clicks of a double click, as the desktop has it. @return `B_OK`
+status_t get_click_speed(bigtime_t* speed);
 
 constexpr int32 B_CONTROL_OFF = 0;
 constexpr int32 B_CONTROL_ON = 1;
