@@ -2,8 +2,8 @@
 
 #include "platform/Control.h"
 
-/// A push button. The space bar and Enter press it, too, where it is navigable; otherwise a click leaves the keyboard
-/// where it is.
+/// A push button. The space bar and Enter press it, too, once each time, where it is navigable; otherwise a click
+/// leaves the keyboard where it is.
 class BButton : public BControl {
 public:
     BButton(BRect frame, const char* name, const char* label, BMessage* message,

@@ -1,13 +1,32 @@
 #include "platform/Button.h"
 
+#include "platform/qt/HeldKey.h"
 #include "platform/qt/Labels.h"
 
 #include <QPushButton>
 
+namespace {
+
+/// A key that is held presses once.
+class PushButton final : public QPushButton {
+public:
+    using QPushButton::QPushButton;
+
+protected:
+    void keyPressEvent(QKeyEvent* event) override
+    {
+        if (!HeldKey::isRepeating())
+            QPushButton::keyPressEvent(event);
+    }
+};
+
+} // namespace
+
 BButton::BButton(BRect frame, const char* name, const char* label, BMessage* message, uint32 flags)
-    : BControl(frame, name, label, message, new QPushButton(labelText(label)), flags)
+    : BControl(frame, name, label, message, new PushButton(labelText(label)), flags)
 {
     auto* button = static_cast<QPushButton*>(widget());
+    HeldKey::watch();
     // Enter presses the button that has the keyboard, as the space bar does.
     button->setAutoDefault(true);
     if ((flags & B_NAVIGABLE) == 0)

@@ -375,6 +375,14 @@ TEST_F(OperationTest, ASuccessIsToldAndADoubleClickBooksOnce)
     click(kAdd);
     EXPECT_EQ(countOperations(), 1U);
     EXPECT_EQ(notice(), "Bought 100 BBB, 4,036.75 EUR from Cash");
+    add.setFocus();
+    for (const bool isHeld : {false, true, true}) {
+        QTest::qWait(QApplication::doubleClickInterval() + 50); // as long as a key takes to repeat itself
+        QTest::simulateEvent(&add, true, Qt::Key_Return, Qt::NoModifier, "\r", isHeld);
+        settle();
+    }
+    EXPECT_EQ(countOperations(), 2U) << "a held key is no more meant";
+    post('HUnd');
     post('OBAd');
     EXPECT_EQ(countOperations(), 2U) << "a code that no person sends is no double click";
     post('HUnd');

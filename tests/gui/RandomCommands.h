@@ -242,7 +242,7 @@ protected:
     void changeOperation()
     {
         settle();
-        static const char* const kTypes[] = {"DEPOSIT", "TRANSFER", "BUY", "SELL"};
+        static const char* const kTypes[] = {"DEPOSIT", "TRANSFER", "BUY", "SELL", "INCOME", "CHARGE"};
         auto& page = dynamic_cast<OperationView&>(*window().FindView("OperationView"));
         page.SetType(kTypes[under(std::size(kTypes))]);
         page.setDate(readDate(day()));
