@@ -168,6 +168,11 @@ bool BView::IsFocus() const
     return widget_->hasFocus();
 }
 
+void BView::MakeFocus()
+{
+    widget_->setFocus(Qt::TabFocusReason);
+}
+
 void BView::SetAccessibleName(const char* text)
 {
     widget_->setAccessibleName(QString::fromUtf8(text));
