@@ -2,10 +2,10 @@
 
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
+#include "platform/Label.h"
 #include "platform/MenuField.h"
 #include "platform/MenuItem.h"
 #include "platform/PopUpMenu.h"
-#include "platform/StringView.h"
 #include "views/Look.h"
 
 using namespace look;
@@ -76,18 +76,18 @@ void EventBox::makeFields(BRect area)
                                           "Split", 'CTQv', kDivider);
     divider_ = PageView::addTypedNumber(this, {second, top, second + 24 + kNumberWidth, top + kFieldHeight},
                                         "txtEventSplitRangeDenum", "to", 'CTQv', 24);
+    numerator_->askForCount(NumberControl::kLargestShort);
+    divider_->askForCount(NumberControl::kLargestShort);
     title_ = PageView::addField(this, {area.left, top, area.right, top + kFieldHeight}, "txtCompanyEventTitle", "Title",
                                 'CTEt', kDivider);
     top += kRow;
-    auto* label = new BStringView({area.left, top, area.left + kDivider - kGap, top + kFieldHeight}, "", "Text");
-    // It hides with the note's text, so it is kept.
-    label->SetAlignment(B_ALIGN_RIGHT);
-    AddChild(textLabel_ = label);
     text_ = new BTextView({area.left + kDivider, top, area.right, area.bottom}, "txtCompanyEventText",
                           B_FOLLOW_LEFT | B_FOLLOW_TOP);
-    // It has no label of its own: that stands beside it.
     text_->SetAccessibleName("Text");
     AddChild(text_);
+    // It hides with the note's text, so it is kept.
+    textLabel_ = new BLabel({area.left, top, area.left + kDivider - kGap, top + kFieldHeight}, "Text", *text_);
+    AddChild(textLabel_);
 }
 
 void EventBox::setType(short type)

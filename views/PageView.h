@@ -16,6 +16,8 @@ class PageView : public BView {
 public:
     /// The label of the button in a box that adds what the box's fields say.
     static constexpr const char* kAddLabel = "Add";
+    /// The label of the one that puts them in place of what is selected.
+    static constexpr const char* kUpdateLabel = "Update";
 
     PageView(BRect frame, const char* name);
 
@@ -50,6 +52,8 @@ public:
     {
         return addFieldOf<NumberControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
     }
+    /// One that adds, updates or splits refuses while a number in its box cannot be read: it sends nothing, the
+    /// number's field gets the keyboard, and a notice says why.
     static BButton* addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code);
     struct ButtonPlan {
         const char* name;
