@@ -1,5 +1,6 @@
 #include "app/PLWindow.h"
 
+#include "app/Completions.h"
 #include "app/Holds.h"
 #include "app/MessageView.h"
 #include "app/NoticeLine.h"
@@ -10,6 +11,7 @@
 #include "platform/Application.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
+#include "views/FieldNotice.h"
 #include "views/OperationView.h"
 #include "views/ParameterView.h"
 #include "views/SplitWindow.h"
@@ -33,6 +35,13 @@ void valueAtDate(PLWindow& window)
 {
     if (!window.IsNextMessage('WTDa'))
         window.UpdateState();
+}
+
+const char* textIn(const BMessage& message)
+{
+    const char* text = "";
+    message.FindString("text", &text);
+    return text;
 }
 
 constexpr Command kCommands[] = {
@@ -117,6 +126,10 @@ constexpr Command kOwnCommands[] = {
     {'HUnd', [](PLWindow& w, BMessage*) { w.Undo(); }},
     {'HRed', [](PLWindow& w, BMessage*) { w.Redo(); }},
     {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
+    {kFieldNotice,
+     [](PLWindow& w, BMessage* m) {
+         w.showNotice({"field", textIn(*m), {}, true});
+     }},
     {'WBGd', [](PLWindow& w, BMessage*) { w.valueAtLastQuotes(); }},           // the portfolio page
     {'OPIn', [](PLWindow& w, BMessage*) { w.ChangeOperationType("INCOME"); }}, // the operation page
     {'OPCh', [](PLWindow& w, BMessage*) { w.ChangeOperationType("CHARGE"); }},
@@ -153,6 +166,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     events_ = std::make_unique<EventEditor>(*this, *companyView_);
     operations_ = std::make_unique<OperationEditor>(*this, *operationView_, *companyView_);
     split_ = std::make_unique<SplitAssistant>(*this, *companyView_, *operationView_);
+    makeCompletions();
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     walletView_->setDate(today());
     ReinitWallet(); // from here on there is a wallet, always
@@ -183,6 +197,15 @@ void PLWindow::makePages()
     AddChild(messageView_);
     makeUndoButtons();
     AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // last: in front of the edges of both
+}
+
+void PLWindow::makeCompletions()
+{
+    completions_ = std::make_unique<Completions>(*this);
+    completions_->offerCurrencies(*companyView_, "txtMarketCurrencyRepresentation");
+    completions_->offerCurrencies(*walletView_, "txtAccountCurrency");
+    completions_->offerMarkets(*operationView_, "txtMarketName");
+    completions_->offerCompanies(*operationView_, "txtCompanyAbbreviation", "txtMarketName");
 }
 
 void PLWindow::MessageReceived(BMessage* message)

@@ -16,6 +16,7 @@
 #include <memory>
 
 class BButton;
+class Completions;
 class MessageView;
 class NoticeLine;
 class ParameterView;
@@ -189,6 +190,7 @@ private:
     /// The page in front.
     BView& front() const;
     void makeUndoButtons();
+    void makeCompletions();
     /// Compares what is here with what there was after the last command, and keeps what has changed. `command` names
     /// the step; commands know nothing of it, so that none can forget it.
     void noteStep(const std::string& command);
@@ -233,6 +235,7 @@ private:
     std::unique_ptr<EventEditor> events_;
     std::unique_ptr<SplitAssistant> split_;
     std::unique_ptr<OperationEditor> operations_;
+    std::unique_ptr<Completions> completions_;
     std::unique_ptr<Shortcuts> shortcuts_;
     std::unique_ptr<Rescue> rescue_; // the last one to come and the first to go: its last copy needs all of the above
     int holds_ = 0;                  // of the valuation; 0 between two commands

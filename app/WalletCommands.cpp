@@ -122,9 +122,8 @@ void PLWindow::ChangeParameter(uint32 code)
     const auto parameter = ParameterView::parameterOf(code);
     if (!parameter)
         return;
-    const float value = parameterView_->getParameter(*parameter);
-    wallet_->setParameter(*parameter, value);
-    parameterView_->setParameter(*parameter, value); // what was understood, in place of what was typed
+    wallet_->setParameter(*parameter, parameterView_->getParameter(*parameter));
+    parameterView_->showUnderstood(*parameter); // in place of what was typed
     if (ParameterView::revalues(*parameter))
         UpdateState();
     else

@@ -39,6 +39,19 @@ struct Parts {
     }
 };
 
+/// Day, month and year of what a person typed, without the blanks around them.
+Parts typedParts(std::string_view text)
+{
+    constexpr std::size_t kFullYear = 4;
+    Parts parts(text, "/.-");
+    for (std::string_view* part : {&parts.first, &parts.second, &parts.third})
+        *part = trimmed(*part);
+    // No day has four digits, unless they are zeros in front.
+    if (parts.first.size() == kFullYear && text.find_first_of("/.") == text.npos)
+        std::swap(parts.first, parts.third);
+    return parts;
+}
+
 } // namespace
 
 std::string dateText(const Date& date)
@@ -48,10 +61,24 @@ std::string dateText(const Date& date)
 
 Date readDate(std::string_view text)
 {
-    const Parts parts(text, "/.-");
-    const auto number = [](std::string_view part) { return numberOf(trimmed(part), 1, part.npos); };
+    const Parts parts = typedParts(text);
+    const auto number = [](std::string_view part) { return numberOf(part, 1, part.npos); };
     const Date date(number(parts.first), number(parts.second), number(parts.third));
     return date.isValid() && date.getYear() > 0 ? date : Date();
+}
+
+Date readShortDate(std::string_view text, const Date& today)
+{
+    const Parts parts = typedParts(text);
+    const short year = numberOf(parts.third, 2, 2);
+    if (year < 0)
+        return readDate(text);
+    // The first of the hundred years that are thought of, and from there on to the one with these two digits.
+    const int first = today.getYear() - 50;
+    const int completed = first + ((year - first) % 100 + 100) % 100;
+    // Completed before it is looked at: a leap day may be none in the first century, and there is no year 0.
+    const Date date(numberOf(parts.first, 1, 2), numberOf(parts.second, 1, 2), completed);
+    return date.isValid() && completed > 0 ? date : Date();
 }
 
 std::optional<Date> parseDate(std::string_view text)

@@ -7,10 +7,16 @@
 #include <cstdio>
 #include <cstdlib>
 #include <iterator>
+#include <string_view>
 
 namespace {
 
 constexpr std::size_t kGroup = 3; // digits between thousands separators
+
+bool isDigit(char c)
+{
+    return c >= '0' && c <= '9';
+}
 
 std::string withSeparators(std::string digits, std::size_t end)
 {
@@ -59,6 +65,26 @@ Parsed parsed(const std::string& text)
     if (result.ec != std::errc() || !std::isfinite(value))
         return {};
     return {value, std::all_of(result.ptr, end, [](char c) { return c == ' ' || c == '\t'; })};
+}
+
+/// How many groups of three digits stand behind one of one to three, with the same mark between all of them, and
+/// nothing else; 0 for any other text.
+std::size_t thousandsIn(std::string_view text)
+{
+    const std::size_t begin = text.find_first_not_of(" \t+-");
+    if (begin == text.npos || text[begin] == '0')
+        return 0;
+    text = text.substr(begin, text.find_last_not_of(" \t") + 1 - begin);
+    const std::size_t first = std::min(text.find_first_not_of("0123456789"), text.size());
+    const std::size_t rest = text.size() - first;
+    if (first < 1 || first > kGroup || rest % (kGroup + 1) != 0)
+        return 0;
+    for (std::size_t i = first; i < text.size(); ++i) {
+        const bool isMark = (i - first) % (kGroup + 1) == 0;
+        if (isMark ? (text[i] != text[first] || (text[i] != '.' && text[i] != ',')) : !isDigit(text[i]))
+            return 0;
+    }
+    return rest / (kGroup + 1);
 }
 
 } // namespace
@@ -130,4 +156,18 @@ double readCount(const std::string& text)
 bool isNumber(const std::string& text)
 {
     return parsed(text).isWhole;
+}
+
+bool isCount(const std::string& text)
+{
+    const double count = readCount(text);
+    if (!isNumber(text) || count != std::floor(count))
+        return false;
+    // Where a mark was taken for one between thousands, the digits must stand so.
+    return count == readNumber(text) || thousandsIn(text) > 0;
+}
+
+bool mayMeanThousands(const std::string& text)
+{
+    return thousandsIn(text) == 1;
 }

@@ -24,3 +24,7 @@ double readNumber(const std::string& text);
 double readCount(const std::string& text);
 /// Whether all of `text` but the blanks around it is what `readNumber` reads.
 bool isNumber(const std::string& text);
+/// Whether it is what `readCount` reads, and that is a whole number: "1,234" and "5.00", but neither "1,5" nor "0,125".
+bool isCount(const std::string& text);
+/// Whether a person may mean thousands by the decimal mark that `readNumber` takes: "1,234", but not "0.125".
+bool mayMeanThousands(const std::string& text);

@@ -2,12 +2,28 @@
 
 #include "platform/Control.h"
 
+#include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 class FieldText;
 class QLabel;
-class QLineEdit;
+class TextField;
+
+/// What a field's text may become.
+struct Completion {
+    std::string text;           ///< for the field
+    std::string label;          ///< in the list
+    std::function<void()> take; ///< what else happens when it is chosen, before the field tells of it; may be empty
+};
+
+/// A day as a calendar names it; no day when all are 0.
+struct CalendarDay {
+    int day = 0;
+    int month = 0;
+    int year = 0;
+};
 
 /// A label with a field for one line of text, UTF-8.
 ///
@@ -34,6 +50,16 @@ public:
     void MarkAsInvalid(const char* reason);
     /// Hook: the text was changed by hand and not sent yet.
     virtual void TextModified() {}
+    /// Hook: Enter was pressed, or the keyboard leaves a text that was changed by hand. Comes before the message, so
+    /// that a text that is set here is what counts.
+    virtual void TextFinished() {}
+    /// While a person types, a list below the field shows what `find` has for the text; Down opens it, too. Arrow keys
+    /// or the mouse choose, and what is chosen counts as typed, with Enter. As long as nothing is chosen the text
+    /// stands as it is typed.
+    void SetCompletions(const std::function<std::vector<Completion>(const std::string& typed)>& find);
+    /// Puts a button at the field's right end, and Alt+Down, that open a calendar at the day that `shown` gives;
+    /// `choose` is called with the one that a person takes.
+    void SetCalendar(const std::function<CalendarDay()>& shown, const std::function<void(const CalendarDay&)>& choose);
 
     void SetFont(const BFont* font, uint32 mask = B_FONT_ALL) override;
     void FrameResized(float /*width*/, float /*height*/) override { layOut(); }
@@ -44,8 +70,9 @@ private:
     void show(const char* text);
     std::string shown() const;
     void commit();
+    void complete(const Completion& chosen);
 
-    QLineEdit* field_; // a part of the widget
+    TextField* field_; // a part of the widget
     QLabel* caption_;  // and so is this
     float divider_;
     std::string committed_; // what the field showed when its text was set or sent

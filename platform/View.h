@@ -61,10 +61,12 @@ public:
     void ResizeTo(float width, float height);
     void Hide();
     void Show();
+    /// Whether it was hidden itself; what it stands in may be hidden, too. In the kits both count.
+    bool IsHidden() const { return hidden_; }
 
     // Keyboard focus and what assistive tools say.
     bool IsFocus() const;
-    /// Gives the view the keyboard.
+    /// Gives the view the keyboard, as the Tab key does.
     void MakeFocus();
     void SetAccessibleName(const char* text);
     void SetToolTip(const char* text);

@@ -18,10 +18,37 @@ Date monthsFrom(const Date& date, int months)
 
 } // namespace
 
+DateControl::DateControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message)
+    : BTextControl(frame, name, label, text, message), shown_(text)
+{
+    SetCalendar(
+        [this] {
+            const Date date = getDate();
+            return CalendarDay{date.getDay(), date.getMonth(), date.getYear()};
+        },
+        [this](const CalendarDay& day) {
+            enter(Date(static_cast<short>(day.day), static_cast<short>(day.month), day.year));
+        });
+}
+
 void DateControl::setDate(const Date& date)
 {
-    SetText(dateText(date).c_str());
+    shown_ = dateText(date);
+    SetText(shown_.c_str());
     mark();
+}
+
+Date DateControl::getDate() const
+{
+    // A date of the first century that was put in is shown with its two digits, and stays what it is.
+    return Text() == shown_ ? readDate(shown_) : readShortDate(Text(), today());
+}
+
+void DateControl::TextFinished()
+{
+    const Date date = getDate();
+    if (!date.isUndefined() && Text() != shown_)
+        setDate(date);
 }
 
 void DateControl::KeyDown(const char* bytes, int32)

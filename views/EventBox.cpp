@@ -3,10 +3,10 @@
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
 #include "platform/Button.h"
+#include "platform/Label.h"
 #include "platform/MenuField.h"
 #include "platform/MenuItem.h"
 #include "platform/PopUpMenu.h"
-#include "platform/StringView.h"
 #include "views/Look.h"
 
 using namespace look;
@@ -82,18 +82,18 @@ void EventBox::makeFields(BRect area)
     apply_ =
         PageView::addButton(this, {second + 24 + kNumberWidth + kGap, top - 1, area.right, top - 1 + kButtonHeight},
                             "btnApplySplit", "Apply...", 'CBAs');
+    numerator_->askForCount(NumberControl::kLargestShort);
+    divider_->askForCount(NumberControl::kLargestShort);
     title_ = PageView::addField(this, {area.left, top, area.right, top + kFieldHeight}, "txtCompanyEventTitle", "Title",
                                 'CTEt', kDivider);
     top += kRow;
-    auto* label = new BStringView({area.left, top, area.left + kDivider - kGap, top + kFieldHeight}, "", "Text");
-    // It hides with the note's text, so it is kept.
-    label->SetAlignment(B_ALIGN_RIGHT);
-    AddChild(textLabel_ = label);
     text_ = new BTextView({area.left + kDivider, top, area.right, area.bottom}, "txtCompanyEventText",
                           B_FOLLOW_LEFT | B_FOLLOW_TOP);
-    // It has no label of its own: that stands beside it.
     text_->SetAccessibleName("Text");
     AddChild(text_);
+    // It hides with the note's text, so it is kept.
+    textLabel_ = new BLabel({area.left, top, area.left + kDivider - kGap, top + kFieldHeight}, "Text", *text_);
+    AddChild(textLabel_);
 }
 
 void EventBox::setType(short type)

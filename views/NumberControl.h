@@ -9,9 +9,17 @@
 
 /// A field for a number, with "." or "," as decimal mark. A text that is none shows by its colour until it is mended,
 /// and so does one with a number and more; the number that it begins with counts then, or 0.
+///
+/// When a person leaves the field, or presses Enter, the number is written as it was understood. Where the mark may
+/// have been meant to part thousands, and where a whole number is too large, a notice says how it was read.
 class NumberControl : public BTextControl {
 public:
+    static constexpr int kLargestShort = std::numeric_limits<short>::max();
+
     using BTextControl::BTextControl;
+
+    /// From here on it is for whole numbers up to `largest`, and others are marked.
+    void askForCount(int largest = std::numeric_limits<int>::max());
 
     /// Shows enough digits for `getNumber` to give the same value.
     void setNumber(float value) { show(exactText(value)); }
@@ -23,7 +31,12 @@ public:
     int getInteger() const { return limited<int>(readCount(Text())); }
     short getShort() const { return limited<short>(readCount(Text())); }
 
+    /// What is wrong with the text, as it goes on from it: "is no number". Null when it is what the field is for, and
+    /// when the field is empty.
+    const char* fault() const;
+
     void TextModified() override { mark(); }
+    void TextFinished() override;
 
 private:
     /// The nearest number that `Number` has.
@@ -36,4 +49,7 @@ private:
     }
     void show(const std::string& text);
     void mark();
+
+    int largestCount_ = 0; // 0: it need not be whole
+    std::string shown_;    // what was last put into the field; another text there was typed
 };

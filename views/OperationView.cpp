@@ -164,6 +164,7 @@ void OperationView::makeTypedFields(BBox* box)
     marketName_ = of(kTrade | kIncome, word(0, 1, "txtMarketName", "Market"));
     companyAbbreviation_ = of(kTrade | kIncome, word(1, 1, "txtCompanyAbbreviation", "Ticker"));
     quantity_ = of(kTrade, number(2, 1, "txtQuantity", "Quantity", 'OTQy'));
+    quantity_->askForCount();
     quote_ = of(kTrade, number(0, 2, "txtQuote", "Quote", 'OTQo'));
     shareCost_ = of(kTrade, number(1, 2, "txtShareCost", "Cost", 'OTSc'));
     total_ = of(kTrade, addNumber(box, cell(2, 2), "txtTotal", "Total", 'OTTo', kDivider));

@@ -3,10 +3,41 @@
 #include "foundation/NumberText.h"
 #include "platform/Button.h"
 #include "platform/StringView.h"
+#include "views/FieldNotice.h"
 #include "views/Look.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstring>
+
+namespace {
+
+constexpr const char* kBookingLabels[] = {PageView::kAddLabel, PageView::kUpdateLabel, "Split"};
+
+/// A button whose command takes the numbers of its box.
+class BookingButton final : public BButton {
+public:
+    using BButton::BButton;
+
+    status_t Invoke(const BMessage* message) override
+    {
+        for (int32 i = 0; i < Parent()->CountChildren(); ++i) {
+            auto* field = dynamic_cast<NumberControl*>(Parent()->ChildAt(i));
+            if (field == nullptr || field->IsHidden() || field->fault() == nullptr)
+                continue;
+            field->MakeFocus();
+            tellAboutField(*field, std::string(field->Label()) + ": " + shortened(field->Text(), kLongestTold) + ' ' +
+                                       field->fault());
+            return B_BAD_VALUE;
+        }
+        return BButton::Invoke(message);
+    }
+
+private:
+    static constexpr std::size_t kLongestTold = 60; // bytes
+};
+
+} // namespace
 
 PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_ALL, B_WILL_DRAW | B_FRAME_EVENTS)
 {
@@ -15,8 +46,11 @@ PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_
 
 BButton* PageView::addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code)
 {
+    const bool isBooking =
+        std::ranges::any_of(kBookingLabels, [&](const char* l) { return std::strcmp(l, label) == 0; });
     auto* message = new BMessage(code);
-    auto* button = new BButton(frame, name, label, message);
+    auto* button =
+        isBooking ? new BookingButton(frame, name, label, message) : new BButton(frame, name, label, message);
     // `app/Shortcuts.cpp` finds the button that adds by the same label.
     if (std::strcmp(label, kAddLabel) == 0) {
         message->AddInt32(kByHand, 1);

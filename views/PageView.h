@@ -18,6 +18,8 @@ public:
     static constexpr const char* kAddLabel = "Add";
     /// What the message of such a button has, and one that comes in another way has not.
     static constexpr const char* kByHand = "byHand";
+    /// The label of the one that puts them in place of what is selected.
+    static constexpr const char* kUpdateLabel = "Update";
 
     PageView(BRect frame, const char* name);
 
@@ -52,6 +54,8 @@ public:
     {
         return addFieldOf<NumberControl>(parent, frame, name, label, code, divider, B_ALIGN_RIGHT);
     }
+    /// One that adds, updates or splits refuses while a number in its box cannot be read: it sends nothing, the
+    /// number's field gets the keyboard, and a notice says why.
     static BButton* addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code);
     struct ButtonPlan {
         const char* name;

@@ -1,14 +1,18 @@
 #include "views/ParameterView.h"
 
+#include "foundation/NumberText.h"
 #include "platform/TextControl.h"
+#include "views/FieldNotice.h"
 #include "views/Look.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstdio>
 #include <cstdlib>
 #include <iterator>
 #include <limits>
 #include <string>
+#include <tuple>
 
 namespace {
 
@@ -55,22 +59,41 @@ constexpr float kHeight = 20;
 constexpr float kDivider = 123;
 constexpr float kTextSize = 11; // the longest label must stand beside its field within that width
 
-/// The first piece of `text` between delimiters: blanks, letters, "$", the bytes of "£", and "%" where that is one,
-/// too. Empty when there is nothing but delimiters.
-std::string firstToken(const std::string& text, bool isPercent)
+/// Delimiters are blanks, letters, "$", the bytes of "£", and "%" where that is one, too.
+bool isDelimiter(char c, bool isPercent)
 {
-    const auto isDelimiter = [isPercent](char c) {
-        return c == ' ' || c == '\t' || c == '$' || c == '\xC2' || c == '\xA3' || (c >= 'A' && c <= 'Z') ||
-               (c >= 'a' && c <= 'z') || (isPercent && c == '%');
-    };
+    return c == ' ' || c == '\t' || c == '$' || c == '\xC2' || c == '\xA3' || (c >= 'A' && c <= 'Z') ||
+           (c >= 'a' && c <= 'z') || (isPercent && c == '%');
+}
+
+/// The first piece of `text` between delimiters. Empty when there is nothing but delimiters.
+std::string_view firstToken(std::string_view text, bool isPercent)
+{
     // What stands before the number is skipped, then the number ends where the next such character comes.
     std::size_t begin = 0;
-    while (begin < text.size() && isDelimiter(text[begin]))
+    while (begin < text.size() && isDelimiter(text[begin], isPercent))
         ++begin;
     std::size_t end = begin;
-    while (end < text.size() && !isDelimiter(text[end]))
+    while (end < text.size() && !isDelimiter(text[end], isPercent))
         ++end;
     return text.substr(begin, end - begin);
+}
+
+/// Whether `text` holds more of a number than the piece of it that is read: "0,25", "90.7" days, "1 000".
+bool readsInPart(const std::string& text, Kind kind)
+{
+    const std::string_view token = firstToken(text, kind == Kind::kRate);
+    if (token.empty())
+        return false;
+    const std::string number(token);
+    char* end;
+    if (kind == Kind::kDays)
+        std::ignore = std::strtol(number.c_str(), &end, 10);
+    else
+        std::ignore = std::strtod(number.c_str(), &end);
+    // Behind the piece there may be a unit, but no further number.
+    const auto rest = static_cast<std::size_t>(token.data() + token.size() - text.data());
+    return *end != '\0' || text.find_first_of("0123456789", rest) != text.npos;
 }
 
 /// The number that `token` begins with, divided by `unit`; 0 without one, the nearest float for one that is too large.
@@ -83,7 +106,7 @@ float number(const std::string& token, double unit)
 float readAs(Kind kind, const std::string& text)
 {
     // A person may leave the unit in the field, take it out or type another: it is skipped.
-    const std::string token = firstToken(text, kind == Kind::kRate);
+    const std::string token(firstToken(text, kind == Kind::kRate));
     if (kind != Kind::kDays)
         return number(token, kind == Kind::kRate ? 100 : 1);
     // A whole number ends at the first character that is no digit, so "90.7" is 90.
@@ -107,15 +130,54 @@ std::string textOf(float value, Kind kind)
     }
 }
 
+/// What to type instead of a text that is read in part; empty when nobody can tell.
+std::string proposal(const std::string& text, Kind kind)
+{
+    std::string number;
+    std::ranges::copy_if(text, std::back_inserter(number),
+                         [&](char c) { return !isDelimiter(c, kind == Kind::kRate); });
+    if (!isNumber(number))
+        return {};
+    if (kind == Kind::kDays)
+        return std::to_string(std::lround(std::trunc(std::clamp(readCount(number), -1e4, 1e4))));
+    return exactText(static_cast<float>(readNumber(number)));
+}
+
 } // namespace
+
+/// The field of a parameter. A text that is read in part shows by its colour, with what is read of it as tool tip.
+class ParameterField final : public BTextControl {
+public:
+    using BTextControl::BTextControl;
+
+    void setPlan(const Plan& plan) { plan_ = &plan; }
+    bool isInDoubt() const { return readsInPart(Text(), plan_->kind); }
+    /// Such as "0,25 is read as 0.00 %: write 0.25".
+    std::string reading() const
+    {
+        const std::string text = Text();
+        const std::string better = proposal(text, plan_->kind);
+        return text + " is read as " + textOf(readAs(plan_->kind, text), plan_->kind) +
+               (better.empty() ? ": write a plain number, such as " : ": write ") +
+               (!better.empty()              ? better
+                : plan_->kind == Kind::kDays ? "90"
+                                             : "1234.5");
+    }
+    void mark() { MarkAsInvalid(isInDoubt() ? reading().c_str() : nullptr); }
+    void TextModified() override { mark(); }
+
+private:
+    const Plan* plan_ = nullptr;
+};
 
 ParameterView::ParameterView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
 {
     addOpenFile(this, {kRight, 2, look::kPageWidth - look::kMargin, 2 + kHeight});
     for (std::size_t i = 0; i < fields_.size(); ++i) {
         const float top = kTop + kPitch * static_cast<float>(i);
-        fields_[i] = addNumber(this, {kLeft, top, kRight, top + kHeight}, kPlan[i].name, kPlan[i].label, kPlan[i].code,
-                               kDivider);
+        fields_[i] = addFieldOf<ParameterField>(this, {kLeft, top, kRight, top + kHeight}, kPlan[i].name,
+                                                kPlan[i].label, kPlan[i].code, kDivider, B_ALIGN_RIGHT);
+        fields_[i]->setPlan(kPlan[i]);
         fields_[i]->SetFontSize(kTextSize);
         fields_[i]->SetToolTip(kPlan[i].help);
     }
@@ -157,6 +219,16 @@ void ParameterView::setParameter(Wallet::Parameter parameter, float value)
 {
     // This is not typing: no message is sent, and nothing is stored in the wallet.
     fields_[parameter]->SetText(textOf(value, kPlan[parameter].kind).c_str());
+    fields_[parameter]->mark();
+}
+
+void ParameterView::showUnderstood(Wallet::Parameter parameter)
+{
+    const ParameterField& field = *fields_[parameter];
+    // What was read in part stays as it was typed, marked until a person mends it: nothing else would tell of it.
+    if (field.isInDoubt())
+        return tellAboutField(field, std::string(field.Label()) + ": " + field.reading());
+    setParameter(parameter, getParameter(parameter));
 }
 
 float ParameterView::getParameter(Wallet::Parameter parameter) const

@@ -6,6 +6,8 @@
 #include <array>
 #include <optional>
 
+class ParameterField;
+
 /// The page of the ten trading parameters.
 ///
 /// Each is shown in a field of its own, rates as percentages, and is sent to the window when it is committed. A getter
@@ -24,6 +26,9 @@ public:
     /// Any of the ten by its number, as below by its name.
     void setParameter(Wallet::Parameter parameter, float value);
     float getParameter(Wallet::Parameter parameter) const;
+    /// Shows what the getter has understood in place of what was typed. A text of which it has read a part only, such
+    /// as "0,25", stays as it is and marked, and a notice says what was read.
+    void showUnderstood(Wallet::Parameter parameter);
 
     void setBuyCost(float cost) { setParameter(Wallet::kBuyCost, cost); }
     float getBuyCost() const { return getParameter(Wallet::kBuyCost); }
@@ -52,5 +57,5 @@ public:
     void KeyDown(const char* bytes, int32 numBytes) override;
 
 private:
-    std::array<BTextControl*, Wallet::kParameterCount> fields_{};
+    std::array<ParameterField*, Wallet::kParameterCount> fields_{};
 };

@@ -57,8 +57,8 @@ WalletView::~WalletView() = default;
 void WalletView::makeTop()
 {
     date_ =
-        addDate(this, {kMargin, kMargin + 1, kMargin + 132, kMargin + 1 + kFieldHeight}, "txtDate", "Date", 'WTDa', 38);
-    computeEvolution_ = addCheckBox(this, {kMargin + 148, kMargin + 1, kMargin + 300, kMargin + 1 + kFieldHeight},
+        addDate(this, {kMargin, kMargin + 1, kMargin + 144, kMargin + 1 + kFieldHeight}, "txtDate", "Date", 'WTDa', 38);
+    computeEvolution_ = addCheckBox(this, {kMargin + 156, kMargin + 1, kMargin + 308, kMargin + 1 + kFieldHeight},
                                     "cbxComputeEvolution", "Compute Evolution", 'WCCe');
     constexpr float kButtonWidth = 110;
     addButtons(this, {kRight - 4 * kButtonWidth - 3 * kGap, kMargin, kRight, kTopEnd},

@@ -10,6 +10,7 @@ BTabView::BTabView(BRect frame, const char* name, button_width, uint32 resizingM
     : BView(frame, name, resizingMode, flags, new QTabWidget)
 {
     tabWidget().setDocumentMode(true);
+    tabWidget().setFocusPolicy(Qt::NoFocus); // the bar has the keyboard, see below
     tabWidget().tabBar()->setObjectName(QString::fromUtf8(Name()) + "Bar");
     tabWidget().tabBar()->setAccessibleName(QString::fromUtf8(Name()));
     tabWidget().tabBar()->setExpanding(false);

@@ -1,48 +1,18 @@
 #include "platform/TextControl.h"
 
+#include "platform/qt/CalendarPopup.h"
 #include "platform/qt/FieldText.h"
-#include "platform/qt/Keys.h"
 #include "platform/qt/Labels.h"
+#include "platform/qt/TextField.h"
 
 #include <QFont>
-#include <QKeyEvent>
 #include <QLabel>
-#include <QLineEdit>
 
 #include <cmath>
 
 namespace {
 
 constexpr std::size_t kLongestShown = 4096; // bytes; no name is as long
-
-/// Gives the control's `KeyDown` what the field itself has no use for.
-class Field final : public QLineEdit {
-public:
-    using QLineEdit::QLineEdit;
-
-    BView* view = nullptr;
-
-    bool event(QEvent* event) override
-    {
-        return isForWindow(*event, isModified(), isRedoAvailable()) || QLineEdit::event(event);
-    }
-
-protected:
-    void keyPressEvent(QKeyEvent* event) override
-    {
-        if ((event->modifiers() & ~Qt::KeypadModifier) != Qt::NoModifier)
-            return QLineEdit::keyPressEvent(event);
-        // Enter is the field's: it sends the message, and must not reach a default button.
-        if (event->key() == Qt::Key_Up || event->key() == Qt::Key_Down || event->key() == Qt::Key_PageUp ||
-            event->key() == Qt::Key_PageDown) {
-            // In a field of one line these keys do nothing by themselves.
-            const std::string bytes = keyBytes(*event);
-            view->KeyDown(bytes.c_str(), static_cast<int32>(bytes.size()));
-            return;
-        }
-        QLineEdit::keyPressEvent(event);
-    }
-};
 
 Qt::Alignment toQt(alignment side)
 {
@@ -55,14 +25,13 @@ Qt::Alignment toQt(alignment side)
 } // namespace
 
 BTextControl::BTextControl(BRect frame, const char* name, const char* label, const char* text, BMessage* message)
-    : BControl(frame, name, label, message, new QWidget, B_WILL_DRAW | B_FRAME_EVENTS), field_(new Field(widget())),
-      caption_(new QLabel(labelText(label), widget())), divider_(*Label() == '\0' ? 0 : std::floor(frame.Width() / 2)),
-      text_(std::make_unique<FieldText>(kLongestShown))
+    : BControl(frame, name, label, message, new QWidget, B_WILL_DRAW | B_FRAME_EVENTS),
+      field_(new TextField(*this, *widget())), caption_(new QLabel(labelText(label), widget())),
+      divider_(*Label() == '\0' ? 0 : std::floor(frame.Width() / 2)), text_(std::make_unique<FieldText>(kLongestShown))
 {
     // The field is what the keyboard reaches, so the field bears the names.
     widget()->setObjectName({});
     widget()->setAccessibleName({});
-    static_cast<Field*>(field_)->view = this;
     field_->setObjectName(QString::fromUtf8(Name()));
     field_->setAccessibleName(QString::fromUtf8(Label()));
     show(text);
@@ -71,6 +40,7 @@ BTextControl::BTextControl(BRect frame, const char* name, const char* label, con
     // Enter sends the text in any case, changed or not; leaving the field sends it only when it was changed since it
     // was set or sent last. Qt reports Enter as both, in this order, and the second then finds nothing to send.
     QObject::connect(field_, &QLineEdit::returnPressed, [this] {
+        TextFinished();
         committed_ = shown();
         Invoke();
     });
@@ -101,9 +71,34 @@ void BTextControl::commit()
 {
     if (committed_ == shown())
         return;
+    TextFinished();
     // Before the message, which may put another text into the field.
     committed_ = shown();
     Invoke();
+}
+
+void BTextControl::SetCompletions(const std::function<std::vector<Completion>(const std::string&)>& find)
+{
+    field_->setCompletions(find, [this](const Completion& chosen) { complete(chosen); });
+}
+
+void BTextControl::complete(const Completion& chosen)
+{
+    show(chosen.text.c_str());
+    if (chosen.take)
+        chosen.take();
+    // As after typing and Enter.
+    TextModified();
+    Invoke();
+}
+
+void BTextControl::SetCalendar(const std::function<CalendarDay()>& shown,
+                               const std::function<void(const CalendarDay&)>& choose)
+{
+    field_->setCalendar([this, shown, choose] {
+        field_->setFocus(Qt::OtherFocusReason);
+        CalendarPopup::open(*field_, shown(), choose);
+    });
 }
 
 const char* BTextControl::Text() const

@@ -170,7 +170,7 @@ bool BView::IsFocus() const
 
 void BView::MakeFocus()
 {
-    widget_->setFocus(Qt::OtherFocusReason);
+    widget_->setFocus(Qt::TabFocusReason);
 }
 
 void BView::SetAccessibleName(const char* text)

@@ -2,6 +2,7 @@
 
 #include "platform/InterfaceDefs.h"
 #include "platform/Window.h"
+#include "platform/qt/Access.h"
 #include "platform/qt/HeldKey.h"
 
 #include <QCloseEvent>
@@ -14,6 +15,7 @@
 
 WindowWidget::WindowWidget(BWindow& window) : window_(window)
 {
+    nameRoles();
     addShortcut(Qt::Key_Q, B_CONTROL_KEY, [this] { close(); });
 }
 

@@ -9,6 +9,7 @@
 #include "history/CatalogueImage.h"
 #include "history/WalletImage.h"
 #include "market/Market.h"
+#include "market/NameIndex.h"
 #include "market/Quote.h"
 #include "platform/Application.h"
 #include "platform/CheckBox.h"
@@ -383,6 +384,40 @@ void BM_FillLine(benchmark::State& state)
     state.counters["items"] = static_cast<double>(state.range());
 }
 BENCHMARK(BM_FillLine)->Arg(20000)->Arg(80000)->Unit(benchmark::kMillisecond);
+
+/// So many companies, of which each tenth has "water" in its name.
+std::vector<NamedEntry> companies(int count)
+{
+    constexpr const char* kWords[] = {"Alpine", "Métallurgie", "Bank", "Energy", "Systèmes",
+                                      "Foods",  "Håndverk",    "Rail", "Water",  "Électricité"};
+    std::vector<NamedEntry> entries;
+    for (int i = 0; i < count; ++i)
+        entries.push_back({"T" + std::to_string(i * 7919 % count),
+                           std::string(kWords[i / 10 % 10]) + ' ' + kWords[i % 10],
+                           "Market " + std::to_string(i % 20)});
+    return entries;
+}
+
+/// The first letter typed after a change of the catalogue: the names are gathered anew.
+void BM_FirstCompletion(benchmark::State& state)
+{
+    const auto entries = companies(static_cast<int>(state.range(0)));
+    for (auto _ : state)
+        benchmark::DoNotOptimize(NameIndex(entries).find("w", 50));
+}
+BENCHMARK(BM_FirstCompletion)->Arg(5000)->Unit(benchmark::kMillisecond);
+
+/// Each further letter; the last text fits nothing, and so is looked for everywhere.
+void BM_Completion(benchmark::State& state)
+{
+    const NameIndex index(companies(static_cast<int>(state.range(0))));
+    for (auto _ : state) {
+        for (const char* typed : {"t", "t1", "water", "électricité w", "nobody"})
+            benchmark::DoNotOptimize(index.find(typed, 50));
+    }
+    state.SetItemsProcessed(5 * state.iterations());
+}
+BENCHMARK(BM_Completion)->Arg(5000)->Unit(benchmark::kMillisecond);
 
 /// A start from nothing, libraries and all, until the window is painted.
 void BM_Start(benchmark::State& state, const char* window)

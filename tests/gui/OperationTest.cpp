@@ -89,23 +89,23 @@ TEST_F(OperationTest, AnAdditionIsListedSelectedAndLeavesTheFields)
         const char* row;
         int where;
     } cases[] = {
-        {{{"operationType", "Deposit"}, {"baseAccount", "Broker"}, {"txtAmount", "1000"}},
+        {{{"operationType", "Deposit"}, {"baseAccount", "Broker"}, {"txtAmount", "1000.00"}},
          "21/11/2024\tBroker\tDeposit\t\t\t1,000.00\t\t1,000.00 EUR\t",
          0},
         {{{"operationType", "Transfer"},
           {"transferAccount", "Dollars"},
-          {"txtAmount", "50"},
+          {"txtAmount", "50.00"},
           {"txtDate", "20/11/2024"},
-          {"txtTransferCost", "2"},
+          {"txtTransferCost", "2.00"},
           {"txtTransferRateCost", "0.01"}},
          "20/11/2024\tBroker\tTransfer\tto Dollars\t\t50.00\t2.50\t50.00 EUR\t",
          0},
         {{{"operationType", "Buy"},
           {"txtMarketName", "Paris"},
           {"txtCompanyAbbreviation", "BBB"},
-          {"txtQuantity", "3,000"},
+          {"txtQuantity", "3000"},
           {"txtDate", "22/11/2024"},
-          {"txtQuote", "12,5"},
+          {"txtQuote", "12.50"},
           {"txtShareCost", "1.25"}},
          "22/11/2024\tBroker\tBuy\tBBB  Beta\t3,000\t12.50\t1.25\t37,500.00 EUR\t",
          2},
@@ -299,7 +299,7 @@ TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
     fill({{"txtShareCost", ""}, {"txtMarketName", "Paris"}});
     EXPECT_EQ(text("txtShareCost"), "") << "emptied by hand: no cost";
     fill({{"txtShareCost", "7"}, {"operationType", "Buy"}});
-    EXPECT_EQ(text("txtShareCost"), "7") << "typed";
+    EXPECT_EQ(text("txtShareCost"), "7.00") << "typed";
 
     type("txtCompanyAbbreviation", "BBB");
     EXPECT_EQ(text("txtQuote"), "10.00");
@@ -309,20 +309,20 @@ TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
     type("txtCompanyAbbreviation", "AAA");
     EXPECT_EQ(text("txtQuote"), "") << "it has no quotes, and BBB's is not its";
     fill({{"txtQuote", "4"}, {"txtCompanyAbbreviation", "BB"}});
-    EXPECT_EQ(text("txtQuote"), "4") << "typed, and there is no other company yet";
+    EXPECT_EQ(text("txtQuote"), "4.00") << "typed, and there is no other company yet";
     type("txtCompanyAbbreviation", "BBB");
     EXPECT_EQ(text("txtQuote"), "12.00") << "what was typed was a quote of AAA";
     fill({{"txtQuote", "5"}, {"txtMarketName", "Pari"}, {"txtMarketName", "Paris"}});
-    EXPECT_EQ(text("txtQuote"), "5") << "the same company again";
+    EXPECT_EQ(text("txtQuote"), "5.00") << "the same company again";
     fill({{"txtCompanyAbbreviation", ""}, {"txtQuote", "6"}, {"txtCompanyAbbreviation", "BBB"}});
-    EXPECT_EQ(text("txtQuote"), "6") << "typed for no company yet";
+    EXPECT_EQ(text("txtQuote"), "6.00") << "typed for no company yet";
 
     fill({{"operationType", "Transfer"}, {"baseAccount", "Cash"}, {"transferAccount", "Dollars"}});
     EXPECT_EQ(text("txtTransferFromQuote") + " " + text("txtTransferToQuote"), "1.00 0.50");
     choose("transferAccount", "Broker");
     EXPECT_EQ(text("txtTransferToQuote"), "1.00") << "nothing to exchange";
     fill({{"txtTransferToQuote", "3"}, {"transferAccount", "Dollars"}});
-    EXPECT_EQ(text("txtTransferToQuote"), "3") << "typed";
+    EXPECT_EQ(text("txtTransferToQuote"), "3.00") << "typed";
 
     type("txtDate", "05/05/2024");
     valueOn("04/11/2024");

@@ -2,6 +2,7 @@
 
 #include <QPoint>
 #include <QProcess>
+#include <map>
 #include <string>
 
 /// The built program in a real window: on an X server of its own without a screen, driven by real mouse and key events.
@@ -9,8 +10,10 @@
 /// What goes wrong throws std::runtime_error.
 class RealProgram {
 public:
-    /// Starts an X server, and `program` on it with `home` as home folder.
-    RealProgram(const std::string& program, const std::string& home);
+    using Variables = std::map<std::string, std::string>;
+
+    /// Starts an X server, and `program` on it with `home` as home folder and `more` in its environment.
+    RealProgram(const std::string& program, const std::string& home, const Variables& more = {});
 
     /// Clicks at a place of the main window.
     void click(QPoint place);
