@@ -42,6 +42,8 @@ constexpr Figure kFigures[] = {
     {"Evolution of 20 years in the window / without", "BM_Window/evolve_20_years", "BM_Files/evolve_20_years", "", ""},
     {"Drawing of a line, 100,000 / 5,000 points", "BM_DrawLine/100000", "BM_DrawLine/5000", "", "< 3"},
     {"Filling and clearing a line, a point, 4 n / n", "BM_FillLine/80000", "BM_FillLine/20000", "", "about 1"},
+    {"First letter of a completion, 5,000 companies", "BM_FirstCompletion/5000", nullptr, "ms", "< 20"},
+    {"Completion of five more texts, together", "BM_Completion/5000", nullptr, "ms", "< 20"},
 };
 
 double medianOf(std::vector<double> values)
