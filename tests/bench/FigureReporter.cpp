@@ -44,6 +44,8 @@ constexpr Figure kFigures[] = {
     {"A zoom step in 20 years / drawing all of them", "BM_ZoomStep", "BM_DrawLine/7305", "", "< 1.5"},
     {"A read-out in 20 years / drawing all of them", "BM_ReadOut", "BM_DrawLine/7305", "", "< 0.5"},
     {"Filling and clearing a line, a point, 4 n / n", "BM_FillLine/80000", "BM_FillLine/20000", "", "about 1"},
+    {"First letter of a completion, 5,000 companies", "BM_FirstCompletion/5000", nullptr, "ms", "< 20"},
+    {"Completion of five more texts, together", "BM_Completion/5000", nullptr, "ms", "< 20"},
 };
 
 double medianOf(std::vector<double> values)
