@@ -67,11 +67,11 @@ void ChartPainter::drawChart(const ChartLayout& layout, const ChartContents& con
     std::for_each(series.begin(), front, draw);
     drawAxes(layout);
     std::for_each(front, series.end(), draw);
-    for (const ChartFlagMark& flag : layout.flags)
-        drawFlag(flag.shape, flag.where, contents.flagStyles[static_cast<std::size_t>(flag.shape)].color);
     for (const ChartMark& mark : layout.marks)
         // Above all lines, since they are about the values themselves. The texts come last: nothing covers them.
         drawMark(mark);
+    for (const ChartFlagMark& flag : layout.flags) // the disc of an extreme would hide a diamond
+        drawFlag(flag.shape, flag.where, contents.flagStyles[static_cast<std::size_t>(flag.shape)].color);
     for (const ChartText& label : layout.labels)
         drawText(label, label_);
     for (const ChartText& legend : layout.legends)

@@ -13,7 +13,7 @@ public:
     void fillBackground();
     /// A text in place of a chart.
     void drawNotice(const char* text, BPoint where, float size);
-    /// From back to front: grid, the elements in the order of their series, flags, lowest and highest value, texts. The
+    /// From back to front: grid, the elements in the order of their series, lowest and highest value, flags, texts. The
     /// axes come before the first element that is no polygon: areas behind all else lie below them.
     void drawChart(const ChartLayout& layout, const ChartContents& contents);
     /// A frame around the chart that has the keyboard.
