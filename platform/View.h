@@ -61,11 +61,17 @@ public:
     void ResizeTo(float width, float height);
     void Hide();
     void Show();
+    /// Whether this view was hidden; those around it are not asked.
+    bool IsHidden() const { return hidden_; }
 
     // Keyboard focus and what assistive tools say.
     bool IsFocus() const;
+    /// Takes the keyboard here; the text of a field is then selected, as by the Tab key.
+    void MakeFocus();
     void SetAccessibleName(const char* text);
     void SetToolTip(const char* text);
+    /// Whether the pointer shows that something can be moved to the left and to the right here.
+    void SetMovesSideways(bool movesSideways);
 
     // Hooks.
     virtual void AttachedToWindow() {}
@@ -78,6 +84,8 @@ public:
     virtual void MouseMoved(BPoint /*where*/, bool /*inside*/) {}
     /// The left button was pressed. The views around this one are not told.
     virtual void MouseDown(BPoint /*where*/) {}
+    /// The left button, which was pressed here, was let go, here or elsewhere.
+    virtual void MouseUp(BPoint /*where*/) {}
     /// `bytes` is the UTF-8 text of the key, or one of the control characters of InterfaceDefs.h.
     virtual void KeyDown(const char* /*bytes*/, int32 /*numBytes*/) {}
     /// The right mouse button was pressed, or the key for menus. The kits have no such hook.

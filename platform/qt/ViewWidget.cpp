@@ -37,6 +37,14 @@ void ViewWidget::mousePressEvent(QMouseEvent* event)
         QWidget::mousePressEvent(event);
 }
 
+void ViewWidget::mouseReleaseEvent(QMouseEvent* event)
+{
+    if (event->button() == Qt::LeftButton)
+        view_.MouseUp(at(*event));
+    else
+        QWidget::mouseReleaseEvent(event);
+}
+
 void ViewWidget::mouseMoveEvent(QMouseEvent* event)
 {
     view_.MouseMoved(at(*event), rect().contains(event->position().toPoint()));
