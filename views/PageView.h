@@ -16,6 +16,8 @@ class PageView : public BView {
 public:
     /// The label of the button in a box that adds what the box's fields say.
     static constexpr const char* kAddLabel = "Add";
+    /// And of the one that removes the selected row.
+    static constexpr const char* kRemoveLabel = "Remove";
 
     PageView(BRect frame, const char* name);
 
