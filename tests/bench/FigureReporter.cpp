@@ -40,6 +40,10 @@ constexpr Figure kFigures[] = {
     {"100 pages come up", "BM_Window/switch_page", nullptr, "ms", ""},
     {"Load of a market file in the window / without", "BM_Window/load_market", "BM_Files/load_market", "", "about 1"},
     {"Evolution of 20 years in the window / without", "BM_Window/evolve_20_years", "BM_Files/evolve_20_years", "", ""},
+    {"50,000 operations sorted by a text", "BM_Window/sort_by_text", nullptr, "ms", "< 100"},
+    {"The same by a number", "BM_Window/sort_by_number", nullptr, "ms", "< 100"},
+    {"The same filtered, the first letter", "BM_Window/filter_first", nullptr, "ms", "< 100"},
+    {"The next letter, in sorted ones", "BM_Window/filter_further", nullptr, "ms", "< 100"},
     {"Drawing of a line, 100,000 / 5,000 points", "BM_DrawLine/100000", "BM_DrawLine/5000", "", "< 3"},
     {"Filling and clearing a line, a point, 4 n / n", "BM_FillLine/80000", "BM_FillLine/20000", "", "about 1"},
 };
