@@ -1,6 +1,7 @@
 #include "app/Shortcuts.h"
 
 #include "platform/Button.h"
+#include "platform/ListView.h"
 #include "platform/Message.h"
 #include "platform/TabView.h"
 #include "platform/Window.h"
@@ -17,6 +18,7 @@ constexpr uint32 kSave = 'KySv';
 constexpr uint32 kAdd = 'KyAd';
 constexpr uint32 kUndo = 'KyUn';
 constexpr uint32 kRedo = 'KyRe';
+constexpr uint32 kFind = 'KyFi';
 
 void press(BView* button)
 {
@@ -50,6 +52,17 @@ void collectAddButtons(BView& view, std::vector<BView*>& found)
         collectAddButtons(*view.ChildAt(i), found);
 }
 
+BView* firstListOf(BView& view)
+{
+    if (dynamic_cast<BListView*>(&view) != nullptr)
+        return &view;
+    for (int32 i = 0; i < view.CountChildren(); ++i) {
+        if (BView* found = firstListOf(*view.ChildAt(i)))
+            return found;
+    }
+    return nullptr;
+}
+
 } // namespace
 
 Shortcuts::Shortcuts(BWindow& window, BTabView& tabs) : window_(window), tabs_(tabs)
@@ -62,6 +75,7 @@ Shortcuts::Shortcuts(BWindow& window, BTabView& tabs) : window_(window), tabs_(t
     window.AddShortcut('O', B_CONTROL_KEY, new BMessage(kLoad), this);
     window.AddShortcut('S', B_CONTROL_KEY, new BMessage(kSave), this);
     window.AddShortcut('N', B_CONTROL_KEY, new BMessage(kAdd), this);
+    window.AddShortcut('F', B_CONTROL_KEY, new BMessage(kFind), this);
     window.AddShortcut('Z', B_CONTROL_KEY, new BMessage(kUndo), this);
     window.AddShortcut('Z', B_CONTROL_KEY | B_SHIFT_KEY, new BMessage(kRedo), this);
 }
@@ -93,6 +107,9 @@ void Shortcuts::MessageReceived(BMessage* message)
         break;
     case kRedo:
         press(window_.FindView("btnRedo"));
+        break;
+    case kFind:
+        find();
         break;
     default:
         BHandler::MessageReceived(message);
@@ -128,4 +145,14 @@ void Shortcuts::pressAdd()
     collectAddButtons(front(), buttons);
     if (buttons.size() == 1)
         press(buttons.front());
+}
+
+void Shortcuts::find()
+{
+    // A list finds what is typed while it has the keyboard.
+    BView* place = front().FindView("txtFilter");
+    if (place == nullptr)
+        place = firstListOf(front());
+    if (place != nullptr)
+        place->MakeFocus();
 }

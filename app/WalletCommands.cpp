@@ -207,7 +207,7 @@ void PLWindow::UpdateState()
     if (isEvolutionAsked)
         walletView_->UpdateEvolution(evolutionPoints(*wallet_, catalogue_), catalogue_.getReferenceCurrency(), outcome);
     else
-        walletView_->ClearEvolution(state->getFirstOperationDate() < date);
+        walletView_->ClearEvolution();
     SetState(state);
     tellSimulation();
 }

@@ -4,8 +4,6 @@
 #include <cctype>
 #include <charconv>
 #include <cmath>
-#include <cstdio>
-#include <cstdlib>
 #include <iterator>
 #include <string_view>
 
@@ -32,10 +30,10 @@ std::string fixedText(double value, int decimals, const char* unit = "")
     if (!std::isfinite(value))
         return "?";
     char text[400]; // the largest double has 309 digits before the point
-    std::snprintf(text, sizeof text, "%.*f", decimals, value);
-    if (std::strtod(text, nullptr) == 0)
-        std::snprintf(text, sizeof text, "%.*f", decimals, 0.0);
-    return std::string(text) + unit;
+    char* end = std::to_chars(text, text + sizeof text, value, std::chars_format::fixed, decimals).ptr;
+    const bool isZero = std::all_of(text, end, [](char c) { return c == '-' || c == '0' || c == '.'; });
+    char* begin = isZero && text[0] == '-' ? text + 1 : text;
+    return std::string(begin, end) + unit;
 }
 
 /// What a text says as a number, and whether it says nothing else.

@@ -45,3 +45,6 @@ constexpr char B_END = 0x04;
 constexpr char B_PAGE_UP = 0x0b;
 constexpr char B_PAGE_DOWN = 0x0c;
 constexpr char B_ESCAPE = 0x1b;
+constexpr char B_ENTER = 0x0a;
+constexpr char B_DELETE = 0x7f;
+constexpr char B_FUNCTION_KEY = 0x10; ///< lists get it for F2 only

@@ -19,9 +19,11 @@ public:
     /// Draws the row into `frame` of `owner`. The list has painted the ground, in the colour of selected rows where the
     /// row is selected, and set the high colour to one that can be read on it.
     virtual void DrawItem(BView* owner, BRect frame, bool complete = false) = 0;
-    /// The row as text in one line, UTF-8, with tabs between its cells: what typing finds it by, what is copied, and
-    /// what assistive tools say. The kits do not ask for it.
+    /// The row as text in one line, UTF-8, with tabs between its cells: what typing finds it by, and what assistive
+    /// tools say. The kits do not ask for it.
     virtual std::string Text() const = 0;
+    /// The row as a spreadsheet takes it, when it is copied.
+    virtual std::string CopyText() const { return Text(); }
 
     bool IsSelected() const { return selected_; }
 

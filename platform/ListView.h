@@ -29,6 +29,9 @@ public:
     void AddItems(const std::vector<BListItem*>& items);
     /// Null out of range.
     BListItem* RemoveItem(int32 index);
+    /// Shows these rows, each at most once, in the place of those that are here. The selected ones of them stay so;
+    /// sends no message.
+    void SetItems(std::vector<BListItem*> items);
     void MakeEmpty();
     int32 CountItems() const { return static_cast<int32>(items_.size()); }
     /// Null out of range.
@@ -49,8 +52,12 @@ public:
     int32 CurrentSelection(int32 which = 0) const;
     int32 CountSelected() const;
     bool IsItemSelected(int32 index) const;
-    /// The texts of the selected rows, a line each: what Ctrl+C copies.
+    void SelectAll();
+    void DeselectAll();
+    /// What is copied of the selected rows, a line each.
     std::string SelectedText() const;
+    /// Puts that on the clipboard, as Ctrl+C does.
+    void CopySelected() const;
     void ScrollTo(int32 index);
     void ScrollToSelection() { ScrollTo(CurrentSelection()); }
     /// Index of the row at the upper edge, for `SetTopRow` to bring back; 0 in an empty list.
@@ -66,6 +73,18 @@ public:
     /// Height of each row, in pixels.
     float RowHeight() const { return rowHeight_; }
     void SetRowHeight(float height) { rowHeight_ = height; }
+    /// The least width of each row. Where the list has less, it scrolls sideways.
+    void SetRowWidth(float width);
+    float RowWidth() const { return rowWidth_; }
+    /// How far it is scrolled to the right.
+    float LeftEdge() const;
+
+    // Hooks. `KeyDown` hears of Enter, F2 and Delete only, all other keys are the list's; `MenuRequested` after the row
+    // below the pointer, which then is `where`, was selected.
+    /// The list was scrolled sideways.
+    virtual void ScrolledSideways() {}
+    /// What the tool tip says at `where`, over the row of that index; empty for none.
+    virtual std::string ToolTipAt(BPoint /*where*/, int32 /*index*/) const { return {}; }
 
     /// For the platform's own use.
     void drawRow(QPainter& painter, BRect frame, int32 index);
@@ -81,4 +100,5 @@ private:
     mutable int32 firstUnnumbered_ = 0; // rows from here on do not know their index
     bool quiet_ = false;
     float rowHeight_ = 18;
+    float rowWidth_ = 0;
 };

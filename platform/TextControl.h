@@ -46,6 +46,7 @@ public:
     // What the kits do not have.
     /// Whether the text can be changed by hand; it can be selected in either case.
     void SetEditable(bool editable);
+    bool IsEditable() const;
     /// Shows by colour that the text is not understood, with the reason as tool tip; null takes the colour away.
     void MarkAsInvalid(const char* reason);
     /// Hook: the text was changed by hand and not sent yet.

@@ -70,6 +70,8 @@ public:
     void MakeFocus();
     void SetAccessibleName(const char* text);
     void SetToolTip(const char* text);
+    /// Whether the pointer shows that something can be moved to the left and to the right here.
+    void SetMovesSideways(bool movesSideways);
 
     // Hooks.
     virtual void AttachedToWindow() {}

@@ -102,11 +102,7 @@ void CurrencyView::ModifyCurrency(Currency* currency)
 void CurrencyView::DeleteCurrency(Currency* currency)
 {
     // The rows stand in the order of the catalogue, before and after: there, too, the last one takes the free place.
-    const int32 place = currencies_->indexOf(currency);
-    currencies_->remove(currency);
-    const int32 last = currencies_->CountItems() - 1;
-    if (place >= 0 && place < last)
-        currencies_->move(last, place);
+    currencies_->removeByLast(currency);
     // No row of a market or a rate outlives the currency that owns them.
     if (currency == marketsOf_)
         SetMarketList(nullptr);

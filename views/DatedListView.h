@@ -7,13 +7,13 @@
 #include <ranges>
 #include <vector>
 
-/// A list of objects with a date, in its order; several can be selected.
+/// A list of objects with a date, in its order and in no other.
 ///
 /// The rows look at the dates of their objects, so an object's row is taken out before it is destroyed.
 template <class Object>
 class DatedListView : public ObjectListView<Object> {
 public:
-    explicit DatedListView(const char* name) : ObjectListView<Object>(name, B_MULTIPLE_SELECTION_LIST) {}
+    explicit DatedListView(const char* name) : ObjectListView<Object>(name, false) {}
 
     /// Shows these objects, given in any order, and no others. When they are what is shown already, nothing but the
     /// drawing is done.
@@ -31,7 +31,7 @@ public:
     void insert(Object* object)
     {
         const int32 index = placeFor(object->getDate(), 0, this->CountItems());
-        this->add(object, index);
+        ObjectListView<Object>::insert(object, index);
         this->ScrollTo(index);
     }
 
@@ -43,7 +43,7 @@ public:
             return;
         const int32 place = placeAfterChange(index, object->getDate());
         if (place != index) {
-            this->move(index, place);
+            this->moveRow(index, place);
             this->ScrollTo(place);
         }
         this->InvalidateItem(place);

@@ -9,11 +9,16 @@
 
 namespace {
 
+Cell rateCell(float rate)
+{
+    return {exactText(rate), look::kText, rate};
+}
+
 Cell latestRate(const Currency& currency)
 {
     // What is held in a currency without a rate has no value.
     const unsigned rates = currency.getNbrQuotes();
-    return rates > 0 ? Cell{exactText(currency.getQuote(rates - 1)->getValue())} : Cell{"no rate", look::kWarning};
+    return rates > 0 ? rateCell(currency.getQuote(rates - 1)->getValue()) : Cell{"no rate", look::kWarning};
 }
 
 Cell contentOf(const CompanyEvent& event)
@@ -34,7 +39,7 @@ const std::vector<ColumnOf<Currency>> ObjectItem<Currency>::kColumns = {
     {{"Latest Rate", 96, B_ALIGN_RIGHT}, latestRate},
     {{"Rate of", 82, B_ALIGN_RIGHT},
      [](const Currency& c) {
-         return Cell{dateText(c.getLastQuote()), look::kFaint};
+         return Cell{dateText(c.getLastQuote()), look::kFaint, dayNumber(c.getLastQuote())};
      }},
 };
 
@@ -43,7 +48,10 @@ const std::vector<ColumnOf<Market>> ObjectItem<Market>::kColumns = {
     {{"Market", kRemainingWidth}, [](const Market& m) { return Cell{textOf(m.getName())}; }},
     {{"Currency", 66}, [](const Market& m) { return Cell{textOf(m.getCurrencyRepresentation())}; }},
     {{"Companies", 78, B_ALIGN_RIGHT},
-     [](const Market& m) { return Cell{countText(static_cast<int>(m.getNbrCompanies()))}; }},
+     [](const Market& m) {
+         const int companies = static_cast<int>(m.getNbrCompanies());
+         return Cell{countText(companies), look::kText, companies};
+     }},
 };
 
 template <>
@@ -54,7 +62,10 @@ const std::vector<ColumnOf<Company>> ObjectItem<Company>::kColumns = {
 
 template <>
 const std::vector<ColumnOf<CompanyEvent>> ObjectItem<CompanyEvent>::kColumns = {
-    {{"Date", 82}, [](const CompanyEvent& e) { return Cell{dateText(e.getDate())}; }},
+    {{"Date", 82},
+     [](const CompanyEvent& e) {
+         return Cell{dateText(e.getDate()), look::kText, dayNumber(e.getDate())};
+     }},
     {{"Kind", 46},
      [](const CompanyEvent& e) { return Cell{e.getType() == NoteCompanyEvent::kType ? "Note" : "Split"}; }},
     {{"Content", 194}, contentOf},
@@ -62,6 +73,9 @@ const std::vector<ColumnOf<CompanyEvent>> ObjectItem<CompanyEvent>::kColumns = {
 
 template <>
 const std::vector<ColumnOf<Quote>> ObjectItem<Quote>::kColumns = {
-    {{"Date", 82}, [](const Quote& q) { return Cell{dateText(q.getDate())}; }},
-    {{"Value", 96, B_ALIGN_RIGHT}, [](const Quote& q) { return Cell{exactText(q.getValue())}; }},
+    {{"Date", 82},
+     [](const Quote& q) {
+         return Cell{dateText(q.getDate()), look::kText, dayNumber(q.getDate())};
+     }},
+    {{"Value", 96, B_ALIGN_RIGHT}, [](const Quote& q) { return rateCell(q.getValue()); }},
 };

@@ -1,8 +1,10 @@
 #pragma once
 
+#include "foundation/Date.h"
 #include "foundation/String.h"
 #include "platform/ShortText.h"
 
+#include <optional>
 #include <string>
 
 /// A text of the model, to be shown in a list, a chart or a line; empty for a String without text. Of a longer one, as
@@ -13,7 +15,13 @@ inline std::string textOf(const String& text)
     return shortened(text.bytes(), kLongestShown);
 }
 
-/// The same, whole, for what gives it back: fields and menus, which show as much of it as they can.
+/// What a date is sorted by; nothing for the undefined one.
+inline std::optional<double> dayNumber(const Date& day)
+{
+    return day.isUndefined() ? std::nullopt : std::optional<double>(day - Date(1, 1, 1));
+}
+
+/// The text, whole, for what gives it back: fields and menus, which show as much of it as they can.
 inline const char* wholeTextOf(const String& text)
 {
     return text.hasText() ? text.getCharacterArray() : "";

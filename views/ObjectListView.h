@@ -36,20 +36,16 @@ private:
 template <class Object, class Row = ObjectItem<Object>>
 class ObjectListView : public ColumnListView {
 public:
-    explicit ObjectListView(const char* name, list_view_type type = B_SINGLE_SELECTION_LIST)
-        : ColumnListView(name, type, {Row::kColumns.begin(), Row::kColumns.end()})
+    explicit ObjectListView(const char* name, bool isSortable = true)
+        : ColumnListView(name, {Row::kColumns.begin(), Row::kColumns.end()}, isSortable)
     {}
 
-    /// Puts a row behind the others, or before row `index`.
-    void add(Object* object) { add(object, CountItems()); }
-    void add(Object* object, int32 index)
-    {
-        auto* row = new Row(object);
-        if (isIndexed_)
-            rows_[object] = row;
-        addRow(row, index);
-    }
-    /// Adds rows for all of them at once.
+    /// Puts a row behind the others.
+    void add(Object* object) { appendRow(makeRow(object)); }
+    /// Puts it before the row at `place`, in a list that is neither sorted nor filtered.
+    void insert(Object* object, int32 place) { insertRow(makeRow(object), place); }
+    /// Adds rows for all of them at once. A list that is sorted or filtered shows them with `recall`, or when a
+    /// selection is restored.
     void addAll(const std::vector<Object*>& objects)
     {
         std::vector<ColumnItem*> rows;
@@ -70,38 +66,43 @@ public:
     }
 
     /// Draws the object's row again.
-    void modify(const Object* object) { InvalidateItem(indexOf(object)); }
+    void modify(const Object* object)
+    {
+        if (Row* row = rowOf(object))
+            redraw(row);
+    }
     /// Takes the object's row out. @return false when there is none.
     bool remove(const Object* object)
     {
-        const int32 index = indexOf(object);
-        if (index < 0)
+        Row* row = rowOf(object);
+        if (row == nullptr)
             return false;
         rows_.erase(object);
-        destroyRow(index);
+        deselectWith(*row);
+        destroyRow(row);
         return true;
     }
-    /// Puts the row at `from` at `to`, counted without it; it stays selected if it was. Sends no message.
-    void move(int32 from, int32 to)
+    /// The same, and puts the last row in its place.
+    void removeByLast(const Object* object)
     {
-        const bool wasSelected = IsItemSelected(from);
-        AddItem(RemoveItem(from), to);
-        if (!wasSelected)
+        const Row* row = rowOf(object);
+        if (row == nullptr)
             return;
-        SetQuiet(true);
-        Select(to, true);
-        SetQuiet(false);
+        const int32 place = placeOf(row);
+        remove(object);
+        if (place + 1 < CountRows())
+            moveRow(CountRows() - 1, place);
     }
     /// Leaves the object's row without object, in constant time, for when many objects go: `dropReleased` then takes
     /// all such rows out at once. Needs a row with `release()`. @return false when there is none.
     bool release(const Object* object)
     {
-        index();
-        const auto found = rows_.find(object);
-        if (found == rows_.end())
+        Row* row = rowOf(object);
+        if (row == nullptr)
             return false;
-        found->second->release();
-        rows_.erase(found);
+        deselectWith(*row);
+        row->release();
+        rows_.erase(object);
         hasReleased_ = true;
         return true;
     }
@@ -110,8 +111,8 @@ public:
         if (!hasReleased_)
             return;
         std::vector<Object*> left;
-        for (int32 i = 0; i < CountItems(); ++i) {
-            if (Object* object = objectAt(i))
+        for (int32 i = 0; i < CountRows(); ++i) {
+            if (Object* object = row(i)->object())
                 left.push_back(object);
         }
         setAll(left);
@@ -124,12 +125,10 @@ public:
         hasReleased_ = false;
     }
 
-    int32 indexOf(const Object* object) const
-    {
-        index();
-        const auto found = rows_.find(object);
-        return found != rows_.end() ? IndexOf(found->second) : -1;
-    }
+    /// Negative when it has no row, or one that is not shown.
+    int32 indexOf(const Object* object) const { return IndexOf(rowOf(object)); }
+    /// Whether the object has a row, shown or not.
+    bool has(const Object* object) const { return rowOf(object) != nullptr; }
     Object* objectAt(int32 index) const
     {
         const BListItem* item = ItemAt(index);
@@ -145,7 +144,7 @@ public:
             objects.push_back(objectAt(CurrentSelection(i)));
         return objects;
     }
-    /// Selects the object's row alone and shows it; sends the selection message.
+    /// Selects the object's row alone, where it is shown, and brings it into view; sends the selection message.
     void select(const Object* object)
     {
         Select(indexOf(object));
@@ -174,6 +173,7 @@ public:
     /// Sends no message.
     void recall()
     {
+        settle();
         SetQuiet(true);
         std::sort(remembered_.begin(), remembered_.end());
         int32 first = -1; // of a run of rows that are selected together
@@ -192,14 +192,15 @@ public:
         forget();
     }
 
-    /// What is selected and in view; without the rows.
+    /// What is selected and in view, by place; without the rows.
     ListPlaces selection() const
     {
         ListPlaces places;
         for (int32 i = 0; i < CountSelected(); ++i)
-            places.selected.push_back(CurrentSelection(i));
-        places.top = TopRow();
-        places.count = CountItems();
+            places.selected.push_back(placeAt(CurrentSelection(i)));
+        std::ranges::sort(places.selected);
+        places.top = CountItems() > 0 ? placeAt(TopRow()) : 0;
+        places.count = CountRows();
         return places;
     }
     /// The same with the rows; all of them stand for one of `objects`.
@@ -209,26 +210,33 @@ public:
         for (Object* object : objects)
             placeOf.emplace(object, placeOf.size());
         ListPlaces places = selection();
-        for (int32 i = 0; i < CountItems(); ++i)
-            if (const auto place = placeOf.find(objectAt(i)); place != placeOf.end())
+        for (int32 i = 0; i < CountRows(); ++i)
+            if (const auto place = placeOf.find(row(i)->object()); place != placeOf.end())
                 places.rows.push_back(place->second);
         return places;
     }
     /// Brings back selection and view, where the rows are as many as then: those that a valuation makes up may be
-    /// others. Sends no message.
+    /// others. Sends no message. What is not shown now is not selected.
     void restoreSelection(const ListPlaces& places)
     {
-        if (CountItems() != places.count)
+        settle();
+        if (CountRows() != places.count)
             return;
+        std::vector<int32> selected;
+        for (const int32 place : places.selected)
+            if (const int32 index = IndexOf(rowAt(place)); index >= 0)
+                selected.push_back(index);
+        std::ranges::sort(selected);
         SetQuiet(true);
-        for (std::size_t i = 0; i < places.selected.size();) {
-            const int32 first = places.selected[i]; // of a run, which is selected at once
+        for (std::size_t i = 0; i < selected.size();) {
+            const int32 first = selected[i]; // of a run, which is selected at once
             int32 last = first;
-            while (++i < places.selected.size() && places.selected[i] == last + 1)
+            while (++i < selected.size() && selected[i] == last + 1)
                 ++last;
             Select(first, last, true);
         }
-        SetTopRow(places.top);
+        if (CountRows() > 0)
+            SetTopRow(IndexOf(rowAt(places.top)));
         SetQuiet(false);
     }
     /// The same, and brings back the rows, with `objects` in the places of those of then.
@@ -243,16 +251,36 @@ public:
     }
 
 private:
-    void index() const
+    Row* makeRow(Object* object)
     {
+        auto* row = new Row(object);
         if (isIndexed_)
+            rows_[object] = row;
+        return row;
+    }
+    /// Of several selected rows commands take the first, in lists that can be sorted. When it goes, the others lose
+    /// their selection: the fields are not about them. Sends no message.
+    void deselectWith(const Row& row)
+    {
+        if (!row.IsSelected() || !isSortable())
             return;
-        rows_.clear();
-        for (int32 i = 0; i < CountItems(); ++i) {
-            auto* row = static_cast<Row*>(ItemAt(i));
-            rows_[row->object()] = row;
+        SetQuiet(true);
+        DeselectAll();
+        SetQuiet(false);
+    }
+    Row* row(int32 place) const { return static_cast<Row*>(rowAt(place)); }
+    int32 placeAt(int32 index) const { return placeOf(static_cast<const ColumnItem*>(ItemAt(index))); }
+    /// Null when there is none.
+    Row* rowOf(const Object* object) const
+    {
+        if (!isIndexed_) {
+            rows_.clear();
+            for (int32 i = 0; i < CountRows(); ++i)
+                rows_[row(i)->object()] = row(i);
+            isIndexed_ = true;
         }
-        isIndexed_ = true;
+        const auto found = rows_.find(object);
+        return found != rows_.end() ? found->second : nullptr;
     }
 
     mutable std::unordered_map<const Object*, Row*> rows_; // when it is up to date

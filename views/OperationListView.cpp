@@ -4,6 +4,7 @@
 #include "foundation/NumberText.h"
 #include "platform/View.h"
 #include "portfolio/Account.h"
+#include "portfolio/CashMove.h"
 #include "portfolio/OperationKind.h"
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
@@ -11,7 +12,14 @@
 #include "views/Look.h"
 #include "views/ModelText.h"
 
+#include <algorithm>
+#include <functional>
+#include <set>
+
 namespace {
+
+constexpr std::size_t kAccountColumn = 1;
+constexpr std::size_t kBalanceColumn = 9;
 
 bool isTrade(const Operation& operation)
 {
@@ -34,7 +42,17 @@ Cell accountName(const OperationItem& item)
     return {account != nullptr ? textOf(account->getName()) : ""};
 }
 
-/// Ticker and company, or the account that receives a transfer.
+bool isTransfer(OperationKind kind)
+{
+    return kind == OperationKind::kTransfer;
+}
+
+const Account* recipientOf(const Operation& operation)
+{
+    return operation.getType() == Operation::kTransfer ? asTransfer(operation).recipient() : nullptr;
+}
+
+/// Ticker and company, or the account at the other end of a transfer.
 Cell what(const OperationItem& item)
 {
     const Operation& operation = *item.object();
@@ -44,34 +62,48 @@ Cell what(const OperationItem& item)
             return {"no company", look::kWarning};
         return {textOf(share->getCompanyAbbreviation()) + "  " + textOf(share->getCompanyName())};
     }
-    if (kindOf(operation) != OperationKind::kTransfer)
-        return {}; // what comes in or goes is within the account
-    const Account* recipient = asTransfer(operation).recipient();
+    if (!isTransfer(kindOf(operation)))
+        return {};
+    const Account* recipient = recipientOf(operation);
     if (recipient == nullptr)
         return {"to no account", look::kWarning};
+    const Account* sender = operation.account();
+    if (item.account() == recipient && sender != recipient && sender != nullptr)
+        return {"from " + textOf(sender->getName())};
     return {"to " + textOf(recipient->getName())};
 }
 
 /// The quote of a trade, the amount of anything else.
 float price(const Operation& operation)
 {
-    if (kindOf(operation) == OperationKind::kIncome)
-        return -asTransfer(operation).getCost();
-    return isTrade(operation) ? asTrade(operation).getQuote()
-                              : static_cast<const AccountOperation&>(operation).getAmount();
+    if (isTrade(operation))
+        return asTrade(operation).getQuote();
+    // What comes in stands as a negative cost.
+    return kindOf(operation) == OperationKind::kIncome ? -asTransfer(operation).getCost()
+                                                       : static_cast<const AccountOperation&>(operation).getAmount();
+}
+
+Cell numbered(const std::string& text, double number)
+{
+    return {text, look::kText, number};
 }
 
 Cell quantity(const OperationItem& item)
 {
-    return {isTrade(*item.object()) ? countText(asTrade(*item.object()).getQuantity()) : ""};
+    if (!isTrade(*item.object()))
+        return {};
+    const int quantity = asTrade(*item.object()).getQuantity();
+    return numbered(countText(quantity), quantity);
 }
 
 Cell cost(const OperationItem& item)
 {
     const Operation& operation = *item.object();
     if (isTrade(operation))
-        return {amountText(asTrade(operation).getOperationCost())};
-    return {kindOf(operation) == OperationKind::kTransfer ? amountText(asTransfer(operation).getTotalCost()) : ""};
+        return numbered(amountText(asTrade(operation).getOperationCost()), asTrade(operation).getOperationCost());
+    if (!isTransfer(kindOf(operation)))
+        return {};
+    return numbered(amountText(asTransfer(operation).getTotalCost()), asTransfer(operation).getTotalCost());
 }
 
 /// What is traded or moved, before costs, in the account's currency.
@@ -79,22 +111,63 @@ Cell total(const OperationItem& item)
 {
     const Operation& operation = *item.object();
     const double quantity = isTrade(operation) ? asTrade(operation).getQuantity() : 1;
-    return {amountText(quantity * price(operation)) + ' ' + textOf(operation.getCurrencyRepresentation())};
+    const double total = quantity * price(operation);
+    return {amountText(total), look::kText, total, textOf(operation.getCurrencyRepresentation())};
+}
+
+Cell amountOf(double amount, const Account& account)
+{
+    return {amountText(amount), amount < 0 ? look::kLoss : look::kText, amount,
+            textOf(account.getCurrencyRepresentation())};
+}
+
+/// What the account really gets or gives, with all costs.
+Cell effect(const OperationItem& item)
+{
+    const Account* account = item.account();
+    return account != nullptr ? amountOf(cashMove(*item.object(), *account), *account) : Cell();
+}
+
+Cell balanceBehind(const OperationItem& item)
+{
+    return item.balance() ? amountOf(*item.balance(), *item.account()) : Cell();
+}
+
+Cell date(const OperationItem& item)
+{
+    const Date& day = item.object()->getDate();
+    return {dateText(day), look::kText, dayNumber(day)};
 }
 
 } // namespace
 
+// Account and balance take turns. The last column shows while there is an automatic operation.
 const std::vector<ColumnOf<OperationItem>> OperationItem::kColumns = {
-    {{"Date", 78}, [](const OperationItem& i) { return Cell{dateText(i.object()->getDate())}; }},
-    {{"Account", 106}, accountName},
+    {{"Date", 78}, date},
+    {{"Account", 90}, accountName},
     {{"Type", 58}, [](const OperationItem& i) { return Cell{nameOf(kindOf(*i.object()))}; }},
-    {{"What", 128}, what},
+    {{"What", 108}, what},
     {{"Quantity", 64, B_ALIGN_RIGHT}, quantity},
-    {{"Quote/Amount", 98, B_ALIGN_RIGHT}, [](const OperationItem& i) { return Cell{amountText(price(*i.object()))}; }},
-    {{"Cost", 62, B_ALIGN_RIGHT}, cost},
-    {{"Total", 118, B_ALIGN_RIGHT}, total},
-    {{"Auto", 36, B_ALIGN_CENTER}, [](const OperationItem& i) { return Cell{i.isAutomatic() ? "\u2713" : ""}; }},
+    {{"Quote/Amount", 98, B_ALIGN_RIGHT},
+     [](const OperationItem& i) { return numbered(amountText(price(*i.object())), price(*i.object())); }},
+    {{"Cost", 58, B_ALIGN_RIGHT}, cost},
+    {{"Total", 108, B_ALIGN_RIGHT, UnitPlace::kShown}, total},
+    {{"Effect", 86, B_ALIGN_RIGHT, UnitPlace::kCopied}, effect},
+    {{"Balance", 90, B_ALIGN_RIGHT, UnitPlace::kCopied, true}, balanceBehind},
+    {{"Auto", 36, B_ALIGN_CENTER, UnitPlace::kNone, true},
+     [](const OperationItem& i) { return Cell{i.isAutomatic() ? "\u2713" : ""}; }},
 };
+
+const Account* OperationItem::account() const
+{
+    return shown_ != nullptr ? shown_ : operation_->account();
+}
+
+void OperationItem::showEffectOn(const Account* account, std::optional<double> balance)
+{
+    shown_ = account;
+    balance_ = balance;
+}
 
 void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
 {
@@ -119,4 +192,75 @@ void OperationItem::DrawItem(BView* owner, BRect frame, bool complete)
     }
     // The text has the colour again that the list has set.
     ColumnItem::DrawItem(owner, frame, complete);
+}
+
+void OperationListView::setAccount(const Account* account)
+{
+    if (account == account_)
+        return;
+    account_ = account;
+    // Of one account the column would say the same in each row.
+    showColumn(kAccountColumn, account == nullptr);
+    showColumn(kBalanceColumn, account != nullptr);
+    forgetTexts();
+    chooseAgain();
+}
+
+void OperationListView::setYear(std::optional<int> year)
+{
+    if (year == year_)
+        return;
+    year_ = year;
+    chooseAgain();
+}
+
+std::vector<int> OperationListView::years() const
+{
+    std::set<int, std::greater<>> years;
+    for (int32 i = 0; i < CountRows(); ++i) {
+        const auto* row = static_cast<const OperationItem*>(rowAt(i));
+        if (row->object() != nullptr && !row->object()->getDate().isUndefined())
+            years.insert(row->object()->getDate().getYear());
+    }
+    return {years.begin(), years.end()};
+}
+
+bool OperationListView::isArranged() const
+{
+    return account_ != nullptr || year_.has_value() || ObjectListView::isArranged();
+}
+
+void OperationListView::choose(std::vector<ColumnItem*>& rows)
+{
+    const auto operationOf = [](const ColumnItem* row) { return static_cast<const OperationItem*>(row)->object(); };
+    std::erase_if(rows, [&](const ColumnItem* row) { return operationOf(row) == nullptr; });
+    if (account_ != nullptr) {
+        chooseOfAccount(rows);
+    } else {
+        for (ColumnItem* row : rows)
+            static_cast<OperationItem*>(row)->showEffectOn(nullptr, std::nullopt);
+    }
+    // The balances rest on all years.
+    if (year_)
+        std::erase_if(rows, [&](const ColumnItem* row) {
+            const Date& day = operationOf(row)->getDate();
+            return day.isUndefined() || day.getYear() != *year_;
+        });
+}
+
+void OperationListView::chooseOfAccount(std::vector<ColumnItem*>& rows)
+{
+    const auto operationOf = [](const ColumnItem* row) -> const Operation& {
+        return *static_cast<const OperationItem*>(row)->object();
+    };
+    std::erase_if(rows, [&](const ColumnItem* row) {
+        return operationOf(row).account() != account_ && recipientOf(operationOf(row)) != account_;
+    });
+    std::ranges::stable_sort(rows, {},
+                             [&](const ColumnItem* row) -> const Date& { return operationOf(row).getDate(); });
+    double balance = 0;
+    for (ColumnItem* row : rows) {
+        balance += cashMove(operationOf(row), *account_);
+        static_cast<OperationItem*>(row)->showEffectOn(account_, balance);
+    }
 }

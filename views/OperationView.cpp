@@ -25,6 +25,9 @@ constexpr float kEditorTop = kEditorEnd - kBoxTop - 3 * kRow - kButtonHeight - k
 constexpr float kListEnd = kEditorTop - kMargin;
 constexpr float kListTop = kMargin + kFieldHeight + 1; // the list then ends with a whole row
 
+constexpr float kFilterRow = 2 * kListRow; // what the filters take from the list
+constexpr const char* kListTitle = "Operations";
+
 constexpr float kDivider = 82;
 constexpr float kColumnGap = 16;
 constexpr float kColumnWidth = (kRight - kMargin - 2 * kBoxSide - 2 * kColumnGap) / 3;
@@ -100,16 +103,19 @@ OperationView::~OperationView() = default;
 
 void OperationView::makeList()
 {
-    BBox* box = addBox(this, {kMargin, kListTop, kRight, kListEnd}, "Operations");
+    listBox_ = addBox(this, {kMargin, kListTop, kRight, kListEnd}, kListTitle);
+    makeFilters(listBox_);
     operations_ = new OperationListView("lstOperations");
-    operations_->addTo(box, {kBoxSide, kBoxTop, kRight - kMargin - kBoxSide, kListEnd - kListTop - kBoxSide},
-                       "Operations");
+    operations_->addTo(listBox_,
+                       {kBoxSide, kBoxTop + kFilterRow, kRight - kMargin - kBoxSide, kListEnd - kListTop - kBoxSide},
+                       kListTitle);
     operations_->SetSelectionMessage(new BMessage('OSel'));
 }
 
 void OperationView::makeFields()
 {
     BBox* box = addBox(this, {kMargin, kEditorTop, kRight, kEditorEnd}, "Operation");
+    operations_->setEditor(box);
     makeCommonFields(box);
     makeTypedFields(box);
     makeButtons(box);
@@ -204,6 +210,13 @@ void OperationView::Draw(BRect)
     DrawString(kLegend, {left + kPadding, kMargin + kFieldHeight - kPadding + 1});
 }
 
+void OperationView::RecallSelection()
+{
+    fillYearFilter();
+    operations_->recall();
+    tellFiltered();
+}
+
 void OperationView::ClearAllOperations()
 {
     // In this order: what is selected is known only while the rows are there.
@@ -213,9 +226,12 @@ void OperationView::ClearAllOperations()
 
 void OperationView::ShowOperation(const Operation* operation)
 {
-    if (operations_->indexOf(operation) < 0)
+    if (!operations_->has(operation))
         return; // while the page has no date to value at, the list is not filled
 
+    // What was just made is to be seen.
+    if (operations_->indexOf(operation) < 0)
+        ShowAllOperations();
     // The window does not hear of it: the fields already show the operation and must stay.
     operations_->SetQuiet(true);
     operations_->select(operation);
@@ -260,6 +276,7 @@ void OperationView::SetAccountsList(Account** accounts, int count)
 {
     fillAccounts(*baseAccount_->Menu(), accounts, count);
     fillAccounts(*transferAccount_->Menu(), accounts, count);
+    fillAccountFilter(accounts, count);
 }
 
 void OperationView::fillAccounts(BMenu& menu, Account** accounts, int count)

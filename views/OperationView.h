@@ -20,6 +20,7 @@ class Account;
 class BMenu;
 class BMenuField;
 class BMessageRunner;
+class BSearchControl;
 
 /// The page of the operations on the portfolio's accounts: a list of all of them, and the fields of one.
 ///
@@ -39,8 +40,9 @@ public:
     void ClearAllOperations();
     /// Puts rows behind the others.
     void AddOperationList(Operation** operations, int count) { operations_->addAll({operations, operations + count}); }
-    /// To be called when the list is filled again: selects what was selected, where it still is.
-    void RecallSelection() { operations_->recall(); }
+    /// To be called when the list is filled again: shows what the filters let through, and selects what was selected,
+    /// where it still is.
+    void RecallSelection();
     /// What was selected belongs to a portfolio that is gone.
     void ForgetSelection() { operations_->forget(); }
     /// Shows nothing of the operation any more, in constant time; its row goes with the next refresh.
@@ -51,11 +53,14 @@ public:
     ListPlaces selection() const { return operations_->selection(); }
     /// Sends no message.
     void restoreSelection(const ListPlaces& places) { operations_->restoreSelection(places); }
+    /// Takes the filters away.
+    void ShowAllOperations();
     /// Takes the rows of removed operations out of a list that is not filled again.
     void DropRemovedOperations() { operations_->dropReleased(); }
     /// Draws the operation's row again.
     void UpdateShareOperation(ShareOperation* operation) { operations_->modify(operation); }
-    /// Selects the operation's row and brings it into view; the fields stay as they are.
+    /// Selects the operation's row and brings it into view, also when the filters had hidden it; the fields stay as
+    /// they are.
     void ShowOperation(const Operation* operation);
     /// Lights up the operation's row for a moment, where there is one.
     void FlashOperation(const Operation* operation);
@@ -140,6 +145,12 @@ private:
     static void offer(OfferNumber& field, std::optional<float> value);
 
     void makeList();
+    void makeFilters(BBox* box);
+    void fillAccountFilter(Account** accounts, int count);
+    void fillYearFilter();
+    /// Shows what the three filters let through.
+    void filter();
+    void tellFiltered();
     void makeFields();
     void makeCommonFields(BBox* box);
     void makeTypedFields(BBox* box);
@@ -147,7 +158,15 @@ private:
     BMenuField* addMenu(BView* parent, BRect frame, const char* name, const char* label);
     void fillAccounts(BMenu& menu, Account** accounts, int count);
 
+    BBox* listBox_ = nullptr;
     OperationListView* operations_ = nullptr;
+    BSearchControl* filter_ = nullptr;
+    BMenuField* filterAccount_ = nullptr;
+    BMenuField* filterYear_ = nullptr;
+    // What was chosen last in the two menus. The account is found again by its name when it is another object.
+    const Account* chosenAccount_ = nullptr;
+    String chosenAccountName_;
+    std::optional<int> chosenYear_;
     BCheckBox* prevision_ = nullptr;
     BMenuField* type_ = nullptr;
     BMenuField* baseAccount_ = nullptr;

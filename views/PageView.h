@@ -20,6 +20,8 @@ public:
     static constexpr const char* kByHand = "byHand";
     /// The label of the one that puts them in place of what is selected.
     static constexpr const char* kUpdateLabel = "Update";
+    /// And of the one that removes the selected row.
+    static constexpr const char* kRemoveLabel = "Remove";
 
     PageView(BRect frame, const char* name);
 

@@ -3,17 +3,29 @@
 #include "foundation/DateText.h"
 #include "foundation/NumberText.h"
 #include "market/Currency.h"
+#include "market/Market.h"
 #include "portfolio/Account.h"
+#include "valuation/State.h"
+#include "valuation/Totals.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
 
 namespace {
 
+/// "12.3 %": in one decimal, as far as anybody asks.
+std::string shareText(double fraction)
+{
+    const std::string text = changeText(fraction);
+    return text.starts_with('+') ? text.substr(1) : text;
+}
+
+constexpr std::size_t kReferenceColumn = 7;
+
 // Accounts. Name and currency are the account's as they are now, the balance is that of the valuation.
 
 Cell balance(const AccountState& state)
 {
-    return {amountText(state.getCash()), state.getCash() < 0 ? look::kLoss : look::kText};
+    return {amountText(state.getCash()), state.getCash() < 0 ? look::kLoss : look::kText, state.getCash()};
 }
 
 Cell currencyOf(const AccountState& state)
@@ -45,13 +57,14 @@ Cell quantity(const Item& item)
 {
     // More was sold than bought: a mistake among the operations.
     const int quantity = item.object()->getQuantity();
-    return {countText(quantity), quantity < 0 ? look::kLoss : look::kText};
+    return {countText(quantity), quantity < 0 ? look::kLoss : look::kText, quantity};
 }
 
 Cell quote(const Item& item)
 {
     // Without a quote the holding counts as 0 in the totals.
-    return item.basis().isKnown ? Cell{amountText(item.object()->getQuote())} : Cell{"no quote", look::kWarning};
+    const float quote = item.object()->getQuote();
+    return item.basis().isKnown ? Cell{amountText(quote), look::kText, quote} : Cell{"no quote", look::kWarning};
 }
 
 /// Empty where there is a quote of the day shown; otherwise the day of the one that counts, with "~" before the day
@@ -62,29 +75,46 @@ Cell quoteDay(const Item& item)
     const Date day = item.object()->getDate();
     if (!basis.isKnown || basis.day == day)
         return {};
-    return {(basis.isEstimate ? "~ " : "") + dateText(basis.day), basis.day > day ? look::kWarning : look::kFaint};
+    return {(basis.isEstimate ? "~ " : "") + dateText(basis.day), basis.day > day ? look::kWarning : look::kFaint,
+            dayNumber(basis.day)};
 }
 
-Cell value(const Item& item)
+Cell ownValue(const Item& item)
 {
     const ShareState& state = *item.object();
     if (!item.basis().isKnown || !state.isHeld())
         return {};
     if (!item.basis().hasRate)
         return {"no rate", look::kWarning}; // and so it counts as 0 in the totals
-    return {amountText(state.worth()) + ' ' + textOf(state.getCurrencyRepresentation())};
+    return {amountText(state.worth()), look::kText, state.worth(), textOf(state.getCurrencyRepresentation())};
+}
+
+Cell referenceValue(const Item& item)
+{
+    return item.value() ? Cell{amountText(*item.value()), look::kText, item.value(), item.reference()} : Cell();
+}
+
+Cell partOfAll(const Item& item)
+{
+    return item.part() ? Cell{shareText(*item.part()), look::kText, item.part()} : Cell();
 }
 
 Cell gain(const Item& item)
 {
     const auto gain = item.object()->gain();
-    return gain ? Cell{changeText(*gain), *gain < 0 ? look::kLoss : look::kGain} : Cell();
+    return gain ? Cell{changeText(*gain), *gain < 0 ? look::kLoss : look::kGain, gain} : Cell();
 }
 
-/// `text` of a holding that there is still something of.
-Cell whileHeld(const Item& item, const std::string& text)
+Cell buyQuote(const Item& item)
 {
-    return {item.object()->isHeld() ? text : ""};
+    const float quote = item.object()->getBuyQuote();
+    return item.object()->isHeld() ? Cell{amountText(quote), look::kText, quote} : Cell();
+}
+
+Cell endDate(const Item& item)
+{
+    const Date end = item.object()->getEndDate();
+    return item.object()->isHeld() ? Cell{dateText(end), look::kText, dayNumber(end)} : Cell();
 }
 
 } // namespace
@@ -96,15 +126,45 @@ const std::vector<ColumnOf<AccountState>> AccountStateItem::kColumns = {
     {{"Default", 56, B_ALIGN_CENTER}, defaultMark},
 };
 
+// The list scrolls sideways to the last column, which only simulated sales ask for.
 const std::vector<ColumnOf<ShareStateItem>> ShareStateItem::kColumns = {
-    {{"Ticker", 56}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyAbbreviation()); }},
-    {{"Company", 136}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
-    {{"Quantity", 60, B_ALIGN_RIGHT}, quantity},
-    {{"Buy Quote", 72, B_ALIGN_RIGHT},
-     [](const Item& i) { return whileHeld(i, amountText(i.object()->getBuyQuote())); }},
-    {{"Quote", 64, B_ALIGN_RIGHT}, quote},
-    {{"Quote of", 100, B_ALIGN_RIGHT}, quoteDay},
-    {{"Value", 110, B_ALIGN_RIGHT}, value},
-    {{"Gain", 66, B_ALIGN_RIGHT}, gain},
-    {{"End Date", 82, B_ALIGN_RIGHT}, [](const Item& i) { return whileHeld(i, dateText(i.object()->getEndDate())); }},
+    {{"Ticker", 50}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyAbbreviation()); }},
+    {{"Company", 106}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
+    {{"Quantity", 62, B_ALIGN_RIGHT}, quantity},
+    {{"Buy Quote", 72, B_ALIGN_RIGHT}, buyQuote},
+    {{"Quote", 62, B_ALIGN_RIGHT}, quote},
+    {{"Quote of", 92, B_ALIGN_RIGHT}, quoteDay},
+    {{"Value", 108, B_ALIGN_RIGHT, UnitPlace::kShown}, ownValue},
+    {{"In ???", 78, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceValue},
+    {{"Part", 54, B_ALIGN_RIGHT}, partOfAll},
+    {{"Gain", 64, B_ALIGN_RIGHT}, gain},
+    {{"End Date", 78, B_ALIGN_RIGHT}, endDate},
 };
+
+void ShareStateItem::showIn(const std::string& symbol, double rate, double total)
+{
+    const Company* company = share_ != nullptr ? share_->company() : nullptr;
+    const Market* market = company != nullptr ? company->market() : nullptr;
+    const Currency* currency = market != nullptr ? market->currency() : nullptr;
+    // Where the row says no value in its own currency, there is none in another.
+    if (rate == 0 || !basis_.isKnown || !basis_.hasRate || !state_->isHeld() || currency == nullptr)
+        return;
+    reference_ = symbol;
+    value_ = state_->worth() * currency->getRealQuote(state_->getDate()) / rate;
+    if (total > 0)
+        part_ = *value_ / total;
+}
+
+void ShareStateListView::addAllOf(const State& state, const Totals& totals)
+{
+    const auto shares = state.shareStates();
+    const int32 first = CountRows();
+    addAll({shares.begin(), shares.end()});
+    if (totals.reference == nullptr)
+        return;
+    const std::string symbol = textOf(totals.reference->getRepresentation());
+    setTitle(kReferenceColumn, "In " + symbol);
+    const double rate = totals.reference->getRealQuote(state.getDate());
+    for (int32 i = first; i < CountRows(); ++i)
+        static_cast<ShareStateItem*>(rowAt(i))->showIn(symbol, rate, totals.totalValue);
+}

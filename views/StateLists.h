@@ -4,6 +4,12 @@
 #include "valuation/ShareState.h"
 #include "views/ObjectListView.h"
 
+#include <optional>
+#include <string>
+
+class State;
+struct Totals;
+
 /// An account with its balance. Found again by the account, as the states of a valuation go with the next.
 class AccountStateItem final : public ColumnItem {
 public:
@@ -30,6 +36,13 @@ public:
 
     ShareState* object() const { return state_; }
     const void* key() const { return share_; }
+    /// Has the row show what the holding is in the reference currency, which counts `rate` in it, and which part of
+    /// `total`; 0 where there is none.
+    void showIn(const std::string& symbol, double rate, double total);
+    /// In the reference currency; nothing where it is not known.
+    std::optional<double> value() const { return value_; }
+    std::optional<double> part() const { return part_; }
+    const std::string& reference() const { return reference_; }
     /// The quote that the holding was valued by, from when the row was made.
     const QuoteBasis& basis() const { return basis_; }
     Cell cell(std::size_t column) const override { return kColumns[column].cell(*this); }
@@ -38,10 +51,19 @@ private:
     ShareState* state_;
     const Share* share_;
     QuoteBasis basis_;
+    std::optional<double> value_;
+    std::optional<double> part_;
+    std::string reference_;
 };
 
 /// The accounts of the portfolio.
 using AccountStateListView = ObjectListView<AccountState, AccountStateItem>;
 
 /// The holdings of the portfolio.
-using ShareStateListView = ObjectListView<ShareState, ShareStateItem>;
+class ShareStateListView final : public ObjectListView<ShareState, ShareStateItem> {
+public:
+    using ObjectListView::ObjectListView;
+
+    /// Adds the holdings of `state`, of which these are the totals.
+    void addAllOf(const State& state, const Totals& totals);
+};

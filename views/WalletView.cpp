@@ -5,6 +5,7 @@
 #include "market/Currency.h"
 #include "platform/Box.h"
 #include "platform/Button.h"
+#include "platform/SearchControl.h"
 #include "platform/StringView.h"
 #include "valuation/Evolution.h"
 #include "valuation/QuoteCoverage.h"
@@ -139,10 +140,48 @@ void WalletView::makeAccounts()
 
 void WalletView::makeHoldings()
 {
-    BBox* box = addBox(this, {kMargin, kHoldingsTop, kRight, kHoldingsEnd}, "Holdings");
+    holdingsBox_ = addBox(this, {kMargin, kHoldingsTop, kRight, kHoldingsEnd}, "Holdings");
     shares_ = new ShareStateListView("lstShares");
-    shares_->addTo(box, {kBoxSide, kBoxTop, kRight - kMargin - kBoxSide, kHoldingsEnd - kHoldingsTop - kBoxSide},
+    shares_->addTo(holdingsBox_,
+                   {kBoxSide, kBoxTop, kRight - kMargin - kBoxSide, kHoldingsEnd - kHoldingsTop - kBoxSide},
                    "Holdings");
+    // On the upper edge of the box: the list has the room below it.
+    constexpr float kWidth = 220;
+    constexpr float kFilterTop = kHoldingsTop - 4;
+    filter_ = new BSearchControl({kRight - kBoxSide - kWidth, kFilterTop, kRight - kBoxSide, kFilterTop + 20},
+                                 "txtFilter", "Filter", "any words or amounts");
+    filter_->SetDivider(44);
+    filter_->SetAlignment(B_ALIGN_RIGHT, B_ALIGN_LEFT);
+    filter_->SetToolTip("Shows holdings with all of these words.  Ctrl+F; Escape shows all again");
+    filter_->SetHooks(
+        [this] {
+            shares_->setFilter(filter_->Text());
+            tellFiltered();
+        },
+        [this] { shares_->MakeFocus(); });
+    AddChild(filter_);
+}
+
+void WalletView::tellFiltered()
+{
+    const int shown = shares_->CountItems();
+    const int all = shares_->CountRows();
+    std::string title = "Holdings";
+    if (shown < all)
+        title += " - " + countText(shown) + " of " + countText(all) + " shown";
+    holdingsBox_->SetLabel(title.c_str());
+}
+
+void WalletView::showChart(bool isShown)
+{
+    // The holdings have the room of a chart that is not asked for.
+    const float end = isShown ? kHoldingsEnd : kPageHeight - kMargin;
+    holdingsBox_->ResizeTo(kRight - kMargin, end - kHoldingsTop);
+    shares_->ResizeTo(shares_->Bounds().Width(), end - kHoldingsTop - kBoxTop - kHeadingHeight - kBoxSide);
+    if (isShown)
+        evolution_->Show();
+    else
+        evolution_->Hide();
 }
 
 void WalletView::makeChart()
@@ -153,6 +192,7 @@ void WalletView::makeChart()
     noEvolution_ = new BStringView(reasonPlace, "txtNoEvolution", "");
     evolution_->AddChild(noEvolution_);
     AddChild(evolution_);
+    showChart(false);
 }
 
 void WalletView::SetState(const State* state, const Totals& totals)
@@ -163,12 +203,12 @@ void WalletView::SetState(const State* state, const Totals& totals)
     shares_->clear();
     hideCoverage();
     if (state != nullptr) {
-        const auto shares = state->shareStates();
-        shares_->addAll({shares.begin(), shares.end()});
+        shares_->addAllOf(*state, totals);
         // When the rows are there. They are found again by account and share, since all states are new.
         accounts_->recall();
         shares_->recall();
     }
+    tellFiltered();
     showTotals(totals);
 }
 
@@ -257,10 +297,11 @@ void WalletView::UpdateEvolution(const std::vector<EvolutionPoint>& points, cons
                                   : "The first operation has no real date.");
 }
 
-void WalletView::ClearEvolution(bool isNotAsked)
+void WalletView::ClearEvolution()
 {
     evolution_->showNothing();
-    noEvolution_->SetText(isNotAsked ? "tick Compute Evolution" : "");
+    noEvolution_->SetText("");
+    showChart(isComputeEvolution());
 }
 
 void WalletView::SetAccountStateList(const State* state)

@@ -11,6 +11,7 @@
 #include <utility>
 
 class BButton;
+class BSearchControl;
 class BStringView;
 class Currency;
 class EvolutionChart;
@@ -45,8 +46,8 @@ public:
     /// Fills the chart with values in the reference currency, null without one, or says why there are none.
     void UpdateEvolution(const std::vector<EvolutionPoint>& points, const Currency* reference,
                          EvolutionOutcome outcome);
-    /// `isNotAsked`: there would be something to draw.
-    void ClearEvolution(bool isNotAsked = false);
+    /// Without the tick there is no chart, and the list of holdings has its room.
+    void ClearEvolution();
 
     String getAccountName() const { return accountName_->Text(); }
     void setAccountName(const String& name) { showText(*accountName_, name); }
@@ -72,6 +73,8 @@ private:
     void makeChart();
     void makeCoverage();
     void hideCoverage();
+    void showChart(bool isShown);
+    void tellFiltered();
     void showTotals(const Totals& totals);
 
     DateControl* date_ = nullptr;
@@ -88,7 +91,9 @@ private:
     BTextControl* accountName_ = nullptr;
     BTextControl* accountCurrency_ = nullptr;
     BCheckBox* defaultTransferAccount_ = nullptr;
+    BBox* holdingsBox_ = nullptr;
     ShareStateListView* shares_ = nullptr;
+    BSearchControl* filter_ = nullptr; // of the holdings
     EvolutionChart* evolution_ = nullptr;
     BStringView* noEvolution_ = nullptr; // why there is none, in the chart
 };

@@ -4,6 +4,8 @@
 #include "platform/qt/Canvas.h"
 #include "platform/qt/ListWidget.h"
 
+#include <QApplication>
+#include <QClipboard>
 #include <QItemSelectionModel>
 #include <QPainter>
 #include <QScrollBar>
@@ -79,6 +81,36 @@ BListItem* BListView::RemoveItem(int32 index)
             listWidget().selectionModel()->select(row, QItemSelectionModel::Deselect);
     }
     return item;
+}
+
+void BListView::SetItems(std::vector<BListItem*> items)
+{
+    const auto silence = listWidget().silence();
+    const BListItem* current = ItemAt(listWidget().currentIndex().row());
+    // The reset takes the selection with it. Until it is made again, what each item says of itself is what counts.
+    listWidget().rows().beginReset();
+    for (BListItem* item : items_)
+        item->index_ = -1;
+    items_.swap(items);
+    firstUnnumbered_ = 0;
+    renumber();
+    for (BListItem* former : items)
+        former->selected_ = former->selected_ && former->index_ >= 0;
+    listWidget().rows().endReset();
+    // At once: each change of a selection takes as long as it has runs of rows.
+    QItemSelection selected;
+    for (int32 i = 0; i < CountItems(); ++i) {
+        const int32 first = i;
+        while (i < CountItems() && items_[static_cast<std::size_t>(i)]->selected_)
+            ++i;
+        if (i > first)
+            selected.select(listWidget().rows().index(first), listWidget().rows().index(i - 1));
+    }
+    listWidget().selectionModel()->select(selected, QItemSelectionModel::ClearAndSelect);
+    if (current != nullptr && current->index_ >= 0)
+        listWidget().selectionModel()->setCurrentIndex(listWidget().rows().index(current->index_),
+                                                       QItemSelectionModel::NoUpdate);
+    selectionStale_ = true;
 }
 
 void BListView::MakeEmpty()
@@ -185,12 +217,42 @@ bool BListView::IsItemSelected(int32 index) const
     return item != nullptr && item->selected_;
 }
 
+void BListView::SelectAll()
+{
+    listWidget().selectAll();
+}
+
+void BListView::DeselectAll()
+{
+    listWidget().selectionModel()->clearSelection();
+}
+
 std::string BListView::SelectedText() const
 {
     std::string text;
     for (int32 i = 0; i < CountSelected(); ++i)
-        text += (i > 0 ? "\n" : "") + ItemAt(CurrentSelection(i))->Text();
+        text += (i > 0 ? "\n" : "") + ItemAt(CurrentSelection(i))->CopyText();
     return text;
+}
+
+void BListView::CopySelected() const
+{
+    QApplication::clipboard()->setText(QString::fromStdString(SelectedText()));
+}
+
+void BListView::SetRowWidth(float width)
+{
+    if (width == rowWidth_)
+        return;
+    rowWidth_ = width;
+    // The widget has asked a row for its size once, for all.
+    listWidget().doItemsLayout();
+    InvalidateItems();
+}
+
+float BListView::LeftEdge() const
+{
+    return static_cast<float>(listWidget().horizontalScrollBar()->value());
 }
 
 void BListView::ScrollTo(int32 index)

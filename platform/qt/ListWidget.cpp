@@ -3,10 +3,12 @@
 #include "platform/ListItem.h"
 #include "platform/ListView.h"
 
-#include <QApplication>
-#include <QClipboard>
+#include <QContextMenuEvent>
+#include <QHelpEvent>
 #include <QKeyEvent>
 #include <QPainter>
+#include <QScrollBar>
+#include <QToolTip>
 
 namespace {
 
@@ -19,6 +21,24 @@ std::vector<int32> rowsOf(const QItemSelection& selection)
             rows.push_back(row);
     }
     return rows;
+}
+
+/// What `KeyDown` of a list gets for a key; 0 for a key that is none of its business.
+char keyOf(const QKeyEvent& event)
+{
+    if ((event.modifiers() & ~Qt::KeypadModifier) != Qt::NoModifier)
+        return '\0';
+    switch (event.key()) {
+    case Qt::Key_Delete:
+        return B_DELETE;
+    case Qt::Key_F2:
+        return B_FUNCTION_KEY;
+    case Qt::Key_Return:
+    case Qt::Key_Enter:
+        return B_ENTER;
+    default:
+        return '\0';
+    }
 }
 
 } // namespace
@@ -77,7 +97,7 @@ void ListRows::paint(QPainter* painter, const QStyleOptionViewItem& option, cons
 
 QSize ListRows::sizeHint(const QStyleOptionViewItem&, const QModelIndex&) const
 {
-    return {1, static_cast<int>(list_.RowHeight())};
+    return {std::max(static_cast<int>(list_.RowWidth()), 1), static_cast<int>(list_.RowHeight())};
 }
 
 ListWidget::ListWidget(BListView& list) : list_(list), rows_(list), painter_(list)
@@ -86,7 +106,8 @@ ListWidget::ListWidget(BListView& list) : list_(list), rows_(list), painter_(lis
     setUniformItemSizes(true);
     setModel(&rows_);
     setItemDelegate(&painter_);
-    setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
+    setHorizontalScrollMode(QAbstractItemView::ScrollPerPixel);
+    QObject::connect(horizontalScrollBar(), &QScrollBar::valueChanged, [this] { list_.ScrolledSideways(); });
     // Always, so that the columns keep their width, which the pages have reckoned with.
     setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOn);
     // By whole rows, as `TopRow` and `SetTopRow` count them.
@@ -115,9 +136,38 @@ void ListWidget::keyPressEvent(QKeyEvent* event)
 {
     // The rows that are selected, as a table that a spreadsheet takes.
     if (event->matches(QKeySequence::Copy))
-        QApplication::clipboard()->setText(QString::fromStdString(list_.SelectedText()));
+        return list_.CopySelected();
+    const char key = keyOf(*event);
+    if (key != '\0')
+        list_.KeyDown(&key, 1);
     else
         QListView::keyPressEvent(event);
+}
+
+void ListWidget::contextMenuEvent(QContextMenuEvent* event)
+{
+    // The press of the right button has selected the row below the pointer, unless it was among those selected. By the
+    // key the menu comes up where the keyboard stands.
+    QPoint where = event->pos();
+    if (event->reason() == QContextMenuEvent::Keyboard)
+        where = visualRect(currentIndex()).bottomLeft();
+    where.setY(std::clamp(where.y(), 0, viewport()->height()));
+    list_.MenuRequested({static_cast<float>(where.x()), static_cast<float>(where.y())});
+}
+
+bool ListWidget::viewportEvent(QEvent* event)
+{
+    if (event->type() != QEvent::ToolTip)
+        return QListView::viewportEvent(event);
+    const auto& help = static_cast<QHelpEvent&>(*event);
+    const QModelIndex row = indexAt(help.pos());
+    const BPoint where(static_cast<float>(help.x()), static_cast<float>(help.y()));
+    const std::string text = row.isValid() ? list_.ToolTipAt(where, row.row()) : "";
+    // As it stands: a name may look like HTML.
+    const QString shown = QString::fromStdString(text).toHtmlEscaped();
+    QToolTip::showText(help.globalPos(), text.empty() ? QString() : "<p style='white-space:pre'>" + shown + "</p>",
+                       viewport());
+    return true;
 }
 
 void ListWidget::paintEvent(QPaintEvent* event)

@@ -158,6 +158,11 @@ void BTextControl::SetEditable(bool editable)
     field_->setPalette(colors);
 }
 
+bool BTextControl::IsEditable() const
+{
+    return !field_->isReadOnly();
+}
+
 void BTextControl::MarkAsInvalid(const char* reason)
 {
     // From the label's colours again, so that a former mark leaves nothing behind. Without a reason there is no tool

@@ -173,6 +173,14 @@ void BView::MakeFocus()
     widget_->setFocus(Qt::TabFocusReason);
 }
 
+void BView::SetMovesSideways(bool movesSideways)
+{
+    if (movesSideways)
+        widget_->setCursor(Qt::SplitHCursor);
+    else
+        widget_->unsetCursor();
+}
+
 void BView::SetAccessibleName(const char* text)
 {
     widget_->setAccessibleName(QString::fromUtf8(text));

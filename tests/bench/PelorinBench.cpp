@@ -22,6 +22,7 @@
 #include "tests/bench/GeneratedFiles.h"
 #include "valuation/Evolution.h"
 #include "valuation/State.h"
+#include "views/OperationListView.h"
 
 #include <cmath>
 #include <cstdlib>
@@ -242,6 +243,50 @@ bool evolve(Desktop& desktop, const Files&)
     return desktop.window->getWallet()->getNbrStates() > 1;
 }
 
+OperationListView& operationsOf(Desktop& desktop)
+{
+    return dynamic_cast<OperationListView&>(*desktop.window->FindView("lstOperations"));
+}
+
+bool loadAndShowOperations(Desktop& desktop, const Files& files)
+{
+    const bool isLoaded = load(desktop, files);
+    desktop.tabs->Select(3);
+    handle_pending_messages();
+    return isLoaded && operationsOf(desktop).CountItems() == kLarge.operations;
+}
+
+template <std::size_t kColumn>
+bool sortOperations(Desktop& desktop, const Files&)
+{
+    operationsOf(desktop).sortBy(kColumn);
+    handle_pending_messages();
+    return operationsOf(desktop).sortedBy() == kColumn;
+}
+
+/// For the first time, and so in rows that no filter has looked into.
+bool filterOperations(Desktop& desktop, const Files&)
+{
+    operationsOf(desktop).setFilter("buy 2");
+    handle_pending_messages();
+    return operationsOf(desktop).CountItems() < kLarge.operations;
+}
+
+bool loadSortAndFilter(Desktop& desktop, const Files& files)
+{
+    return loadAndShowOperations(desktop, files) && sortOperations<3>(desktop, files) &&
+           filterOperations(desktop, files);
+}
+
+/// The next letter that is typed.
+bool filterFurther(Desktop& desktop, const Files&)
+{
+    const int32 former = operationsOf(desktop).CountItems();
+    operationsOf(desktop).setFilter("buy 31");
+    handle_pending_messages();
+    return operationsOf(desktop).CountItems() < former;
+}
+
 bool switchPages(Desktop& desktop, const Files&)
 {
     constexpr int kPages = 5, kSwitches = 20 * kPages;
@@ -291,6 +336,10 @@ PELORIN_BENCHMARK(BM_Undo, bring_them_back, kLarge, quotesOf(kLarge), loadAndRem
 PELORIN_BENCHMARK(BM_Window, open, small(20), 1, doNothing, openWindow);
 PELORIN_BENCHMARK(BM_Window, switch_page, small(20), 1, load, switchPages);
 PELORIN_BENCHMARK(BM_Window, load_market, kLarge, quotesOf(kLarge), openWindow, loadMarket);
+PELORIN_BENCHMARK(BM_Window, sort_by_text, kLarge, kLarge.operations, loadAndShowOperations, sortOperations<3>);
+PELORIN_BENCHMARK(BM_Window, sort_by_number, kLarge, kLarge.operations, loadAndShowOperations, sortOperations<7>);
+PELORIN_BENCHMARK(BM_Window, filter_first, kLarge, kLarge.operations, loadAndShowOperations, filterOperations);
+PELORIN_BENCHMARK(BM_Window, filter_further, kLarge, kLarge.operations, loadSortAndFilter, filterFurther);
 PELORIN_BENCHMARK(BM_Window, evolve_20_years, small(20), shareStatesOf(small(20)), load, evolve);
 
 /// A price a day that wanders up and down.

@@ -116,10 +116,6 @@ TEST_F(NoticeTest, TotalsSayWhatTheyRestOn)
     buy(markets[0]->companies().front());
     buy(markets[1]->companies().front());
     show(kPortoFolioPage);
-    EXPECT_EQ(shown("txtNoEvolution"), "tick Compute Evolution");
-    enter("txtDate", "1/3/2024");
-    EXPECT_EQ(shown("txtNoEvolution"), "") << "before the first operation that is not the reason";
-    enter("txtDate", "21/11/2024");
     EXPECT_EQ(shown("txtEstimated"), "estimated: 2 of 2 quotes are older than 21/11/2024, no day has all quotes");
     EXPECT_EQ(shown("btnLastQuotes"), "");
     new CompanyQuote(markets[0]->companies().front(), Date(1, 11, 2024), 10);

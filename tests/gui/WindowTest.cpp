@@ -84,6 +84,7 @@ protected:
 
 TEST_F(PortoFolioPageTest, DateRevaluesAWrongOneStopsTheValuationAndTheSelectionsSurvive)
 {
+    click("cbxComputeEvolution"); // whose chart leaves less room
     select("lstShares", 9);
     select("lstAccounts", 1);
     const int32 top = list("lstShares").TopRow();
