@@ -78,7 +78,7 @@ void PlainRow::DrawItem(BView* owner, BRect frame, bool complete)
 }
 
 SplitTradeListView::SplitTradeListView(const char* name)
-    : PlainListView(name, B_SINGLE_SELECTION_LIST,
+    : PlainListView(name,
                     {{"Date", 78},
                      {"Account", kRemainingWidth},
                      {"Type", 42},
@@ -87,7 +87,8 @@ SplitTradeListView::SplitTradeListView(const char* name)
                      {"Quote", 78, B_ALIGN_RIGHT},
                      {"becomes", 78, B_ALIGN_RIGHT},
                      {"Holding", 66, B_ALIGN_RIGHT},
-                     {"becomes", 66, B_ALIGN_RIGHT}})
+                     {"becomes", 66, B_ALIGN_RIGHT}},
+                    false)
 {}
 
 void SplitTradeListView::show(const SplitPlan& plan)
@@ -103,13 +104,14 @@ void SplitTradeListView::show(const SplitPlan& plan)
 }
 
 SplitHoldingListView::SplitHoldingListView(const char* name)
-    : PlainListView(name, B_SINGLE_SELECTION_LIST,
+    : PlainListView(name,
                     {{"", kRemainingWidth},
                      {"Shares", 86, B_ALIGN_RIGHT},
                      {"Price", 92, B_ALIGN_RIGHT},
                      {"Fraction", 72, B_ALIGN_RIGHT},
                      {"Paid Out", 100, B_ALIGN_RIGHT},
-                     {"Total Value", 120, B_ALIGN_RIGHT}})
+                     {"Total Value", 120, B_ALIGN_RIGHT}},
+                    false)
 {}
 
 void SplitHoldingListView::show(const SplitPlan& plan)
