@@ -39,7 +39,7 @@ const std::vector<ColumnOf<Currency>> ObjectItem<Currency>::kColumns = {
     {{"Latest Rate", 96, B_ALIGN_RIGHT}, latestRate},
     {{"Rate of", 82, B_ALIGN_RIGHT},
      [](const Currency& c) {
-         return Cell{dateText(c.getLastQuote()), look::kFaint, dayNumber(c.getLastQuote())};
+         return Cell{dateText(c.getLastQuote()), look::kFaint, dayOrder(c.getLastQuote())};
      }},
 };
 
@@ -64,7 +64,7 @@ template <>
 const std::vector<ColumnOf<CompanyEvent>> ObjectItem<CompanyEvent>::kColumns = {
     {{"Date", 82},
      [](const CompanyEvent& e) {
-         return Cell{dateText(e.getDate()), look::kText, dayNumber(e.getDate())};
+         return Cell{dateText(e.getDate()), look::kText, dayOrder(e.getDate())};
      }},
     {{"Kind", 46},
      [](const CompanyEvent& e) { return Cell{e.getType() == NoteCompanyEvent::kType ? "Note" : "Split"}; }},
@@ -75,7 +75,7 @@ template <>
 const std::vector<ColumnOf<Quote>> ObjectItem<Quote>::kColumns = {
     {{"Date", 82},
      [](const Quote& q) {
-         return Cell{dateText(q.getDate()), look::kText, dayNumber(q.getDate())};
+         return Cell{dateText(q.getDate()), look::kText, dayOrder(q.getDate())};
      }},
     {{"Value", 96, B_ALIGN_RIGHT}, [](const Quote& q) { return rateCell(q.getValue()); }},
 };

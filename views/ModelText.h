@@ -16,7 +16,7 @@ inline std::string textOf(const String& text)
 }
 
 /// What a date is sorted by; nothing for the undefined one.
-inline std::optional<double> dayNumber(const Date& day)
+inline std::optional<double> dayOrder(const Date& day)
 {
     return day.isUndefined() ? std::nullopt : std::optional<double>(day - Date(1, 1, 1));
 }

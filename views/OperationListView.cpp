@@ -136,7 +136,7 @@ Cell balanceBehind(const OperationItem& item)
 Cell date(const OperationItem& item)
 {
     const Date& day = item.object()->getDate();
-    return {dateText(day), look::kText, dayNumber(day)};
+    return {dateText(day), look::kText, dayOrder(day)};
 }
 
 } // namespace

@@ -76,7 +76,7 @@ Cell quoteDay(const Item& item)
     if (!basis.isKnown || basis.day == day)
         return {};
     return {(basis.isEstimate ? "~ " : "") + dateText(basis.day), basis.day > day ? look::kWarning : look::kFaint,
-            dayNumber(basis.day)};
+            dayOrder(basis.day)};
 }
 
 Cell ownValue(const Item& item)
@@ -114,7 +114,7 @@ Cell buyQuote(const Item& item)
 Cell endDate(const Item& item)
 {
     const Date end = item.object()->getEndDate();
-    return item.object()->isHeld() ? Cell{dateText(end), look::kText, dayNumber(end)} : Cell();
+    return item.object()->isHeld() ? Cell{dateText(end), look::kText, dayOrder(end)} : Cell();
 }
 
 } // namespace
