@@ -129,9 +129,9 @@ const std::vector<ColumnOf<AccountState>> AccountStateItem::kColumns = {
 // The list scrolls sideways to the last column, which only simulated sales ask for.
 const std::vector<ColumnOf<ShareStateItem>> ShareStateItem::kColumns = {
     {{"Ticker", 50}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyAbbreviation()); }},
-    {{"Company", 106}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
+    {{"Company", 98}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
     {{"Quantity", 62, B_ALIGN_RIGHT}, quantity},
-    {{"Buy Quote", 72, B_ALIGN_RIGHT}, buyQuote},
+    {{"Buy Quote", 80, B_ALIGN_RIGHT}, buyQuote},
     {{"Quote", 62, B_ALIGN_RIGHT}, quote},
     {{"Quote of", 92, B_ALIGN_RIGHT}, quoteDay},
     {{"Value", 108, B_ALIGN_RIGHT, UnitPlace::kShown}, ownValue},

@@ -184,8 +184,8 @@ TEST_F(OperationTest, ASelectionFillsTheFieldsOfItsTypeAndHidesTheOthers)
                    "txtCharged=37.50 EUR to Cash"},
         {"Charge", "txtDate=06/02/2024 txtAmount=5.00 txtCharged=5.00 EUR from Cash"},
     };
-    EXPECT_EQ(rows("lstOperations")[4], "05/02/2024\tCash\tIncome\t\t\t37.50\t\t37.50 EUR\t");
-    EXPECT_EQ(rows("lstOperations")[5], "06/02/2024\tCash\tCharge\t\t\t5.00\t\t5.00 EUR\t");
+    EXPECT_EQ(rows("lstOperations")[4], "05/02/2024\tCash\tIncome\t\t\t37.50\t\t37.50 EUR\t37.50");
+    EXPECT_EQ(rows("lstOperations")[5], "06/02/2024\tCash\tCharge\t\t\t5.00\t\t5.00 EUR\t-5.00");
     for (int row = 5; row >= 0; --row) {
         select("lstOperations", row);
         EXPECT_EQ(menuText("operationType"), cases[row].first);

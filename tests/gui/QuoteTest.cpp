@@ -58,17 +58,18 @@ TEST_F(QuoteTest, AnotherSeriesEmptiesTheFieldsOfItsQuotes)
     const auto fields = [this] { return text("txtQuoteDate") + ' ' + text("txtQuoteValue"); };
     addCompany("BE", "Beta");
     EXPECT_EQ(fields(), " ");
-    fill({{"txtQuoteDate", "2/3/2024"}, {"txtQuoteValue", "1x"}});
+    fill({{"txtQuoteDate", "2/3/2024"}, {"txtQuoteValue", "1"}});
     click("btnAddQuote");
     post('HUnd');
-    EXPECT_EQ(fields(), "2/3/2024 1x") << "the same company, though it was made anew";
+    EXPECT_EQ(fields(), "02/03/2024 1.00") << "the same company, though it was made anew";
+    type("txtQuoteValue", "1x");
     select("lstCompanies", 0);
     EXPECT_EQ(fields(), " ");
     EXPECT_TRUE(find<QLineEdit>("txtQuoteValue").toolTip().isEmpty());
     show(kCurrencyPage);
     type("txtQuoteValue", "3");
     select("lstCurrencies", 1);
-    EXPECT_EQ(fields(), "1/1/2024 3") << "selected already";
+    EXPECT_EQ(fields(), "01/01/2024 3.00") << "selected already";
     select("lstCurrencies", 0);
     EXPECT_EQ(fields(), " ");
 }
