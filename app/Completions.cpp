@@ -11,9 +11,10 @@ constexpr std::size_t kMostOffers = 50; // nobody reads on: more of the name is 
 /// Such as "ALP  Alpine Water  Paris".
 std::string labelOf(const NamedEntry& entry)
 {
-    std::string label = entry.key;
+    constexpr std::size_t kLongestPart = 100; // bytes; a file can hold megabytes
+    std::string label = shortened(entry.key, kLongestPart);
     for (const std::string& more : {entry.name, entry.place})
-        label += more.empty() ? "" : "  " + more;
+        label += more.empty() ? "" : "  " + shortened(more, kLongestPart);
     return label;
 }
 
@@ -40,14 +41,15 @@ const Completions::Names& Completions::names()
 {
     if (names_ && names_->serial == window_.changeSerial())
         return *names_;
+    // Keys and places are put into fields, whole; names are only shown.
     std::vector<NamedEntry> currencies, markets, companies;
     for (const Currency* currency : window_.catalogue().getCurrencies())
-        currencies.push_back({textOf(currency->getRepresentation()), textOf(currency->getName()), {}});
+        currencies.push_back({wholeTextOf(currency->getRepresentation()), textOf(currency->getName()), {}});
     for (const Market* market : window_.catalogue().getMarkets()) {
-        const std::string name = textOf(market->getName());
+        const std::string name = wholeTextOf(market->getName());
         markets.push_back({name, {}, textOf(market->getCurrencyRepresentation())});
         for (const Company* company : market->companies())
-            companies.push_back({textOf(company->getAbbreviation()), textOf(company->getName()), name});
+            companies.push_back({wholeTextOf(company->getAbbreviation()), textOf(company->getName()), name});
     }
     // What has no name cannot be asked for by it.
     for (auto* entries : {&currencies, &markets, &companies})

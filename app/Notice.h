@@ -16,4 +16,5 @@ struct Notice {
     std::string text;            ///< one line; longer text is in the tool tip
     std::vector<Button> buttons; ///< at most two; pressing one also takes the notice away
     bool isPassing = false;      ///< goes by itself after some seconds, and does not queue
+    bool isRemark = false;       ///< a passing one that is told behind another one which comes within a second
 };

@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <utility>
 
 namespace {
 
@@ -16,6 +17,7 @@ constexpr uint32 kExpired = 'NtEx';
 constexpr uint32 kKeyPressed = 'NtKy';
 constexpr uint32 kDismissed = 'NtDs';
 constexpr bigtime_t kPassingTime = 6000000;
+constexpr std::chrono::seconds kTogether(1);
 constexpr rgb_color kGround = {255, 244, 206, 255};
 constexpr rgb_color kEdge = {204, 178, 104, 255};
 constexpr float kInset = 8;     // of the text
@@ -106,8 +108,13 @@ void NoticeLine::MessageReceived(BMessage* message)
 
 void NoticeLine::show(Notice notice)
 {
-    passing_.reset(); // what is new is seen at once, or it takes its place in the queue
+    // What is new is seen at once, or it takes its place in the queue.
+    const std::optional<Notice> former = std::exchange(passing_, std::nullopt);
     if (notice.isPassing) {
+        const auto now = std::chrono::steady_clock::now();
+        if (former && former->isRemark && !notice.isRemark && now - passingSince_ < kTogether)
+            notice.text += " (" + former->text + ")";
+        passingSince_ = now;
         passing_ = std::move(notice);
         const BMessage expired(kExpired);
         expiry_ = std::make_unique<BMessageRunner>(BMessenger(this), &expired, kPassingTime);

@@ -3,6 +3,7 @@
 #include "app/Notice.h"
 #include "platform/View.h"
 
+#include <chrono>
 #include <deque>
 #include <memory>
 #include <optional>
@@ -24,7 +25,8 @@ public:
     explicit NoticeLine(BRect frame);
     ~NoticeLine() override;
 
-    /// A passing notice stands before the others until it goes; any other one waits for its turn.
+    /// A passing notice stands before the others until it goes; any other one waits for its turn. A remark of
+    /// the second before is told behind it: how a number was read, behind what was booked by it.
     void show(Notice notice);
     /// Takes the notice of that key away, shown or waiting, if there is one.
     void drop(const std::string& key);
@@ -49,6 +51,7 @@ private:
 
     std::deque<Notice> waiting_; // the first one is shown unless `passing_` is
     std::optional<Notice> passing_;
+    std::chrono::steady_clock::time_point passingSince_;
     std::unique_ptr<BMessageRunner> expiry_; // of `passing_`
     int32 shown_ = 0;                        // counts what was shown, so that a late press does not meet another notice
     NoticeText* text_ = nullptr;

@@ -128,7 +128,7 @@ constexpr Command kOwnCommands[] = {
     {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
     {kFieldNotice,
      [](PLWindow& w, BMessage* m) {
-         w.showNotice({"field", textIn(*m), {}, true});
+         w.showNotice({"field", textIn(*m), {}, true, true});
      }},
     {'WBGd', [](PLWindow& w, BMessage*) { w.valueAtLastQuotes(); }},           // the portfolio page
     {'OPIn', [](PLWindow& w, BMessage*) { w.ChangeOperationType("INCOME"); }}, // the operation page

@@ -50,8 +50,10 @@ std::vector<ChartFlag> companyFlags(const Company& company, std::span<CompanyEve
 {
     using Shape = ChartFlag::Shape;
     std::vector<ChartFlag> flags;
+    std::vector<const CompanyEvent*> gone(leaving.begin(), leaving.end());
+    std::ranges::sort(gone);
     for (const CompanyEvent* event : company.events())
-        if (std::ranges::find(leaving, event) == leaving.end())
+        if (!std::ranges::binary_search(gone, event))
             flags.push_back({Shape::kDiamond, event->getDate(), eventText(*event)});
     for (const Share* share : company.shares())
         for (const ShareOperation* trade : share->shareOperations())

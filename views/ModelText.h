@@ -15,10 +15,10 @@ inline std::string textOf(const String& text)
     return shortened(text.bytes(), kLongestShown);
 }
 
-/// What a date is sorted by; nothing for the undefined one.
+/// What a date is sorted by; nothing for one that is no day.
 inline std::optional<double> dayOrder(const Date& day)
 {
-    return day.isUndefined() ? std::nullopt : std::optional<double>(day - Date(1, 1, 1));
+    return !day.isValid() ? std::nullopt : std::optional<double>(day - Date(1, 1, 1));
 }
 
 /// The text, whole, for what gives it back: fields and menus, which show as much of it as they can.

@@ -16,19 +16,44 @@ namespace {
 
 // What is old stands in grey beside the new.
 
-Cell was(const std::string& text)
+Cell was(const std::string& text, double number)
 {
-    return {text, look::kFaint};
+    return {text, look::kFaint, number};
 }
 
-Cell becomes(const std::string& text)
+Cell becomes(const std::string& text, double number)
 {
-    return {text, look::kSeries};
+    return {text, look::kSeries, number};
+}
+
+Cell wasPrice(float price)
+{
+    return was(priceText(price), price);
+}
+
+Cell becomesPrice(float price)
+{
+    return becomes(priceText(price), price);
+}
+
+Cell amountOf(double amount)
+{
+    return {amountText(amount), look::kText, amount};
 }
 
 std::string sharesText(std::int64_t shares)
 {
     return countText(static_cast<int>(shares)); // a plan without problem has 32 bits of them
+}
+
+Cell wasShares(std::int64_t shares)
+{
+    return was(sharesText(shares), static_cast<double>(shares));
+}
+
+Cell becomesShares(std::int64_t shares)
+{
+    return becomes(sharesText(shares), static_cast<double>(shares));
 }
 
 std::string accountText(const Account* account)
@@ -42,12 +67,12 @@ PlainRow* rowOf(const SplitPlan::Trade& trade)
     return new PlainRow({{dateText(operation.getDate())},
                          {accountText(operation.account())},
                          {operation.isBuy() ? "Buy" : "Sell"},
-                         was(countText(operation.getQuantity())),
-                         becomes(countText(trade.quantity)),
-                         was(priceText(operation.getQuote())),
-                         becomes(priceText(trade.quote)),
-                         was(sharesText(trade.formerHolding)),
-                         becomes(sharesText(trade.holding))});
+                         wasShares(operation.getQuantity()),
+                         becomesShares(trade.quantity),
+                         wasPrice(operation.getQuote()),
+                         becomesPrice(trade.quote),
+                         wasShares(trade.formerHolding),
+                         becomesShares(trade.holding)});
 }
 
 PlainRow* settlementOf(const SplitPlan::Holding& holding, const Date& day)
@@ -56,11 +81,11 @@ PlainRow* settlementOf(const SplitPlan::Holding& holding, const Date& day)
                          {accountText(holding.account)},
                          {"Sell"},
                          {},
-                         becomes("1"),
+                         becomesShares(1),
                          {},
-                         becomes(priceText(holding.saleQuote)),
+                         becomesPrice(holding.saleQuote),
                          {},
-                         becomes(sharesText(holding.whole))},
+                         becomesShares(holding.whole)},
                         true);
 }
 
@@ -120,18 +145,18 @@ void SplitHoldingListView::show(const SplitPlan& plan)
     for (const SplitPlan::Holding& holding : plan.holdings()) {
         const bool isSettled = holding.fraction != 0;
         rows.push_back(new PlainRow({{"Before"},
-                                     was(sharesText(holding.former)),
-                                     was(priceText(plan.priceBefore())),
+                                     wasShares(holding.former),
+                                     wasPrice(plan.priceBefore()),
                                      {},
                                      {},
-                                     {amountText(holding.valueBefore)}}));
-        rows.push_back(
-            new PlainRow({{"After"},
-                          becomes(sharesText(holding.whole)),
-                          becomes(priceText(plan.priceAfter())),
-                          isSettled ? becomes(fractionText(static_cast<int>(holding.fraction), plan.from())) : Cell{},
-                          isSettled ? becomes(amountText(holding.paidOut)) : Cell{},
-                          {amountText(holding.valueAfter)}}));
+                                     amountOf(holding.valueBefore)}));
+        rows.push_back(new PlainRow(
+            {{"After"},
+             becomesShares(holding.whole),
+             becomesPrice(plan.priceAfter()),
+             isSettled ? Cell{fractionText(static_cast<int>(holding.fraction), plan.from()), look::kSeries} : Cell{},
+             isSettled ? becomes(amountText(holding.paidOut), holding.paidOut) : Cell{},
+             amountOf(holding.valueAfter)}));
     }
     showRows(rows);
 }

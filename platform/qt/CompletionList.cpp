@@ -1,5 +1,6 @@
 #include "platform/qt/CompletionList.h"
 
+#include <QApplication>
 #include <QKeyEvent>
 #include <QLineEdit>
 #include <QScreen>
@@ -11,6 +12,7 @@ namespace {
 
 constexpr int kMostRows = 8; // that show without scrolling
 constexpr int kPadding = 12; // beside the longest row
+constexpr int kSpacing = 1;  // around a row: capitals may have accents
 
 } // namespace
 
@@ -25,6 +27,7 @@ CompletionList::CompletionList(QLineEdit& field, Find find, Choose choose)
     setObjectName(field.objectName() + "Completions");
     setAccessibleName(field.accessibleName() + " suggestions");
     setUniformItemSizes(true);
+    setSpacing(kSpacing);
     setEditTriggers(NoEditTriggers);
     setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
     setFrameStyle(QFrame::Box | QFrame::Plain);
@@ -56,7 +59,7 @@ void CompletionList::place()
     const int frame = 2 * frameWidth();
     const QRect screen = field_.screen()->availableGeometry();
     const QSize size(std::clamp(sizeHintForColumn(0) + kPadding + bar + frame, field_.width(), screen.width()),
-                     rows * sizeHintForRow(0) + frame);
+                     rows * (sizeHintForRow(0) + 2 * kSpacing) + frame);
     // Below the field or, where there is no room, above.
     QPoint corner = field_.mapToGlobal(QPoint(0, field_.height()));
     if (corner.y() + size.height() > screen.bottom())
@@ -114,9 +117,24 @@ bool CompletionList::takeKey(const QKeyEvent& event)
     }
 }
 
+void CompletionList::showEvent(QShowEvent* event)
+{
+    qApp->installEventFilter(this);
+    QListView::showEvent(event);
+}
+
+void CompletionList::hideEvent(QHideEvent* event)
+{
+    qApp->removeEventFilter(this);
+    QListView::hideEvent(event);
+}
+
 bool CompletionList::eventFilter(QObject* watched, QEvent* event)
 {
-    // The list's own scroll bars are watched, too.
+    // The list's own scroll bars are watched, too, and the whole program while the list is open.
+    const auto* pressed = event->type() == QEvent::MouseButtonPress ? qobject_cast<QWidget*>(watched) : nullptr;
+    if (pressed != nullptr && pressed != &field_ && pressed != this && !isAncestorOf(pressed))
+        hide(); // the click then does what it is for
     const bool isGone =
         event->type() == QEvent::Move || event->type() == QEvent::Resize || event->type() == QEvent::Hide;
     if (isGone && watched == field_.window())

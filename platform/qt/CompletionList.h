@@ -11,7 +11,7 @@ class QLineEdit;
 /// The list of completions below a field. It never has the keyboard: the field hands it the keys that it has a use for,
 /// and a click chooses without the field losing the keyboard. Nothing is chosen until an arrow key or a click does.
 ///
-/// It closes when the field loses the keyboard, and when its window moves.
+/// It closes when the field loses the keyboard, at a click elsewhere, and when its window moves.
 class CompletionList final : public QListView {
 public:
     using Find = std::function<std::vector<Completion>(const std::string& typed)>;
@@ -31,6 +31,8 @@ public:
 
 protected:
     bool eventFilter(QObject* watched, QEvent* event) override;
+    void showEvent(QShowEvent* event) override;
+    void hideEvent(QHideEvent* event) override;
 
 private:
     void place();

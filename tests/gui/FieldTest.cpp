@@ -152,6 +152,9 @@ TEST_F(FieldTest, WhatCannotBeReadIsNotBooked)
     post('OBAd');
     EXPECT_EQ(wallet().getAccount(0)->getNbrOperations(), 2U) << "the code by itself is not asked";
     EXPECT_EQ(static_cast<AccountOperation*>(wallet().getAccount(0)->getOperation(1))->getAmount(), 10);
+    type("txtAmount", "1,234");
+    click("btnAddOperation");
+    EXPECT_EQ(notice(), "Deposited 1.23 EUR to Cash (1,234 was read as 1.234)");
 
     addCurrency("Franc", "CHF");
     fill({{"txtQuoteDate", "1/1/2024"}, {"txtQuoteValue", "1.5x"}});
