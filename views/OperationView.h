@@ -53,6 +53,8 @@ public:
     ListPlaces selection() const { return operations_->selection(); }
     /// Sends no message.
     void restoreSelection(const ListPlaces& places) { operations_->restoreSelection(places); }
+    /// The operation of the fields shows again, and is the selected one: hidden it would be added a second time.
+    void AboutToUpdate() override;
     /// Takes the filters away.
     void ShowAllOperations();
     /// Takes the rows of removed operations out of a list that is not filled again.

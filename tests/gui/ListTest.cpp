@@ -171,6 +171,56 @@ TEST_F(ListTest, FiltersCountWhatTheyShowAndHideNothingThatIsMade)
     EXPECT_EQ(text("txtFilter"), "");
 }
 
+TEST_F(ListTest, OfSeveralRowsTheOneInTheFieldsStaysTheOneThatCommandsTake)
+{
+    select("lstOperations", 1);
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Down, Qt::ShiftModifier);
+    EXPECT_EQ(text("txtAmount"), "1000.00");
+    clickHeading("lstOperations", 0); // the second one now stands above it
+    EXPECT_EQ(list("lstOperations").CountSelected(), 1);
+    click("btnRemoveOperation");
+    EXPECT_THAT(dates(), ElementsAre("01/02/2023", "04/03/2024", "06/03/2024"));
+
+    addMarket("Lyon", "EUR");
+    addCompany("ZZ", "Zulu");
+    fill({{"txtCompanyEventDate", "1/2/2024"}});
+    click("btnAddCompanyEvent");
+    ASSERT_EQ(rows("lstCompanyEvents").size(), 1U);
+    addCompany("AA", "Aleph");
+    select("lstCompanies", 0);
+    select("lstCompanies", 1, true);
+    clickHeading("lstCompanies", 0);
+    EXPECT_EQ(list("lstCompanies").CountSelected(), 1);
+    addQuote("1/3/2024", "10");
+    addQuote("2/3/2024", "11");
+    EXPECT_EQ(rows("lstQuotes").size(), 2U) << "of the company in the fields";
+    select("lstCompanies", 0);
+    EXPECT_EQ(rows("lstQuotes").size(), 0U);
+    post(kUndo);
+    EXPECT_EQ(text("txtName"), "Zulu");
+    EXPECT_EQ(rows("lstCompanyEvents").size(), 1U);
+}
+
+TEST_F(ListTest, AHiddenRowIsNotAddedAgainByAnUpdate)
+{
+    select("lstOperations", 3);
+    for (const char* hiding : {"1,000", "nothing"}) {
+        type("txtFilter", hiding);
+        EXPECT_EQ(list("lstOperations").CountSelected(), 0) << hiding;
+        type("txtFilter", "");
+        EXPECT_EQ(list("lstOperations").CurrentSelection(), 3) << hiding;
+    }
+    type("txtFilter", "nothing");
+    fill({{"txtDate", "7/3/2024"}});
+    click("btnUpdateOperation");
+    EXPECT_THAT(dates(), ElementsAre("01/02/2023", "05/03/2024", "04/03/2024", "07/03/2024"));
+    type("txtFilter", "1,000");
+    select("lstOperations", 0);
+    list("lstOperations").DeselectAll();
+    type("txtFilter", "");
+    EXPECT_EQ(list("lstOperations").CountSelected(), 0) << "another one was selected meanwhile";
+}
+
 TEST_F(ListTest, OneAccountShowsWhatItReceivesAndItsBalance)
 {
     EXPECT_THAT(column("lstOperations", 8), ElementsAre("2,000.00", "-1,000.00", "50.00", "300.00"));
