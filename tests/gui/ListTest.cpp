@@ -254,6 +254,9 @@ TEST_F(ListTest, SeparatorsWidenAndCutTextsShowInAToolTip)
     QTest::mouseRelease(&bar, Qt::LeftButton, {}, separator - QPoint(70, 0));
     EXPECT_EQ(widthOf(3), former - 70);
     EXPECT_EQ(dates().front(), "01/02/2023") << "that is no click on a heading";
+    columns("lstOperations").setColumnWidth(5, 40);
+    QTest::mouseMove(&bar, {endOf("lstOperations", 5) - 20, 9});
+    EXPECT_EQ(bar.toolTip(), "Quote/Amount");
     const QPoint what(endOf("lstOperations", 3) - 10, 27);
     QHelpEvent asked(QEvent::ToolTip, what, viewport("lstOperations").mapToGlobal(what));
     QApplication::sendEvent(&viewport("lstOperations"), &asked);
