@@ -39,7 +39,7 @@ Moment PLWindow::moment() const
     return {CatalogueImage::of(catalogue_, isFirst ? nullptr : history_->now().catalogue),
             std::move(wallet),
             companyView_->places(catalogue_.getMarkets()),
-            currencyView_->places(),
+            currencyView_->places(catalogue_.getCurrencies()),
             walletView_->selections(),
             operationView_->selection()};
 }

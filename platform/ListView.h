@@ -81,6 +81,8 @@ public:
 
     // Hooks. `KeyDown` hears of Enter, F2 and Delete only, all other keys are the list's; `MenuRequested` after the row
     // below the pointer, which then is `where`, was selected.
+    /// Rows were selected or deselected, by hand or by a call, with a message or quietly; not that rows went.
+    virtual void SelectionChanged() {}
     /// The list was scrolled sideways.
     virtual void ScrolledSideways() {}
     /// What the tool tip says at `where`, over the row of that index; empty for none.

@@ -46,6 +46,20 @@ void ColumnHeading::Draw(BRect)
     FillRect({0, bounds.bottom - 1, bounds.right, bounds.bottom});
 }
 
+float ColumnHeading::titleRoom(std::size_t column) const
+{
+    return list_.columns()[column].textWidth() - (list_.sortedBy() == column ? kArrowRoom : 0);
+}
+
+std::string ColumnHeading::toolTipAt(float x) const
+{
+    const auto column = columnAt(x);
+    if (!column)
+        return {};
+    const std::string& title = list_.columns()[*column].title;
+    return StringWidth(title.c_str()) > titleRoom(*column) ? title : "";
+}
+
 void ColumnHeading::drawTitle(std::size_t column, float left)
 {
     ListColumn shown = list_.columns()[column];
@@ -58,7 +72,7 @@ void ColumnHeading::drawTitle(std::size_t column, float left)
     }
     SetHighColor(look::kText);
     const TextWidth widthOf = [this](const std::string& text) { return StringWidth(text.c_str()); };
-    shown.drawText(*this, fitText(shown.title, widthOf, shown.textWidth()), left, baseLine(*this, Bounds()));
+    shown.drawText(*this, fitText(shown.title, widthOf, titleRoom(column)), left, baseLine(*this, Bounds()));
 }
 
 void ColumnHeading::drawArrow(float left, bool isDown)
@@ -117,6 +131,10 @@ void ColumnHeading::MouseMoved(BPoint where, bool inside)
 {
     if (drag_)
         list_.setColumnWidth(drag_->column, std::max(where.x + drag_->offset, kSmallest));
+    if (const std::string tip = toolTipAt(where.x); tip != toolTip_) {
+        toolTip_ = tip;
+        SetToolTip(tip.c_str());
+    }
     SetMovesSideways(drag_.has_value() || (inside && separatorAt(where.x).has_value()));
 }
 

@@ -4,6 +4,7 @@
 
 #include <chrono>
 #include <optional>
+#include <string>
 
 class ColumnListView;
 
@@ -26,6 +27,10 @@ private:
     };
     using Clock = std::chrono::steady_clock;
 
+    /// The room for a title; an arrow may stand beside it.
+    float titleRoom(std::size_t column) const;
+    /// A title that is cut.
+    std::string toolTipAt(float x) const;
     void drawTitle(std::size_t column, float left);
     void drawArrow(float left, bool isDown);
     /// The column whose right end is near; the one that is below the pointer.
@@ -33,6 +38,7 @@ private:
     std::optional<std::size_t> columnAt(float x) const;
 
     ColumnListView& list_;
+    std::string toolTip_;
     std::optional<Drag> drag_;
     std::optional<std::size_t> pressed_; // a title
     std::optional<std::size_t> lastSeparator_;

@@ -105,12 +105,16 @@ public:
     void setFilter(const std::string& text);
     /// All rows, shown or not.
     int32 CountRows() const { return static_cast<int32>(all_.size()); }
+    /// Whether the row that the fields show is hidden. It is selected again as soon as it shows, unless another one was
+    /// selected meanwhile.
+    bool isSelectionHidden() const { return hidden_ != nullptr; }
 
     // Enter and F2 go to the first field of the editor, Delete presses the button there that removes, and the menu
     // offers its buttons.
     void KeyDown(const char* bytes, int32 numBytes) override;
     void MenuRequested(BPoint where) override;
     void ScrolledSideways() override;
+    void SelectionChanged() override { hidden_ = nullptr; }
     /// A text that is cut in its column.
     std::string ToolTipAt(BPoint where, int32 index) const override;
 
@@ -129,6 +133,13 @@ protected:
     void moveRow(int32 from, int32 to);
     /// What the row's cells say has changed.
     void redraw(ColumnItem* row);
+
+    /// The row that fields show and commands take: of several selected ones, the first, also while it is hidden. Null
+    /// when there is none.
+    ColumnItem* leadingRow() const;
+    /// To be called when rows may have come to stand elsewhere, with what `leadingRow` was before. When another row
+    /// would now be it, leaves that one selected alone or, while it does not show, none. Sends no message.
+    void keepLeading(ColumnItem* row);
 
     ColumnItem* rowAt(int32 place) const { return all_[static_cast<std::size_t>(place)]; }
     int32 placeOf(const ColumnItem* row) const;
@@ -162,4 +173,5 @@ private:
     std::vector<std::string> words_;   // that rows must have, folded
     std::vector<ColumnItem*> ordered_; // what was chosen of all, sorted
     bool isOrderKnown_ = false;
+    ColumnItem* hidden_ = nullptr; // the leading row while it does not show; then no row is selected
 };

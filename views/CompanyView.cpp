@@ -276,8 +276,12 @@ CompanyView::Places CompanyView::places(const std::vector<Market*>& markets) con
         places.shownMarket = static_cast<std::size_t>(shown - markets.begin());
         places.companies = companies_->places((*shown)->companies());
     }
-    if (const Company* company = GetSelectedCompany(); company != nullptr && company == eventsOf_)
-        places.events = events_->list().places(company->events());
+    const Company* company = GetSelectedCompany();
+    if (shown == markets.end() || company == nullptr || company != eventsOf_ || !isShown(company))
+        return places;
+    const auto& companies = (*shown)->companies();
+    places.shownCompany = static_cast<std::size_t>(std::ranges::find(companies, company) - companies.begin());
+    places.events = events_->list().places(company->events());
     places.quotes = quoteSelection();
     return places;
 }
@@ -290,10 +294,14 @@ void CompanyView::restore(const Places& places, const std::vector<Market*>& mark
     // Quotes and events follow the company that is selected, each list with what was selected in it.
     shownMarket_ = markets[*places.shownMarket];
     companies_->restore(places.companies, shownMarket_->companies());
-    if (Company* company = GetSelectedCompany()) {
-        SetQuoteList(company);
-        restoreQuoteSelection(places.quotes);
-        eventsOf_ = company;
-        events_->list().restore(places.events, company->events());
-    }
+    Company* company = GetSelectedCompany();
+    if (company == nullptr)
+        return;
+    SetQuoteList(company);
+    SetCompanyEventList(company);
+    // Of several selected ones another may be the first now: the list may be sorted by another column.
+    if (!places.shownCompany || shownMarket_->companies()[*places.shownCompany] != company)
+        return;
+    restoreQuoteSelection(places.quotes);
+    events_->list().restore(places.events, company->events());
 }

@@ -96,6 +96,7 @@ public:
         ListPlaces markets;
         std::optional<std::size_t> shownMarket; // whose companies are listed
         ListPlaces companies;
+        std::optional<std::size_t> shownCompany; // the selected one, whose quotes and events are listed
         ListPlaces quotes;
         ListPlaces events;
     };

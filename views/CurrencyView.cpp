@@ -134,11 +134,16 @@ void CurrencyView::fillChart(QuoteChart& chart, const Currency& currency) const
     chart.showSeries(currency, textOf(currency.getRepresentation()), reference.empty() ? "???" : reference, false, {});
 }
 
-CurrencyView::Places CurrencyView::places() const
+CurrencyView::Places CurrencyView::places(const std::vector<Currency*>& currencies) const
 {
-    Places places{currencies_->selection(), {}, quoteSelection()};
-    if (const Currency* currency = GetSelectedCurrency(); currency != nullptr && currency == marketsOf_)
-        places.markets = markets_->places(currency->markets());
+    Places places;
+    places.currencies = currencies_->selection();
+    const Currency* currency = GetSelectedCurrency();
+    if (currency == nullptr || currency != marketsOf_ || !isShown(currency))
+        return places;
+    places.shownCurrency = static_cast<std::size_t>(std::ranges::find(currencies, currency) - currencies.begin());
+    places.markets = markets_->places(currency->markets());
+    places.quotes = quoteSelection();
     return places;
 }
 
@@ -146,12 +151,16 @@ void CurrencyView::restore(const Places& places, const std::vector<Currency*>& c
 {
     currencies_->addAll(currencies);
     currencies_->restoreSelection(places.currencies);
-    if (Currency* currency = GetSelectedCurrency()) {
-        marketsOf_ = currency;
-        markets_->restore(places.markets, currency->markets());
-        SetQuoteList(currency);
-        restoreQuoteSelection(places.quotes);
-    }
+    Currency* currency = GetSelectedCurrency();
+    if (currency == nullptr)
+        return;
+    SetMarketList(currency);
+    SetQuoteList(currency);
+    // Of several selected ones another may be the first now: the list may be sorted by another column.
+    if (!places.shownCurrency || currencies[*places.shownCurrency] != currency)
+        return;
+    markets_->restore(places.markets, currency->markets());
+    restoreQuoteSelection(places.quotes);
 }
 
 void CurrencyView::DeleteAllCurrencies()

@@ -4,6 +4,8 @@
 #include "views/MarketDataLists.h"
 #include "views/SeriesPage.h"
 
+#include <optional>
+
 /// The page of currencies, with the markets and rates of the selected currency.
 ///
 /// Markets and rates are those of one currency, which need not be selected any more. So the page keeps whose rows it
@@ -38,10 +40,12 @@ public:
     /// What the lists show.
     struct Places {
         ListPlaces currencies;
+        std::optional<std::size_t> shownCurrency; // the selected one, whose markets and rates are listed
         ListPlaces markets;
         ListPlaces quotes;
     };
-    Places places() const;
+    /// `currencies` are those of the catalogue, in its order.
+    Places places(const std::vector<Currency*>& currencies) const;
     /// Fills the lists, which show nothing, and brings back what was selected; sends no message.
     void restore(const Places& places, const std::vector<Currency*>& currencies);
     /// Shows no currency any more.

@@ -83,6 +83,8 @@ void ColumnListView::destroyRow(ColumnItem* row)
     arePlacesKnown_ = false;
     std::erase(ordered_, row);
     RemoveItem(IndexOf(row));
+    if (hidden_ == row)
+        hidden_ = nullptr;
     delete row;
 }
 
@@ -92,6 +94,7 @@ void ColumnListView::destroyRows()
     MakeEmpty();
     ordered_.clear();
     isOrderKnown_ = false;
+    hidden_ = nullptr;
     for (const BListItem* row : std::exchange(all_, {}))
         delete row;
 }
@@ -109,12 +112,33 @@ void ColumnListView::moveRow(int32 from, int32 to)
         return;
     }
     const bool wasSelected = IsItemSelected(from);
+    ColumnItem* leading = leadingRow();
     AddItem(RemoveItem(from), to);
     if (!wasSelected)
         return;
     SetQuiet(true);
     Select(to, true);
     SetQuiet(false);
+    if (isSortable_)
+        keepLeading(leading);
+}
+
+ColumnItem* ColumnListView::leadingRow() const
+{
+    auto* first = static_cast<ColumnItem*>(ItemAt(CurrentSelection()));
+    return first != nullptr ? first : hidden_;
+}
+
+void ColumnListView::keepLeading(ColumnItem* row)
+{
+    const int32 index = IndexOf(row);
+    if (CurrentSelection() != index) {
+        SetQuiet(true);
+        DeselectAll();
+        Select(index);
+        SetQuiet(false);
+    }
+    hidden_ = index < 0 ? row : nullptr; // after the selection, which has changed
 }
 
 void ColumnListView::redraw(ColumnItem* row)
@@ -181,7 +205,9 @@ void ColumnListView::arrange()
         if (passes(*row))
             shown.push_back(row);
     }
+    ColumnItem* leading = leadingRow();
     SetItems(std::move(shown));
+    keepLeading(leading);
     if (isArranged())
         return;
     // From here on rows come and go without it.

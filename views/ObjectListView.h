@@ -155,9 +155,11 @@ public:
     /// emptied and filled.
     void remember()
     {
-        if (CountItems() == 0)
+        if (CountRows() == 0)
             return; // it was emptied before, and what was kept in mind then still stands
         remembered_.clear();
+        const ColumnItem* leading = leadingRow();
+        rememberedLeading_ = leading != nullptr ? static_cast<const Row*>(leading)->key() : nullptr;
         for (int32 i = 0; i < CountSelected(); ++i) {
             if (const void* key = static_cast<const Row*>(ItemAt(CurrentSelection(i)))->key())
                 remembered_.push_back(key);
@@ -168,6 +170,7 @@ public:
     void forget()
     {
         remembered_.clear();
+        rememberedLeading_ = nullptr;
         rememberedTop_ = 0;
     }
     /// Sends no message.
@@ -187,6 +190,8 @@ public:
                 first = -1;
             }
         }
+        if (isSortable() && (!remembered_.empty() || rememberedLeading_ != nullptr))
+            keepLeading(rowOfKey(rememberedLeading_));
         SetTopRow(rememberedTop_);
         SetQuiet(false);
         forget();
@@ -235,7 +240,10 @@ public:
                 ++last;
             Select(first, last, true);
         }
-        if (CountRows() > 0)
+        // The rows may have been in another order then: in one that was chosen the view stays, but for the selection.
+        if (isArranged())
+            ScrollToSelection();
+        else if (CountRows() > 0)
             SetTopRow(IndexOf(rowAt(places.top)));
         SetQuiet(false);
     }
@@ -244,7 +252,8 @@ public:
     {
         std::vector<Object*> rows;
         for (const std::size_t place : places.rows)
-            rows.push_back(objects[place]);
+            if (place < objects.size())
+                rows.push_back(objects[place]);
         clear();
         addAll(rows);
         restoreSelection(places);
@@ -262,11 +271,16 @@ private:
     /// their selection: the fields are not about them. Sends no message.
     void deselectWith(const Row& row)
     {
-        if (!row.IsSelected() || !isSortable())
-            return;
-        SetQuiet(true);
-        DeselectAll();
-        SetQuiet(false);
+        if (isSortable() && (row.IsSelected() || &row == leadingRow()))
+            keepLeading(nullptr);
+    }
+    /// Null when there is none.
+    Row* rowOfKey(const void* key) const
+    {
+        for (int32 i = 0; key != nullptr && i < CountRows(); ++i)
+            if (row(i)->key() == key)
+                return row(i);
+        return nullptr;
     }
     Row* row(int32 place) const { return static_cast<Row*>(rowAt(place)); }
     int32 placeAt(int32 index) const { return placeOf(static_cast<const ColumnItem*>(ItemAt(index))); }
@@ -287,5 +301,6 @@ private:
     mutable bool isIndexed_ = false;
     bool hasReleased_ = false; // rows that wait to be dropped
     std::vector<const void*> remembered_;
+    const void* rememberedLeading_ = nullptr; // the key of the leading row
     int32 rememberedTop_ = 0;
 };

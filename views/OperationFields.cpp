@@ -6,6 +6,12 @@
 #include "platform/MenuItem.h"
 #include "views/OperationView.h"
 
+namespace {
+
+constexpr float kTextPadding = 6; // from the sides of a field to its text
+
+} // namespace
+
 String OperationView::chosen(const BMenuField& field)
 {
     // The commands know an account by its name.
@@ -53,6 +59,15 @@ void OperationView::setTotal(float total)
 {
     // Thousands separators are welcome here: nobody types in this field, and nothing reads it.
     total_->SetText(amountText(total).c_str());
+}
+
+void OperationView::setCharged(const std::string& text)
+{
+    charged_->SetText(text.c_str());
+    // Where the field has no room for it, the whole text is to be read all the same.
+    const float room = charged_->Bounds().Width() - kChargedDivider - 2 * kTextPadding;
+    const bool isCut = charged_->StringWidth(text.c_str()) > room;
+    charged_->SetToolTip(isCut ? text.c_str() : kChargedTip);
 }
 
 void OperationView::SetTypingHook(const std::function<void()>& hook)

@@ -118,6 +118,12 @@ void OperationView::filter()
     tellFiltered();
 }
 
+void OperationView::AboutToUpdate()
+{
+    if (operations_->isSelectionHidden())
+        ShowAllOperations();
+}
+
 void OperationView::ShowAllOperations()
 {
     filter_->SetText("");

@@ -189,9 +189,9 @@ void OperationView::makeButtons(BBox* box)
     const float left = cell(2, 0).left + kColumnGap;
     // A transfer has two ends to tell of.
     charged_ = addField(box, {kBoxSide + kAutomaticWidth, top + 1, left - kColumnGap, bottom - 1}, "txtCharged",
-                        "Charged", 'OTCh', 64);
+                        "Charged", 'OTCh', kChargedDivider);
     charged_->SetEditable(false);
-    charged_->SetToolTip("What the account pays or gets, with all costs");
+    charged_->SetToolTip(kChargedTip);
     addButtons(box, {left, top, kRight - kMargin - kBoxSide, bottom},
                {{"btnAddOperation", "Add", 'OBAd'},
                 {"btnUpdateOperation", "Update", 'OBUp'},

@@ -53,6 +53,8 @@ public:
     ListPlaces selection() const { return operations_->selection(); }
     /// Sends no message.
     void restoreSelection(const ListPlaces& places) { operations_->restoreSelection(places); }
+    /// The operation of the fields shows again, and is the selected one: hidden it would be added a second time.
+    void AboutToUpdate() override;
     /// Takes the filters away.
     void ShowAllOperations();
     /// Takes the rows of removed operations out of a list that is not filled again.
@@ -112,7 +114,7 @@ public:
     void setShareCost(float cost) { show(*shareCost_, cost); }
     void setTotal(float total);
     /// What the account will be charged.
-    void setCharged(const std::string& text) { charged_->SetText(text.c_str()); }
+    void setCharged(const std::string& text);
 
     // Offers.
     /// `hook` is called when a person has changed what offers depend on: the date, an account, the market or the
@@ -159,6 +161,9 @@ private:
     void fillAccounts(BMenu& menu, Account** accounts, int count);
 
     BBox* listBox_ = nullptr;
+    static constexpr float kChargedDivider = 64;
+    static constexpr const char* kChargedTip = "What the account pays or gets, with all costs";
+
     OperationListView* operations_ = nullptr;
     BSearchControl* filter_ = nullptr;
     BMenuField* filterAccount_ = nullptr;

@@ -30,10 +30,16 @@ public:
                                        field->fault());
             return B_BAD_VALUE;
         }
+        for (BView* view = Parent(); view != nullptr && isUpdating(); view = view->Parent()) {
+            if (auto* page = dynamic_cast<PageView*>(view))
+                page->AboutToUpdate();
+        }
         return BButton::Invoke(message);
     }
 
 private:
+    bool isUpdating() const { return std::strcmp(Label(), PageView::kUpdateLabel) == 0; }
+
     static constexpr std::size_t kLongestTold = 60; // bytes
 };
 

@@ -25,6 +25,9 @@ public:
 
     PageView(BRect frame, const char* name);
 
+    /// Hook: a button of the page that updates is pressed; its message is sent behind this.
+    virtual void AboutToUpdate() {}
+
     // All of these put what they make into `parent`, which owns it.
     static BBox* addBox(BView* parent, BRect frame, const char* label)
     {

@@ -126,18 +126,18 @@ const std::vector<ColumnOf<AccountState>> AccountStateItem::kColumns = {
     {{"Default", 56, B_ALIGN_CENTER}, defaultMark},
 };
 
-// The list scrolls sideways to the last column, which only simulated sales ask for.
+// All of them fit into the page.
 const std::vector<ColumnOf<ShareStateItem>> ShareStateItem::kColumns = {
-    {{"Ticker", 50}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyAbbreviation()); }},
-    {{"Company", 98}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
+    {{"Ticker", 48}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyAbbreviation()); }},
+    {{"Company", 82}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
     {{"Quantity", 62, B_ALIGN_RIGHT}, quantity},
-    {{"Buy Quote", 80, B_ALIGN_RIGHT}, buyQuote},
-    {{"Quote", 62, B_ALIGN_RIGHT}, quote},
-    {{"Quote of", 92, B_ALIGN_RIGHT}, quoteDay},
-    {{"Value", 108, B_ALIGN_RIGHT, UnitPlace::kShown}, ownValue},
-    {{"In ???", 78, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceValue},
-    {{"Part", 54, B_ALIGN_RIGHT}, partOfAll},
-    {{"Gain", 64, B_ALIGN_RIGHT}, gain},
+    {{"Buy Quote", 74, B_ALIGN_RIGHT}, buyQuote},
+    {{"Quote", 56, B_ALIGN_RIGHT}, quote},
+    {{"Quote of", 80, B_ALIGN_RIGHT}, quoteDay},
+    {{"Value", 96, B_ALIGN_RIGHT, UnitPlace::kShown}, ownValue},
+    {{"In ???", 70, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceValue},
+    {{"Part", 46, B_ALIGN_RIGHT}, partOfAll},
+    {{"Gain", 56, B_ALIGN_RIGHT}, gain},
     {{"End Date", 78, B_ALIGN_RIGHT}, endDate},
 };
 

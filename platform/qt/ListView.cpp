@@ -188,6 +188,7 @@ void BListView::selectionChangedByWidget(const std::vector<int32>& on, const std
     }
     // Before the message: what it sets off asks for the selection.
     selectionStale_ = true;
+    SelectionChanged();
     if (!quiet_)
         Invoke();
 }

@@ -171,6 +171,56 @@ TEST_F(ListTest, FiltersCountWhatTheyShowAndHideNothingThatIsMade)
     EXPECT_EQ(text("txtFilter"), "");
 }
 
+TEST_F(ListTest, OfSeveralRowsTheOneInTheFieldsStaysTheOneThatCommandsTake)
+{
+    select("lstOperations", 1);
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Down, Qt::ShiftModifier);
+    EXPECT_EQ(text("txtAmount"), "1000.00");
+    clickHeading("lstOperations", 0); // the second one now stands above it
+    EXPECT_EQ(list("lstOperations").CountSelected(), 1);
+    click("btnRemoveOperation");
+    EXPECT_THAT(dates(), ElementsAre("01/02/2023", "04/03/2024", "06/03/2024"));
+
+    addMarket("Lyon", "EUR");
+    addCompany("ZZ", "Zulu");
+    fill({{"txtCompanyEventDate", "1/2/2024"}});
+    click("btnAddCompanyEvent");
+    ASSERT_EQ(rows("lstCompanyEvents").size(), 1U);
+    addCompany("AA", "Aleph");
+    select("lstCompanies", 0);
+    select("lstCompanies", 1, true);
+    clickHeading("lstCompanies", 0);
+    EXPECT_EQ(list("lstCompanies").CountSelected(), 1);
+    addQuote("1/3/2024", "10");
+    addQuote("2/3/2024", "11");
+    EXPECT_EQ(rows("lstQuotes").size(), 2U) << "of the company in the fields";
+    select("lstCompanies", 0);
+    EXPECT_EQ(rows("lstQuotes").size(), 0U);
+    post(kUndo);
+    EXPECT_EQ(text("txtName"), "Zulu");
+    EXPECT_EQ(rows("lstCompanyEvents").size(), 1U);
+}
+
+TEST_F(ListTest, AHiddenRowIsNotAddedAgainByAnUpdate)
+{
+    select("lstOperations", 3);
+    for (const char* hiding : {"1,000", "nothing"}) {
+        type("txtFilter", hiding);
+        EXPECT_EQ(list("lstOperations").CountSelected(), 0) << hiding;
+        type("txtFilter", "");
+        EXPECT_EQ(list("lstOperations").CurrentSelection(), 3) << hiding;
+    }
+    type("txtFilter", "nothing");
+    fill({{"txtDate", "7/3/2024"}});
+    click("btnUpdateOperation");
+    EXPECT_THAT(dates(), ElementsAre("01/02/2023", "05/03/2024", "04/03/2024", "07/03/2024"));
+    type("txtFilter", "1,000");
+    select("lstOperations", 0);
+    list("lstOperations").DeselectAll();
+    type("txtFilter", "");
+    EXPECT_EQ(list("lstOperations").CountSelected(), 0) << "another one was selected meanwhile";
+}
+
 TEST_F(ListTest, OneAccountShowsWhatItReceivesAndItsBalance)
 {
     EXPECT_THAT(column("lstOperations", 8), ElementsAre("2,000.00", "-1,000.00", "50.00", "300.00"));
@@ -204,6 +254,9 @@ TEST_F(ListTest, SeparatorsWidenAndCutTextsShowInAToolTip)
     QTest::mouseRelease(&bar, Qt::LeftButton, {}, separator - QPoint(70, 0));
     EXPECT_EQ(widthOf(3), former - 70);
     EXPECT_EQ(dates().front(), "01/02/2023") << "that is no click on a heading";
+    columns("lstOperations").setColumnWidth(5, 40);
+    QTest::mouseMove(&bar, {endOf("lstOperations", 5) - 20, 9});
+    EXPECT_EQ(bar.toolTip(), "Quote/Amount");
     const QPoint what(endOf("lstOperations", 3) - 10, 27);
     QHelpEvent asked(QEvent::ToolTip, what, viewport("lstOperations").mapToGlobal(what));
     QApplication::sendEvent(&viewport("lstOperations"), &asked);
@@ -259,6 +312,11 @@ TEST_F(ListTest, HoldingsShowTheirPartAndHaveTheRoomOfAChartThatIsNotAskedFor)
     show(kPortoFolioPage);
     EXPECT_EQ(column("lstShares", 7).at(0), "100.00");
     EXPECT_EQ(column("lstShares", 8).at(0), "4.3%") << "of 2,340 in cash, less 110, and 100";
+    EXPECT_EQ(list("lstShares").RowWidth(), 0) << "all columns have room";
+    for (std::size_t i = 0; i < 11; ++i) {
+        QTest::mouseMove(&heading("lstShares"), {endOf("lstShares", i) - 20, 9});
+        EXPECT_EQ(heading("lstShares").toolTip(), "") << i << ": no title is cut";
+    }
     const int former = list("lstShares").widget()->height();
     click("cbxComputeEvolution");
     EXPECT_LT(list("lstShares").widget()->height(), former);
