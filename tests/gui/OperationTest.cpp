@@ -2,7 +2,6 @@
 
 #include "market/NoteCompanyEvent.h"
 #include "platform/ListView.h"
-#include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/SmallPortfolio.h"
 #include "valuation/AccountState.h"
@@ -362,9 +361,6 @@ TEST_F(OperationTest, ANewOperationStartsWithTheAccountThatIsLikely)
 
 TEST_F(OperationTest, ASuccessIsToldAndADoubleClickBooksOnce)
 {
-    const auto notice = [this] {
-        return window().widget().findChild<QWidget*>("txtNotice")->accessibleName().toStdString();
-    };
     fill({{"operationType", "Buy"},
           {"txtMarketName", "Paris"},
           {"txtCompanyAbbreviation", "BBB"},
