@@ -381,6 +381,7 @@ TEST_F(OperationTest, ASuccessIsToldAndADoubleClickBooksOnce)
     }
     EXPECT_EQ(countOperations(), 2U) << "a held key is no more meant";
     post('HUnd');
+    EXPECT_EQ(notice(), "") << "it is undone";
     post('OBAd');
     EXPECT_EQ(countOperations(), 2U) << "a code that no person sends is no double click";
     post('HUnd');
