@@ -11,6 +11,7 @@
 #include "views/OperationListView.h"
 #include "views/PageView.h"
 
+#include <array>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -110,7 +111,10 @@ public:
     void setQuote(float quote) { show(*quote_, quote); }
     float getShareCost() const { return shareCost_->getNumber(); }
     void setShareCost(float cost) { show(*shareCost_, cost); }
-    void setTotal(float total);
+    /// Nothing empties the field.
+    void setTotal(std::optional<float> total);
+    /// Whether a number that the type has cannot be read.
+    bool hasFault() const;
     /// What the account will be charged.
     void setCharged(const std::string& text) { charged_->SetText(text.c_str()); }
 
@@ -138,6 +142,7 @@ public:
 private:
     using OfferNumber = OfferField<NumberControl>;
 
+    std::array<OfferNumber*, 8> figures() const;
     static String chosen(const BMenuField& field);
     /// Marks the item of that label, or none.
     static void choose(BMenuField& field, const String& label);

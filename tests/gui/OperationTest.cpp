@@ -224,15 +224,18 @@ TEST_F(OperationTest, ARemovalIsNotAskedFor)
     EXPECT_THAT(rows("lstOperations"), ElementsAre(EndsWith("3.00 EUR\t3.00")));
 }
 
-TEST_F(OperationTest, TheTotalFollowsConfirmedQuantitiesAndQuotes)
+TEST_F(OperationTest, TheTotalFollowsQuantityAndQuote)
 {
     fill({{"operationType", "Buy"},
           {"txtMarketName", "Paris"},
           {"txtCompanyAbbreviation", "BBB"},
           {"txtQuantity", "7"}});
-    EXPECT_EQ(text("txtTotal"), "") << "typed only";
-    enter("txtQuantity", "7");
-    EXPECT_EQ(text("txtTotal"), "70.00");
+    EXPECT_EQ(text("txtTotal"), "70.00") << "typed only";
+    type("txtQuantity", "7x");
+    EXPECT_EQ(text("txtTotal"), "") << "of no number";
+    type("txtQuantity", "7");
+    type("txtCompanyAbbreviation", "AAA");
+    EXPECT_EQ(text("txtTotal"), "0.00") << "has no quote";
     enter("txtQuote", "1000.5");
     EXPECT_EQ(text("txtTotal"), "7,003.50") << "before costs";
 }
@@ -317,6 +320,18 @@ TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
     EXPECT_EQ(text("txtQuote"), "5.00") << "the same company again";
     fill({{"txtCompanyAbbreviation", ""}, {"txtQuote", "6"}, {"txtCompanyAbbreviation", "BBB"}});
     EXPECT_EQ(text("txtQuote"), "6.00") << "typed for no company yet";
+    type("txtCompanyAbbreviation", "AAA");
+    EXPECT_EQ(text("txtQuote"), "") << "BBB's since then";
+    fill({{"txtQuote", "4"}, {"txtCompanyAbbreviation", "AAB"}, {"txtQuantity", "3"}});
+    type("txtCompanyAbbreviation", "BBB");
+    EXPECT_EQ(text("txtQuote"), "12.00") << "a quantity says nothing of whose quote it is";
+    fill({{"txtCompanyAbbreviation", ""}, {"txtQuote", "6"}, {"txtCompanyAbbreviation", "AAA"}});
+    EXPECT_EQ(text("txtQuote"), "6.00");
+    type("txtCompanyAbbreviation", "BBB");
+    EXPECT_EQ(text("txtQuote"), "12.00") << "what was typed has become AAA's";
+    new Company(beta()->market(), "Longer", "BBBB");
+    fill({{"txtCompanyAbbreviation", ""}, {"txtQuote", "6"}, {"txtCompanyAbbreviation", "BBBB"}});
+    EXPECT_EQ(text("txtQuote"), "6.00") << "BBB came by on the way";
 
     fill({{"operationType", "Transfer"}, {"baseAccount", "Cash"}, {"transferAccount", "Dollars"}});
     EXPECT_EQ(text("txtTransferFromQuote") + " " + text("txtTransferToQuote"), "1.00 0.50");
