@@ -189,6 +189,6 @@ void OperationEditor::changeType(const String& type)
 {
     // The fields of that type show with what they held.
     page_.SetType(type);
-    offers_.offerCost();
+    offers_.noteType();
     offers_.renew();
 }

@@ -65,8 +65,9 @@ Wallet& OperationOffers::wallet() const
     return *window_.getWallet();
 }
 
-void OperationOffers::offerCost()
+void OperationOffers::noteType()
 {
+    typed_ = {}; // what market and ticker never hold: the account may be that of another type
     if (const String type = page_.getType(); isTrade(type))
         page_.offerShareCost(shareCost(wallet(), type));
 }

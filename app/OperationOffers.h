@@ -22,8 +22,9 @@ public:
         : window_(window), page_(page), maker_(maker)
     {}
 
-    /// Another type was chosen: each kind of trade has a fixed cost of its own to offer.
-    void offerCost();
+    /// Another type was chosen: each kind of trade has a fixed cost of its own to offer, and the
+    /// company chooses the account again.
+    void noteType();
     /// Brings everything up to date with the fields, the quotes and the parameters.
     void renew();
     /// A figure was typed that no offer depends on.
