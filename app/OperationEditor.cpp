@@ -8,6 +8,12 @@
 #include "views/CompanyView.h"
 #include "views/OperationView.h"
 
+namespace {
+
+constexpr const char* kNotice = "operation";
+
+} // namespace
+
 OperationEditor::OperationEditor(PLWindow& window, OperationView& page, CompanyView& companies)
     : window_(window), page_(page), maker_(window, page), offers_(window, page, maker_), notes_(window, companies)
 {
@@ -72,13 +78,16 @@ void OperationEditor::book(Operation* former)
     Company* payer = kindOf(*made) == OperationKind::kIncome ? maker_.company() : nullptr;
     if (payer != nullptr && !made->isAutomatic())
         notes_.add(*payer, *made);
+    const bool stays = !made->isAutomatic();
     showMade(made, former);
+    if (!stays)
+        return window_.dropNotice(kNotice); // the valuation has taken it away: nothing is done, nor is what was before
     tell(former != nullptr ? "Updated: " + deed : deed);
 }
 
 void OperationEditor::tell(const std::string& deed)
 {
-    window_.showNotice({"operation", deed, {}, true});
+    window_.showNotice({kNotice, deed, {}, true});
 }
 
 void OperationEditor::showMade(Operation* made, Operation* former)

@@ -18,6 +18,8 @@ namespace {
 
 using testing::ElementsAre;
 using testing::EndsWith;
+using testing::HasSubstr;
+using testing::Not;
 using testing::SizeIs;
 
 constexpr const char* kAdd = "btnAddOperation";
@@ -282,6 +284,7 @@ TEST_F(AutomaticOperationTest, CanBeReplacedByAnotherOneWhichIsGoneBeforeItIsLis
 {
     click(kUpdate);
     EXPECT_EQ(countOperations(), 1U) << "the simulated sale is in the past now, and moves no profit again";
+    EXPECT_THAT(notice(), Not(HasSubstr("Transferred"))) << "it is gone";
     click(kAdd);
     EXPECT_EQ(countOperations(), 1U);
     EXPECT_EQ(firstShare().getNbrShareOperations(), 2U) << "the sale stays with its holding";
