@@ -440,9 +440,11 @@ TEST_F(OperationTest, IncomeAndChargesMoveTheirSumsAndNoDeposits)
         EXPECT_EQ(cashOf(2), dollars) << when;
         EXPECT_EQ(window().getState()->getTotalDeposit(), 1000) << when;
     };
-    const auto notes = [this] {
+    const auto notes = [this](const char* ticker = "BBB") {
         std::vector<std::string> texts;
-        for (const CompanyEvent* event : beta()->events()) {
+        Company* company = nullptr;
+        wallet().getCompany("Paris", ticker, &company);
+        for (const CompanyEvent* event : company->events()) {
             const auto& note = dynamic_cast<const NoteCompanyEvent&>(*event);
             texts.push_back(std::string(event->getDate().toString().getCharacterArray()) + ' ' +
                             note.getTitle().getCharacterArray() + ' ' + note.getText().getCharacterArray());
@@ -489,6 +491,20 @@ TEST_F(OperationTest, IncomeAndChargesMoveTheirSumsAndNoDeposits)
     click(kRemove);
     expectCash(euros, 0, "removed");
     EXPECT_THAT(notes(), testing::IsEmpty());
+
+    const auto expectNotes = [&](const char* ofAlpha) {
+        EXPECT_THAT(notes("AAA"), ElementsAre(ofAlpha));
+        EXPECT_THAT(notes("BBB"), ElementsAre("21/11/2024 Dividend 5.00 USD to Dollars"));
+    };
+    follow({{{{"txtCompanyAbbreviation", "BBB"}, {"baseAccount", "Dollars"}, {"txtAmount", "5"}}, kAdd, ""},
+            {{{"txtCompanyAbbreviation", "AAA"}}, kAdd, ""},
+            {{{"txtAmount", "6"}}, kUpdate, ""}});
+    expectNotes("21/11/2024 Dividend 6.00 USD to Dollars");
+    follow({{{{"txtAmount", "5"}}, kUpdate, ""}});
+    select("lstOperations", 3);
+    EXPECT_EQ(text("txtMarketName") + ' ' + text("txtCompanyAbbreviation"), "Paris AAA") << "one of two alike";
+    follow({{{{"txtAmount", "7"}}, kUpdate, ""}});
+    expectNotes("21/11/2024 Dividend 7.00 USD to Dollars");
 }
 
 } // namespace
