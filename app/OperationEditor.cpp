@@ -8,6 +8,12 @@
 #include "views/CompanyView.h"
 #include "views/OperationView.h"
 
+namespace {
+
+constexpr const char* kNotice = "operation";
+
+} // namespace
+
 OperationEditor::OperationEditor(PLWindow& window, OperationView& page, CompanyView& companies)
     : window_(window), page_(page), maker_(window, page), offers_(window, page, maker_), notes_(window, companies)
 {
@@ -51,7 +57,7 @@ void OperationEditor::remove()
     Operation* operation = selected();
     const std::string deed = operation != nullptr ? deedText(*operation) : "";
     if (operation != nullptr) {
-        notes_.remove(notes_.of(*operation));
+        notes_.remove(notes_.of(*operation, payer_));
         destroy(operation);
     }
     window_.UpdateState();
@@ -62,7 +68,7 @@ void OperationEditor::remove()
 void OperationEditor::book(Operation* former)
 {
     // Before there is a new one, which may look the same.
-    NoteCompanyEvent* formerNote = former != nullptr ? notes_.of(*former) : nullptr;
+    NoteCompanyEvent* formerNote = former != nullptr ? notes_.of(*former, payer_) : nullptr;
     Operation* made = maker_.make();
     if (made == nullptr)
         return;                               // the former one stays, and its note
@@ -72,13 +78,17 @@ void OperationEditor::book(Operation* former)
     Company* payer = kindOf(*made) == OperationKind::kIncome ? maker_.company() : nullptr;
     if (payer != nullptr && !made->isAutomatic())
         notes_.add(*payer, *made);
+    const bool stays = !made->isAutomatic();
+    payer_ = payer != nullptr && stays ? DividendNotes::nameOf(*payer) : "";
     showMade(made, former);
+    if (!stays)
+        return window_.dropNotice(kNotice); // the valuation has taken it away: nothing is done, nor is what was before
     tell(former != nullptr ? "Updated: " + deed : deed);
 }
 
 void OperationEditor::tell(const std::string& deed)
 {
-    window_.showNotice({"operation", deed, {}, true});
+    window_.showNotice({kNotice, deed, {}, true});
 }
 
 void OperationEditor::showMade(Operation* made, Operation* former)
@@ -157,9 +167,10 @@ void OperationEditor::showCash(const AccountOperation& operation)
 void OperationEditor::showPayer(const Operation& income)
 {
     // The file says nothing of it but by the note. What is shown is what an update will note again.
-    const NoteCompanyEvent* note = notes_.of(income);
+    const NoteCompanyEvent* note = notes_.of(income, {});
     const Company* payer = note != nullptr ? note->company() : nullptr;
     const Market* market = payer != nullptr ? payer->market() : nullptr;
+    payer_ = payer != nullptr ? DividendNotes::nameOf(*payer) : "";
     page_.setMarketName(market != nullptr ? market->getName() : String());
     page_.setCompanyAbbreviation(payer != nullptr ? payer->getAbbreviation() : String());
 }
@@ -189,6 +200,6 @@ void OperationEditor::changeType(const String& type)
 {
     // The fields of that type show with what they held.
     page_.SetType(type);
-    offers_.offerCost();
+    offers_.noteType();
     offers_.renew();
 }

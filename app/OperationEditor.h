@@ -54,4 +54,5 @@ private:
     OperationMaker maker_;
     OperationOffers offers_;
     DividendNotes notes_;
+    std::string payer_; // whose note the income has that was shown or made last; empty without one
 };

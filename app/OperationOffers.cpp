@@ -65,8 +65,9 @@ Wallet& OperationOffers::wallet() const
     return *window_.getWallet();
 }
 
-void OperationOffers::offerCost()
+void OperationOffers::noteType()
 {
+    typed_ = {}; // what market and ticker never hold: the account may be that of another type
     if (const String type = page_.getType(); isTrade(type))
         page_.offerShareCost(shareCost(wallet(), type));
 }
@@ -81,21 +82,33 @@ void OperationOffers::renew()
         page_.renewShareCost(shareCost(wallet(), type));
     if (isTrade(type) || type == "INCOME")
         followCompany();
-    showCharged();
+    showSums();
 }
 
 void OperationOffers::noteFigure()
 {
     if (isTrade(page_.getType()))
-        quoteOf_ = companyKey();
-    showCharged();
+        noteQuote();
+    showSums();
 }
 
 void OperationOffers::noteShown()
 {
     typed_ = typedKey();
     quoteOf_ = companyKey();
-    showCharged();
+    isFirst_ = false;
+    quote_ = page_.getQuote();
+    showSums();
+}
+
+void OperationOffers::noteQuote()
+{
+    // While there is no company, another figure says nothing of whose quote it is.
+    const bool isOther = std::exchange(quote_, page_.getQuote()) != page_.getQuote();
+    if (maker_.company() == nullptr && !isOther)
+        return;
+    quoteOf_ = companyKey();
+    isFirst_ = false;
 }
 
 void OperationOffers::noteUsed(const Account& account)
@@ -132,15 +145,19 @@ void OperationOffers::followCompany()
         chooseAccountFor(*company);
     if (!isTrade(page_.getType()))
         return;
-    // On the way from one ticker to another there is none for a moment: what was typed waits for the other.
+    // On the way from one ticker to another there is none for a moment: what was typed waits for the other. What was
+    // typed before any ticker was waits, too, while the ticker that is being typed goes on from one that came by.
     const auto quote = quoteAt(company, page_.getDate());
-    if (company != nullptr && !quoteOf_.empty() && quoteOf_ != key)
+    const bool goesOn = isFirst_ && key.starts_with(quoteOf_);
+    if (company != nullptr && !quoteOf_.empty() && quoteOf_ != key && !goesOn)
         page_.replaceQuote(quote);
     else
         page_.offerQuote(quote);
-    // What was typed before any ticker was does not belong to the first one that comes by.
-    if (company != nullptr && (!isOther || page_.isQuoteOffered()))
+    if (company != nullptr) {
+        isFirst_ = isOther && !page_.isQuoteOffered() && (quoteOf_.empty() || goesOn);
         quoteOf_ = key;
+    }
+    quote_ = page_.getQuote();
 }
 
 void OperationOffers::chooseAccountFor(const Company& company)
@@ -169,16 +186,22 @@ void OperationOffers::offerTransferQuotes()
         page_.offerTransferQuotes(quoteAt(from, date), quoteAt(to, date));
 }
 
-void OperationOffers::showCharged()
+void OperationOffers::showSums()
 {
     page_.setCharged(chargedText());
+    if (!isTrade(page_.getType()))
+        return;
+    // For the eye only: no command reads the total.
+    const bool isKnown = page_.getQuantity() != 0 && !page_.hasFault();
+    const double quote = page_.getQuote();
+    page_.setTotal(isKnown ? std::optional(static_cast<float>(page_.getQuantity() * quote)) : std::nullopt);
 }
 
 /// Empty for what would not be booked, or would move nothing.
 std::string OperationOffers::chargedText() const
 {
     const Account* account = chosenAccount();
-    if (account == nullptr)
+    if (account == nullptr || page_.hasFault())
         return {};
     const String type = page_.getType();
     const auto operation = maker_.draft(Date());

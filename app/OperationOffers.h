@@ -22,8 +22,9 @@ public:
         : window_(window), page_(page), maker_(maker)
     {}
 
-    /// Another type was chosen: each kind of trade has a fixed cost of its own to offer.
-    void offerCost();
+    /// Another type was chosen: each kind of trade has a fixed cost of its own to offer, and the
+    /// company chooses the account again.
+    void noteType();
     /// Brings everything up to date with the fields, the quotes and the parameters.
     void renew();
     /// A figure was typed that no offer depends on.
@@ -40,7 +41,10 @@ private:
     void followCompany();
     void chooseAccountFor(const Company& company);
     void offerTransferQuotes();
-    void showCharged();
+    /// What is made of the figures, for the eye.
+    void showSums();
+    /// A figure of a trade was typed, which may be the quote.
+    void noteQuote();
     std::string chargedText() const;
     /// The company that the fields name, in words that stay true when it is destroyed; empty when there is none.
     std::string companyKey() const;
@@ -49,7 +53,9 @@ private:
     PLWindow& window_;
     OperationView& page_;
     const OperationMaker& maker_;
-    String used_;         // the account that was booked on last; undefined before
-    std::string typed_;   // what market and ticker held when they were looked at last
-    std::string quoteOf_; // the company that the quote in its field is of; empty when it is of none
+    String used_;          // the account that was booked on last; undefined before
+    std::string typed_;    // what market and ticker held when they were looked at last
+    std::string quoteOf_;  // the company that the quote in its field is of; empty when it is of none
+    bool isFirst_ = false; // the quote was typed before any ticker, and that company was the first to come by
+    float quote_ = 0;      // what the field held when it was looked at last
 };

@@ -18,6 +18,7 @@
 #include "views/WalletView.h"
 
 #include <algorithm>
+#include <cstring>
 #include <iterator>
 #include <span>
 
@@ -148,6 +149,23 @@ const Command* commandOf(uint32 code)
     return nullptr;
 }
 
+/// A step in words for its success, "Added market Paris" for "Add market Paris"; empty for one that is told otherwise.
+std::string doneText(const std::string& command, const std::string& label)
+{
+    // Those of operations say what was moved, and those that fetch quotes what came.
+    for (const char* told : {"Add operation", "Update operation", "Update company", "Update quotes"})
+        if (command == told)
+            return {};
+    std::string done;
+    for (const auto& [deed, past] : {std::pair("Add ", "Added "), std::pair("Update ", "Updated ")})
+        if (command.starts_with(deed))
+            done = past + command.substr(std::strlen(deed));
+    if (done.empty() || label.size() <= command.size())
+        return done;
+    const bool isOf = done.ends_with("quote") || done.ends_with("rate") || done.ends_with("event");
+    return done + (isOf ? " of" : "") + label.substr(command.size());
+}
+
 const BRect kPageFrame(0, 0, 800, 775);
 const BRect kNoticeFrame(8, 757, 792, 779); // between what is on the pages and the letters of the status line
 
@@ -223,9 +241,18 @@ void PLWindow::MessageReceived(BMessage* message)
     if (repeats_.isRepeat(*message, front()))
         return;
     command_ = command->step;
+    const std::uint64_t former = history_->serial();
     command->run(*this, message);
     repeats_.noteRun(*message, front());
     noteStep(std::exchange(command_, {}));
+    if (history_->serial() != former)
+        tellDone(command->step);
+}
+
+void PLWindow::tellDone(const std::string& command)
+{
+    if (const std::string text = doneText(command, history_->undoLabel()); !text.empty())
+        showNotice({kDoneNotice, text, {}, true});
 }
 
 BView& PLWindow::front() const

@@ -186,6 +186,8 @@ public:
 private:
     friend class StateHold;
 
+    static constexpr const char* kDoneNotice = "done";
+
     void makePages();
     /// The page in front.
     BView& front() const;
@@ -196,6 +198,8 @@ private:
     void noteStep(const std::string& command);
     Moment moment() const;
     void restore(const Moment& moment);
+    /// Tells for some seconds that the command was done: what the status line says may be of a former mistake.
+    void tellDone(const std::string& command);
     void showFields(const Market& market);
     /// Says what can be taken back, which files are open, and how much of them is not saved.
     void showHistory();

@@ -92,10 +92,12 @@ template <class Series>
 void QuoteEditor<Series>::followSeries()
 {
     const Series* series = page_.selectedSeries();
-    if (series == nullptr)
+    if (series == nullptr) {
+        series_ = nullptr; // it may be gone, and the next one come to its address
         return;
+    }
     const std::string name = nameOf(*series);
-    if (series_ != nullptr && series != series_ && name != name_)
+    if (!name_.empty() && series != series_ && name != name_)
         page_.clearQuoteFields();
     series_ = series;
     name_ = name;

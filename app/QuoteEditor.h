@@ -37,7 +37,8 @@ private:
     PLWindow& window_;
     SeriesPage<Series>& page_;
     const char* unselected_;
-    // What the fields were for last. Never looked into: an undo makes the series anew, and a person may rename it.
-    const Series* series_ = nullptr;
-    std::string name_;
+    // What the fields were for last. An undo makes the series anew, and a person may rename it: only one that differs
+    // in both is another one.
+    const Series* series_ = nullptr; // null while none is selected; never looked into
+    std::string name_;               // empty before the first
 };

@@ -1,5 +1,6 @@
 #include "app/RepeatGuard.h"
 
+#include "platform/Button.h"
 #include "platform/CheckBox.h"
 #include "platform/Menu.h"
 #include "platform/MenuField.h"
@@ -15,12 +16,25 @@ bool isAddition(const BMessage& message)
     return message.FindInt32(PageView::kByHand, &byHand) == B_OK;
 }
 
-/// What all fields below `view` hold.
+/// The box of the button below `view` that adds by that code; null when there is none.
+const BView* boxOf(uint32 code, const BView& view)
+{
+    const auto* button = dynamic_cast<const BButton*>(&view);
+    if (button != nullptr && button->Message() != nullptr && button->Message()->what == code)
+        return view.Parent();
+    for (int32 i = 0; i < view.CountChildren(); ++i) {
+        if (const BView* box = boxOf(code, *view.ChildAt(i)))
+            return box;
+    }
+    return nullptr;
+}
+
+/// What all fields below `view` hold that a person can change: the others follow what was added.
 std::string fieldsOf(const BView& view)
 {
     std::string held;
     if (const auto* text = dynamic_cast<const BTextControl*>(&view))
-        held = text->Text();
+        held = text->IsEditable() ? text->Text() : "";
     else if (const auto* box = dynamic_cast<const BCheckBox*>(&view))
         held = std::to_string(box->Value());
     else if (const auto* menu = dynamic_cast<const BMenuField*>(&view))
@@ -28,6 +42,13 @@ std::string fieldsOf(const BView& view)
     for (int32 i = 0; i < view.CountChildren(); ++i)
         held += '\n' + fieldsOf(*view.ChildAt(i));
     return held;
+}
+
+/// Those of the box that the addition is of: the rest of the page shows what was added, and changes with it.
+std::string addedFrom(uint32 code, const BView& page)
+{
+    const BView* box = boxOf(code, page);
+    return fieldsOf(box != nullptr ? *box : page);
 }
 
 } // namespace
@@ -38,7 +59,7 @@ bool RepeatGuard::isRepeat(const BMessage& message, const BView& page)
         return false;
     bigtime_t longest;
     get_click_speed(&longest);
-    if (Clock::now() - done_ >= std::chrono::microseconds(longest) || fieldsOf(page) != fields_)
+    if (Clock::now() - done_ >= std::chrono::microseconds(longest) || addedFrom(code_, page) != fields_)
         return false;
     done_ = Clock::now(); // a third one is no more meant than the second
     return true;
@@ -49,6 +70,6 @@ void RepeatGuard::noteRun(const BMessage& message, const BView& page)
     if (!isAddition(message))
         return;
     code_ = message.what;
-    fields_ = fieldsOf(page);
+    fields_ = addedFrom(code_, page);
     done_ = Clock::now();
 }

@@ -9,7 +9,7 @@ class BMessage;
 class BView;
 
 /// Tells a second click of a double click, on a button that adds, from a second addition: it comes within the time of a
-/// double click after the first was done, and nothing was changed in the fields of the page.
+/// double click after the first was done, and nothing was changed in the fields of the button's box.
 class RepeatGuard {
 public:
     /// Whether `message` is such a repetition, which is to do nothing. It may be any message.

@@ -92,6 +92,8 @@ void PLWindow::Redo()
 void PLWindow::restore(const Moment& moment)
 {
     repeats_.forget();
+    for (const char* key : {kDoneNotice, "operation", "split"})
+        dropNotice(key); // they tell of what may no longer be so
     // First no row, no selection and no portfolio refers to anything in the catalogue.
     replaceWallet();
     companyView_->SetMarketList({});

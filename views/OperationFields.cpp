@@ -6,6 +6,8 @@
 #include "platform/MenuItem.h"
 #include "views/OperationView.h"
 
+#include <algorithm>
+
 namespace {
 
 constexpr float kTextPadding = 6; // from the sides of a field to its text
@@ -55,10 +57,10 @@ void OperationView::setDate(const Date& date)
     date_->noteShown();
 }
 
-void OperationView::setTotal(float total)
+void OperationView::setTotal(std::optional<float> total)
 {
     // Thousands separators are welcome here: nobody types in this field, and nothing reads it.
-    total_->SetText(amountText(total).c_str());
+    total_->SetText(total ? amountText(*total).c_str() : "");
 }
 
 void OperationView::setCharged(const std::string& text)
@@ -79,11 +81,22 @@ void OperationView::SetTypingHook(const std::function<void()>& hook)
     companyAbbreviation_->setTypingHook(hook);
 }
 
+std::array<OperationView::OfferNumber*, 8> OperationView::figures() const
+{
+    return {amount_,   transferCost_, transferRateCost_, transferFromQuote_, transferToQuote_,
+            quantity_, quote_,        shareCost_};
+}
+
 void OperationView::SetFigureHook(const std::function<void()>& hook)
 {
-    for (OfferNumber* field : {amount_, transferCost_, transferRateCost_, transferFromQuote_, transferToQuote_,
-                               quantity_, quote_, shareCost_})
+    for (OfferNumber* field : figures())
         field->setTypingHook(hook);
+}
+
+bool OperationView::hasFault() const
+{
+    const auto fields = figures();
+    return std::ranges::any_of(fields, [](const OfferNumber* field) { return !field->IsHidden() && field->fault(); });
 }
 
 void OperationView::replaceQuote(std::optional<float> quote)

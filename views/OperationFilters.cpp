@@ -80,8 +80,10 @@ void OperationView::fillAccountFilter(Account** accounts, int count)
     for (int i = 0; i < count; ++i) {
         const Account* account = accounts[i];
         items.push_back(new ChoiceItem(wholeTextOf(account->getName()), [choose, account] { choose(account); }));
-        if (isChosen(account))
+        if (isChosen(account)) {
             marked = items.size() - 1;
+            chosenAccountName_ = account->getName(); // it may have another one since it was chosen
+        }
     }
     filterAccount_->Menu()->ReplaceItems(items);
     items[marked]->SetMarked(true);
@@ -112,6 +114,7 @@ void OperationView::fillYearFilter()
 
 void OperationView::filter()
 {
+    endFlash(); // a row that goes from view with a light would come back with it
     operations_->setAccount(chosenAccount_);
     operations_->setYear(chosenYear_);
     operations_->setFilter(filter_->Text());

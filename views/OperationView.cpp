@@ -253,13 +253,24 @@ void OperationView::MessageReceived(BMessage* message)
     if (flashStep_ == 0)
         return flashTimer_.reset();
     --flashStep_;
+    lightFlashed(std::min(static_cast<float>(flashStep_) / kFlashHold, 1.0F));
+}
+
+void OperationView::lightFlashed(float light)
+{
     // The row may have been made anew since the last step, or be gone.
     const int32 index = operations_->indexOf(flashed_);
     if (index < 0)
         return;
-    const float light = static_cast<float>(flashStep_) / kFlashHold;
-    static_cast<OperationItem*>(operations_->ItemAt(index))->setLight(std::min(light, 1.0F));
+    static_cast<OperationItem*>(operations_->ItemAt(index))->setLight(light);
     operations_->InvalidateItem(index);
+}
+
+void OperationView::endFlash()
+{
+    lightFlashed(0);
+    flashed_ = nullptr;
+    flashTimer_.reset();
 }
 
 AccountOperation* OperationView::GetSelectedAccountOperation() const

@@ -11,6 +11,7 @@
 #include "views/OperationListView.h"
 #include "views/PageView.h"
 
+#include <array>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -44,7 +45,11 @@ public:
     /// where it still is.
     void RecallSelection();
     /// What was selected belongs to a portfolio that is gone.
-    void ForgetSelection() { operations_->forget(); }
+    void ForgetSelection()
+    {
+        operations_->forget();
+        endFlash(); // another operation may come to have its address
+    }
     /// Shows nothing of the operation any more, in constant time; its row goes with the next refresh.
     void RemoveOperation(const Operation* operation) { operations_->release(operation); }
     void RemoveAccountOperation(AccountOperation* operation) { RemoveOperation(operation); }
@@ -112,7 +117,10 @@ public:
     void setQuote(float quote) { show(*quote_, quote); }
     float getShareCost() const { return shareCost_->getNumber(); }
     void setShareCost(float cost) { show(*shareCost_, cost); }
-    void setTotal(float total);
+    /// Nothing empties the field.
+    void setTotal(std::optional<float> total);
+    /// Whether a number that the type has cannot be read.
+    bool hasFault() const;
     /// What the account will be charged.
     void setCharged(const std::string& text);
 
@@ -140,12 +148,15 @@ public:
 private:
     using OfferNumber = OfferField<NumberControl>;
 
+    std::array<OfferNumber*, 8> figures() const;
     static String chosen(const BMenuField& field);
     /// Marks the item of that label, or none.
     static void choose(BMenuField& field, const String& label);
     static void show(OfferNumber& field, float value);
     static void offer(OfferNumber& field, std::optional<float> value);
 
+    void lightFlashed(float light);
+    void endFlash();
     void makeList();
     void makeFilters(BBox* box);
     void fillAccountFilter(Account** accounts, int count);

@@ -4,6 +4,7 @@
 #include "market/Currency.h"
 #include "market/Market.h"
 #include "platform/ListView.h"
+#include "platform/qt/WindowWidget.h"
 #include "portfolio/Account.h"
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
@@ -75,6 +76,7 @@ protected:
         (new ShareOperation(Date(2, 3, 2024), share, true, 10, 11, false, 0))->setAccount(account);
         window().UpdateState();
     }
+    std::string notice() { return window().widget().findChild<QWidget*>("txtNotice")->accessibleName().toStdString(); }
     Company* company()
     {
         Company* found = nullptr;

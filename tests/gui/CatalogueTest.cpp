@@ -68,6 +68,33 @@ TEST_F(CatalogueTest, CatalogueByHandIsSavedAndComesBackTheSame)
     EXPECT_TRUE(hasTitle("Companies"));
 }
 
+TEST_F(CatalogueTest, AnAdditionIsToldAndADoubleClickAddsOnce)
+{
+    addSmallCatalogue();
+    const auto addTwice = [this](const char* name) {
+        auto& button = find<QWidget>(name);
+        QTest::mouseClick(&button, Qt::LeftButton);
+        settle();
+        QTest::mouseDClick(&button, Qt::LeftButton);
+        settle();
+    };
+    EXPECT_EQ(notice(), "Added quote of AL");
+    select("lstCompanies", 0); // which shows its trend
+    fill({{"txtAbbreviation", "BE"}, {"txtName", "Beta"}});
+    addTwice("btnAddCompany");
+    EXPECT_EQ(list("lstCompanies").CountItems(), 2);
+    EXPECT_EQ(notice(), "Added company BE");
+    fill({{"txtMarketName", "London"}});
+    click("btnUpdateMarket");
+    EXPECT_EQ(notice(), "Updated market London");
+    show(kCurrencyPage);
+    fill({{"txtQuoteDate", "5/3/2024"}, {"txtQuoteValue", "3"}});
+    fill({{"txtCurrencyName", "Yen"}, {"txtCurrencyRepresentation", "JPY"}});
+    addTwice("btnAddCurrency");
+    EXPECT_EQ(list("lstCurrencies").CountItems(), 3);
+    EXPECT_EQ(notice(), "Added currency Yen");
+}
+
 TEST_F(CatalogueTest, EventFieldsFollowTheKindAndAnUpdateTakesItFromTheMenu)
 {
     addSmallCatalogue();

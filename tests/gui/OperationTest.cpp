@@ -2,7 +2,6 @@
 
 #include "market/NoteCompanyEvent.h"
 #include "platform/ListView.h"
-#include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/SmallPortfolio.h"
 #include "valuation/AccountState.h"
@@ -19,6 +18,8 @@ namespace {
 
 using testing::ElementsAre;
 using testing::EndsWith;
+using testing::HasSubstr;
+using testing::Not;
 using testing::SizeIs;
 
 constexpr const char* kAdd = "btnAddOperation";
@@ -225,15 +226,18 @@ TEST_F(OperationTest, ARemovalIsNotAskedFor)
     EXPECT_THAT(rows("lstOperations"), ElementsAre(EndsWith("3.00 EUR\t3.00")));
 }
 
-TEST_F(OperationTest, TheTotalFollowsConfirmedQuantitiesAndQuotes)
+TEST_F(OperationTest, TheTotalFollowsQuantityAndQuote)
 {
     fill({{"operationType", "Buy"},
           {"txtMarketName", "Paris"},
           {"txtCompanyAbbreviation", "BBB"},
           {"txtQuantity", "7"}});
-    EXPECT_EQ(text("txtTotal"), "") << "typed only";
-    enter("txtQuantity", "7");
-    EXPECT_EQ(text("txtTotal"), "70.00");
+    EXPECT_EQ(text("txtTotal"), "70.00") << "typed only";
+    type("txtQuantity", "7x");
+    EXPECT_EQ(text("txtTotal"), "") << "of no number";
+    type("txtQuantity", "7");
+    type("txtCompanyAbbreviation", "AAA");
+    EXPECT_EQ(text("txtTotal"), "0.00") << "has no quote";
     enter("txtQuote", "1000.5");
     EXPECT_EQ(text("txtTotal"), "7,003.50") << "before costs";
 }
@@ -280,6 +284,7 @@ TEST_F(AutomaticOperationTest, CanBeReplacedByAnotherOneWhichIsGoneBeforeItIsLis
 {
     click(kUpdate);
     EXPECT_EQ(countOperations(), 1U) << "the simulated sale is in the past now, and moves no profit again";
+    EXPECT_THAT(notice(), Not(HasSubstr("Transferred"))) << "it is gone";
     click(kAdd);
     EXPECT_EQ(countOperations(), 1U);
     EXPECT_EQ(firstShare().getNbrShareOperations(), 2U) << "the sale stays with its holding";
@@ -318,6 +323,18 @@ TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
     EXPECT_EQ(text("txtQuote"), "5.00") << "the same company again";
     fill({{"txtCompanyAbbreviation", ""}, {"txtQuote", "6"}, {"txtCompanyAbbreviation", "BBB"}});
     EXPECT_EQ(text("txtQuote"), "6.00") << "typed for no company yet";
+    type("txtCompanyAbbreviation", "AAA");
+    EXPECT_EQ(text("txtQuote"), "") << "BBB's since then";
+    fill({{"txtQuote", "4"}, {"txtCompanyAbbreviation", "AAB"}, {"txtQuantity", "3"}});
+    type("txtCompanyAbbreviation", "BBB");
+    EXPECT_EQ(text("txtQuote"), "12.00") << "a quantity says nothing of whose quote it is";
+    fill({{"txtCompanyAbbreviation", ""}, {"txtQuote", "6"}, {"txtCompanyAbbreviation", "AAA"}});
+    EXPECT_EQ(text("txtQuote"), "6.00");
+    type("txtCompanyAbbreviation", "BBB");
+    EXPECT_EQ(text("txtQuote"), "12.00") << "what was typed has become AAA's";
+    new Company(beta()->market(), "Longer", "BBBB");
+    fill({{"txtCompanyAbbreviation", ""}, {"txtQuote", "6"}, {"txtCompanyAbbreviation", "BBBB"}});
+    EXPECT_EQ(text("txtQuote"), "6.00") << "BBB came by on the way";
 
     fill({{"operationType", "Transfer"}, {"baseAccount", "Cash"}, {"transferAccount", "Dollars"}});
     EXPECT_EQ(text("txtTransferFromQuote") + " " + text("txtTransferToQuote"), "1.00 0.50");
@@ -343,14 +360,15 @@ TEST_F(OperationTest, ANewOperationStartsWithTheAccountThatIsLikely)
     EXPECT_EQ(chosen() + text("txtCharged"), "Dollars") << "chosen by hand after that, though it does not fit";
     fill({{"baseAccount", "Broker"}, {"txtShareCost", "1"}});
     EXPECT_EQ(text("txtCharged"), "21.03 EUR from Broker") << "2 * 10 * 1.0017 + 1";
+    type("txtShareCost", "1x");
+    EXPECT_EQ(text("txtCharged"), "") << "nothing is booked of a faulty number";
+    type("txtShareCost", "1");
     click(kAdd);
     fill({{"txtCompanyAbbreviation", "AAA"}, {"txtCompanyAbbreviation", "BBB"}});
     EXPECT_EQ(chosen(), "Broker") << "used last";
     fill({{"operationType", "Deposit"}, {"baseAccount", "Dollars"}, {"txtAmount", "1"}});
     click(kAdd);
     choose("operationType", "Buy");
-    EXPECT_EQ(chosen(), "Dollars") << "the ticker has not changed since";
-    fill({{"txtCompanyAbbreviation", "AAA"}, {"txtCompanyAbbreviation", "BBB"}});
     EXPECT_EQ(chosen(), "Broker") << "used last for this company";
     restart();
     addTwoMarkets();
@@ -362,9 +380,6 @@ TEST_F(OperationTest, ANewOperationStartsWithTheAccountThatIsLikely)
 
 TEST_F(OperationTest, ASuccessIsToldAndADoubleClickBooksOnce)
 {
-    const auto notice = [this] {
-        return window().widget().findChild<QWidget*>("txtNotice")->accessibleName().toStdString();
-    };
     fill({{"operationType", "Buy"},
           {"txtMarketName", "Paris"},
           {"txtCompanyAbbreviation", "BBB"},
@@ -385,6 +400,7 @@ TEST_F(OperationTest, ASuccessIsToldAndADoubleClickBooksOnce)
     }
     EXPECT_EQ(countOperations(), 2U) << "a held key is no more meant";
     post('HUnd');
+    EXPECT_EQ(notice(), "") << "it is undone";
     post('OBAd');
     EXPECT_EQ(countOperations(), 2U) << "a code that no person sends is no double click";
     post('HUnd');
@@ -424,9 +440,11 @@ TEST_F(OperationTest, IncomeAndChargesMoveTheirSumsAndNoDeposits)
         EXPECT_EQ(cashOf(2), dollars) << when;
         EXPECT_EQ(window().getState()->getTotalDeposit(), 1000) << when;
     };
-    const auto notes = [this] {
+    const auto notes = [this](const char* ticker = "BBB") {
         std::vector<std::string> texts;
-        for (const CompanyEvent* event : beta()->events()) {
+        Company* company = nullptr;
+        wallet().getCompany("Paris", ticker, &company);
+        for (const CompanyEvent* event : company->events()) {
             const auto& note = dynamic_cast<const NoteCompanyEvent&>(*event);
             texts.push_back(std::string(event->getDate().toString().getCharacterArray()) + ' ' +
                             note.getTitle().getCharacterArray() + ' ' + note.getText().getCharacterArray());
@@ -473,6 +491,20 @@ TEST_F(OperationTest, IncomeAndChargesMoveTheirSumsAndNoDeposits)
     click(kRemove);
     expectCash(euros, 0, "removed");
     EXPECT_THAT(notes(), testing::IsEmpty());
+
+    const auto expectNotes = [&](const char* ofAlpha) {
+        EXPECT_THAT(notes("AAA"), ElementsAre(ofAlpha));
+        EXPECT_THAT(notes("BBB"), ElementsAre("21/11/2024 Dividend 5.00 USD to Dollars"));
+    };
+    follow({{{{"txtCompanyAbbreviation", "BBB"}, {"baseAccount", "Dollars"}, {"txtAmount", "5"}}, kAdd, ""},
+            {{{"txtCompanyAbbreviation", "AAA"}}, kAdd, ""},
+            {{{"txtAmount", "6"}}, kUpdate, ""}});
+    expectNotes("21/11/2024 Dividend 6.00 USD to Dollars");
+    follow({{{{"txtAmount", "5"}}, kUpdate, ""}});
+    select("lstOperations", 3);
+    EXPECT_EQ(text("txtMarketName") + ' ' + text("txtCompanyAbbreviation"), "Paris AAA") << "one of two alike";
+    follow({{{{"txtAmount", "7"}}, kUpdate, ""}});
+    expectNotes("21/11/2024 Dividend 7.00 USD to Dollars");
 }
 
 } // namespace
