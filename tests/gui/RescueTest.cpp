@@ -109,6 +109,8 @@ TEST_F(RescueTest, WhatAClosedWindowHadNotSavedIsOfferedAndComesBackToItsFiles)
     show(kCurrencyPage);
     fill({{"txtCurrencyName", "Other"}, {"txtCurrencyRepresentation", "O"}});
     click("btnAddCurrency");
+    EXPECT_EQ(notice(), "Added currency Other");
+    QTest::mouseClick(widget().findChild<QWidget*>("txtNotice"), Qt::LeftButton); // what was done goes by itself later
     restoreUnsaved();
     EXPECT_EQ(message(), "Unsaved changes successfully restored...");
     EXPECT_EQ(model() == before, true);
