@@ -129,15 +129,15 @@ const std::vector<ColumnOf<AccountState>> AccountStateItem::kColumns = {
 // All of them fit into the page.
 const std::vector<ColumnOf<ShareStateItem>> ShareStateItem::kColumns = {
     {{"Ticker", 48}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyAbbreviation()); }},
-    {{"Company", 82}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
+    {{"Company", 62}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
     {{"Quantity", 62, B_ALIGN_RIGHT}, quantity},
     {{"Buy Quote", 74, B_ALIGN_RIGHT}, buyQuote},
     {{"Quote", 56, B_ALIGN_RIGHT}, quote},
-    {{"Quote of", 80, B_ALIGN_RIGHT}, quoteDay},
-    {{"Value", 96, B_ALIGN_RIGHT, UnitPlace::kShown}, ownValue},
-    {{"In ???", 70, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceValue},
-    {{"Part", 46, B_ALIGN_RIGHT}, partOfAll},
-    {{"Gain", 56, B_ALIGN_RIGHT}, gain},
+    {{"Quote of", 92, B_ALIGN_RIGHT}, quoteDay},
+    {{"Value", 100, B_ALIGN_RIGHT, UnitPlace::kShown}, ownValue},
+    {{"In ???", 72, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceValue},
+    {{"Part", 44, B_ALIGN_RIGHT}, partOfAll},
+    {{"Gain", 60, B_ALIGN_RIGHT}, gain},
     {{"End Date", 78, B_ALIGN_RIGHT}, endDate},
 };
 
