@@ -85,10 +85,12 @@ void OperationView::fillAccountFilter(Account** accounts, int count)
             chosenAccountName_ = account->getName(); // it may have another one since it was chosen
         }
     }
+    // Of the only account there is a balance, too.
+    onlyAccount_ = count == 1 ? accounts[0] : nullptr;
     filterAccount_->Menu()->ReplaceItems(items);
     items[marked]->SetMarked(true);
     if (operations_ != nullptr)
-        operations_->setAccount(marked > 0 ? chosenAccount_ : nullptr);
+        operations_->setAccount(marked > 0 ? chosenAccount_ : onlyAccount_);
 }
 
 void OperationView::fillYearFilter()
@@ -115,7 +117,7 @@ void OperationView::fillYearFilter()
 void OperationView::filter()
 {
     endFlash(); // a row that goes from view with a light would come back with it
-    operations_->setAccount(chosenAccount_);
+    operations_->setAccount(chosenAccount_ != nullptr ? chosenAccount_ : onlyAccount_);
     operations_->setYear(chosenYear_);
     operations_->setFilter(filter_->Text());
     tellFiltered();

@@ -180,6 +180,7 @@ private:
     BMenuField* filterAccount_ = nullptr;
     BMenuField* filterYear_ = nullptr;
     // What was chosen last in the two menus. The account is found again by its name when it is another object.
+    const Account* onlyAccount_ = nullptr; // where there is one
     const Account* chosenAccount_ = nullptr;
     String chosenAccountName_;
     std::optional<int> chosenYear_;

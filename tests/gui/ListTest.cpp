@@ -241,6 +241,16 @@ TEST_F(ListTest, OneAccountShowsWhatItReceivesAndItsBalance)
     EXPECT_EQ(text("txtAmount"), "300.00") << "of several, commands take the first";
     show(kPortoFolioPage);
     EXPECT_EQ(rows("lstAccounts")[1], "M\u00E9nage\t1,340.00\tEUR\t");
+
+    show(kOperationPage);
+    choose("filterAccount", "All accounts");
+    EXPECT_EQ(columns("lstOperations").columns()[9].isHidden, true);
+    show(kPortoFolioPage);
+    select("lstAccounts", 0);
+    answerNextAlert("Continue");
+    click("btnRemoveQuote");
+    show(kOperationPage);
+    EXPECT_EQ(columns("lstOperations").columns()[9].isHidden, false) << "of the only account";
 }
 
 TEST_F(ListTest, SeparatorsWidenAndCutTextsShowInAToolTip)
