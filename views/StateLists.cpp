@@ -128,17 +128,17 @@ const std::vector<ColumnOf<AccountState>> AccountStateItem::kColumns = {
 
 // All of them fit into the page.
 const std::vector<ColumnOf<ShareStateItem>> ShareStateItem::kColumns = {
-    {{"Ticker", 46}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyAbbreviation()); }},
-    {{"Company", 67}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
+    {{"Ticker", 50}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyAbbreviation()); }},
+    {{"Company", 106}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
     {{"Quantity", 62, B_ALIGN_RIGHT}, quantity},
-    {{"Buy Quote", 74, B_ALIGN_RIGHT}, buyQuote},
-    {{"Quote", 56, B_ALIGN_RIGHT}, quote},
-    {{"Quote of", 91, B_ALIGN_RIGHT}, quoteDay},
-    {{"Value", 99, B_ALIGN_RIGHT, UnitPlace::kShown}, ownValue},
-    {{"In ???", 72, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceValue},
-    {{"Part", 44, B_ALIGN_RIGHT}, partOfAll},
-    {{"Gain", 60, B_ALIGN_RIGHT}, gain},
-    {{"End Date", 77, B_ALIGN_RIGHT}, endDate},
+    {{"Buy Quote", 76, B_ALIGN_RIGHT}, buyQuote},
+    {{"Quote", 62, B_ALIGN_RIGHT}, quote},
+    {{"Quote of", 92, B_ALIGN_RIGHT}, quoteDay},
+    {{"Value", 106, B_ALIGN_RIGHT, UnitPlace::kShown}, ownValue},
+    {{"In ???", 76, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceValue},
+    {{"Part", 50, B_ALIGN_RIGHT}, partOfAll},
+    {{"Gain", 68, B_ALIGN_RIGHT}, gain},
+    {{"End Date", 82, B_ALIGN_RIGHT, UnitPlace::kNone, true}, endDate}, // see `ShareStateItem::kEndDate`,
 };
 
 void ShareStateItem::showIn(const std::string& symbol, double rate, double total)

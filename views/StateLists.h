@@ -31,6 +31,8 @@ private:
 class ShareStateItem final : public ColumnItem {
 public:
     static const std::vector<ColumnOf<ShareStateItem>> kColumns;
+    static constexpr std::size_t kEndDate =
+        10; ///< the column that shows while sales are simulated: only they look at it
 
     explicit ShareStateItem(ShareState* state) : state_(state), share_(state->share()), basis_(state->quoteBasis()) {}
 

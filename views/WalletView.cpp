@@ -203,6 +203,7 @@ void WalletView::SetState(const State* state, const Totals& totals)
     shares_->clear();
     hideCoverage();
     if (state != nullptr) {
+        shares_->showColumn(ShareStateItem::kEndDate, state->isAutomatic());
         shares_->addAllOf(*state, totals);
         // When the rows are there. They are found again by account and share, since all states are new.
         accounts_->recall();
