@@ -104,9 +104,10 @@ ListWidget::ListWidget(BListView& list) : list_(list), rows_(list), painter_(lis
 {
     // The widget then asks one row for its size, and not 100,000.
     setUniformItemSizes(true);
+    // Before there is a model: it would be asked for its rows, and the list is still being made.
+    setHorizontalScrollMode(QAbstractItemView::ScrollPerPixel);
     setModel(&rows_);
     setItemDelegate(&painter_);
-    setHorizontalScrollMode(QAbstractItemView::ScrollPerPixel);
     QObject::connect(horizontalScrollBar(), &QScrollBar::valueChanged, [this] { list_.ScrolledSideways(); });
     // Always, so that the columns keep their width, which the pages have reckoned with.
     setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOn);
