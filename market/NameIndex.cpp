@@ -42,8 +42,8 @@ NameIndex::NameIndex(std::vector<NamedEntry> entries)
     for (NamedEntry& entry : entries)
         entries_.push_back({foldedText(entry.key), foldedText(entry.name), std::move(entry)});
     std::ranges::stable_sort(entries_, {}, [](const Folded& e) { return std::tie(e.key, e.name); });
-    const auto same = std::ranges::unique(entries_, {}, &Folded::entry);
-    entries_.erase(same.begin(), same.end());
+    const auto isSame = [](const Folded& a, const Folded& b) { return a.entry == b.entry; };
+    entries_.erase(std::unique(entries_.begin(), entries_.end(), isSame), entries_.end());
 }
 
 std::vector<const NamedEntry*> NameIndex::find(std::string_view typed, std::size_t most) const
