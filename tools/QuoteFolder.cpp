@@ -1,8 +1,8 @@
 #include "tools/QuoteFolder.h"
 
+#include "exchange/Importer.h"
+#include "exchange/Table.h"
 #include "net/QuoteServers.h"
-#include "tools/Importer.h"
-#include "tools/Table.h"
 
 #include <optional>
 #include <ostream>

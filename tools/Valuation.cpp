@@ -1,8 +1,8 @@
 #include "tools/Valuation.h"
 
+#include "foundation/PrintableText.h"
 #include "portfolio/WalletDiagnosis.h"
 #include "storage/InputFile.h"
-#include "tools/TextTable.h"
 #include "valuation/State.h"
 
 #include <algorithm>

@@ -1,7 +1,7 @@
 #pragma once
 
+#include "exchange/Table.h"
 #include "foundation/Date.h"
-#include "tools/Table.h"
 
 #include <cstddef>
 #include <iosfwd>

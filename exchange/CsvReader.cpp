@@ -1,4 +1,4 @@
-#include "tools/CsvReader.h"
+#include "exchange/CsvReader.h"
 
 #include "storage/InputFile.h"
 

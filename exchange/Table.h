@@ -1,7 +1,7 @@
 #pragma once
 
+#include "exchange/CsvReader.h"
 #include "foundation/Date.h"
-#include "tools/CsvReader.h"
 
 #include <array>
 #include <cstddef>

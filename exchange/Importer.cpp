@@ -1,4 +1,4 @@
-#include "tools/Importer.h"
+#include "exchange/Importer.h"
 
 #include "market/Catalogue.h"
 #include "market/Company.h"

@@ -1,9 +1,9 @@
+#include "exchange/CsvReader.h"
+#include "exchange/Importer.h"
 #include "foundation/DateText.h"
 #include "tests/support/Bytes.h"
 #include "tests/support/SmallPortfolio.h"
 #include "tests/support/ToolRun.h"
-#include "tools/CsvReader.h"
-#include "tools/Importer.h"
 
 #include <gmock/gmock.h>
 #include <sstream>

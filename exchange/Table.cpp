@@ -1,7 +1,7 @@
-#include "tools/Table.h"
+#include "exchange/Table.h"
 
 #include "foundation/DateText.h"
-#include "tools/TextTable.h"
+#include "foundation/PrintableText.h"
 
 #include <algorithm>
 #include <charconv>
