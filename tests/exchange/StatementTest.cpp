@@ -1,6 +1,7 @@
 #include "exchange/OperationPlan.h"
 #include "exchange/TextForms.h"
 #include "foundation/DateText.h"
+#include "tests/support/Bytes.h"
 #include "tests/support/SmallPortfolio.h"
 #include "tests/support/ToolRun.h"
 #include "valuation/State.h"
@@ -279,6 +280,58 @@ TEST_F(StatementTest, WhatIsBookedAlreadyIsCountedAndSkipped)
     EXPECT_THAT(failure(csv), HasSubstr("an account \"Giro\" already, which is not in \"USD\""));
     newAccounts_ = {{"X", "CHF"}};
     EXPECT_THAT(failure(csv), HasSubstr("no currency \"CHF\""));
+}
+
+TEST_F(StatementTest, TheProgramBooksAllOrNothingAndKeepsTheFormerFile)
+{
+    setenv("HOME", folder_.path.c_str(), 1);
+    unsetenv("XDG_CONFIG_HOME");
+    p_.wallet.setBuyRateCost(0);
+    p_.wallet.setSellRateCost(0.5F);
+    folder_.write("m", written([&](FILE* file) { p_.catalogue.wrt(file, kStart); }));
+    const std::string empty = written([&](FILE* file) { p_.wallet.wrt(file, kStart); });
+    const std::string portfolio = folder_.write("p", empty);
+    folder_.write("s.csv", "Valuta;Was;Ticker;St\xC3\xBC"
+                           "ck;Betrag\n1.2.2026;Ein;;;1.000,50\n"
+                           "1.2.2026;Kauf;GM;2;-40,25\n2.2.2026;Split;GM;2;\nSumme;;;;960,25\n");
+    const std::string arguments = "--operations s.csv --portfolio p --market m --profile bank ";
+    const std::string options = "--type Ein=deposit --column type=Was --account Neu --dates dmy --new-account Neu=EUR ";
+    const auto run = [&](const std::string& more) { return ToolRun(PELORIN_IMPORT, arguments + more, folder_); };
+
+    const ToolRun refused = run(options);
+    EXPECT_EQ(refused.status, 1);
+    EXPECT_EQ(refused.err, "s.csv, line 4: the type \"Split\" is not known: --type WORD=TYPE says what it means\n"
+                           "pelorin-import: s.csv: nothing is booked, since 1 line is refused; --skip-bad books the "
+                           "others\n");
+    EXPECT_EQ(run(options + "--skip-bad --dry-run").status, 0);
+    EXPECT_EQ(folder_.content("p"), empty);
+    EXPECT_FALSE(std::filesystem::exists(folder_ / "bank"));
+
+    const ToolRun booked = run(options + "--skip-bad");
+    EXPECT_EQ(booked.status, 0);
+    EXPECT_EQ(booked.out, "line 5: passed over, behind the last line with a date: Summe 960,25\n"
+                          "operations: 2 new, 0 booked already\nrefused: 1\n"
+                          "besides the costs of the lines, the portfolio's rate costs count: 0.0000 % of "
+                          "purchases, 50.0000 % of sales\nnew account: Neu\n"
+                          "Account  Currency  Before   After\n"
+                          "Giro     EUR         0.00    0.00\n"
+                          "Broker   USD         0.00    0.00\n"
+                          "Neu      EUR         0.00  960.25\n");
+    EXPECT_EQ(folder_.content("bank"), "column type=Was\ntype Ein=deposit\naccount Neu\ndates dmy\n");
+    const std::string kept = folder_ / "Documents/Pelorin/Backups/Elsewhere" + folder_.path.string();
+    for (const auto& version : std::filesystem::directory_iterator(kept))
+        EXPECT_EQ(contentOf(version), empty);
+
+    const std::string saved = folder_.content("p");
+    const ToolRun again = run("--skip-bad");
+    EXPECT_THAT(again.out, HasSubstr("line 3: booked already: 01/02/2026 Buy 2 GM (Paris) at 20.125, Neu\n"
+                                     "operations: 0 new, 2 booked already\n"));
+    EXPECT_EQ(folder_.content("p"), saved);
+    for (const char* bad :
+         {"OUTPUT", "--quotes s.csv", "--type Split=split", "--column x=y", "--new-account A", "--dates d"})
+        EXPECT_EQ(run(bad).status, 2) << bad;
+    folder_.write("bank", "type Ein=deposit\nkind Kauf=buy\n");
+    EXPECT_THAT(run("").err, HasSubstr("bank, line 2: \"kind Kauf=buy\" does not begin with"));
 }
 
 } // namespace
