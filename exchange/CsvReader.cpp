@@ -8,7 +8,8 @@
 #include <new>
 #include <stdexcept>
 
-CsvReader::CsvReader(const std::string& path) : path_(path), file_(gzdopen(openForReading(path), "rb"), gzclose)
+CsvReader::CsvReader(const std::string& path, char separator)
+    : path_(path), file_(gzdopen(openForReading(path), "rb"), gzclose), separator_(separator)
 {
     if (file_ == nullptr)
         throw std::bad_alloc();

@@ -12,7 +12,8 @@
 /// are taken. A file that cannot be opened or read to its end throws std::runtime_error with one line for the user.
 class CsvReader {
 public:
-    explicit CsvReader(const std::string& path);
+    /// @param separator '\0' to guess it.
+    explicit CsvReader(const std::string& path, char separator = '\0');
 
     /// Goes to the next line that has a text in any field. @return false at the end of the file.
     bool next();
@@ -34,7 +35,7 @@ private:
 
     std::string path_;
     std::unique_ptr<gzFile_s, int (*)(gzFile)> file_;
-    char separator_ = '\0'; // not known yet
+    char separator_; // '\0' as long as it is not known
     unsigned long line_ = 0;
     std::string text_; // of the line
     std::vector<std::string> fields_;

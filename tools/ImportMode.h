@@ -7,8 +7,10 @@
 
 /// What several ways of importing are told by options of one name.
 struct ImportArguments {
-    std::string output; // OUTPUT: the market file to make
-    std::string market; // --market: a name or, where operations are imported, a file
+    std::string output;    // OUTPUT: the market file to make
+    std::string portfolio; // --portfolio: the portfolio file to import into
+    bool dryRun = false;   // --dry-run: only tell what would come of it
+    std::string market;    // --market: a name or, where operations are imported, a file
     bool force = false;
 };
 
@@ -26,3 +28,5 @@ public:
 
 /// Market data from tables of quotes and rates: what is meant when no other way is.
 std::unique_ptr<ImportMode> importTables();
+/// Operations from a statement into a portfolio file: what is meant with --operations.
+std::unique_ptr<ImportMode> importOperations();

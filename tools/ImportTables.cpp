@@ -42,6 +42,8 @@ void ImportTables::describe(CLI::App& app)
 
 void ImportTables::run(const CLI::App& app, const ImportArguments& arguments)
 {
+    if (arguments.output.empty())
+        throw CLI::RequiredError("OUTPUT");
     if (quotes_.empty() && rates_.empty())
         throw CLI::RequiredError("--quotes or --rates");
     if (app.count("--reference") == 0 && rates_.empty())

@@ -24,6 +24,8 @@ public:
 
     const Catalogue& catalogue() const { return catalogue_; }
     const Wallet& wallet() const { return wallet_; }
+    /// To be changed; what was computed before is of no use then.
+    Wallet& wallet() { return wallet_; }
     const State& state() const { return *state_; }
     Totals totals() const { return {*state_, catalogue_}; }
     bool hasEvolution() const { return hasEvolution_; }

@@ -5,8 +5,10 @@
 
 namespace {
 
-const char* const kPurpose = "Makes a Pelorin market file of tables of quotes and exchange rates.\n"
-                             "Example: pelorin-import Companies/World --quotes prices.csv.gz --rates rates.csv.gz";
+const char* const kPurpose =
+    "Makes a Pelorin market file of tables of quotes and exchange rates, or adds the operations "
+    "of a statement to a portfolio file.\n"
+    "Example: pelorin-import Companies/World --quotes prices.csv.gz --rates rates.csv.gz";
 
 const char* const kTables = R"(The tables are CSV files, plain or gzipped, with ',', ';' or tab between the fields:
   quotes   date,ticker,close, or a header line that names these columns and perhaps market, currency and
@@ -23,14 +25,20 @@ round as a rule, as units of the currency per unit of the reference, and are inv
 like units_per_eur, and those of which neither a heading nor --rates-are says anything. The reference currency itself
 gets the rate 1.
 
-Exit status: 0, 1 when a file cannot be read or written, 2 for bad arguments.)";
+Statements (--operations) have headings in one of their first lines: Date,Type,Account,To Account,Market,Ticker,
+Quantity,Quote,Amount,Cost,Rate Cost,From Quote,To Quote, or Name, Debit, Credit, Currency, in any order; usual headings
+and words in English, German and French are known. Either all lines are booked or, when one is refused, none.
+
+Exit status: 0, 1 when a file cannot be read or written or a line of a statement is refused, 2 for bad arguments.)";
 
 void describe(CLI::App& app, ImportArguments& arguments)
 {
     app.footer(kTables);
-    app.add_option("OUTPUT", arguments.output, "Market file to write; comes first")->required();
+    app.add_option("OUTPUT", arguments.output, "Market file to write; comes first");
     addText(app, "--market", arguments.market, "NAME",
-            "Market of the tickers that no table tells it of; without it NYSE");
+            "Market of the tickers that no table tells it of; without it NYSE. With --operations the market file");
+    addText(app, "--portfolio", arguments.portfolio, "PORTFOLIO_FILE", "Portfolio file to import into");
+    app.add_flag("--dry-run", arguments.dryRun, "Only tell what would be imported; write nothing");
     app.add_flag("--force", arguments.force, "Replace OUTPUT when it exists");
 }
 
@@ -43,6 +51,7 @@ int main(int argc, char** argv)
     describe(app, arguments);
     // The first that is meant is taken; tables are always meant, and so come last.
     std::vector<std::unique_ptr<ImportMode>> modes;
+    modes.push_back(importOperations());
     modes.push_back(importTables());
     for (const auto& mode : modes)
         mode->describe(app);
