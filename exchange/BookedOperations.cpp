@@ -26,9 +26,9 @@ BookedOperations::BookedOperations(const Wallet& wallet)
                 ++left_[keyOf(*operation)];
 }
 
-bool BookedOperations::take(const PlannedOperation& operation)
+bool BookedOperations::take(const Key& key)
 {
-    const auto found = left_.find(keyOf(operation));
+    const auto found = left_.find(key);
     if (found == left_.end() || found->second == 0)
         return false;
     --found->second;

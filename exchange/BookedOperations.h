@@ -17,11 +17,13 @@ public:
     explicit BookedOperations(const Wallet& wallet);
 
     /// Whether there is one like `operation` that has not been taken yet; it is taken then.
-    bool take(const PlannedOperation& operation);
+    bool take(const PlannedOperation& operation) { return take(keyOf(operation)); }
+    bool take(const Operation& operation) { return take(keyOf(operation)); }
 
 private:
     using Key = std::tuple<Date, const Account*, const Account*, OperationKind, const Company*, std::uint32_t>;
 
+    bool take(const Key& key);
     static Key keyOf(const Operation& operation);
     static Key keyOf(const PlannedOperation& operation);
 

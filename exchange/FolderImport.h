@@ -1,5 +1,6 @@
 #pragma once
 
+#include "exchange/BookedOperations.h"
 #include "exchange/ExportedTable.h"
 #include "exchange/SeriesUpdate.h"
 
@@ -54,8 +55,7 @@ private:
 
     void readAccounts(Wallet& wallet);
     void readHoldings(Wallet& wallet);
-    void readOperations();
-    void readOperation(const ExportedTable& row);
+    void readOperation(const ExportedTable& row, BookedOperations& before);
     Operation* makeTrade(const ExportedTable& row, Account* account, bool isBuy) const;
     Operation* makeTransfer(const ExportedTable& row, Account* account) const;
     void readParameters(Wallet& wallet);
@@ -74,5 +74,4 @@ private:
     Named<Company> companies_;
     std::unordered_map<std::string, Account*> accounts_;
     std::map<std::pair<std::string, std::string>, Share*> shares_; // by market and ticker
-    std::unordered_map<std::string, std::size_t> booked_; // operations that were there before, by what they say
 };

@@ -13,8 +13,6 @@
 #include "portfolio/Wallet.h"
 
 #include <algorithm>
-#include <cstdint>
-#include <memory>
 
 using namespace export_tables;
 
@@ -38,30 +36,16 @@ enum {
 };
 }
 
-/// What tells an operation from others: day, kind, account, and company with quantity, or recipient with amounts.
-std::string contentOf(const Operation& operation)
-{
-    const auto place = [](const void* object) { return std::to_string(reinterpret_cast<std::uintptr_t>(object)); };
-    std::string text = tableDate(operation.getDate()) + nameOf(kindOf(operation)) + place(operation.account());
-    if (const auto* trade = dynamic_cast<const ShareOperation*>(&operation))
-        return text + ' ' + place(trade->share()) + ' ' + std::to_string(trade->getQuantity());
-    text += ' ' + numberText(static_cast<const AccountOperation&>(operation).getAmount());
-    if (const auto* transfer = dynamic_cast<const TransferAccountOperation*>(&operation))
-        text += ' ' + place(transfer->recipient()) + ' ' + numberText(transfer->getCost());
-    return text;
-}
-
 } // namespace
 
 void FolderImport::readPortfolio(Wallet& wallet)
 {
     const bool isNew = wallet.getNbrAccounts() == 0 && wallet.getNbrShares() == 0;
-    for (const Account* account : wallet.accounts())
-        for (const Operation* operation : account->operations())
-            ++booked_[contentOf(*operation)];
+    BookedOperations before(wallet);
     readAccounts(wallet);
     readHoldings(wallet);
-    readOperations();
+    for (ExportedTable row(folder_, kOperations); row.next();)
+        readOperation(row, before);
     // Those of a portfolio that is there are its owner's.
     if (isNew)
         readParameters(wallet);
@@ -106,13 +90,7 @@ void FolderImport::readHoldings(Wallet& wallet)
     }
 }
 
-void FolderImport::readOperations()
-{
-    for (ExportedTable row(folder_, kOperations); row.next();)
-        readOperation(row);
-}
-
-void FolderImport::readOperation(const ExportedTable& row)
+void FolderImport::readOperation(const ExportedTable& row, BookedOperations& before)
 {
     using namespace operation_columns;
     const std::string& type = row.cell(kType);
@@ -128,15 +106,11 @@ void FolderImport::readOperation(const ExportedTable& row)
     else
         row.refuse(shown(type) + " is no type of operation");
 
-    const auto booked = booked_.find(contentOf(*operation));
-    if (booked == booked_.end() || booked->second == 0) {
-        ++operations_.added;
-        return;
-    }
-    // One that is booked stands for one row: equal rows beyond it are operations of their own.
-    --booked->second;
-    ++operations_.equal;
-    delete operation;
+    // One that was booked before stands for one row: equal rows beyond it are operations of their own.
+    const bool isBooked = before.take(*operation);
+    ++(isBooked ? operations_.equal : operations_.added);
+    if (isBooked)
+        delete operation;
 }
 
 Operation* FolderImport::makeTrade(const ExportedTable& row, Account* account, bool isBuy) const

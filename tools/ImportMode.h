@@ -8,6 +8,7 @@
 /// What several ways of importing are told by options of one name.
 struct ImportArguments {
     std::string output;    // OUTPUT: the market file to make
+    std::string into;      // --into: the market file to import into
     std::string portfolio; // --portfolio: the portfolio file to import into
     bool dryRun = false;   // --dry-run: only tell what would come of it
     std::string market;    // --market: a name or, where operations are imported, a file
@@ -30,3 +31,5 @@ public:
 std::unique_ptr<ImportMode> importTables();
 /// Operations from a statement into a portfolio file: what is meant with --operations.
 std::unique_ptr<ImportMode> importOperations();
+/// What pelorin-export has written as tables, back into files: what is meant with --from.
+std::unique_ptr<ImportMode> importFolder();

@@ -22,7 +22,8 @@ Valuation::Valuation(const std::string& marketPath, const std::string& portfolio
 {
     // In this order: the portfolio's names are looked up in the market data.
     readMarket();
-    readPortfolio();
+    if (!portfolioPath.empty())
+        readPortfolio();
 }
 
 void Valuation::readMarket()

@@ -37,6 +37,7 @@ void describe(CLI::App& app, ImportArguments& arguments)
     app.add_option("OUTPUT", arguments.output, "Market file to write; comes first");
     addText(app, "--market", arguments.market, "NAME",
             "Market of the tickers that no table tells it of; without it NYSE. With --operations the market file");
+    addText(app, "--into", arguments.into, "MARKET_FILE", "Market file to import into");
     addText(app, "--portfolio", arguments.portfolio, "PORTFOLIO_FILE", "Portfolio file to import into");
     app.add_flag("--dry-run", arguments.dryRun, "Only tell what would be imported; write nothing");
     app.add_flag("--force", arguments.force, "Replace OUTPUT when it exists");
@@ -52,6 +53,7 @@ int main(int argc, char** argv)
     // The first that is meant is taken; tables are always meant, and so come last.
     std::vector<std::unique_ptr<ImportMode>> modes;
     modes.push_back(importOperations());
+    modes.push_back(importFolder());
     modes.push_back(importTables());
     for (const auto& mode : modes)
         mode->describe(app);
