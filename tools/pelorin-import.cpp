@@ -29,6 +29,9 @@ Statements (--operations) have headings in one of their first lines: Date,Type,A
 Quantity,Quote,Amount,Cost,Rate Cost,From Quote,To Quote, or Name, Debit, Credit, Currency, in any order; usual headings
 and words in English, German and French are known. Either all lines are booked or, when one is refused, none.
 
+Tables that pelorin-export has written (--from) become files that value to the same figures. Into files that are there
+they bring what is new and the values of days; what is booked already is passed over.
+
 Exit status: 0, 1 when a file cannot be read or written or a line of a statement is refused, 2 for bad arguments.)";
 
 void describe(CLI::App& app, ImportArguments& arguments)
