@@ -8,7 +8,9 @@
 /// What several ways of importing are told by options of one name.
 struct ImportArguments {
     std::string output; // OUTPUT: the market file to make
+    std::string into;   // --into: the market file to add to
     std::string market; // --market: a name or, where operations are imported, a file
+    bool dryRun = false;
     bool force = false;
 };
 
