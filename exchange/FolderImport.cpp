@@ -133,21 +133,21 @@ void FolderImport::readListing(const Catalogue& catalogue)
 void FolderImport::readRates(const Catalogue& catalogue)
 {
     enum { kDate, kCurrency, kValue };
-    std::unordered_map<Currency*, DatedValues> values;
+    std::unordered_map<Currency*, std::vector<DatedValue>> values;
     for (ExportedTable row(folder_, kRates); row.next();)
-        values[currencyOf(row, kCurrency)].emplace_back(row.date(kDate), row.number(kValue));
+        values[currencyOf(row, kCurrency)].push_back({row.date(kDate), row.number(kValue)});
     ValueCounts ofReference;
     for (auto& [currency, dated] : values)
-        updateSeries<CurrencyQuote>(*currency, std::move(dated),
-                                    currency == catalogue.getReferenceCurrency() ? &ofReference : &rates_);
+        updateSeries(*currency, std::move(dated),
+                     currency == catalogue.getReferenceCurrency() ? &ofReference : &rates_);
 }
 
 void FolderImport::readQuotes()
 {
     enum { kDate, kTicker, kClose, kMarket, kCurrency };
     // An export has those of a company one behind the other, so that most rows need no look-up.
-    std::unordered_map<Company*, DatedValues> values;
-    DatedValues* ofLast = nullptr;
+    std::unordered_map<Company*, std::vector<DatedValue>> values;
+    std::vector<DatedValue>* ofLast = nullptr;
     std::string ticker, market, currency;
     for (ExportedTable row(folder_, kQuotes); row.next();) {
         const bool isLast =
@@ -158,10 +158,10 @@ void FolderImport::readQuotes()
             market = row.cell(kMarket);
             currency = row.cell(kCurrency);
         }
-        ofLast->emplace_back(row.date(kDate), row.number(kClose));
+        ofLast->push_back({row.date(kDate), row.number(kClose)});
     }
     for (auto& [company, dated] : values)
-        updateSeries<CompanyQuote>(*company, std::move(dated), &quotes_);
+        updateSeries(*company, std::move(dated), &quotes_);
 }
 
 void FolderImport::readEvents()

@@ -53,14 +53,12 @@ void read(const std::string& path, Wallet& wallet, const Catalogue& catalogue, c
     throw std::runtime_error(path + ": " + diagnosis.text("the portfolio", "the market file " + marketPath));
 }
 
-/// `before` is the stamp that the file had when it was read.
+/// `former` is the stamp that the file had when it was read, if it was there.
 template <class Object>
-void save(const std::string& path, const std::optional<FileStamp>& before, const Object& object)
+void save(const std::string& path, const std::optional<FileStamp>& former, const Object& object)
 {
-    if (FileStamp::of(path) != before)
-        throw std::runtime_error(path + ": was changed by another program meanwhile, and is left as it is");
     const auto write = [&object](FILE* file) { return object.wrt(file, today()); };
-    const auto result = DurableSave(DataFolder()).save(path, write);
+    const auto result = DurableSave(DataFolder()).save(path, write, former);
     if (result.outcome != DurableSave::Outcome::kSaved)
         throw std::runtime_error(result.reason);
 }
