@@ -22,6 +22,7 @@
 #include <algorithm>
 #include <cmath>
 #include <stdexcept>
+#include <unordered_set>
 
 namespace {
 
@@ -38,8 +39,9 @@ constexpr const char* kTheRest = ""; // no amount: what the other postings leave
 std::vector<const Company*> companiesOf(const Catalogue& catalogue, const Wallet& wallet)
 {
     std::vector<const Company*> companies;
+    std::unordered_set<const Company*> taken;
     for (const Share* share : wallet.shares())
-        if (share->company() != nullptr && std::ranges::find(companies, share->company()) == companies.end())
+        if (share->company() != nullptr && taken.insert(share->company()).second)
             companies.push_back(share->company());
     if (wallet.getNbrShares() + wallet.getNbrAccounts() == 0)
         for (const Market* market : catalogue.getMarkets())
@@ -141,14 +143,16 @@ void Journal::addTransfer(const TransferAccountOperation& transfer, Transaction*
         return;
     }
     const Units sent = -unitsOf(ownCashMove(transfer), transfer);
+    const Units received = to != nullptr ? unitsOf(receivedCash(transfer), transfer) : 0;
     move(from, -sent, transaction);
-    if (to == nullptr || to->currency() == nullptr) {
-        post(transaction, kExchange, kTheRest);
+    if (to != nullptr) {
+        transaction->text += " to " + nameText(to->getName());
+        move(*to, received, transaction);
+    }
+    if (to == nullptr || to->currency() == nullptr || from.currency() == nullptr) {
+        post(transaction, kExchange, kTheRest); // one of them has no cash that counts
         return;
     }
-    transaction->text += " to " + nameText(to->getName());
-    const Units received = unitsOf(receivedCash(transfer), transfer);
-    move(*to, received, transaction);
     if (areOfOneSymbol(*from.currency(), *to->currency())) {
         if (sent != received)
             post(transaction, kFees, kTheRest);

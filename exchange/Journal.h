@@ -47,7 +47,6 @@ private:
     };
     using Units = long long; // ten-thousandths of a currency
 
-    void addOperations();
     void addOperation(const Operation& operation);
     void addTrade(const ShareOperation& trade, Transaction* transaction);
     void addTransfer(const TransferAccountOperation& transfer, Transaction* transaction);

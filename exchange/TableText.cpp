@@ -104,11 +104,10 @@ std::string escaped(std::string_view bytes)
     std::string text;
     for (std::size_t i = 0; i < bytes.size();) {
         const char c = bytes[i];
-        const bool isEnd = i == 0 || i + 1 == bytes.size();
         const std::size_t length = characterLength(bytes.substr(i));
         if (c == '\\' || c == '\n') {
             text += c == '\n' ? "\\n" : "\\\\";
-        } else if (length == 0 || isControl(c) || (c == ' ' && isEnd)) {
+        } else if (length == 0 || isControl(c)) {
             const auto byte = static_cast<unsigned char>(c);
             text += {'\\', 'x', kHexDigits[byte >> 4], kHexDigits[byte & 0xF]};
         } else {

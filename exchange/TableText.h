@@ -22,7 +22,7 @@ std::string tableDate(const Date& date);
 std::optional<Date> readTableDate(std::string_view text);
 
 /// `bytes` as a cell of one line of UTF-8: a backslash becomes "\\", a line end "\n", and any other byte that is no
-/// text, or a blank at an end, "\x" with two digits.
+/// text "\x" with two digits.
 std::string escaped(std::string_view bytes);
 /// What `escaped` was made of; what begins like no such sign stands for itself.
 std::string unescaped(std::string_view text);
