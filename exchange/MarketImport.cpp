@@ -40,6 +40,7 @@ std::string tickerOf(const std::string& path)
     return name;
 }
 
+/// The latest day of all values; the undefined one without any.
 template <class Series>
 PackedDate lastDayOf(const Series& all)
 {
@@ -50,15 +51,21 @@ PackedDate lastDayOf(const Series& all)
     return last;
 }
 
-/// `all` has values.
+/// The same of the earliest.
 template <class Series>
 PackedDate firstDayOf(const Series& all)
 {
-    PackedDate first = all.front().values.front().day;
+    PackedDate first = lastDayOf(all);
     for (const auto& series : all)
         for (const DatedValue& value : series.values)
             first = std::min(first, value.day);
     return first;
+}
+
+template <class Series>
+bool hasValues(const Series& all)
+{
+    return std::ranges::any_of(all, [](const auto& series) { return !series.values.empty(); });
 }
 
 } // namespace
@@ -85,6 +92,8 @@ void MarketImport::addRates(const std::string& path)
     Table table(path, kRates);
     const bool units = areUnits(table, path);
     const bool isWide = !table.wideColumns().empty();
+    for (const Table::WideColumn& column : table.wideColumns())
+        (void)places_.currency(column.name); // the heading is its first mention, whichever has the first value
     plan_.refused += table.forEach([&] { isWide ? takeRates(table, units) : takeRate(table, units); }, watch_);
 }
 
@@ -94,7 +103,22 @@ void MarketImport::addQuotes(const std::string& path)
     // A table that has a ticker column goes by it, whatever its file is called.
     const std::string tickerOfFile = table.has(Column::kTicker) ? std::string() : tickerOf(path);
     const bool isWide = !table.wideColumns().empty();
+    mentionCompanies(table);
     plan_.refused += table.forEach([&] { isWide ? takeQuotes(table) : takeQuote(table, tickerOfFile); }, watch_);
+}
+
+/// The headings of a wide table are the first mention of its companies, whichever has the first value.
+void MarketImport::mentionCompanies(const Table& table)
+{
+    // Where the rows tell something of the place, a company is mentioned by its first row.
+    if (table.has(Column::kMarket) || table.has(Column::kCurrency))
+        return;
+    for (const Table::WideColumn& column : table.wideColumns())
+        try {
+            companyOf(table, column.name);
+        } catch (const UnusableRow&) {
+            // It is told with each of its values.
+        }
 }
 
 /// What the heading says, unless it contradicts the options: a rate taken the wrong way round would go unnoticed.
@@ -229,7 +253,7 @@ SeriesValues<Company>* MarketImport::companyOf(const Table& row, const std::stri
 
 MarketPlan MarketImport::plan()
 {
-    if (plan_.quotes.empty() && plan_.rates.empty())
+    if (!hasValues(plan_.quotes) && !hasValues(plan_.rates))
         throw std::runtime_error("there is no usable quote or rate in the input");
     // Until here the values are only gathered, in the order of the lines.
     giveReferenceItsRates();
@@ -271,7 +295,7 @@ void MarketImport::checkRates() const
             rated.insert(rates.owner);
     std::string missing;
     for (const auto& quotes : plan_.quotes)
-        if (quotes.currency->getNbrQuotes() == 0 && rated.insert(quotes.currency).second)
+        if (!quotes.values.empty() && quotes.currency->getNbrQuotes() == 0 && rated.insert(quotes.currency).second)
             missing += (missing.empty() ? "" : "; ") + std::string("no rate of ") +
                        shown(quotes.currency->getRepresentation().bytes()) + ", in which " +
                        shown(quotes.owner->getAbbreviation().bytes()) + " is quoted";

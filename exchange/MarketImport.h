@@ -53,6 +53,7 @@ private:
         std::string name;
     };
 
+    void mentionCompanies(const Table& table);
     void takeListed(const Table& row);
     void takeRate(Table& row, bool units);
     void takeRates(Table& row, bool units);

@@ -95,6 +95,9 @@ void MarketPlan::dropUnused()
     std::unordered_set<const void*> used;
     for (const auto& series : rates)
         used.insert(series.owner);
+    for (const auto& series : quotes)
+        used.insert(series.owner);
+    std::erase_if(newCompanies, [&](const NewCompany& entry) { return !used.contains(entry.company.get()); });
     for (const auto& [company, market] : newCompanies)
         used.insert(market);
     std::erase_if(newMarkets, [&](const NewMarket& entry) { return !used.contains(entry.market.get()); });

@@ -7,6 +7,8 @@
 #include "tools/ProgressBar.h"
 
 #include <algorithm>
+#include <cerrno>
+#include <cstring>
 #include <filesystem>
 #include <iostream>
 #include <vector>
@@ -16,39 +18,52 @@ namespace {
 const char* const kUnits = "units-per-reference";
 const char* const kValues = "value-in-reference";
 
-/// "name of each"; of many only the first ones.
+/// "new markets: NYSE, Paris"; of many names only the first ones. Empty when there are none.
 template <class Entries, class NameOf>
-void tellNew(const char* what, const Entries& entries, const NameOf& nameOf)
+std::string newText(const char* what, const Entries& entries, const NameOf& nameOf)
 {
     constexpr std::size_t kTold = 20;
     if (entries.empty())
-        return;
-    std::cerr << "new " << what << ':';
+        return "";
+    std::string text = std::string("new ") + what + ':';
     for (std::size_t i = 0; i < std::min(entries.size(), kTold); ++i)
-        std::cerr << (i == 0 ? " " : ", ") << printable(nameOf(entries[i]).bytes());
+        text += (i == 0 ? " " : ", ") + printable(nameOf(entries[i]).bytes());
     if (entries.size() > kTold)
-        std::cerr << " and " << entries.size() - kTold << " more";
-    std::cerr << '\n';
+        text += " and " + std::to_string(entries.size() - kTold) + " more";
+    return text + '\n';
 }
 
-void tellCounts(const char* what, const MarketPlan::Counts& counts)
+std::string countText(const char* what, const MarketPlan::Counts& counts)
 {
-    std::cout << what << ": " << counts.added << " new, " << counts.changed << " changed, " << counts.equal
-              << " equal\n";
+    return std::string(what) + ": " + std::to_string(counts.added) + " new, " + std::to_string(counts.changed) +
+           " changed, " + std::to_string(counts.equal) + " equal\n";
 }
 
-/// The figures on standard output, names beside them.
-void report(const MarketPlan& plan)
-{
-    tellNew("currencies", plan.newCurrencies, [](const auto& made) { return made->getRepresentation(); });
-    tellNew("markets", plan.newMarkets, [](const auto& made) { return made.market->getName(); });
-    tellNew("companies", plan.newCompanies, [](const auto& made) { return made.company->getAbbreviation(); });
-    if (plan.replaced > 0)
-        std::cerr << "values of a day for which a later line has another: " << plan.replaced << '\n';
-    tellCounts("quotes", plan.quoteCounts);
-    tellCounts("rates", plan.rateCounts);
-    std::cout << "refused: " << plan.refused << '\n';
-}
+/// What is to be told of a plan that is not carried out yet: figures for standard output, names beside them.
+struct Report {
+    explicit Report(const MarketPlan& plan)
+    {
+        names =
+            newText("currencies", plan.newCurrencies, [](const auto& made) { return made->getRepresentation(); }) +
+            newText("markets", plan.newMarkets, [](const auto& made) { return made.market->getName(); }) +
+            newText("companies", plan.newCompanies, [](const auto& made) { return made.company->getAbbreviation(); });
+        if (plan.replaced > 0)
+            names += "values of a day for which a later line has another: " + std::to_string(plan.replaced) + '\n';
+        figures = countText("quotes", plan.quoteCounts) + countText("rates", plan.rateCounts) +
+                  "refused: " + std::to_string(plan.refused) + '\n';
+    }
+
+    /// Throws when standard output takes nothing.
+    void print() const
+    {
+        std::cerr << names;
+        if (!(std::cout << figures << std::flush))
+            throw std::runtime_error(std::string("standard output: ") + std::strerror(errno));
+    }
+
+    std::string names;
+    std::string figures;
+};
 
 class ImportTables : public ImportMode {
 public:
@@ -114,15 +129,16 @@ void ImportTables::runNew(const ImportArguments& arguments)
     Catalogue catalogue;
     Date stamp;
     MarketPlan made = plan(catalogue, &stamp);
-    report(made);
+    const Report report(made);
     if (arguments.dryRun)
-        return;
+        return report.print();
     made.carryOut(catalogue);
     // The records bear a date; that of the data makes the same input give the same file on any day.
     AtomicFile file(arguments.output, existing);
     if (catalogue.wrt(file.stream(), stamp) != 0)
         file.fail("cannot be written");
     file.commit();
+    report.print();
 }
 
 void ImportTables::runInto(const ImportArguments& arguments)
@@ -138,12 +154,12 @@ void ImportTables::runInto(const ImportArguments& arguments)
     checkReference(path, file.reference());
     Date stamp;
     MarketPlan added = plan(file.catalogue(), &stamp);
-    report(added);
+    const Report report(added);
     if (arguments.dryRun)
-        return;
+        return report.print();
     if (added.isEmpty()) {
         std::cerr << path << ": has all of it, and is left as it is\n";
-        return;
+        return report.print();
     }
     const MarketPlan::Owners changed = added.carryOut(file.catalogue());
     // Tables of former days leave the date that later ones have given.
@@ -152,6 +168,7 @@ void ImportTables::runInto(const ImportArguments& arguments)
     const auto result = DurableSave(DataFolder()).save(path, write, file.stamp());
     if (result.outcome != DurableSave::Outcome::kSaved)
         throw std::runtime_error(result.reason);
+    report.print();
 }
 
 /// Makes the file's reference that of the import, or the option's where the file has none.

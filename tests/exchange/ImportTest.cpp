@@ -208,13 +208,14 @@ TEST_F(ImportTest, AWideTableHasAColumnACurrencyOrTicker)
     // As a central bank publishes them: the newest first, and a separator behind the last column.
     importer.addRates(folder_.write("r.csv", "Date, USD,JPY,CHF,\n2005-01-04,1.25,N/A,0.5,\n2005-01-03,NA,100,-,\n"
                                              "2005-01-02,x,200,y,\n"));
-    importer.addQuotes(folder_.write("q.csv", "date;BRK.B;A\n3/1/2005;1,5;\n4/1/2005;2,5;.5\n"));
+    importer.addQuotes(folder_.write("q.csv", "date;BRK.B;A;Z\n3/1/2005;;;7\n4/1/2005;2,5;.5\n"));
     MarketPlan plan = importer.plan();
     plan.carryOut(catalogue_);
     EXPECT_EQ(rates("USD") + rates("JPY") + rates("CHF"),
               " 04/01/2005=0.8 02/01/2005=0.005 03/01/2005=0.01 04/01/2005=2");
     EXPECT_EQ(rates("EUR"), " 02/01/2005=1 03/01/2005=1 04/01/2005=1");
-    EXPECT_THAT(companies(), ElementsAre("NYSE/BRK.B/BRK.B/USD 03/01/2005=1.5 04/01/2005=2.5"));
+    EXPECT_THAT(companies(), ElementsAre("NYSE/BRK.B/BRK.B/USD 04/01/2005=2.5", "NYSE/Z/Z/USD 03/01/2005=7"))
+        << "the headings are the first mention";
     EXPECT_THAT(log(), HasSubstr("r.csv, line 4: USD: \"x\" is no positive number with decimal '.'; CHF: \"y\""));
     EXPECT_THAT(log(), HasSubstr("q.csv, line 3: A: \".5\" is no positive number"));
     EXPECT_EQ(plan.refused, 2U);
@@ -347,6 +348,30 @@ TEST_F(ImportTest, IntoAFileGoesWhatIsNewAndNothingElseChanges)
               "quotes: 0 new, 0 changed, 2 equal\nrates: 0 new, 0 changed, 2 equal\nrefused: 1\n");
     EXPECT_EQ(folder_.content("f"), after);
     EXPECT_EQ(backups().size(), 1U) << "nothing has changed";
+}
+
+TEST_F(ImportTest, TablesInPartsGiveWhatTheyGiveInOneGo)
+{
+    std::mt19937 random(5);
+    const std::string headings = "date,ticker,market,currency,close\n";
+    std::string all = headings;
+    folder_.write("r.csv", "3/1/2005,USD,2\n");
+    EXPECT_EQ(run("parts --rates r.csv"), 0);
+    for (int part = 0; part < 4; ++part) {
+        std::string rows;
+        for (int row = 0; row < 60; ++row) {
+            const unsigned ticker = below(random, 6);
+            const std::string date = daysAfterStart(below(random, 20)).toString().getCharacterArray();
+            rows += date + ',' + std::string(1, static_cast<char>('A' + ticker)) + ",M" + std::to_string(ticker % 2) +
+                    (ticker % 2 == 0 ? ",EUR," : ",USD,") + std::to_string(below(random, 900) + 1) + '\n';
+        }
+        all += rows;
+        folder_.write("part.csv", headings + rows);
+        EXPECT_EQ(run("--into parts --quotes part.csv"), 0);
+    }
+    folder_.write("all.csv", all);
+    EXPECT_EQ(run("whole --rates r.csv --quotes all.csv"), 0);
+    EXPECT_EQ(folder_.content("parts"), folder_.content("whole"));
 }
 
 TEST_F(ImportTest, TheReferenceGetsTheDaysThatItLacks)
