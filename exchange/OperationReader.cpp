@@ -107,6 +107,9 @@ void OperationReader::readTransfer(const Row& row, PlannedOperation* operation) 
     const PlannedAccount& from = *operation->account;
     operation->kind = OperationKind::kTransfer;
     operation->recipient = &accountNamed(to);
+    // Within an account it would be a charge or nothing, and be taken for one once it is booked.
+    if (operation->recipient == &from)
+        throw UnusableRow("is a transfer to the account that it comes from");
     operation->amount = single(std::abs(neededAmount(row, from)));
     operation->cost = single(sizeOf(row, StatementColumn::kCost));
     operation->rateCost = single(sizeOf(row, StatementColumn::kRateCost));

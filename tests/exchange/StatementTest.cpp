@@ -199,6 +199,7 @@ TEST_F(StatementTest, ALineThatCannotBeBookedIsRefusedWithItsNumberAndReason)
                  {"01.02.2026;Deposit;Giro;;;;;;;USD 1;;;;;;;", "is in \"USD\", but"},
                  {"01.02.2026;Fee;Giro;;;;;;;0,00;;;;;;;", "has an amount of 0"},
                  {"01.02.2026;Transfer;Giro;;;;;;;1;;;;;;;", "names no account to transfer to"},
+                 {"01.02.2026;Transfer;Giro;Giro;;;;;;1;;;;;;;", "to the account that it comes from"},
                  {"01.02.2026;Buy;Broker;;Paris;AC;;1;1;;;;;;;;", "\"Broker\" is in \"USD\", the company in \"EUR\""},
                  {"01.02.2026;Buy;Giro;;;;Alpha;1;1;;;;;;;;", "\"Alpha\" may be \"AC\" at \"Paris\" or \"A2\" at"},
                  {"01.02.2026;Buy;Giro;;;XX;;1;1;;;;;;;;", "has no company \"XX\""},
@@ -241,6 +242,7 @@ TEST_F(StatementTest, WhatCountsForTheWholeTableIsFoundAnywhereInIt)
     giro.setDates("dmy");
     EXPECT_THAT(planned(both, giro), ElementsAre("13/03/2026 Deposit Giro 2", HasSubstr("2: \"03/13/2026\" is no")));
 
+    EXPECT_THAT(failure("Date,Type,Amount\n1 Feb 2026,Deposit,1\n", giro), HasSubstr("no line has a date in the"));
     EXPECT_THAT(failure("Valuta;Was;Betrag\n"), HasSubstr("no column for type, which --column"));
     giro.addColumn("Type=was");
     giro.addColumn("amount=Soll");
