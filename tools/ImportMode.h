@@ -8,9 +8,10 @@
 /// What several ways of importing are told by options of one name.
 struct ImportArguments {
     std::string output;    // OUTPUT: the market file to make
+    std::string into;      // --into: the market file to add to
     std::string portfolio; // --portfolio: the portfolio file to import into
-    bool dryRun = false;   // --dry-run: only tell what would come of it
     std::string market;    // --market: a name or, where operations are imported, a file
+    bool dryRun = false;   // --dry-run: only tell what would come of it
     bool force = false;
 };
 

@@ -220,10 +220,8 @@ void ImportOperations::refuse(const OperationPlan& plan) const
 
 void ImportOperations::save(const ImportArguments& arguments, const Wallet& wallet) const
 {
-    if (FileStamp::of(arguments.portfolio) != stamp_)
-        throw std::runtime_error(arguments.portfolio + ": was changed by another program meanwhile; nothing is booked");
     const auto write = [&](FILE* file) { return wallet.wrt(file, today()); };
-    const auto result = DurableSave(DataFolder()).save(arguments.portfolio, write);
+    const auto result = DurableSave(DataFolder()).save(arguments.portfolio, write, stamp_);
     if (result.outcome != DurableSave::Outcome::kSaved)
         throw std::runtime_error(result.reason);
 }

@@ -6,40 +6,53 @@
 namespace {
 
 const char* const kPurpose =
-    "Makes a Pelorin market file of tables of quotes and exchange rates, or adds the operations "
-    "of a statement to a portfolio file.\n"
-    "Example: pelorin-import Companies/World --quotes prices.csv.gz --rates rates.csv.gz";
+    "Makes a Pelorin market file of tables of quotes and exchange rates, or adds them to one, or adds the operations "
+    "of a\n"
+    "statement to a portfolio file.\n"
+    "Example: pelorin-import Companies/World --quotes prices.csv.gz --rates rates.csv.gz\n"
+    "         pelorin-import --into Companies/World --quotes today.csv --dry-run\n"
+    "         pelorin-import --operations june.csv --portfolio PortoFolios/Mine --market Companies/World";
 
 const char* const kTables = R"(The tables are CSV files, plain or gzipped, with ',', ';' or tab between the fields:
   quotes   date,ticker,close, or a header line that names these columns and perhaps market, currency and
-           name, in any order; usual headings are known (Date, Symbol, Close, Price, Exchange, ...)
-  rates    date,currency,rate, likewise
+           name, in any order; usual headings are known (Date, Symbol, Close, Price, Exchange, ...);
+           or wide, a column a ticker: Date,AAPL,MSFT,...
+  rates    date,currency,rate, likewise; or wide, as central banks publish them: Date,USD,JPY,...
   listing  ticker,market,currency,name, likewise; cells may be empty
-Only ordinary files are read, no pipes. Dates are YYYY-MM-DD or DD/MM/YYYY. Numbers may have a decimal comma where
-commas do not separate the fields.
+In a wide table an empty cell, N/A, NA or - is no value. Only ordinary files are read, no pipes. Dates are YYYY-MM-DD
+or DD/MM/YYYY. Numbers may have a decimal comma where commas do not separate the fields.
 What a row of the quotes says comes before the listing, the listing before the options. Of two values for the same
 day the later line counts. A line that cannot be used is reported with its number and skipped.
+
+--into adds to a file: a day that has a value gets the new one, and all else in the file stays as it is. Companies
+are found by market and ticker, or by the ticker alone where no table tells the market and the file has one company
+of it. What is new comes behind what is there. The former version is kept in the data folder's Backups, as by a save
+of the window. Load the file again in a window that shows it.
 
 Market files hold the price of one unit of a currency in the reference currency. Rates are published the other way
 round as a rule, as units of the currency per unit of the reference, and are inverted: so are those under a heading
 like units_per_eur, and those of which neither a heading nor --rates-are says anything. The reference currency itself
-gets the rate 1.
+gets the rate 1. Quotes in a currency that has no rate are refused: they would be worth nothing.
 
 Statements (--operations) have headings in one of their first lines: Date,Type,Account,To Account,Market,Ticker,
 Quantity,Quote,Amount,Cost,Rate Cost,From Quote,To Quote, or Name, Debit, Credit, Currency, in any order; usual headings
 and words in English, German and French are known. Either all lines are booked or, when one is refused, none.
 
-Exit status: 0, 1 when a file cannot be read or written or a line of a statement is refused, 2 for bad arguments.)";
+Standard output has what is new, changed and equal, and how many lines were refused; --dry-run stops there.
+
+Exit status: 0, 1 when a file cannot be read, written or added to, or a line of a statement is refused, 2 for bad
+arguments.)";
 
 void describe(CLI::App& app, ImportArguments& arguments)
 {
     app.footer(kTables);
-    app.add_option("OUTPUT", arguments.output, "Market file to write; comes first");
+    auto* output = app.add_option("OUTPUT", arguments.output, "Market file to make; comes first");
+    addText(app, "--into", arguments.into, "FILE", "Market file that is there, to add to")->excludes(output);
+    addText(app, "--portfolio", arguments.portfolio, "PORTFOLIO_FILE", "Portfolio file that is there, to add to");
     addText(app, "--market", arguments.market, "NAME",
             "Market of the tickers that no table tells it of; without it NYSE. With --operations the market file");
-    addText(app, "--portfolio", arguments.portfolio, "PORTFOLIO_FILE", "Portfolio file to import into");
-    app.add_flag("--dry-run", arguments.dryRun, "Only tell what would be imported; write nothing");
-    app.add_flag("--force", arguments.force, "Replace OUTPUT when it exists");
+    app.add_flag("--dry-run", arguments.dryRun, "Write nothing, only tell what would be new, changed, equal, refused");
+    app.add_flag("--force", arguments.force, "Replace OUTPUT when it exists")->needs(output);
 }
 
 } // namespace
