@@ -129,9 +129,12 @@ void StatementTable::failWithout(const std::string& path, const StatementProfile
             missing +=
                 (missing.empty() ? "" : ", ") + std::string(nameOf(column)) + (told.empty() ? "" : " " + shown(told));
     }
+    constexpr std::size_t kMostTold = 20;
     std::string headings;
-    for (const std::string& heading : headings_)
-        headings += (headings.empty() ? "" : ", ") + shown(readable(heading));
+    for (std::size_t i = 0; i < std::min(headings_.size(), kMostTold); ++i)
+        headings += (headings.empty() ? "" : ", ") + shown(readable(headings_[i]));
+    if (headings_.size() > kMostTold)
+        headings += ", ...";
     throw std::runtime_error(path + ": no line has the headings of a statement: " +
                              (missing.empty()
                                   ? "they are on no single line"

@@ -305,7 +305,9 @@ TEST_F(StatementTest, TheProgramBooksAllOrNothingAndKeepsTheFormerFile)
     EXPECT_EQ(refused.err, "s.csv, line 4: the type \"Split\" is not known: --type WORD=TYPE says what it means\n"
                            "pelorin-import: s.csv: nothing is booked, since 1 line is refused; --skip-bad books the "
                            "others\n");
-    EXPECT_EQ(run(options + "--skip-bad --dry-run").status, 0);
+    const ToolRun dry = run(options + "--skip-bad --dry-run");
+    EXPECT_EQ(dry.status, 0);
+    EXPECT_THAT(dry.out, HasSubstr("line 2: new: 01/02/2026 Deposit 1000.50, Neu\n"));
     EXPECT_EQ(folder_.content("p"), empty);
     EXPECT_FALSE(std::filesystem::exists(folder_ / "bank"));
 
