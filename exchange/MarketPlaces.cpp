@@ -93,7 +93,8 @@ SeriesValues<Company>* MarketPlaces::company(const std::string& ticker, const Na
     const bool isNew = place.company == nullptr;
     if (isNew) {
         auto made = std::make_unique<Company>(nullptr, toString(name), toString(ticker));
-        place.company = plan_.newCompanies.emplace_back(std::move(made), place.market).company.get();
+        place.company =
+            plan_.newCompanies.emplace_back(MarketPlan::NewCompany{std::move(made), place.market}).company.get();
         enrol(place.company, place.market);
     }
     SeriesValues<Company>*& quotes = quotes_[place.company];
@@ -140,7 +141,8 @@ std::string MarketPlaces::tradedIn(const Market* market) const
 Market* MarketPlaces::makeMarket(const std::string& name, const std::string& currencyOrNone)
 {
     Currency* tradesIn = currency(currencyOrNone.empty() ? usual_.currency : currencyOrNone);
-    Market* market = plan_.newMarkets.emplace_back(std::make_unique<Market>(toString(name)), tradesIn).market.get();
+    auto made = std::make_unique<Market>(toString(name));
+    Market* market = plan_.newMarkets.emplace_back(MarketPlan::NewMarket{std::move(made), tradesIn}).market.get();
     enrol(market, tradesIn);
     return market;
 }
