@@ -3,32 +3,13 @@
 
 #include "exchange/OperationPlan.h"
 #include "tests/fuzz/FuzzedPortfolio.h"
-#include "tests/fuzz/Require.h"
+#include "tests/fuzz/MemoryTable.h"
 #include "tests/support/Bytes.h"
 
 #include <cstdint>
 #include <stdexcept>
-#include <sys/mman.h>
-#include <unistd.h>
 
 namespace {
-
-/// A file that is in memory only, which still has a path.
-class MemoryFile {
-public:
-    MemoryFile(const void* bytes, std::size_t size) : descriptor_(memfd_create("statement", MFD_CLOEXEC))
-    {
-        require(write(descriptor_, bytes, size) == static_cast<ssize_t>(size), "a file in memory can be written");
-    }
-    ~MemoryFile() { close(descriptor_); }
-    MemoryFile(const MemoryFile&) = delete;
-    MemoryFile& operator=(const MemoryFile&) = delete;
-
-    std::string path() const { return "/proc/self/fd/" + std::to_string(descriptor_); }
-
-private:
-    int descriptor_;
-};
 
 void check(const StatementTable& table, const StatementProfile& profile)
 {
@@ -54,7 +35,7 @@ void check(const StatementTable& table, const StatementProfile& profile)
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
-    const MemoryFile file(data, size);
+    const MemoryTable file({reinterpret_cast<const char*>(data), size});
     StatementProfile profile;
     profile.setAccount("Main");
     try {
