@@ -206,6 +206,11 @@ void ImportOperations::tellLines(const StatementTable& table, const OperationPla
     if (withNew)
         for (const PlannedOperation& operation : plan.operations())
             tell("new: " + textOf(operation), operation.line);
+    for (const PlannedOperation& operation : plan.operations())
+        if (operation.otherAmount != 0)
+            tell("its amount " + amountText(operation.otherAmount) +
+                     " is not what quantity, quote and cost make: " + textOf(operation),
+                 operation.line);
     std::cout << "operations: " << plan.operations().size() << " new, " << plan.booked().size() << " booked already\n"
               << "refused: " << plan.refused().size() << std::endl; // before what goes to the other stream
     for (const OperationPlan::Refusal& refusal : plan.refused())

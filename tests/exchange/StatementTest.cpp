@@ -31,6 +31,8 @@ std::string textOf(const PlannedOperation& o)
     text << (o.cost != 0 ? " cost " : "");
     if (o.cost != 0)
         text << o.cost;
+    if (o.otherAmount != 0)
+        text << ", and not " << o.otherAmount;
     return text.str();
 }
 
@@ -167,7 +169,9 @@ TEST_F(StatementTest, EachLineBecomesTheOperationThatItMeans)
         {"Fee;Giro;;;;;;;-4,8;;;;;;;", "Charge Giro 4.8"},
         {"Transfer;Giro;Broker;;;;;;-50;;;2;0,01;;;", "Transfer Giro 50 to Broker 0.01 1/2 cost 2"},
         {"Transfer;Giro;Broker;;;;;;50;;;;;3;4;", "Transfer Giro 50 to Broker 0 3/4"},
-        {"Buy;Giro;;Paris;AC;;20;61,4;-99;;;-6,5;;;;", "Buy Giro 20 Paris/Alpha at 61.4 cost 6.5"},
+        {"Buy;Giro;;Paris;AC;;20;61,4;-99;;;-6,5;;;;", "Buy Giro 20 Paris/Alpha at 61.4 cost 6.5, and not 99"},
+        {"Buy;Giro;;Paris;AC;;20;61,4;-1.234,50;;;6,5;;;;", "Buy Giro 20 Paris/Alpha at 61.4 cost 6.5"},
+        {"Sell;Giro;;Paris;AC;;20;61,4;;;1.221,50;6,5;;;;", "Sell Giro 20 Paris/Alpha at 61.4 cost 6.5"},
         {"Buy;Giro;;;GM;;-60;;1.515,95;;;5,95;;;;", "Buy Giro 60 Paris/G\xC3\xA4mma SA at 25.1667 cost 5.95"},
         {"Sell;Giro;;;;g\xC3\x84MMA sa;-30;;;;818,05;5,95;;;;EUR",
          "Sell Giro 30 Paris/G\xC3\xA4mma SA at 27.4667 cost 5.95"},
