@@ -20,6 +20,13 @@ float single(double value)
     return kept;
 }
 
+/// Whether the amounts may differ by nothing but their rounding to cents.
+bool areEqualToACent(double a, double b)
+{
+    constexpr double kCent = 0.011;
+    return std::abs(a - b) <= kCent;
+}
+
 std::string symbolOf(const Currency* currency)
 {
     return currency != nullptr ? shown(currency->getRepresentation().comparedBytes()) : "no currency";
@@ -107,6 +114,9 @@ void OperationReader::readTransfer(const Row& row, PlannedOperation* operation) 
     const PlannedAccount& from = *operation->account;
     operation->kind = OperationKind::kTransfer;
     operation->recipient = &accountNamed(to);
+    // Within an account it would be a charge or nothing, and be taken for one once it is booked.
+    if (operation->recipient == &from)
+        throw UnusableRow("is a transfer to the account that it comes from");
     operation->amount = single(std::abs(neededAmount(row, from)));
     operation->cost = single(sizeOf(row, StatementColumn::kCost));
     operation->rateCost = single(sizeOf(row, StatementColumn::kRateCost));
@@ -143,6 +153,7 @@ void OperationReader::readTrade(const Row& row, PlannedOperation* operation) con
                           ", the company in " + symbolOf(operation->company->market()->currency()));
     operation->quantity = quantityOf(row);
     const double cost = sizeOf(row, StatementColumn::kCost);
+    const double costs = operation->kind == OperationKind::kBuy ? cost : -cost; // what they add to the amount
     operation->cost = single(cost);
     const auto quote = money(row, StatementColumn::kQuote, account);
     const auto amount = amountOf(row, account);
@@ -151,11 +162,13 @@ void OperationReader::readTrade(const Row& row, PlannedOperation* operation) con
     // A quote of 0 beside an amount was only filled in.
     if (quote && (*quote != 0 || !amount)) {
         operation->quote = single(*quote);
+        if (amount && !areEqualToACent(std::abs(*amount), std::abs(*quote * operation->quantity + costs)))
+            operation->otherAmount = std::abs(*amount);
         return;
     }
     if (!amount)
         throw UnusableRow("has neither a quote nor an amount");
-    const double total = std::abs(*amount) + (operation->kind == OperationKind::kBuy ? -cost : cost);
+    const double total = std::abs(*amount) - costs;
     if (!(total > 0))
         throw UnusableRow("has an amount that its cost uses up, so that nothing is left for the shares");
     operation->quote = single(total / operation->quantity);

@@ -30,6 +30,9 @@ struct PlannedOperation {
     Company* company = nullptr;
     int quantity = 0;
     float quote = 0;
+    /// The amount of the line, without its sign, when that is not what quantity, quote and cost make: a column may have
+    /// been taken for another one. Otherwise 0.
+    double otherAmount = 0;
 
     // Of a transfer only:
     const PlannedAccount* recipient = nullptr;

@@ -45,7 +45,7 @@ StatementTable::StatementTable(const std::string& path, const StatementProfile& 
     const char separator = findSeparator(path, profile);
     readAll(path, separator);
     decode();
-    passOverEnd();
+    passOverEnd(path);
     // From here on `rows_` are the lines that are meant to be read, and nothing is added to them.
     settleDates(path, profile);
     settleDecimalMarks(separator);
@@ -129,9 +129,12 @@ void StatementTable::failWithout(const std::string& path, const StatementProfile
             missing +=
                 (missing.empty() ? "" : ", ") + std::string(nameOf(column)) + (told.empty() ? "" : " " + shown(told));
     }
+    constexpr std::size_t kMostTold = 20;
     std::string headings;
-    for (const std::string& heading : headings_)
-        headings += (headings.empty() ? "" : ", ") + shown(readable(heading));
+    for (std::size_t i = 0; i < std::min(headings_.size(), kMostTold); ++i)
+        headings += (headings.empty() ? "" : ", ") + shown(readable(headings_[i]));
+    if (headings_.size() > kMostTold)
+        headings += ", ...";
     throw std::runtime_error(path + ": no line has the headings of a statement: " +
                              (missing.empty()
                                   ? "they are on no single line"
@@ -167,13 +170,16 @@ void StatementTable::decode()
 }
 
 /// Sums and remarks stand behind the last line with a date.
-void StatementTable::passOverEnd()
+void StatementTable::passOverEnd(const std::string& path)
 {
     // A line that cannot be cut may have had one.
     const auto isDated = [this](const Row& row) {
         return row.fields.empty() || WrittenDate::read(cell(row, StatementColumn::kDate)).has_value();
     };
     const auto end = std::find_if(rows_.rbegin(), rows_.rend(), isDated).base();
+    if (end == rows_.begin() && !rows_.empty())
+        throw std::runtime_error(path + ": no line has a date in the column " +
+                                 shown(headingOf(StatementColumn::kDate)));
     for (auto row = end; row != rows_.end(); ++row)
         passedOver_.push_back({row->line, textOf(row->fields), "behind the last line with a date"});
     rows_.erase(end, rows_.end());

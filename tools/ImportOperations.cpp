@@ -85,7 +85,7 @@ public:
 private:
     static void check(const CLI::App& app, const ImportArguments& arguments);
     StatementProfile profile();
-    void tellLines(const StatementTable& table, const OperationPlan& plan) const;
+    void tellLines(const StatementTable& table, const OperationPlan& plan, bool withNew) const;
     void refuse(const OperationPlan& plan) const;
     void save(const ImportArguments& arguments, const Wallet& wallet) const;
     void keepProfile(const StatementProfile& profile) const;
@@ -158,7 +158,7 @@ void ImportOperations::run(const CLI::App& app, const ImportArguments& arguments
     for (const std::string& text : newAccounts_)
         newAccounts.push_back(newAccountOf(text));
     OperationPlan plan(table, profile, newAccounts, valuation.wallet(), valuation.catalogue());
-    tellLines(table, plan);
+    tellLines(table, plan, arguments.dryRun);
     if (!plan.refused().empty() && !skipBad_)
         refuse(plan);
     const std::vector<float> before = cashOf(valuation);
@@ -169,9 +169,6 @@ void ImportOperations::run(const CLI::App& app, const ImportArguments& arguments
         if (!plan.isEmpty())
             save(arguments, valuation.wallet());
         keepProfile(profile);
-    } else {
-        for (const PlannedOperation& operation : plan.operations())
-            std::cout << "line " << operation.line << ": new: " << textOf(operation) << '\n';
     }
     report(plan, valuation, before, after);
 }
@@ -197,16 +194,25 @@ StatementProfile ImportOperations::profile()
     return profile;
 }
 
-void ImportOperations::tellLines(const StatementTable& table, const OperationPlan& plan) const
+void ImportOperations::tellLines(const StatementTable& table, const OperationPlan& plan, bool withNew) const
 {
-    const auto tell = [](std::ostream& out, unsigned long line, const std::string& text) {
-        out << "line " << line << ": " << text << '\n';
+    const auto tell = [](const std::string& text, unsigned long line) {
+        std::cout << "line " << line << ": " << text << '\n';
     };
     for (const StatementTable::PassedOver& line : table.passedOver())
-        tell(std::cout, line.line, std::string("passed over, ") + line.reason + ": " + printable(line.text));
+        tell(std::string("passed over, ") + line.reason + ": " + printable(line.text), line.line);
     for (const PlannedOperation& operation : plan.booked())
-        tell(std::cout, operation.line, "booked already: " + textOf(operation));
-    std::cout.flush();
+        tell("booked already: " + textOf(operation), operation.line);
+    if (withNew)
+        for (const PlannedOperation& operation : plan.operations())
+            tell("new: " + textOf(operation), operation.line);
+    for (const PlannedOperation& operation : plan.operations())
+        if (operation.otherAmount != 0)
+            tell("its amount " + amountText(operation.otherAmount) +
+                     " is not what quantity, quote and cost make: " + textOf(operation),
+                 operation.line);
+    std::cout << "operations: " << plan.operations().size() << " new, " << plan.booked().size() << " booked already\n"
+              << "refused: " << plan.refused().size() << std::endl; // before what goes to the other stream
     for (const OperationPlan::Refusal& refusal : plan.refused())
         std::cerr << table_ << ", line " << refusal.line << ": " << refusal.reason << '\n';
 }
@@ -220,10 +226,8 @@ void ImportOperations::refuse(const OperationPlan& plan) const
 
 void ImportOperations::save(const ImportArguments& arguments, const Wallet& wallet) const
 {
-    if (FileStamp::of(arguments.portfolio) != stamp_)
-        throw std::runtime_error(arguments.portfolio + ": was changed by another program meanwhile; nothing is booked");
     const auto write = [&](FILE* file) { return wallet.wrt(file, today()); };
-    const auto result = DurableSave(DataFolder()).save(arguments.portfolio, write);
+    const auto result = DurableSave(DataFolder()).save(arguments.portfolio, write, stamp_);
     if (result.outcome != DurableSave::Outcome::kSaved)
         throw std::runtime_error(result.reason);
 }
@@ -241,8 +245,6 @@ void ImportOperations::keepProfile(const StatementProfile& profile) const
 void ImportOperations::report(const OperationPlan& plan, const Valuation& valuation, const std::vector<float>& before,
                               const std::vector<float>& after)
 {
-    std::cout << "operations: " << plan.operations().size() << " new, " << plan.booked().size() << " booked already\n"
-              << "refused: " << plan.refused().size() << '\n';
     const Wallet& wallet = valuation.wallet();
     const bool hasTrades = std::ranges::any_of(plan.operations(), &PlannedOperation::isTrade);
     if (hasTrades && (wallet.getBuyRateCost() != 0 || wallet.getSellRateCost() != 0))

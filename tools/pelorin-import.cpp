@@ -5,11 +5,13 @@
 
 namespace {
 
-const char* const kPurpose = "Makes a Pelorin market file of tables of quotes and exchange rates, or adds them to one; "
-                             "adds the operations of a\n"
-                             "statement to a portfolio file; makes files of the tables of an export.\n"
-                             "Example: pelorin-import Companies/World --quotes prices.csv.gz --rates rates.csv.gz\n"
-                             "         pelorin-import --into Companies/World --quotes today.csv --dry-run";
+const char* const kPurpose =
+    "Makes a Pelorin market file of tables of quotes and exchange rates, or adds them to one.\n"
+    "Adds the operations of a statement to a portfolio file. Makes files of the tables of an export.\n"
+    "Example: pelorin-import Companies/World --quotes prices.csv.gz --rates rates.csv.gz\n"
+    "         pelorin-import --into Companies/World --quotes today.csv --dry-run\n"
+    "         pelorin-import --operations june.csv --portfolio PortoFolios/Mine --market Companies/World\n"
+    "         pelorin-import --from tables --into Companies/World --portfolio PortoFolios/Mine";
 
 const char* const kTables = R"(The tables are CSV files, plain or gzipped, with ',', ';' or tab between the fields:
   quotes   date,ticker,close, or a header line that names these columns and perhaps market, currency and

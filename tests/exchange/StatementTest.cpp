@@ -31,6 +31,8 @@ std::string textOf(const PlannedOperation& o)
     text << (o.cost != 0 ? " cost " : "");
     if (o.cost != 0)
         text << o.cost;
+    if (o.otherAmount != 0)
+        text << ", and not " << o.otherAmount;
     return text.str();
 }
 
@@ -167,7 +169,9 @@ TEST_F(StatementTest, EachLineBecomesTheOperationThatItMeans)
         {"Fee;Giro;;;;;;;-4,8;;;;;;;", "Charge Giro 4.8"},
         {"Transfer;Giro;Broker;;;;;;-50;;;2;0,01;;;", "Transfer Giro 50 to Broker 0.01 1/2 cost 2"},
         {"Transfer;Giro;Broker;;;;;;50;;;;;3;4;", "Transfer Giro 50 to Broker 0 3/4"},
-        {"Buy;Giro;;Paris;AC;;20;61,4;-99;;;-6,5;;;;", "Buy Giro 20 Paris/Alpha at 61.4 cost 6.5"},
+        {"Buy;Giro;;Paris;AC;;20;61,4;-99;;;-6,5;;;;", "Buy Giro 20 Paris/Alpha at 61.4 cost 6.5, and not 99"},
+        {"Buy;Giro;;Paris;AC;;20;61,4;-1.234,50;;;6,5;;;;", "Buy Giro 20 Paris/Alpha at 61.4 cost 6.5"},
+        {"Sell;Giro;;Paris;AC;;20;61,4;;;1.221,50;6,5;;;;", "Sell Giro 20 Paris/Alpha at 61.4 cost 6.5"},
         {"Buy;Giro;;;GM;;-60;;1.515,95;;;5,95;;;;", "Buy Giro 60 Paris/G\xC3\xA4mma SA at 25.1667 cost 5.95"},
         {"Sell;Giro;;;;g\xC3\x84MMA sa;-30;;;;818,05;5,95;;;;EUR",
          "Sell Giro 30 Paris/G\xC3\xA4mma SA at 27.4667 cost 5.95"},
@@ -199,6 +203,7 @@ TEST_F(StatementTest, ALineThatCannotBeBookedIsRefusedWithItsNumberAndReason)
                  {"01.02.2026;Deposit;Giro;;;;;;;USD 1;;;;;;;", "is in \"USD\", but"},
                  {"01.02.2026;Fee;Giro;;;;;;;0,00;;;;;;;", "has an amount of 0"},
                  {"01.02.2026;Transfer;Giro;;;;;;;1;;;;;;;", "names no account to transfer to"},
+                 {"01.02.2026;Transfer;Giro;Giro;;;;;;1;;;;;;;", "to the account that it comes from"},
                  {"01.02.2026;Buy;Broker;;Paris;AC;;1;1;;;;;;;;", "\"Broker\" is in \"USD\", the company in \"EUR\""},
                  {"01.02.2026;Buy;Giro;;;;Alpha;1;1;;;;;;;;", "\"Alpha\" may be \"AC\" at \"Paris\" or \"A2\" at"},
                  {"01.02.2026;Buy;Giro;;;XX;;1;1;;;;;;;;", "has no company \"XX\""},
@@ -241,6 +246,7 @@ TEST_F(StatementTest, WhatCountsForTheWholeTableIsFoundAnywhereInIt)
     giro.setDates("dmy");
     EXPECT_THAT(planned(both, giro), ElementsAre("13/03/2026 Deposit Giro 2", HasSubstr("2: \"03/13/2026\" is no")));
 
+    EXPECT_THAT(failure("Date,Type,Amount\n1 Feb 2026,Deposit,1\n", giro), HasSubstr("no line has a date in the"));
     EXPECT_THAT(failure("Valuta;Was;Betrag\n"), HasSubstr("no column for type, which --column"));
     giro.addColumn("Type=was");
     giro.addColumn("amount=Soll");
@@ -303,7 +309,9 @@ TEST_F(StatementTest, TheProgramBooksAllOrNothingAndKeepsTheFormerFile)
     EXPECT_EQ(refused.err, "s.csv, line 4: the type \"Split\" is not known: --type WORD=TYPE says what it means\n"
                            "pelorin-import: s.csv: nothing is booked, since 1 line is refused; --skip-bad books the "
                            "others\n");
-    EXPECT_EQ(run(options + "--skip-bad --dry-run").status, 0);
+    const ToolRun dry = run(options + "--skip-bad --dry-run");
+    EXPECT_EQ(dry.status, 0);
+    EXPECT_THAT(dry.out, HasSubstr("line 2: new: 01/02/2026 Deposit 1000.50, Neu\n"));
     EXPECT_EQ(folder_.content("p"), empty);
     EXPECT_FALSE(std::filesystem::exists(folder_ / "bank"));
 

@@ -5,32 +5,13 @@
 #include "exchange/MarketFile.h"
 #include "exchange/MarketImport.h"
 #include "tests/fuzz/FuzzedPortfolio.h"
+#include "tests/fuzz/MemoryTable.h"
 #include "tests/fuzz/Require.h"
 #include "tests/support/Bytes.h"
 
 #include <cstdint>
-#include <sys/mman.h>
-#include <unistd.h>
 
 namespace {
-
-/// A file of these bytes, in memory.
-class MemoryTable {
-public:
-    explicit MemoryTable(std::string_view bytes) : descriptor_(memfd_create("table", MFD_CLOEXEC))
-    {
-        require(write(descriptor_, bytes.data(), bytes.size()) == static_cast<ssize_t>(bytes.size()),
-                "there is memory");
-    }
-    ~MemoryTable() { close(descriptor_); }
-    MemoryTable(const MemoryTable&) = delete;
-    MemoryTable& operator=(const MemoryTable&) = delete;
-
-    std::string path() const { return "/proc/self/fd/" + std::to_string(descriptor_); }
-
-private:
-    int descriptor_;
-};
 
 std::string bytesOf(const Catalogue& catalogue, const Date& stamp)
 {

@@ -1,5 +1,5 @@
 // Writes a small valid file and page of each kind for the fuzzers to start from: fuzz_seeds FOLDER makes FOLDER/market,
-// FOLDER/wallet, FOLDER/latest, FOLDER/history and FOLDER/table.
+// FOLDER/wallet, FOLDER/latest, FOLDER/history, FOLDER/table and FOLDER/statement.
 
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
@@ -54,9 +54,13 @@ int main(int argc, char** argv)
     fill(p);
     const char* latest = "<html><td nowrap><b>112 <sup>3</sup>/<sub>8</sub></b></td><td nowrap><b>45</b></td>";
     const char* history = "<pre><b>Date Close Volume (00s)</b>\n5/3/1999 45.5 46 100\n05/04/1999\t46\t47\t9\n</pre>";
+    const char* statement =
+        "Bank\n\nDatum;Art;Zielkonto;Titel;Menge;Kurs;Betrag;Kosten\n01.02.1999;Kauf;;Alpha;5;7,25;;1\n"
+        "02.02.1999;Transfer;Side;;;;1.000,50;\n13.02.1999;Zinsen;;;;;0,05;\nSumme;;;;;;1;\n";
     if (argc == 2 && save(written([&p](FILE* file) { p.catalogue.wrt(file, kStart); }), folder / "market") &&
         save(written([&p](FILE* file) { p.wallet.wrt(file, kStart); }), folder / "wallet") &&
-        save(latest, folder / "latest") && save(history, folder / "history") && saveTables(folder / "table"))
+        save(latest, folder / "latest") && save(history, folder / "history") && saveTables(folder / "table") &&
+        save(statement, folder / "statement"))
         return 0;
     std::fputs("usage: fuzz_seeds FOLDER, one that can be written into\n", stderr);
     return 1;
