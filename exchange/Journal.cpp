@@ -17,7 +17,9 @@
 #include "portfolio/TransferAccountOperation.h"
 #include "portfolio/Wallet.h"
 #include "valuation/AccountState.h"
+#include "valuation/ShareState.h"
 #include "valuation/State.h"
+#include "valuation/Totals.h"
 
 #include <algorithm>
 #include <cmath>
@@ -29,6 +31,7 @@ namespace {
 constexpr const char* kDeposits = "Equity:Deposits";
 constexpr const char* kExchange = "Equity:Exchange";
 constexpr const char* kRounding = "Equity:Rounding";
+constexpr const char* kTotalRounding = "Assets:Rounding";
 constexpr const char* kIncome = "Income:Received";
 constexpr const char* kCharges = "Expenses:Charges";
 constexpr const char* kFees = "Expenses:Fees";
@@ -80,6 +83,25 @@ std::string described(const Operation& operation)
 std::string nameText(const String& name)
 {
     return cleanName(name.bytes());
+}
+
+/// What the total of the state has beyond the values of its holdings and accounts, in the reference currency.
+double totalRounding(const Catalogue& catalogue, const State& state)
+{
+    const Totals totals(state, catalogue);
+    const double referenceRate = totals.isKnown ? totals.reference->getRealQuote(state.getDate()) : 0;
+    if (referenceRate == 0)
+        return 0;
+    double sum = 0;
+    const auto add = [&](double amount, const String& symbol) {
+        if (const Currency* currency = catalogue.getCurrencyByRepresentation(symbol))
+            sum += amount * currency->getRealQuote(state.getDate()) / referenceRate;
+    };
+    for (const ShareState* holding : state.shareStates())
+        add(holding->worth(), holding->getCurrencyRepresentation());
+    for (const AccountState* account : state.accountStates())
+        add(account->getCash(), account->getCurrencyRepresentation());
+    return totals.totalValue - sum;
 }
 
 bool areOfOneSymbol(const Currency& a, const Currency& b)
@@ -196,10 +218,10 @@ void Journal::addTrade(const ShareOperation& trade, Transaction* transaction)
          isPriced ? kTheRest : amount(-cash, names_.ofCurrency(account->getCurrencyRepresentation())));
 }
 
-/// What the replay has in the accounts on the day beyond the moves of the transactions: it rounds every sum to a float.
+/// What the accounts have on the day beyond the moves of the transactions, and the total beyond its parts: a replay
+/// rounds every sum to a float.
 void Journal::addRoundings()
 {
-    constexpr int kDecimals = 8;
     Transaction transaction{day_, "Rounding of the sums in Pelorin", {}};
     for (const AccountState* state : state_.accountStates()) {
         const Account& account = *state->account();
@@ -207,16 +229,26 @@ void Journal::addRoundings()
             continue;
         if (!std::isfinite(state->getCash()))
             throw std::runtime_error("the cash of " + printable(account.getName().bytes()) + " is no number");
-        const double difference = state->getCash() - static_cast<double>(cash_.at(&account)) / kUnitsInOne;
-        const std::string digits = fixedText(difference, kDecimals);
-        if (digits == fixedText(0, kDecimals))
-            continue;
-        const std::string& commodity = form_.inAmount(names_.ofCurrency(account.getCurrencyRepresentation()));
-        post(&transaction, names_.of(account), digits + ' ' + commodity);
-        post(&transaction, kRounding, fixedText(-difference, kDecimals) + ' ' + commodity);
+        addRounding(names_.of(account), state->getCash() - static_cast<double>(cash_.at(&account)) / kUnitsInOne,
+                    account.getCurrencyRepresentation(), &transaction);
     }
+    // Beyond a hundred thousand a float has hardly a cent, and the sum of many holdings may lack two.
+    const Currency* reference = catalogue_.getReferenceCurrency();
+    if (const double lost = totalRounding(catalogue_, state_); reference != nullptr && std::isfinite(lost))
+        addRounding(kTotalRounding, lost, reference->getRepresentation(), &transaction);
     if (!transaction.postings.empty())
         transactions_.push_back(std::move(transaction));
+}
+
+void Journal::addRounding(const std::string& account, double difference, const String& symbol, Transaction* transaction)
+{
+    constexpr int kDecimals = 8;
+    const std::string digits = fixedText(difference, kDecimals);
+    if (digits == fixedText(0, kDecimals))
+        return;
+    const std::string& commodity = form_.inAmount(names_.ofCurrency(symbol));
+    post(transaction, account, digits + ' ' + commodity);
+    post(transaction, kRounding, fixedText(-difference, kDecimals) + ' ' + commodity);
 }
 
 Journal::Units Journal::unitsOf(double amount, const Operation& operation) const

@@ -16,6 +16,7 @@ class Currency;
 class Operation;
 class ShareOperation;
 class State;
+class String;
 class TransferAccountOperation;
 class Wallet;
 
@@ -23,10 +24,9 @@ class Wallet;
 /// its companies and currencies.
 ///
 /// What is held on the day, and its prices of that day, are those of the state, so that a program that reads the
-/// journal comes to the state's total but for the rounding of its sums. The moves of cash are in ten-thousandths; what
-/// the replay has rounded otherwise in the end is a transaction of the last day. A trade in its account's currency
-/// names its quote; one in another, and a transfer between currencies, goes by way of Equity:Exchange, where no price
-/// is made up.
+/// journal comes to the state's total. The moves of cash are in ten-thousandths; what the replay's rounding of sums has
+/// made of them, and of the total, is a transaction of the last day. A trade in its account's currency names its quote;
+/// one in another, and a transfer between currencies, goes by way of Equity:Exchange, where no price is made up.
 class Journal {
 public:
     /// `state` is of `wallet`, without simulated sales. A wallet without holdings and accounts gives a journal of the
@@ -51,6 +51,7 @@ private:
     void addTrade(const ShareOperation& trade, Transaction* transaction);
     void addTransfer(const TransferAccountOperation& transfer, Transaction* transaction);
     void addRoundings();
+    void addRounding(const std::string& account, double difference, const String& symbol, Transaction* transaction);
     void addPrices();
     void addPricesOf(const Company& company);
     void addPricesOf(const Currency& currency);

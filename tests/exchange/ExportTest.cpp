@@ -276,9 +276,10 @@ TEST(JournalTest, OtherProgramsValueTheSampleAsPelorinDoes)
     const TemporaryFolder folder("pelorin-journal-test");
     ASSERT_EQ(ToolRun(PELORIN_SAMPLE, "data --date 20/07/2025", folder).status, 0);
     const std::string files = "data/Companies/Sample data/PortoFolios/Sample --date ";
-    // Within the sample, on its last day, and behind it, where quotes are estimated.
+    // Within the sample, on a day when the sum of the total has lost two cents, and behind its end, where quotes are
+    // estimated.
     const std::pair<const char*, const char*> days[] = {
-        {"30/12/2022", "2022-12-30"}, {"20/07/2025", "2025-07-20"}, {"20/10/2025", "2025-10-20"}};
+        {"30/12/2022", "2022-12-30"}, {"19/06/2025", "2025-06-19"}, {"20/10/2025", "2025-10-20"}};
     for (const auto& [day, iso] : days) {
         const std::string json = ToolRun(PELORIN_VALUE, files + day + " --json", folder).out;
         for (const std::string form : {"ledger", "beancount"})
