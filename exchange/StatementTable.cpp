@@ -18,17 +18,27 @@ std::string readable(const std::string& bytes)
     return isUtf8(bytes) ? bytes : fromWindows1252(bytes);
 }
 
-/// The heading, and what is left of it without "(EUR)" behind.
+/// The heading, and what is left of it without a currency behind: "(EUR)", "in EUR", "EUR".
 std::array<std::string, 2> keysOf(const std::string& heading)
 {
-    return {wordKey(heading), wordKey(heading.substr(0, heading.find_first_of("([")))};
+    std::string_view text = withoutBlanks(std::string_view(heading).substr(0, heading.find_first_of("([")));
+    const std::size_t last = text.rfind(' ') + 1; // 0 for a single word
+    const auto isCapital = [](char c) { return c >= 'A' && c <= 'Z'; };
+    constexpr std::size_t kCode = 3;
+    if (last > 0 && text.size() - last == kCode && std::ranges::all_of(text.substr(last), isCapital)) {
+        text = withoutBlanks(text.substr(0, last));
+        for (const std::string_view word : {" in", " en"})
+            if (text.ends_with(word))
+                text.remove_suffix(word.size());
+    }
+    return {wordKey(heading), wordKey(text)};
 }
 
 std::string textOf(const std::vector<std::string>& fields)
 {
     std::string text;
     for (const std::string& field : fields)
-        if (!field.empty())
+        if (!withoutBlanks(field).empty())
             text += (text.empty() ? "" : " ") + field;
     return text;
 }
@@ -95,7 +105,7 @@ char StatementTable::findSeparator(const std::string& path, const StatementProfi
     std::size_t most = 0;
     std::vector<std::string> closest; // to headings
     places_.fill(kNowhere);
-    for (const char separator : {'\t', ';', ','}) {
+    for (const char separator : {'\t', ';', '|', ','}) {
         CsvReader reader(path, separator);
         for (std::size_t n = 0; n < kLongestPreamble && reader.next(); ++n) {
             const Places places = placesIn(reader.fields(), profile);
@@ -148,7 +158,7 @@ void StatementTable::readAll(const std::string& path, char separator)
     while (reader.next())
         if (reader.line() < headerLine_)
             passedOver_.push_back({reader.line(), textOf(reader.fields()), "before the headings"});
-        else if (reader.line() > headerLine_)
+        else if (reader.line() > headerLine_ && (reader.fields().empty() || !textOf(reader.fields()).empty()))
             rows_.push_back({reader.line(), reader.fields()});
 }
 
@@ -194,7 +204,7 @@ void StatementTable::settleDates(const std::string& path, const StatementProfile
     const Row* monthFirst = nullptr;
     for (const Row& row : rows_) {
         const auto written = WrittenDate::read(cell(row, StatementColumn::kDate));
-        if (!written || written->hasYearFirst)
+        if (!written || written->isOrderKnown)
             continue;
         if (written->date(false).isUndefined() && !written->date(true).isUndefined() && monthFirst == nullptr)
             monthFirst = &row;
@@ -265,7 +275,7 @@ Date StatementTable::date(const Row& row) const
     if (date.isUndefined())
         throw UnusableRow(
             shown(text) + " is no date" +
-            (written && !written->hasYearFirst ? isMonthFirst_ ? " as MM/DD/YYYY" : " as DD/MM/YYYY" : ""));
+            (written && !written->isOrderKnown ? isMonthFirst_ ? " as MM/DD/YYYY" : " as DD/MM/YYYY" : ""));
     return date;
 }
 

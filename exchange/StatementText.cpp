@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <array>
 #include <charconv>
+#include <vector>
 
 namespace {
 
@@ -199,11 +200,45 @@ bool isTime(std::string_view text)
     return text.empty() || ((text.front() == ' ' || text.front() == 'T') && text.find(':') != text.npos);
 }
 
+/// 1 to 12 for the name of a month in English, German or French, or its abbreviation; otherwise 0.
+int monthNamed(const std::string& key)
+{
+    constexpr std::string_view kBegins[] = {"jan",      "feb fev", "mar mrz", "apr avr", "mai may", "jun juin",
+                                            "jul juil", "aug aou", "sep",     "oct okt", "nov",     "dec dez"};
+    constexpr std::size_t kLongest = 9; // "september"
+    for (std::size_t month = 0; month < std::size(kBegins) && key.size() <= kLongest; ++month)
+        for (const std::string_view begin : splitAtBlanks(kBegins[month]))
+            if (key.starts_with(begin))
+                return static_cast<int>(month) + 1;
+    return 0;
+}
+
+/// "5 Jan 2026", "5. Januar 2026", "05-janv.-26", "Jan 5, 2026".
+std::optional<WrittenDate> readNamed(std::string_view text)
+{
+    std::string plain(text);
+    std::ranges::replace_if(
+        plain, [](char c) { return std::string_view(".,-/").find(c) != std::string_view::npos; }, ' ');
+    const std::vector<std::string_view> words = splitAtBlanks(plain);
+    if (words.size() != 3)
+        return std::nullopt;
+    const std::size_t name = isAllDigits(words[0]) ? 1 : 0;
+    const std::string_view day = words[1 - name];
+    const std::string_view year = words[2];
+    const int month = monthNamed(wordKey(words[name]));
+    const bool isDate = month > 0 && isAllDigits(day) && day.size() <= 2 && isAllDigits(year);
+    if (!isDate || (year.size() != 2 && year.size() != 4))
+        return std::nullopt;
+    return WrittenDate{true, month, std::stoi(std::string(day)), fullYear(std::stoi(std::string(year)), year.size())};
+}
+
 } // namespace
 
 std::optional<WrittenDate> WrittenDate::read(std::string_view text)
 {
     text = withoutBlanks(text);
+    if (const auto named = readNamed(text))
+        return named;
     constexpr std::size_t kCompact = 8;
     if (isAllDigits(text) && text.size() == kCompact) {
         const std::string apart = std::string(text.substr(0, 4)) + '-' + std::string(text.substr(4, 2)) + '-';
@@ -225,19 +260,19 @@ std::optional<WrittenDate> WrittenDate::read(std::string_view text)
         if (numbers[i] < 0)
             return std::nullopt;
     }
-    const bool hasYearFirst = digits[0] == 4;
-    const std::size_t yearDigits = hasYearFirst ? 4 : digits[2];
-    const bool hasShortNumbers = digits[1] <= 2 && (hasYearFirst ? digits[2] : digits[0]) <= 2;
+    const bool isOrderKnown = digits[0] == 4;
+    const std::size_t yearDigits = isOrderKnown ? 4 : digits[2];
+    const bool hasShortNumbers = digits[1] <= 2 && (isOrderKnown ? digits[2] : digits[0]) <= 2;
     if (!isTime(text) || !hasShortNumbers || (yearDigits != 2 && yearDigits != 4))
         return std::nullopt;
-    if (hasYearFirst)
+    if (isOrderKnown)
         return WrittenDate{true, numbers[1], numbers[2], numbers[0]};
     return WrittenDate{false, numbers[0], numbers[1], fullYear(numbers[2], yearDigits)};
 }
 
 Date WrittenDate::date(bool isMonthFirst) const
 {
-    const bool swap = isMonthFirst || hasYearFirst;
+    const bool swap = isMonthFirst || isOrderKnown;
     const Date date(static_cast<short>(swap ? second : first), static_cast<short>(swap ? first : second), year);
     return date.isValid() && year > 0 ? date : Date();
 }

@@ -39,16 +39,16 @@ private:
 };
 
 /// A date as statements write it: three numbers with '/', '.' or '-' between, the year in front or at the end, perhaps
-/// with a time behind; or eight digits, with the year in front.
+/// with a time behind; eight digits, with the year in front; or with the name of the month, "5 Jan 2026".
 struct WrittenDate {
     /// Nothing for a text that does not look like a date.
     static std::optional<WrittenDate> read(std::string_view text);
 
-    /// Undefined for a day that the calendar does not have. With the year in front the month always comes before the
-    /// day.
+    /// Undefined for a day that the calendar does not have.
+    /// @param isMonthFirst makes no difference when the order is known.
     Date date(bool isMonthFirst) const;
 
-    bool hasYearFirst;
+    bool isOrderKnown; // `first` is the month: the year stands in front, or the month is a name
     int first, second; // day and month, in the order in which they stand
     int year;
 };

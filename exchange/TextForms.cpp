@@ -1,5 +1,6 @@
 #include "exchange/TextForms.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 
@@ -146,6 +147,17 @@ std::string wordKey(std::string_view utf8)
             append(&key, c);
     }
     return key.empty() ? std::string(withoutBlanks(utf8)) : key;
+}
+
+std::vector<std::string_view> splitAtBlanks(std::string_view text)
+{
+    std::vector<std::string_view> parts;
+    for (std::size_t end = 0; !text.empty(); text.remove_prefix(std::min(end + 1, text.size()))) {
+        end = std::min(text.find(' '), text.size());
+        if (end > 0)
+            parts.push_back(text.substr(0, end));
+    }
+    return parts;
 }
 
 bool isBlank(char32_t c)

@@ -2,6 +2,7 @@
 
 #include <string>
 #include <string_view>
+#include <vector>
 
 /// Text of tables that other programs wrote: which bytes it is in, and which words count as the same.
 
@@ -22,6 +23,8 @@ std::string lowerCased(std::string_view utf8);
 /// "datedoperation". Of a text without letters and digits, the text itself without blanks.
 std::string wordKey(std::string_view utf8);
 
+/// What stands between the plain blanks of `text`; refers to it.
+std::vector<std::string_view> splitAtBlanks(std::string_view text);
 /// `utf8` without blanks at its ends, no-break ones included.
 std::string_view withoutBlanks(std::string_view utf8);
 /// Whether it is a blank of any width, with a line break allowed at it or not.
