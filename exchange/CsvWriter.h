@@ -10,7 +10,8 @@
 /// A table that is written: headings, then rows of cells with commas between, quoted where they have to be, as in
 /// RFC 4180. The file appears with `commit`.
 ///
-/// A file of the name that begins with the same headings is from an earlier export, and replaced; any other stays. Whatever fails throws std::runtime_error with one line for the user.
+/// A file of the name that begins with the same headings is from an earlier export, and replaced; any other stays.
+/// Whatever fails throws std::runtime_error with one line for the user.
 class CsvWriter {
 public:
     CsvWriter(const std::string& path, const std::vector<std::string>& headings);
