@@ -5,6 +5,12 @@
 
 #include <cstring>
 
+/// A day and its value, apart from any series.
+struct DatedValue {
+    PackedDate day;
+    float value = 0;
+};
+
 /// A dated value: the price of a share, or the rate of a currency in the reference currency.
 ///
 /// The value is a 32-bit float, in memory and on file. The volume lives in memory only.

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "foundation/PackedDate.h"
+#include "market/Quote.h"
 #include "market/RecordList.h"
 
 #include <algorithm>
@@ -38,6 +39,9 @@ public:
         updatePrevisions();
         return result;
     }
+    /// Adds a quote for each of `values`, with the outcome of one `addQuote` after the other, in whatever order they
+    /// come.
+    void addQuotes(std::span<const DatedValue> values);
     /// Unlinks `q`, which from then on belongs to the caller.
     int removeQuote(SeriesQuote* q)
     {
@@ -200,6 +204,14 @@ private:
         return static_cast<float>(last.getValue() + static_cast<double>(d - last.getDate()) / span * rise);
     }
     void fitTrend() const;
+    /// Adds `q`, a new quote, if its day is behind all others; else puts it into `late`, for `replaceWith`.
+    void addBehindOrLater(SeriesQuote* q, std::vector<LateQuote>& late)
+    {
+        if (firstOnOrAfter(q->getPackedDate()) == quotes_.getNbr())
+            quotes_.addNew(q); // nothing of its day to replace
+        else
+            late.push_back({q, quotes_.reserveTurn()});
+    }
     void replaceWith(std::vector<LateQuote>& late);
 
     ManyEnd quotes_;
@@ -255,15 +267,24 @@ int QuoteSeries<Owner, SeriesQuote, ManyEnd>::readQuotes(FILE* file)
         for (unsigned i = 0; i < whole; ++i) {
             auto* q = new SeriesQuote;
             q->decode(block + i * SeriesQuote::kFileSize);
-            if (firstOnOrAfter(q->getPackedDate()) == quotes_.getNbr())
-                quotes_.addNew(q); // nothing of its day to replace
-            else
-                late.push_back({q, quotes_.reserveTurn()});
+            addBehindOrLater(q, late);
         }
         missing -= whole;
     }
     replaceWith(late);
     return missing == 0 && !reachedEnd(file) ? 0 : -1;
+}
+
+template <class Owner, class SeriesQuote, class ManyEnd>
+void QuoteSeries<Owner, SeriesQuote, ManyEnd>::addQuotes(std::span<const DatedValue> values)
+{
+    std::vector<LateQuote> late;
+    quotes_.reserve(quotes_.getNbr() + static_cast<std::uint32_t>(values.size()));
+    for (const DatedValue& value : values) {
+        auto* q = new SeriesQuote(nullptr, value.day.date(), value.value);
+        addBehindOrLater(q, late);
+    }
+    replaceWith(late);
 }
 
 template <class Owner, class SeriesQuote, class ManyEnd>

@@ -51,13 +51,14 @@ DurableSave::Result failed(DurableSave::Outcome outcome, std::string reason)
 
 } // namespace
 
-DurableSave::Result DurableSave::save(const std::string& path, const Writer& write) const
+DurableSave::Result DurableSave::save(const std::string& path, const Writer& write,
+                                      const std::optional<FileStamp>& former) const
 {
     // For as long as the save lasts, and for the device as well.
     const SizeSignalIgnored ignored;
     try {
         if (!isDevice(path))
-            return {Outcome::kSaved, "", replace(path, write)};
+            return {Outcome::kSaved, "", replace(path, write, former)};
         writeDevice(path, write);
         return {Outcome::kSaved, "", std::nullopt};
     } catch (const AtomicFile::OpenError& error) {
@@ -67,7 +68,8 @@ DurableSave::Result DurableSave::save(const std::string& path, const Writer& wri
     }
 }
 
-std::optional<FileStamp> DurableSave::replace(const std::string& path, const Writer& write) const
+std::optional<FileStamp> DurableSave::replace(const std::string& path, const Writer& write,
+                                              const std::optional<FileStamp>& former) const
 {
     AtomicFile file(path, AtomicFile::Existing::kReplace);
     fill(file.stream(), path, write);
@@ -75,7 +77,9 @@ std::optional<FileStamp> DurableSave::replace(const std::string& path, const Wri
     file.flush();
     const auto stamp = file.stamp();
     const SaveLock lock(file.target(), folder_, patience_);
-    // Asked under the lock: another program may have made the file since this save began.
+    // Asked under the lock: another program may have made or changed the file since this save began.
+    if (former && FileStamp::of(file.target()) != former)
+        throw AtomicFile::WriteError(path + ": another program has changed it meanwhile, so it is left as it is");
     if (!file.replaces()) {
         file.commit();
         return stamp;

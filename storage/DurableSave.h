@@ -32,13 +32,16 @@ public:
     {}
 
     /// Saves what `write` writes to `path`. It is called at most once, and only when the file could be opened.
+    /// @param former what `write` is based on: a file that is another one by then is not replaced.
     /// @return kWriteFailed also when the old file could not be kept, or another program did not end its save.
-    Result save(const std::string& path, const Writer& write) const;
+    Result save(const std::string& path, const Writer& write,
+                const std::optional<FileStamp>& former = std::nullopt) const;
 
 private:
     static constexpr SaveLock::Patience kPatience{10000}; // longer than a slow disk takes to copy a large file
 
-    std::optional<FileStamp> replace(const std::string& path, const Writer& write) const;
+    std::optional<FileStamp> replace(const std::string& path, const Writer& write,
+                                     const std::optional<FileStamp>& former) const;
 
     DataFolder folder_;
     SaveLock::Patience patience_;

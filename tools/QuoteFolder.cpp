@@ -1,8 +1,8 @@
 #include "tools/QuoteFolder.h"
 
+#include "exchange/MarketImport.h"
+#include "exchange/Table.h"
 #include "net/QuoteServers.h"
-#include "tools/Importer.h"
-#include "tools/Table.h"
 
 #include <optional>
 #include <ostream>
@@ -49,14 +49,24 @@ std::string QuoteFolder::answer(std::string_view request) const
 /// Of two prices of a day the later line counts.
 Closes QuoteFolder::closesOf(std::string_view ticker) const
 {
+    constexpr std::size_t kRefusedTold = 20;
     Closes closes;
+    std::size_t refused = 0;
     const std::filesystem::path file = folder_ / (std::string(ticker) + ".csv");
     std::error_code error;
     if (!isFileName(ticker) || !std::filesystem::exists(file, error))
         return closes;
     try {
         Table table(file, kQuotesOfOneTicker);
-        table.forEach([&] { closes.insert_or_assign(table.date(), table.value(false)); }, log_);
+        TableWatch watch;
+        watch.refused = [&](const std::string& path, unsigned long line, const std::string& reason) {
+            // At each request anew: the first say enough.
+            if (++refused <= kRefusedTold)
+                log_ << path << ", line " << line << ": " << reason << '\n';
+        };
+        table.forEach([&] { closes.insert_or_assign(table.date(), table.value(false)); }, watch);
+        if (refused > kRefusedTold)
+            log_ << file.string() << ": ... and " << refused - kRefusedTold << " more\n";
     } catch (const std::runtime_error& reason) {
         // What stands before the damage is served all the same.
         log_ << reason.what() << '\n';

@@ -2,6 +2,7 @@
 
 #include "foundation/DateText.h"
 #include "foundation/NumberText.h"
+#include "foundation/PrintableText.h"
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "portfolio/Account.h"

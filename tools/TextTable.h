@@ -1,13 +1,8 @@
 #pragma once
 
 #include <string>
-#include <string_view>
 #include <utility>
 #include <vector>
-
-/// `bytes` as one line of UTF-8 for a terminal: what is no printable character of UTF-8 becomes '?', and what would
-/// take more than 60 columns is cut with "...". Needs a UTF-8 locale for what lies outside ASCII.
-std::string printable(std::string_view bytes);
 
 /// A table in columns as wide as their widest cell, for a terminal.
 class TextTable {

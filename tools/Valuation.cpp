@@ -1,8 +1,8 @@
 #include "tools/Valuation.h"
 
+#include "foundation/PrintableText.h"
 #include "portfolio/WalletDiagnosis.h"
 #include "storage/InputFile.h"
-#include "tools/TextTable.h"
 #include "valuation/State.h"
 
 #include <algorithm>
@@ -22,7 +22,8 @@ Valuation::Valuation(const std::string& marketPath, const std::string& portfolio
 {
     // In this order: the portfolio's names are looked up in the market data.
     readMarket();
-    readPortfolio();
+    if (!portfolioPath.empty())
+        readPortfolio();
 }
 
 void Valuation::readMarket()

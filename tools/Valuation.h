@@ -15,7 +15,7 @@ class State;
 /// Whatever fails throws std::runtime_error with one line for the user that names the file and what is wrong with it.
 class Valuation {
 public:
-    /// Reads both files.
+    /// Reads both files; an empty path stands for a portfolio without anything in it.
     Valuation(const std::string& marketPath, const std::string& portfolioPath);
 
     /// Values the portfolio on `date`, a valid one: with automatic sales when `previsions` is set, with every day from
@@ -24,6 +24,8 @@ public:
 
     const Catalogue& catalogue() const { return catalogue_; }
     const Wallet& wallet() const { return wallet_; }
+    /// To be changed; what was computed before is of no use then.
+    Wallet& wallet() { return wallet_; }
     const State& state() const { return *state_; }
     Totals totals() const { return {*state_, catalogue_}; }
     bool hasEvolution() const { return hasEvolution_; }

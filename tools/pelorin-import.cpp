@@ -1,110 +1,80 @@
-#include "market/Catalogue.h"
-#include "storage/AtomicFile.h"
-#include "tools/Importer.h"
-#include "tools/Program.h"
+#include "tools/ImportMode.h"
 
-#include <iostream>
-#include <string>
+#include <algorithm>
 #include <vector>
 
 namespace {
 
-const char* const kUnits = "units-per-reference";
-const char* const kValues = "value-in-reference";
-
-const char* const kPurpose = "Makes a Pelorin market file of tables of quotes and exchange rates.\n"
-                             "Example: pelorin-import Companies/World --quotes prices.csv.gz --rates rates.csv.gz";
+const char* const kPurpose =
+    "Makes a Pelorin market file of tables of quotes and exchange rates, or adds them to one.\n"
+    "Adds the operations of a statement to a portfolio file. Makes files of the tables of an export.\n"
+    "Example: pelorin-import Companies/World --quotes prices.csv.gz --rates rates.csv.gz\n"
+    "         pelorin-import --into Companies/World --quotes today.csv --dry-run\n"
+    "         pelorin-import --operations june.csv --portfolio PortoFolios/Mine --market Companies/World\n"
+    "         pelorin-import --from tables --into Companies/World --portfolio PortoFolios/Mine";
 
 const char* const kTables = R"(The tables are CSV files, plain or gzipped, with ',', ';' or tab between the fields:
   quotes   date,ticker,close, or a header line that names these columns and perhaps market, currency and
-           name, in any order; usual headings are known (Date, Symbol, Close, Price, Exchange, ...)
-  rates    date,currency,rate, likewise
+           name, in any order; usual headings are known (Date, Symbol, Close, Price, Exchange, ...);
+           or wide, a column a ticker: Date,AAPL,MSFT,...
+  rates    date,currency,rate, likewise; or wide, as central banks publish them: Date,USD,JPY,...
   listing  ticker,market,currency,name, likewise; cells may be empty
-Only ordinary files are read, no pipes. Dates are YYYY-MM-DD or DD/MM/YYYY. Numbers may have a decimal comma where
-commas do not separate the fields.
+In a wide table an empty cell, N/A, NA or - is no value. Only ordinary files are read, no pipes. Dates are YYYY-MM-DD
+or DD/MM/YYYY. Numbers may have a decimal comma where commas do not separate the fields.
 What a row of the quotes says comes before the listing, the listing before the options. Of two values for the same
 day the later line counts. A line that cannot be used is reported with its number and skipped.
+
+--into adds to a file: a day that has a value gets the new one, and all else in the file stays as it is. Companies
+are found by market and ticker, or by the ticker alone where no table tells the market and the file has one company
+of it. What is new comes behind what is there. The former version is kept in the data folder's Backups, as by a save
+of the window. Load the file again in a window that shows it.
 
 Market files hold the price of one unit of a currency in the reference currency. Rates are published the other way
 round as a rule, as units of the currency per unit of the reference, and are inverted: so are those under a heading
 like units_per_eur, and those of which neither a heading nor --rates-are says anything. The reference currency itself
-gets the rate 1.
+gets the rate 1. Quotes in a currency that has no rate are refused: they would be worth nothing.
 
-Exit status: 0, 1 when a file cannot be read or written, 2 for bad arguments.)";
+Standard output has what is new, changed and equal, and how many lines were refused; --dry-run stops there.
 
-struct Arguments {
-    std::string output;
-    std::vector<std::string> quotes;
-    std::vector<std::string> rates;
-    std::vector<std::string> listings;
-    std::string ratesAre;
-    bool force = false;
-    ImportOptions import;
-};
+Statements (--operations) have headings in one of their first lines: Date,Type,Account,To Account,Market,Ticker,
+Quantity,Quote,Amount,Cost,Rate Cost,From Quote,To Quote, or Name, Debit, Credit, Currency, in any order; usual headings
+and words in English, German and French are known. Either all lines are booked or, when one is refused, none.
 
-void describe(CLI::App& app, Arguments& arguments)
+Tables that pelorin-export has written (--from) become files that value to the same figures. Into files that are there
+they bring what is new and the values of days; what is booked already is passed over.
+
+Exit status: 0, 1 when a file cannot be read, written or added to or a line of a statement is refused, 2 for bad
+arguments.)";
+
+void describe(CLI::App& app, ImportArguments& arguments)
 {
-    ImportOptions& import = arguments.import;
     app.footer(kTables);
-    app.add_option("OUTPUT", arguments.output, "Market file to write; comes first")->required();
-    app.add_option("--quotes", arguments.quotes, "Tables of closing prices")->type_name("FILE");
-    app.add_option("--rates", arguments.rates, "Tables of exchange rates")->type_name("FILE");
-    app.add_option("--listing", arguments.listings, "Tables that tell market, currency and name of tickers")
-        ->type_name("FILE");
-    addText(app, "--reference", import.reference, "SYMBOL",
-            "Currency that the rates refer to; without it EUR, or when there are no rates the --currency");
-    app.add_option("--rates-are", arguments.ratesAre, "How the rates are meant; see below")
-        ->check(CLI::IsMember({kUnits, kValues}));
-    addText(app, "--currency", import.currency, "SYMBOL", "Currency of the markets that no table tells it of")
-        ->capture_default_str();
-    addText(app, "--market", import.market, "NAME", "Market of the tickers that no table tells it of")
-        ->capture_default_str();
-    app.add_flag("--ticker-from-name", import.tickerFromName,
-                 "The quotes are of one ticker a file, which the file's name tells (AAPL.csv: date,close)");
-    app.add_flag("--force", arguments.force, "Replace OUTPUT when it exists");
-}
-
-void run(const CLI::App& app, Arguments& arguments)
-{
-    if (arguments.quotes.empty() && arguments.rates.empty())
-        throw CLI::RequiredError("--quotes or --rates");
-    if (app.count("--reference") == 0 && arguments.rates.empty())
-        arguments.import.reference = arguments.import.currency;
-    if (!arguments.ratesAre.empty())
-        arguments.import.ratesAreUnits = arguments.ratesAre == kUnits;
-    const auto existing = arguments.force ? AtomicFile::Existing::kReplace : AtomicFile::Existing::kKeep;
-    // Before anything is read: the tables may take minutes, and the writing would fail only then.
-    AtomicFile::check(arguments.output, existing);
-
-    Catalogue catalogue;
-    Importer importer(arguments.import, catalogue, std::cerr);
-    // In this order whatever that of the options: listings say where the tickers of the quotes belong, and currencies
-    // stand in the file in the order of their first mention.
-    for (const std::string& path : arguments.listings)
-        importer.addListing(path);
-    for (const std::string& path : arguments.rates)
-        importer.addRates(path);
-    for (const std::string& path : arguments.quotes)
-        importer.addQuotes(path);
-    // The records bear a date; that of the data makes the same input give the same file on any day.
-    const Date stamp = importer.finish();
-    AtomicFile file(arguments.output, existing);
-    if (catalogue.wrt(file.stream(), stamp) != 0)
-        file.fail("cannot be written");
-    file.commit();
-    const ImportCounts& counts = importer.counts();
-    std::cerr << "companies: " << counts.companies << ", quotes: " << counts.quotes
-              << ", currencies: " << counts.currencies << ", rates: " << counts.rates
-              << ", skipped lines: " << counts.skipped << ", values replaced by a later line: " << counts.replaced
-              << '\n';
+    auto* output = app.add_option("OUTPUT", arguments.output, "Market file to make; comes first");
+    addText(app, "--into", arguments.into, "FILE", "Market file to add to; with --from it may be missing")
+        ->excludes(output);
+    addText(app, "--market", arguments.market, "NAME",
+            "Market of the tickers that no table tells it of; without it NYSE. With --operations the market file");
+    addText(app, "--portfolio", arguments.portfolio, "FILE", "Portfolio file to add to");
+    app.add_flag("--dry-run", arguments.dryRun, "Write nothing, only tell what would be new, changed, equal, refused");
+    app.add_flag("--force", arguments.force, "Replace OUTPUT when it exists")->needs(output);
 }
 
 } // namespace
 
 int main(int argc, char** argv)
 {
-    Arguments arguments;
     CLI::App app(kPurpose, "pelorin-import");
+    ImportArguments arguments;
     describe(app, arguments);
-    return runProgram(app, argc, argv, [&] { run(app, arguments); });
+    // The first that is meant is taken; tables are always meant, and so come last.
+    std::vector<std::unique_ptr<ImportMode>> modes;
+    modes.push_back(importOperations());
+    modes.push_back(importFolder());
+    modes.push_back(importTables());
+    for (const auto& mode : modes)
+        mode->describe(app);
+    return runProgram(app, argc, argv, [&] {
+        const auto isMeant = [&](const auto& mode) { return mode->isMeant(app); };
+        (*std::ranges::find_if(modes, isMeant))->run(app, arguments);
+    });
 }

@@ -77,6 +77,18 @@ void changeASeriesAtRandom()
         ASSERT_EQ(owner.getQuote(day, &found), expected != sorted.end() ? 0 : -1) << "turn " << turn;
         ASSERT_EQ(found, expected != sorted.end() ? *expected : nullptr) << "turn " << turn;
     }
+    // Many at once give what one after the other does.
+    Owner atOnce;
+    Owner oneByOne;
+    for (int batch = 0; batch < 5; ++batch) {
+        std::vector<DatedValue> values(40);
+        for (DatedValue& value : values) {
+            value = {anyDay(), anyValue()};
+            new AnyQuote(&oneByOne, value.day.date(), value.value);
+        }
+        atOnce.addQuotes(values);
+        ASSERT_EQ(atOnce.quoteRecords(), oneByOne.quoteRecords()) << "batch " << batch;
+    }
 }
 
 } // namespace

@@ -110,6 +110,21 @@ TEST_F(DurableSaveTest, GivesTheOldFileOrTheNewOneAndSaysWhich)
     }
 }
 
+TEST_F(DurableSaveTest, AFileThatIsNoLongerTheFormerOneStays)
+{
+    const std::string path = folder_.write("files/f", "old");
+    const auto former = FileStamp::of(path);
+    EXPECT_EQ(save_.save(path, writeNew, former).outcome, kSaved);
+    EXPECT_EQ(save_
+                  .save(
+                      path, [](FILE*) { return 0; }, former)
+                  .outcome,
+              kWriteFailed)
+        << "it is the new one by now";
+    EXPECT_EQ(folder_.content("files/f"), "new");
+    EXPECT_EQ(names("f"), "f 1");
+}
+
 TEST_F(DurableSaveTest, DealsWithWhateverThePathLeadsTo)
 {
     folder_.write("folder/file", "old");

@@ -18,6 +18,7 @@ TEST(ProgramsTest, FailureIsOneLineThatNamesTheReasonAndMakesNoFile)
     std::filesystem::rename(folder / "data/PortoFolios/Sample", folder / "wallet");
     folder.write("short", folder.content("wallet").substr(0, 200));
     folder.write("file", "x");
+    folder.write("bare", std::string(8, '\0'));
     folder.write("IBM.csv", "Date,Close\n2005-01-03,97.75\n");
     folder.write("r.csv", "2005-01-03,USD,1.25\n");
     const ServerRun server(PELORIN_QUOTES, folder.path);
@@ -49,6 +50,16 @@ TEST(ProgramsTest, FailureIsOneLineThatNamesTheReasonAndMakesNoFile)
         {PELORIN_IMPORT, "new --rates none.csv", 1, "none.csv: "},
         {PELORIN_IMPORT, "new --quotes IBM.csv", 1, "IBM.csv"},
         {PELORIN_IMPORT, "market --rates r.csv", 1, "market: exists already and is left as it is\n"},
+        {PELORIN_IMPORT, "market --into market --rates r.csv", 2, "--into"},
+        {PELORIN_IMPORT, "--rates r.csv", 2, "--into"},
+        {PELORIN_IMPORT, "--into none --rates r.csv", 1, "without --into a new file is made"},
+        {PELORIN_IMPORT, "--into wallet --rates r.csv", 1, "wallet: this is a portfolio file\n"},
+        {PELORIN_IMPORT, "--into short --rates r.csv", 1, "short: "},
+        {PELORIN_IMPORT, "--into market --rates r.csv --reference CHF", 1, "\"CHF\" as --reference says"},
+        {PELORIN_IMPORT, "--into bare --rates r.csv", 1, "bare: has no reference currency; --reference tells"},
+        {PELORIN_IMPORT, "--into market --quotes IBM.csv --ticker-from-name --market X --currency XXX", 1,
+         "no rate of \"XXX\", in which \"IBM\" is quoted: add a table with its --rates"},
+        {PELORIN_IMPORT, "new --quotes IBM.csv --ticker-from-name --reference EUR", 1, "--reference of a new file"},
     };
     for (const auto& c : cases) {
         const ToolRun run(c.program, c.arguments, folder);

@@ -1,12 +1,11 @@
-#include "tools/Table.h"
+#include "exchange/Table.h"
 
 #include "foundation/DateText.h"
-#include "tools/TextTable.h"
+#include "foundation/PrintableText.h"
 
 #include <algorithm>
 #include <charconv>
 #include <limits>
-#include <ostream>
 
 namespace {
 
@@ -55,8 +54,10 @@ Table::Table(const std::string& path, const TableForm& form) : path_(path), read
         mostFields_ = form.plain.size();
         for (std::size_t i = 0; i < mostFields_; ++i)
             place(form.plain[i]) = i;
-    }
-    for (std::size_t i = 0; i < form.required; ++i)
+    } else if (form.mayBeWide)
+        takeWideColumns(form);
+    // The columns of a wide table stand for all that a plain one must have behind the date.
+    for (std::size_t i = 0; i < form.required && wide_.empty(); ++i)
         if (!has(form.plain[i]))
             throw std::runtime_error(path + ": the header line names no column for the " + describe(form.plain[i]));
     // The header line is no row: the first one is behind it. Without a header the record read is a row.
@@ -90,6 +91,20 @@ bool Table::takeHeader(const TableForm& form)
     return found > 1 || has(Column::kDate);
 }
 
+/// Takes the table for a wide one if it has dates and nothing else that a plain one must have.
+void Table::takeWideColumns(const TableForm& form)
+{
+    const auto isThere = [this](Column column) { return has(column); };
+    if (!has(Column::kDate) || std::any_of(form.plain.begin() + 1, form.plain.end(), isThere))
+        return;
+    // Afterwards `wide_` has all columns with a heading but those that say something of the whole row.
+    const auto& fields = reader_.fields();
+    for (std::size_t i = 0; i < fields.size(); ++i)
+        if (const std::string_view name = trimmed(fields[i]);
+            !name.empty() && std::ranges::find(places_, i) == places_.end())
+            wide_.push_back({i, std::string(name)});
+}
+
 std::string Table::headingOf(std::string_view text)
 {
     std::string heading;
@@ -99,38 +114,46 @@ std::string Table::headingOf(std::string_view text)
     return heading;
 }
 
-std::size_t Table::forEach(const std::function<void()>& take, std::ostream& log)
+std::size_t Table::forEach(const std::function<void()>& take, const TableWatch& watch)
 {
-    std::size_t rejected = 0;
+    constexpr std::size_t kRowsOfAStep = 4096;
+    std::size_t refused = 0;
     // A row that throws leaves the table as it was: the next one is read as if this one had never been there. Other
     // errors are the file's, and end the reading.
-    for (; more_; more_ = reader_.next())
+    for (std::size_t row = 0; more_; more_ = reader_.next(), ++row) {
+        if (row % kRowsOfAStep == 0 && watch.progress)
+            watch.progress(path_, reader_.progress());
         try {
             checkFit();
             take();
         } catch (const UnusableRow& reason) {
-            if (++rejected <= kLinesTold)
-                log << path_ << ", line " << reader_.line() << ": " << reason.what() << '\n';
+            ++refused;
+            if (watch.refused)
+                watch.refused(path_, reader_.line(), reason.what());
         }
-    if (rejected > kLinesTold)
-        log << path_ << ": ... and " << rejected - kLinesTold << " more\n";
-    return rejected;
+    }
+    return refused;
 }
 
 void Table::checkFit() const
 {
     // The reader gives no fields for a line that it could not cut; an empty line never comes here.
     if (reader_.fields().empty())
-        throw UnusableRow("has a quote that is not closed, or is too long");
+        throw UnusableRow("has text behind a closing quote");
     for (std::size_t i = mostFields_; i < reader_.fields().size(); ++i)
         if (!reader_.fields()[i].empty())
             throw UnusableRow("has too many fields for a table without a header line");
 }
 
-std::string_view Table::cell(Column column) const
+std::string_view Table::field(std::size_t i) const
 {
-    const std::size_t i = place(column);
     return i < reader_.fields().size() ? trimmed(reader_.fields()[i]) : std::string_view();
+}
+
+std::string_view Table::cell(const WideColumn& column) const
+{
+    const std::string_view text = field(column.index);
+    return text == "N/A" || text == "NA" || text == "-" ? std::string_view() : text;
 }
 
 Date Table::date() const
@@ -142,9 +165,9 @@ Date Table::date() const
     return *date;
 }
 
-float Table::value(bool inverted)
+float Table::value(std::string_view cell, bool inverted)
 {
-    std::string text(cell(Column::kValue));
+    std::string text(cell);
     const std::size_t place = text.find_first_of(".,");
     const char mark = place != text.npos ? text[place] : decimalMark_;
     const bool isAllowed =
@@ -160,5 +183,5 @@ float Table::value(bool inverted)
     }
     // The mark stays as it was: a number that is refused settles nothing.
     const char expected = decimalMark_ == '\0' ? '.' : decimalMark_;
-    throw UnusableRow(shown(cell(Column::kValue)) + " is no positive number with decimal '" + expected + "'");
+    throw UnusableRow(shown(cell) + " is no positive number with decimal '" + expected + "'");
 }

@@ -1,12 +1,11 @@
 #pragma once
 
+#include "exchange/CsvReader.h"
 #include "foundation/Date.h"
-#include "tools/CsvReader.h"
 
 #include <array>
 #include <cstddef>
 #include <functional>
-#include <iosfwd>
 #include <stdexcept>
 #include <string>
 #include <string_view>
@@ -26,11 +25,20 @@ struct TableForm {
     std::vector<Headings> headings;
     std::vector<Column> plain; // the columns of a table without a header line
     std::size_t required;      // so many of the plain ones, the first, must be there
+    /// Whether it may be wide: a date, and then a column a ticker or currency, headed by its name, with the values.
+    bool mayBeWide = false;
 };
 
 /// Why a row cannot be used, in words that go on from "line 7: ".
 struct UnusableRow : std::runtime_error {
     using std::runtime_error::runtime_error;
+};
+
+/// Who follows the reading of tables: is told, perhaps, of each row that cannot be used, and now and then how much of
+/// the file has been read, from 0 to 1.
+struct TableWatch {
+    std::function<void(const std::string& path, unsigned long line, const std::string& reason)> refused;
+    std::function<void(const std::string& path, double part)> progress;
 };
 
 /// The rows of a table file, each column where the header line says, or where it is in the table's plain form.
@@ -39,10 +47,17 @@ public:
     /// Throws std::runtime_error for a file that cannot be read, and for a header line that lacks a required column.
     Table(const std::string& path, const TableForm& form);
 
-    /// Calls `take` for every row. A row for which it throws UnusableRow is told on the log with its line number; of
-    /// more than `kLinesTold` only the first. @return how many of them.
-    std::size_t forEach(const std::function<void()>& take, std::ostream& log);
-    static constexpr std::size_t kLinesTold = 20;
+    /// Calls `take` for every row. One for which it throws UnusableRow is refused, and the next one taken.
+    /// @return how many were refused.
+    std::size_t forEach(const std::function<void()>& take, const TableWatch& watch);
+
+    /// A column of a wide table: the ticker or currency of its values, as the heading has it.
+    struct WideColumn {
+        std::size_t index;
+        std::string name;
+    };
+    /// Empty unless the table is wide.
+    const std::vector<WideColumn>& wideColumns() const { return wide_; }
 
     bool has(Column column) const { return place(column) != kNowhere; }
     /// The heading of the value column; empty without a header line.
@@ -53,14 +68,17 @@ public:
     // Of the row, for `take`:
 
     /// The field without blanks around it; empty when there is none.
-    std::string_view cell(Column column) const;
+    std::string_view cell(Column column) const { return field(place(column)); }
+    /// The same of a column of a wide table; empty also for what stands for no value there: "N/A", "NA" and "-".
+    std::string_view cell(const WideColumn& column) const;
     Date date() const;
-    /// The positive finite number under `Column::kValue`, or its inverse, as a float.
+    /// The positive finite number that `cell` is, or its inverse, as a float.
     ///
     /// Where commas do not separate the fields, the file's first number with a decimal mark settles whether that is '.'
     /// or ','. From then on the other one makes a number unusable, since it may as well separate thousands: "1.234"
     /// would be wrong by a factor of 1000.
-    float value(bool inverted);
+    float value(std::string_view cell, bool inverted);
+    float value(bool inverted) { return value(cell(Column::kValue), inverted); }
 
 private:
     static constexpr std::size_t kNowhere = ~std::size_t{0};
@@ -69,6 +87,8 @@ private:
     std::size_t& place(Column column) { return places_[static_cast<std::size_t>(column)]; }
     std::size_t place(Column column) const { return places_[static_cast<std::size_t>(column)]; }
     bool takeHeader(const TableForm& form);
+    void takeWideColumns(const TableForm& form);
+    std::string_view field(std::size_t i) const;
     void checkFit() const;
 
     std::string path_;
@@ -77,6 +97,7 @@ private:
     std::array<std::size_t, kColumns> places_;
     std::size_t mostFields_ = kNowhere;
     std::string valueHeading_;
+    std::vector<WideColumn> wide_;
     char decimalMark_ = '\0'; // not settled yet
 };
 

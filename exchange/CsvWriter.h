@@ -1,0 +1,36 @@
+#pragma once
+
+#include "storage/AtomicFile.h"
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <vector>
+
+/// A table that is written: headings, then rows of cells with commas between, quoted where they have to be, as in
+/// RFC 4180. The file appears with `commit`.
+///
+/// A file of the name that begins with the same headings is from an earlier export, and replaced; any other stays.
+/// Whatever fails throws std::runtime_error with one line for the user.
+class CsvWriter {
+public:
+    CsvWriter(const std::string& path, const std::vector<std::string>& headings);
+
+    /// @return false for a row that a reader would find too long; it is not written.
+    bool add(const std::vector<std::string>& cells);
+    /// Throws when anything of the table could not be written.
+    void commit() { file_.commit(); }
+
+    const std::string& path() const { return path_; }
+    std::size_t rows() const { return rows_; }
+
+private:
+    std::string path_;
+    std::size_t rows_ = 0;
+    std::string line_;
+    AtomicFile file_;
+};
+
+/// Whether there may be a new file at `path`: there is none yet, an empty one, or one whose first line is
+/// `firstLine`. Throws std::runtime_error otherwise.
+void checkReplaceable(const std::string& path, std::string_view firstLine);

@@ -1,0 +1,182 @@
+#include "exchange/MarketFile.h"
+
+#include "foundation/FieldIO.h"
+#include "foundation/PrintableText.h"
+#include "market/MarketDiagnosis.h"
+#include "market/NoteCompanyEvent.h"
+#include "market/RecordList.h"
+#include "market/SplitCompanyEvent.h"
+
+#include <algorithm>
+#include <stdexcept>
+
+namespace {
+
+/// Goes over the former file and the catalogue side by side. The catalogue has all that the file has, in its order, and
+/// behind that what is new.
+class Copy {
+public:
+    Copy(FILE* from, FILE* to, const MarketPlan::Owners& changed, const Date& stamp)
+        : from_(from), to_(to), changed_(changed), stamp_(stamp)
+    {}
+
+    /// From the count of the currencies on. @return whether all has been read and written.
+    bool run(const std::vector<Currency*>& currencies)
+    {
+        copyRecords(
+            currencies, [this](const Currency& currency) { copyCurrency(currency); },
+            [this](const Currency& currency) { currency.wrt(to_, stamp_); });
+        // What stands behind the last record is nothing that a reader asks for, but it is the user's.
+        copyRest();
+        return !hasFailed_ && std::ferror(from_) == 0 && std::ferror(to_) == 0;
+    }
+
+private:
+    /// A list of which the first records are in the file, and the others are new.
+    template <class Records, class CopyRecord, class WriteRecord>
+    void copyRecords(const Records& records, const CopyRecord& copyRecord, const WriteRecord& writeRecord)
+    {
+        const auto known = std::min(static_cast<std::size_t>(static_cast<unsigned>(freadint(from_))), records.size());
+        fwriteint(to_, static_cast<int>(records.size()));
+        for (std::size_t i = 0; i < records.size(); ++i)
+            if (i < known)
+                copyRecord(*records[i]);
+            else
+                writeRecord(*records[i]);
+    }
+
+    void copyCurrency(const Currency& currency)
+    {
+        Date former;
+        former.rd(from_);
+        stamp_.wrt(to_);
+        copyString();
+        copyString();
+        copyRecords(
+            currency.markets(), [this](const Market& market) { copyMarket(market); },
+            [this](const Market& market) { market.wrt(to_); });
+        copyQuotes(currency);
+    }
+
+    void copyMarket(const Market& market)
+    {
+        copyString();
+        copyRecords(
+            market.companies(), [this](const Company& company) { copyCompany(company); },
+            [this](const Company& company) { company.wrt(to_); });
+    }
+
+    void copyCompany(const Company& company)
+    {
+        copyString();
+        copyString();
+        copyQuotes(company);
+        for (auto events = copyCount(); events > 0 && !hasFailed_; --events)
+            copyEvent();
+    }
+
+    template <class Series>
+    void copyQuotes(const Series& series)
+    {
+        const auto former = std::uint64_t{static_cast<unsigned>(freadint(from_))} * Quote::kFileSize;
+        if (changed_.contains(&series)) {
+            fseeko(from_, static_cast<off_t>(former), SEEK_CUR);
+            fwriteint(to_, static_cast<int>(series.getNbrQuotes()));
+            const std::string records = series.quoteRecords();
+            std::fwrite(records.data(), 1, records.size(), to_);
+            return;
+        }
+        fwriteint(to_, static_cast<int>(former / Quote::kFileSize));
+        copyBytes(former);
+    }
+
+    void copyEvent()
+    {
+        const unsigned short type = freadshort(from_);
+        fwriteshort(to_, type);
+        // An event of any other type has no body.
+        if (type == SplitCompanyEvent::kType)
+            copyBytes(Date::kFileSize + 2 * sizeof(std::uint16_t));
+        if (type == NoteCompanyEvent::kType) {
+            copyBytes(Date::kFileSize);
+            copyString();
+            copyString();
+        }
+    }
+
+    unsigned copyCount()
+    {
+        const int count = freadint(from_);
+        fwriteint(to_, count);
+        return static_cast<unsigned>(count);
+    }
+
+    void copyString() { copyBytes(copyCount()); }
+
+    void copyBytes(std::uint64_t missing)
+    {
+        while (missing > 0 && !hasFailed_) {
+            const std::size_t wanted = std::min<std::uint64_t>(missing, sizeof block_);
+            const std::size_t got = std::fread(block_, 1, wanted, from_);
+            hasFailed_ = got != wanted || std::fwrite(block_, 1, got, to_) != got;
+            missing -= got;
+        }
+    }
+
+    void copyRest()
+    {
+        while (const std::size_t got = std::fread(block_, 1, sizeof block_, from_))
+            std::fwrite(block_, 1, got, to_);
+    }
+
+    FILE* from_;
+    FILE* to_;
+    const MarketPlan::Owners& changed_;
+    const Date& stamp_;
+    bool hasFailed_ = false; // the file is not the one that was read
+    char block_[1 << 16];
+};
+
+} // namespace
+
+MarketFile::MarketFile(const std::string& path) : file_(path), stamp_(FileStamp::of(fileno(file_.stream())))
+{
+    read();
+}
+
+/// Not by `Catalogue::rd`: of several currencies with the reference's symbol each would divide the rates of the others,
+/// and these are to stay as they stand in the file. The first is the reference here.
+void MarketFile::read()
+{
+    FILE* file = file_.stream();
+    const auto readCurrency = [&] {
+        auto currency = std::make_unique<Currency>();
+        Date stamp;
+        if (currency->rd(file, &stamp) != 0)
+            return -1;
+        if (stamp.isValid())
+            latestStamp_ = std::max(latestStamp_, stamp);
+        catalogue_.addCurrency(currency.release());
+        return 0;
+    };
+    // A portfolio begins with a date, a market file with the length of a text. A large portfolio could be read a long
+    // way before it did not fit.
+    Date head;
+    head.rd(file);
+    std::rewind(file);
+    if (head.isValid() || reference_.rd(file) != 0 || readRecords(file, readCurrency) != 0)
+        throw std::runtime_error(file_.path() + ": " + faultOfMarketFile(file, printable));
+    if (!reference_.isUndefined())
+        catalogue_.setReferenceCurrency(catalogue_.getCurrencyByRepresentation(reference_));
+}
+
+int MarketFile::write(FILE* to, const MarketPlan::Owners& changed, const Date& stamp) const
+{
+    std::rewind(file_.stream());
+    String head;
+    head.rd(file_.stream());
+    // A file that named no reference gets the one that the import was told of.
+    const bool isNamed = !reference_.isUndefined() || catalogue_.getReferenceCurrency() == nullptr;
+    (isNamed ? reference_ : catalogue_.getReferenceCurrency()->getRepresentation()).wrt(to);
+    return Copy(file_.stream(), to, changed, stamp).run(catalogue_.getCurrencies()) ? 0 : -1;
+}

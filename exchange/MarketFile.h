@@ -1,0 +1,42 @@
+#pragma once
+
+#include "exchange/MarketPlan.h"
+#include "market/Catalogue.h"
+#include "storage/FileStamp.h"
+#include "storage/InputFile.h"
+
+#include <optional>
+
+/// A market data file that is there, to be added to: what it holds, and the writing of it anew.
+///
+/// What nothing was added to is written byte by byte as it stands in the file, and not as the model has it: a series
+/// that is not in order, or has a day twice, is one that nobody has asked to change.
+class MarketFile {
+public:
+    /// Reads the file. Throws std::runtime_error with one line for the user when it is no market data file, or not
+    /// whole.
+    explicit MarketFile(const std::string& path);
+
+    Catalogue& catalogue() { return catalogue_; }
+    /// The symbol of the reference as the file names it, even when it has no currency of that symbol; empty when it
+    /// names none.
+    std::string reference() const { return std::string(reference_.comparedBytes()); }
+    /// The latest of the dates that the currencies bear; undefined when none has a real one.
+    const Date& latestStamp() const { return latestStamp_; }
+    /// Tells the file as it was read from what another program may have put in its place since.
+    const std::optional<FileStamp>& stamp() const { return stamp_; }
+
+    /// Writes the file with what a plan has added to the catalogue. `changed` are those of whose quotes or rates some
+    /// are other than in the file; all else that the file has is copied from it.
+    /// @return 0; -1 when reading or writing fails.
+    int write(FILE* to, const MarketPlan::Owners& changed, const Date& stamp) const;
+
+private:
+    void read();
+
+    InputFile file_;
+    std::optional<FileStamp> stamp_;
+    Catalogue catalogue_;
+    String reference_;
+    Date latestStamp_;
+};

@@ -1,0 +1,70 @@
+#include "exchange/TableNames.h"
+
+#include "exchange/TableText.h"
+#include "exchange/UniqueNames.h"
+#include "foundation/PrintableText.h"
+#include "market/Catalogue.h"
+#include "market/Currency.h"
+#include "market/Market.h"
+#include "portfolio/Wallet.h"
+
+namespace {
+
+constexpr const char* kEmptyName = "\\"; // no text is escaped so
+
+} // namespace
+
+/// Gives names to what must not be mixed up with each other.
+class TableNames::Taker {
+public:
+    Taker(TableNames* all, const char* kind) : all_(*all), kind_(kind) {}
+
+    template <class T>
+    void take(const T& object, const String& name)
+    {
+        const std::string& taken = unique_.take(cleanName(name.bytes()));
+        all_.names_.emplace(&object, taken);
+        if (taken != name.bytes())
+            all_.changes_.push_back(std::string("a ") + kind_ + " called \"" + printable(name.bytes()) + "\" is \"" +
+                                    printable(taken) + "\" in the tables");
+    }
+
+private:
+    TableNames& all_;
+    const char* kind_;
+    UniqueNames unique_{" #"};
+};
+
+TableNames::TableNames(const Catalogue& catalogue, const Wallet* wallet)
+{
+    Taker symbols(this, "currency");
+    for (const Currency* currency : catalogue.getCurrencies()) {
+        symbols.take(*currency, currency->getRepresentation());
+        Taker markets(this, "market");
+        for (const Market* market : currency->markets()) {
+            markets.take(*market, market->getName());
+            Taker tickers(this, "company");
+            for (const Company* company : market->companies())
+                tickers.take(*company, company->getAbbreviation());
+        }
+    }
+    if (wallet == nullptr)
+        return;
+    Taker accounts(this, "account");
+    for (const Account* account : wallet->accounts())
+        accounts.take(*account, account->getName());
+}
+
+std::string TableNames::original(const String& name, const std::string& inTables)
+{
+    if (name.bytes() == inTables)
+        return {};
+    return name.isUndefined() ? kEmptyName : escaped(name.bytes());
+}
+
+std::string TableNames::originalOf(const std::string& cell, const std::string& inTables)
+{
+    if (cell.empty())
+        return inTables;
+    return cell == kEmptyName ? std::string() : unescaped(cell);
+}

@@ -1,0 +1,220 @@
+#include "exchange/MarketFile.h"
+#include "exchange/MarketImport.h"
+#include "foundation/PrintableText.h"
+#include "storage/AtomicFile.h"
+#include "storage/DurableSave.h"
+#include "tools/ImportMode.h"
+#include "tools/ProgressBar.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <cstring>
+#include <filesystem>
+#include <iostream>
+#include <vector>
+
+namespace {
+
+const char* const kUnits = "units-per-reference";
+const char* const kValues = "value-in-reference";
+
+/// "new markets: NYSE, Paris"; of many names only the first ones. Empty when there are none.
+template <class Entries, class NameOf>
+std::string newText(const char* what, const Entries& entries, const NameOf& nameOf)
+{
+    constexpr std::size_t kTold = 20;
+    if (entries.empty())
+        return "";
+    std::string text = std::string("new ") + what + ':';
+    for (std::size_t i = 0; i < std::min(entries.size(), kTold); ++i)
+        text += (i == 0 ? " " : ", ") + printable(nameOf(entries[i]).bytes());
+    if (entries.size() > kTold)
+        text += " and " + std::to_string(entries.size() - kTold) + " more";
+    return text + '\n';
+}
+
+std::string countText(const char* what, const MarketPlan::Counts& counts)
+{
+    return std::string(what) + ": " + std::to_string(counts.added) + " new, " + std::to_string(counts.changed) +
+           " changed, " + std::to_string(counts.equal) + " equal\n";
+}
+
+/// What is to be told of a plan that is not carried out yet: figures for standard output, names beside them.
+struct Report {
+    explicit Report(const MarketPlan& plan)
+    {
+        names =
+            newText("currencies", plan.newCurrencies, [](const auto& made) { return made->getRepresentation(); }) +
+            newText("markets", plan.newMarkets, [](const auto& made) { return made.market->getName(); }) +
+            newText("companies", plan.newCompanies, [](const auto& made) { return made.company->getAbbreviation(); });
+        if (plan.replaced > 0)
+            names += "values of a day for which a later line has another: " + std::to_string(plan.replaced) + '\n';
+        figures = countText("quotes", plan.quoteCounts) + countText("rates", plan.rateCounts) +
+                  "refused: " + std::to_string(plan.refused) + '\n';
+    }
+
+    /// Throws when standard output takes nothing.
+    void print() const
+    {
+        std::cerr << names;
+        if (!(std::cout << figures << std::flush))
+            throw std::runtime_error(std::string("standard output: ") + std::strerror(errno));
+    }
+
+    std::string names;
+    std::string figures;
+};
+
+class ImportTables : public ImportMode {
+public:
+    void describe(CLI::App& app) override;
+    bool isMeant(const CLI::App&) const override { return true; }
+    void run(const CLI::App& app, const ImportArguments& arguments) override;
+
+private:
+    void runNew(const ImportArguments& arguments);
+    void runInto(const ImportArguments& arguments);
+    void checkReference(const std::string& path, const std::string& reference);
+    MarketPlan plan(const Catalogue& catalogue, Date* latestDay) const;
+
+    std::vector<std::string> quotes_;
+    std::vector<std::string> rates_;
+    std::vector<std::string> listings_;
+    std::string ratesAre_;
+    bool hasReference_ = false; // --reference is given
+    ImportOptions import_;
+};
+
+void ImportTables::describe(CLI::App& app)
+{
+    app.add_option("--quotes", quotes_, "Tables of closing prices")->type_name("FILE");
+    app.add_option("--rates", rates_, "Tables of exchange rates")->type_name("FILE");
+    app.add_option("--listing", listings_, "Tables that tell market, currency and name of tickers")->type_name("FILE");
+    addText(app, "--reference", import_.reference, "SYMBOL",
+            "Currency that the rates refer to; without it that of the file of --into, or EUR, or when there are no "
+            "rates the --currency");
+    app.add_option("--rates-are", ratesAre_, "How the rates are meant; see below")
+        ->check(CLI::IsMember({kUnits, kValues}));
+    addText(app, "--currency", import_.currency, "SYMBOL", "Currency of the markets that no table tells it of")
+        ->capture_default_str();
+    app.add_flag("--ticker-from-name", import_.tickerFromName,
+                 "The quotes are of one ticker a file, which the file's name tells (AAPL.csv: date,close)");
+}
+
+void ImportTables::run(const CLI::App& app, const ImportArguments& arguments)
+{
+    if (arguments.output.empty() == arguments.into.empty())
+        throw CLI::RequiredError("Either OUTPUT or --into");
+    if (quotes_.empty() && rates_.empty())
+        throw CLI::RequiredError("--quotes or --rates");
+    hasReference_ = app.count("--reference") > 0;
+    if (!ratesAre_.empty())
+        import_.ratesAreUnits = ratesAre_ == kUnits;
+    if (!arguments.market.empty())
+        import_.market = arguments.market;
+    if (arguments.into.empty())
+        runNew(arguments);
+    else
+        runInto(arguments);
+}
+
+void ImportTables::runNew(const ImportArguments& arguments)
+{
+    if (!hasReference_ && rates_.empty())
+        import_.reference = import_.currency;
+    const auto existing = arguments.force ? AtomicFile::Existing::kReplace : AtomicFile::Existing::kKeep;
+    // Before anything is read: the tables may take minutes, and the writing would fail only then.
+    if (!arguments.dryRun)
+        AtomicFile::check(arguments.output, existing);
+    Catalogue catalogue;
+    Date stamp;
+    MarketPlan made = plan(catalogue, &stamp);
+    const Report report(made);
+    if (arguments.dryRun)
+        return report.print();
+    made.carryOut(catalogue);
+    // The records bear a date; that of the data makes the same input give the same file on any day.
+    AtomicFile file(arguments.output, existing);
+    if (catalogue.wrt(file.stream(), stamp) != 0)
+        file.fail("cannot be written");
+    file.commit();
+    report.print();
+}
+
+void ImportTables::runInto(const ImportArguments& arguments)
+{
+    const std::string& path = arguments.into;
+    std::error_code error;
+    if (!std::filesystem::exists(path, error) && !error)
+        throw std::runtime_error(path + ": is not there, so that nothing can be imported --into it; without --into a "
+                                        "new file is made");
+    if (!arguments.dryRun)
+        AtomicFile::check(path, AtomicFile::Existing::kReplace);
+    MarketFile file(path);
+    checkReference(path, file.reference());
+    Date stamp;
+    MarketPlan added = plan(file.catalogue(), &stamp);
+    const Report report(added);
+    if (arguments.dryRun)
+        return report.print();
+    if (added.isEmpty()) {
+        std::cerr << path << ": has all of it, and is left as it is\n";
+        return report.print();
+    }
+    const MarketPlan::Owners changed = added.carryOut(file.catalogue());
+    // Tables of former days leave the date that later ones have given.
+    stamp = std::max(stamp, file.latestStamp());
+    const auto write = [&](FILE* to) { return file.write(to, changed, stamp); };
+    const auto result = DurableSave(DataFolder()).save(path, write, file.stamp());
+    if (result.outcome != DurableSave::Outcome::kSaved)
+        throw std::runtime_error(result.reason);
+    report.print();
+}
+
+/// Makes the file's reference that of the import, or the option's where the file has none.
+void ImportTables::checkReference(const std::string& path, const std::string& reference)
+{
+    if (reference.empty() && !hasReference_)
+        throw std::runtime_error(path + ": has no reference currency; --reference tells which it is to be");
+    if (reference.empty())
+        return;
+    if (hasReference_ && import_.reference != reference)
+        throw std::runtime_error(path + ": has the reference currency " + shown(reference) + ", and not " +
+                                 shown(import_.reference) + " as --reference says");
+    import_.reference = reference;
+}
+
+MarketPlan ImportTables::plan(const Catalogue& catalogue, Date* latestDay) const
+{
+    ProgressBar bar(stderr);
+    TableWatch watch;
+    watch.progress = [&](const std::string& path, double part) { bar.show(path, part); };
+    watch.refused = [&](const std::string& path, unsigned long line, const std::string& reason) {
+        bar.clear();
+        std::cerr << path << ", line " << line << ": " << reason << '\n';
+    };
+    MarketImport import(import_, catalogue, watch);
+    // In this order whatever that of the options: listings say where the tickers of the quotes belong, and currencies
+    // stand in the file in the order of their first mention.
+    for (const std::string& path : listings_)
+        import.addListing(path);
+    for (const std::string& path : rates_)
+        import.addRates(path);
+    for (const std::string& path : quotes_)
+        import.addQuotes(path);
+    try {
+        MarketPlan plan = import.plan();
+        *latestDay = import.latestDay();
+        return plan;
+    } catch (const MissingRate& error) {
+        throw std::runtime_error(std::string(error.what()) +
+                                 ": add a table with its --rates, or make it the --reference of a new file");
+    }
+}
+
+} // namespace
+
+std::unique_ptr<ImportMode> importTables()
+{
+    return std::make_unique<ImportTables>();
+}
