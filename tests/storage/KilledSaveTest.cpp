@@ -231,6 +231,11 @@ TEST(KilledSaveTest, AnErrorOfAnySystemCallFailsTheSaveWithAReasonOrDoesNoHarm)
 #endif
     enum { kSaved, kRefused = kNotTraced + 1, kUntold };
     const int errors[] = {EIO, EACCES, ENOSPC, ELOOP, ENAMETOOLONG};
+#ifdef __SANITIZE_ADDRESS__
+    const int step = 5; // a fork takes its time there: each call has one of the errors
+#else
+    const int step = 1;
+#endif
     const Saves files;
     int refused = 0, number = 1;
     ASSERT_TRUE(files.save(0) && files.save(number));
@@ -243,6 +248,8 @@ TEST(KilledSaveTest, AnErrorOfAnySystemCallFailsTheSaveWithAReasonOrDoesNoHarm)
     for (int call = 0; isReached; ++call) {
         isReached = false;
         for (int i = 0; i < 2 * std::ssize(errors); ++i) {
+            if ((i / 2 + call) % step != 0)
+                continue;
             const int error = errors[i / 2];
             SCOPED_TRACE(std::strerror(error) + (" in call " + std::to_string(call)));
             files.setInUse(i % 2 == 1); // a copy is written
@@ -263,5 +270,5 @@ TEST(KilledSaveTest, AnErrorOfAnySystemCallFailsTheSaveWithAReasonOrDoesNoHarm)
         }
         files.saveAgain(++number, true);
     }
-    EXPECT_GT(refused, 200);
+    EXPECT_GT(refused, 200 / step);
 }
