@@ -348,6 +348,22 @@ TEST_F(ImportTest, IntoAFileGoesWhatIsNewAndNothingElseChanges)
               "quotes: 0 new, 0 changed, 2 equal\nrates: 0 new, 0 changed, 2 equal\nrefused: 1\n");
     EXPECT_EQ(folder_.content("f"), after);
     EXPECT_EQ(backups().size(), 1U) << "nothing has changed";
+
+    // A series in disorder that does change: on its own days only.
+    folder_.write("b.csv", "date,ticker,close\n2005-01-03,B,1.5\n2005-01-02,B,2\n2005-01-09,B,2\n");
+    EXPECT_EQ(ToolRun(PELORIN_IMPORT, "--into f --quotes b.csv", folder_).status, 0);
+    EXPECT_THAT(
+        folder_.content("f"),
+        HasSubstr(bytesOf("05 00 00 00  02 00 01 00 D5 07 00 00 00 00 00 40  04 00 01 00 D5 07 00 00 00 00 C0 3F "
+                          "03 00 01 00 D5 07 00 00 00 00 C0 3F  04 00 01 00 D5 07 00 00 00 00 80 3F "
+                          "09 00 01 00 D5 07 00 00 00 00 00 40 ")))
+        << "of two quotes of a day that nobody named both stay";
+    folder_.write("b.csv", "date,ticker,close\n2005-01-04,B,2\n");
+    EXPECT_EQ(ToolRun(PELORIN_IMPORT, "--into f --quotes b.csv", folder_).status, 0);
+    EXPECT_THAT(folder_.content("f"), HasSubstr(bytesOf("04 00 01 00 D5 07 00 00 00 00 00 40 "
+                                                        "03 00 01 00 D5 07 00 00 00 00 C0 3F "
+                                                        "04 00 01 00 D5 07 00 00 00 00 00 40 ")))
+        << "and of the day that is named both change";
 }
 
 TEST_F(ImportTest, TablesInPartsGiveWhatTheyGiveInOneGo)
