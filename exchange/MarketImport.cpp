@@ -265,8 +265,9 @@ MarketPlan MarketImport::plan()
 }
 
 /// The reference is worth 1 on every day for which any rate has come, where it has no value yet. Without rates one day
-/// is enough, the first of the quotes, since a single quote holds for ever. A reference with other rates of its own is
-/// left alone: its owner means something by them.
+/// is enough, the first of the quotes, since a single quote holds for ever; that is only done for a reference that is
+/// new or in which something is quoted. A reference with other rates of its own is left alone: its owner means
+/// something by them.
 void MarketImport::giveReferenceItsRates()
 {
     Currency& reference = *plan_.reference;
@@ -277,7 +278,12 @@ void MarketImport::giveReferenceItsRates()
     for (const auto& rates : plan_.rates)
         for (const DatedValue& rate : rates.values)
             days.push_back(rate.day);
-    if (days.empty() && reference.getNbrQuotes() == 0)
+    const auto isInReference = [&](const auto& quotes) {
+        return quotes.currency == &reference && !quotes.values.empty();
+    };
+    const bool isNew = !plan_.newCurrencies.empty() && plan_.newCurrencies.front().get() == &reference;
+    const bool isNamed = isNew || std::ranges::any_of(plan_.quotes, isInReference);
+    if (days.empty() && reference.getNbrQuotes() == 0 && isNamed)
         days.push_back(firstDayOf(plan_.quotes));
     std::ranges::sort(days);
     days.erase(std::unique(days.begin(), days.end()), days.end());

@@ -401,16 +401,22 @@ TEST_F(ImportTest, TheReferenceGetsTheDaysThatItLacks)
         {{1, 1}, "2005-01-02,USD,2\n2005-01-04,USD,2\n", " 02/01/2005=1 03/01/2005=1 04/01/2005=1", "all are 1"},
         {{1, 2}, "2005-01-02,USD,2\n", " 03/01/2005=1 04/01/2005=2", "it means something else"},
         {{}, "2005-01-02,USD,2\n", " 02/01/2005=1", "it had none"},
+        {{}, "date,ticker,close,market,currency\n2005-01-02,Q,2,Rome,EUR\n", " 02/01/2005=1", "it is quoted in"},
+        {{}, "date,ticker,close\n2005-01-02,Q,2\n", "", "no table names it"},
     };
     for (const auto& c : cases) {
         Catalogue catalogue;
         auto* euro = new Currency("Euro", "EUR", nullptr);
         catalogue.addCurrency(euro);
         catalogue.setReferenceCurrency(euro);
+        auto* dollar = new Currency("Dollar", "USD", nullptr);
+        catalogue.addCurrency(dollar);
+        new CurrencyQuote(dollar, Date(1, 1, 2005), 0.5F);
         for (short day = 3; const float rate : c.own)
             new CurrencyQuote(euro, Date(day++, 1, 2005), rate);
         MarketImport importer = import(catalogue);
-        importer.addRates(folder_.write("r.csv", c.tables));
+        const std::string table = folder_.write("t.csv", c.tables);
+        std::string_view(c.tables).starts_with("date") ? importer.addQuotes(table) : importer.addRates(table);
         importer.plan().carryOut(catalogue);
         EXPECT_EQ(quotes(*euro), c.rates) << c.why;
     }
