@@ -1,6 +1,7 @@
 #include "exchange/StatementWords.h"
 
 #include "exchange/TextForms.h"
+#include "foundation/FoldedText.h"
 
 #include <algorithm>
 #include <array>
@@ -149,6 +150,28 @@ constexpr std::array<Meaning, kStatementTypes> kTypes = {{
      "prelevementsociaux prelevementssociaux prelevementfiscal retenuealasource interetsdebit interetspayes"},
 }};
 
+/// Codes that may stand beside an amount; a file need not have the currency. "GBX" is a hundredth of "GBP".
+constexpr std::string_view kCurrencyCodes =
+    "AED ARS AUD BGN BRL CAD CHF CLP CNY COP CZK DKK EGP EUR GBP GBX HKD HUF IDR ILS INR ISK JPY KRW KWD MAD MXN MYR "
+    "NOK "
+    "NZD PEN PHP PKR PLN QAR RON RSD RUB SAR SEK SGD THB TND TRY TWD UAH USD VND ZAR";
+
+/// Codes, and the signs and words for them, in small letters.
+constexpr std::array<Meaning, 12> kCurrencies = {{
+    {"EUR", "\u20AC euro euros"},
+    {"GBP", "\u00A3 pound pounds"},
+    {"USD", "us$"},
+    {"AUD", "a$ au$"},
+    {"CAD", "c$ ca$"},
+    {"HKD", "hk$"},
+    {"NZD", "nz$"},
+    {"SGD", "s$"},
+    {"CHF", "fr sfr franken"},
+    {"USD AUD CAD HKD NZD SGD MXN TWD", "$ dollar dollars"},
+    {"JPY CNY", "\u00A5 yen"},
+    {"SEK NOK DKK ISK CZK", "kr kronen"},
+}};
+
 /// The number of the one that is called `name`.
 template <std::size_t n>
 std::optional<std::size_t> indexOf(const std::array<Meaning, n>& meanings, std::string_view name)
@@ -198,6 +221,20 @@ std::optional<StatementType> typeOfWord(std::string_view key)
 const char* nameOf(StatementType type)
 {
     return kTypes[static_cast<std::size_t>(type)].name;
+}
+
+std::string_view currencyCodesOf(std::string_view text)
+{
+    if (text == "GBp")
+        return "GBX";
+    const std::string key = foldedText(text);
+    for (const std::string_view code : splitAtBlanks(kCurrencyCodes))
+        if (foldedText(code) == key)
+            return code;
+    for (const auto& [codes, words] : kCurrencies)
+        if (std::ranges::count(splitAtBlanks(words), key) > 0)
+            return codes;
+    return {};
 }
 
 std::optional<StatementType> typeNamed(std::string_view name)
