@@ -163,8 +163,8 @@ void OperationReader::readTrade(const Row& row, PlannedOperation* operation) con
     const auto amount = amountOf(row, account);
     if (quote && *quote < 0)
         throw UnusableRow("has a quote below 0");
-    // A quote of 0 beside an amount was only filled in.
-    if (quote && (*quote != 0 || !amount)) {
+    // A quote of 0 beside an amount was only filled in, unless the shares were for free.
+    if (quote && (*quote != 0 || amount.value_or(0) == 0)) {
         operation->quote = single(*quote);
         if (amount && !areEqualToACent(std::abs(*amount), std::abs(*quote * operation->quantity + costs)))
             operation->otherAmount = std::abs(*amount);

@@ -11,6 +11,7 @@
 namespace {
 
 constexpr std::size_t kLongestPreamble = 200; // lines in which the headings have to be found
+constexpr std::size_t kMostRows = 1'000'000;
 
 /// A field as UTF-8, taken by itself.
 std::string readable(const std::string& bytes)
@@ -155,11 +156,16 @@ void StatementTable::failWithout(const std::string& path, const StatementProfile
 void StatementTable::readAll(const std::string& path, char separator)
 {
     CsvReader reader(path, separator);
-    while (reader.next())
+    while (reader.next()) {
         if (reader.line() < headerLine_)
             passedOver_.push_back({reader.line(), textOf(reader.fields()), "before the headings"});
         else if (reader.line() > headerLine_ && (reader.fields().empty() || !textOf(reader.fields()).empty()))
             rows_.push_back({reader.line(), reader.fields()});
+        // All of them are held, and a zipped file may have any number.
+        if (rows_.size() > kMostRows)
+            throw std::runtime_error(path + ": has more than " + std::to_string(kMostRows) +
+                                     " lines: this is no statement");
+    }
 }
 
 /// Text that is not UTF-8 is Windows-1252, all of it.
@@ -200,23 +206,37 @@ void StatementTable::settleDates(const std::string& path, const StatementProfile
     isMonthFirst_ = profile.isMonthFirst().value_or(false);
     if (profile.isMonthFirst())
         return;
-    const Row* dayFirst = nullptr; // one that shows it, as a number above 12 does that is no month
-    const Row* monthFirst = nullptr;
-    for (const Row& row : rows_) {
-        const auto written = WrittenDate::read(cell(row, StatementColumn::kDate));
+    // Rows that show it, as a number above 12 does that is no month.
+    struct Shown {
+        const Row* dayFirst = nullptr;
+        const Row* monthFirst = nullptr;
+    };
+    const auto lookAt = [](const Row& row, std::string_view text, Shown* shown) {
+        const auto written = WrittenDate::read(text);
         if (!written || written->isOrderKnown)
-            continue;
-        if (written->date(false).isUndefined() && !written->date(true).isUndefined() && monthFirst == nullptr)
-            monthFirst = &row;
-        if (written->date(true).isUndefined() && !written->date(false).isUndefined() && dayFirst == nullptr)
-            dayFirst = &row;
-    }
-    if (dayFirst != nullptr && monthFirst != nullptr)
-        throw std::runtime_error(path + ": " + lineText(*dayFirst) + " has the day first, " +
-                                 shown(cell(*dayFirst, StatementColumn::kDate)) + ", and " + lineText(*monthFirst) +
-                                 " the month, " + shown(cell(*monthFirst, StatementColumn::kDate)) +
+            return;
+        if (written->date(false).isUndefined() && !written->date(true).isUndefined() && shown->monthFirst == nullptr)
+            shown->monthFirst = &row;
+        if (written->date(true).isUndefined() && !written->date(false).isUndefined() && shown->dayFirst == nullptr)
+            shown->dayFirst = &row;
+    };
+    Shown dates;
+    for (const Row& row : rows_)
+        lookAt(row, cell(row, StatementColumn::kDate), &dates);
+    if (dates.dayFirst != nullptr && dates.monthFirst != nullptr)
+        throw std::runtime_error(path + ": " + lineText(*dates.dayFirst) + " has the day first, " +
+                                 shown(cell(*dates.dayFirst, StatementColumn::kDate)) + ", and " +
+                                 lineText(*dates.monthFirst) + " the month, " +
+                                 shown(cell(*dates.monthFirst, StatementColumn::kDate)) +
                                  ": --dates dmy or --dates mdy says which is meant");
-    isMonthFirst_ = monthFirst != nullptr;
+    isMonthFirst_ = dates.monthFirst != nullptr;
+    if (dates.dayFirst != nullptr || dates.monthFirst != nullptr)
+        return;
+    // A bank writes all its dates alike, those of the settlement too.
+    for (const Row& row : rows_)
+        for (const std::string& field : row.fields)
+            lookAt(row, field, &dates);
+    isMonthFirst_ = dates.monthFirst != nullptr && dates.dayFirst == nullptr;
 }
 
 void StatementTable::settleDecimalMarks(char separator)

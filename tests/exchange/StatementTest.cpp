@@ -181,6 +181,8 @@ TEST_F(StatementTest, EachLineBecomesTheOperationThatItMeans)
         {"Buy;Giro;;;GM;;-60;;1.515,95;;;5,95;;;;", "Buy Giro 60 Paris/G\xC3\xA4mma SA at 25.1667 cost 5.95"},
         {"Sell;Giro;;;;GAMMA sa;-30;;;;818,05;5,95;;;;euro", "Sell Giro 30 Paris/G\xC3\xA4mma SA at 27.4667 cost 5.95"},
         {"Buy;Broker;;;AC;;2 St;USD 9;;;;;;;;", "Buy Broker 2 York/Beta at 9"},
+        {"Buy;Broker;;;AC;;2;0,00;0,00;;;;;;;", "Buy Broker 2 York/Beta at 0"}, // for free
+        {"Buy;Broker;;;AC;;2;0,00;18,00;;;;;;;", "Buy Broker 2 York/Beta at 9"},
         {"Buy;Broker;;;gm;;2;9;;;;;;;;", "Buy Broker 2 York/Gamma at 9"},
     };
     std::string csv = kHeadings;
@@ -246,6 +248,9 @@ TEST_F(StatementTest, WhatCountsForTheWholeTableIsFoundAnywhereInIt)
     EXPECT_THAT(passedOver_, ElementsAre(1, 7));
     EXPECT_THAT(planned("Date,Type,Amount\n01/02/2026,Deposit,1.250\n03/13/2026,Deposit,2\n", giro),
                 ElementsAre("02/01/2026 Deposit Giro 1.25", "13/03/2026 Deposit Giro 2"));
+    EXPECT_THAT(planned("Date,Settled,Type,Amount\n01/02/2026,01/13/2026,Deposit,2\n", giro),
+                ElementsAre("02/01/2026 Deposit Giro 2"))
+        << "any date shows the order";
     EXPECT_THAT(planned("Date;Type;Amount\n01/02/2026;Deposit;1,250\n", giro),
                 ElementsAre(HasSubstr("2: \"1,250\" in the column \"Amount\" may be a thousand times too large")));
 
