@@ -1,5 +1,6 @@
 #include "exchange/CsvReader.h"
 
+#include "exchange/TextForms.h"
 #include "storage/InputFile.h"
 
 #include <algorithm>
@@ -39,6 +40,15 @@ bool CsvReader::next()
             return true;
     }
     return false;
+}
+
+void CsvReader::decode()
+{
+    const auto isAscii = [](char c) { return static_cast<unsigned char>(c) < 0x80; };
+    if (std::ranges::all_of(text_, isAscii) || isUtf8(text_))
+        return;
+    for (std::string& field : fields_)
+        field = fromWindows1252(field);
 }
 
 /// Afterwards `text_` is the line without its end, and `line_` its number.

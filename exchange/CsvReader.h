@@ -20,6 +20,8 @@ public:
     /// Goes to the next line that has a text in any field. @return false at the end of the file.
     bool next();
 
+    /// Makes UTF-8 of the fields of a line that is none, and so is in Windows-1252.
+    void decode();
     /// The fields of the line, without their quotes. None when the line is malformed: a quote is not closed at the end
     /// of its field.
     const std::vector<std::string>& fields() const { return fields_; }

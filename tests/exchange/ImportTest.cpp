@@ -222,6 +222,20 @@ TEST_F(ImportTest, AWideTableHasAColumnACurrencyOrTicker)
     EXPECT_EQ(plan.rateCounts.added, 4U) << "without those of the reference";
 }
 
+TEST_F(ImportTest, DatesAndTextsAreTakenAsOtherProgramsWriteThem)
+{
+    MarketImport importer = import(catalogue_);
+    // The daily table of a central bank, and a spreadsheet of a Windows program.
+    importer.addRates(folder_.write("r.csv", "Date, USD, \n3 January 2005, 1.25, \n"));
+    importer.addQuotes(folder_.write("q.csv",
+                                     "date;ticker;close;name\n03.01.2005;A;1,5;Caf\xE9\n20050104;A;2\n"
+                                     "2005-01-05T00:00:00;A;3\n05-01-2005;A;4\n01/02/05;A;4\n31.02.2005;A;4\n"));
+    MarketPlan plan = importer.plan();
+    plan.carryOut(catalogue_);
+    EXPECT_THAT(companies(), ElementsAre("NYSE/A/Caf\xC3\xA9/USD 03/01/2005=1.5 04/01/2005=2 05/01/2005=3"));
+    EXPECT_EQ(plan.refused, 3U) << "which could be other days, or are none";
+}
+
 /// A catalogue in which names come several times. The pound has no rate.
 void fillWithNamesakes(Catalogue& catalogue)
 {
