@@ -7,6 +7,7 @@
 #include "valuation/State.h"
 
 #include <gmock/gmock.h>
+#include <set>
 #include <sstream>
 
 using testing::ElementsAre;
@@ -155,6 +156,18 @@ TEST_F(StatementTest, WordsAreTheSameInAnyCaseAccentAndEncoding)
     EXPECT_EQ(fromWindows1252("\x80 \xFC\x9F"), "\xE2\x82\xAC \xC3\xBC\xC5\xB8");
     for (const char* broken : {"\xC3", "\xC0\x80", "\xE0\x80\x80", "\xED\xA0\x80", "\xF4\x90\x80\x80", "\xF8", "\x80"})
         EXPECT_FALSE(isUtf8(broken));
+}
+
+TEST_F(StatementTest, EachHeadingCanBeFoundAndMeansOneColumn)
+{
+    std::set<std::string_view> all;
+    for (std::size_t i = 0; i < kStatementColumns; ++i)
+        for (const std::string_view heading : headingsOf(static_cast<StatementColumn>(i))) {
+            EXPECT_TRUE(all.insert(heading).second) << heading;
+            EXPECT_EQ(wordKey(heading), heading) << "as a table's heading is looked for";
+        }
+    EXPECT_EQ(typeOfWord(wordKey("Frais de garde")), StatementType::kCharge);
+    EXPECT_EQ(typeOfWord(wordKey("Virement entrant")), StatementType::kDeposit);
 }
 
 TEST_F(StatementTest, EachLineBecomesTheOperationThatItMeans)
