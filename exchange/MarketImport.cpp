@@ -299,9 +299,13 @@ void MarketImport::checkRates() const
     for (const auto& rates : plan_.rates)
         if (!rates.values.empty())
             rated.insert(rates.owner);
+    // A currency whose rates are all 0 leaves a total at 0 as well.
+    const auto hasRate = [](const Currency& currency) {
+        return std::ranges::any_of(currency.quotes(), [](const auto* rate) { return rate->getValue() > 0; });
+    };
     std::string missing;
     for (const auto& quotes : plan_.quotes)
-        if (!quotes.values.empty() && quotes.currency->getNbrQuotes() == 0 && rated.insert(quotes.currency).second)
+        if (!quotes.values.empty() && !hasRate(*quotes.currency) && rated.insert(quotes.currency).second)
             missing += (missing.empty() ? "" : "; ") + std::string("no rate of ") +
                        shown(quotes.currency->getRepresentation().bytes()) + ", in which " +
                        shown(quotes.owner->getAbbreviation().bytes()) + " is quoted";

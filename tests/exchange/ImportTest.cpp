@@ -236,15 +236,16 @@ TEST_F(ImportTest, DatesAndTextsAreTakenAsOtherProgramsWriteThem)
     EXPECT_EQ(plan.refused, 3U) << "which could be other days, or are none";
 }
 
-/// A catalogue in which names come several times. The pound has no rate.
+/// A catalogue in which names come several times. The pound has no rate, the yen none that counts.
 void fillWithNamesakes(Catalogue& catalogue)
 {
-    for (const char* symbol : {"EUR", "USD", "GBP", "EUR"})
+    for (const char* symbol : {"EUR", "USD", "GBP", "EUR", "JPY"})
         catalogue.addCurrency(new Currency(symbol, symbol, nullptr));
     catalogue.setReferenceCurrency(catalogue.getCurrencies()[0]);
     const Date day(3, 1, 2005);
     new CurrencyQuote(catalogue.getCurrencies()[0], day, 1);
     new CurrencyQuote(catalogue.getCurrencies()[1], day, 0.8F);
+    new CurrencyQuote(catalogue.getCurrencies()[4], day, 0);
     const std::tuple<int, const char*, std::vector<const char*>> markets[] = {
         {0, "Paris", {"ALP"}}, {0, "LSE", {"DUO", "DUO"}}, {1, "LSE", {"DUO", "ONE"}}, {2, "LSE", {"PND"}}};
     for (const auto& [currency, name, tickers] : markets) {
@@ -273,6 +274,7 @@ TEST_F(ImportTest, ARowMeansTheFirstThatBearsItsNames)
         {"NEW,2,LSE,USD,", "3 LSE/NEW/NEW/USD", "or the first in that currency"},
         {"NEW,2,Rome,EUR,", "4 Rome/NEW/NEW/EUR", "a new market of the first euro"},
         {"PND,2,LSE,GBP,", "no rate of \"GBP\", in which \"PND\" is quoted", "worth nothing"},
+        {"NEW,2,Tokyo,JPY,", "no rate of \"JPY\", in which \"NEW\" is quoted", "the same"},
         {"NEW,2,LSE,CHF,", refused, "no market of that name trades in it"},
         {"ALP,2,,USD,", refused, "the only company is quoted in another"},
         {"NEW,2,,CHF,", refused, "no market, and not the option's currency"},
