@@ -56,7 +56,7 @@ StatementTable::StatementTable(const std::string& path, const StatementProfile& 
     const char separator = findSeparator(path, profile);
     readAll(path, separator);
     decode();
-    passOverEnd(path);
+    passOverEnd(path, profile);
     // From here on `rows_` are the lines that are meant to be read, and nothing is added to them.
     settleDates(path, profile);
     settleDecimalMarks(separator);
@@ -186,16 +186,21 @@ void StatementTable::decode()
 }
 
 /// Sums and remarks stand behind the last line with a date.
-void StatementTable::passOverEnd(const std::string& path)
+void StatementTable::passOverEnd(const std::string& path, const StatementProfile& profile)
 {
     // A line that cannot be cut may have had one.
     const auto isDated = [this](const Row& row) {
         return row.fields.empty() || WrittenDate::read(cell(row, StatementColumn::kDate)).has_value();
     };
-    const auto end = std::find_if(rows_.rbegin(), rows_.rend(), isDated).base();
-    if (end == rows_.begin() && !rows_.empty())
+    if (!rows_.empty() && std::ranges::none_of(rows_, isDated))
         throw std::runtime_error(path + ": no line has a date in the column " +
                                  shown(headingOf(StatementColumn::kDate)));
+    // One that has a type and numbers for a date is no sum but an operation; its date is refused when it is read.
+    const auto isMeant = [&](const Row& row) {
+        const bool hasNumbers = cell(row, StatementColumn::kDate).find_first_of("0123456789") != std::string_view::npos;
+        return isDated(row) || (hasNumbers && profile.typeOf(std::string(cell(row, StatementColumn::kType))));
+    };
+    const auto end = std::find_if(rows_.rbegin(), rows_.rend(), isMeant).base();
     for (auto row = end; row != rows_.end(); ++row)
         passedOver_.push_back({row->line, textOf(row->fields), "behind the last line with a date"});
     rows_.erase(end, rows_.end());

@@ -259,6 +259,8 @@ TEST_F(StatementTest, WhatCountsForTheWholeTableIsFoundAnywhereInIt)
                         giro),
                 ElementsAre("01/02/2026 Deposit Giro 1234", "02/02/2026 Deposit Giro 5.5"));
     EXPECT_THAT(passedOver_, ElementsAre(1, 7));
+    EXPECT_THAT(planned("Date;Type;Amount\n01.02.2026;Deposit;1\n46027;Deposit;2\nTotal 2;;3\n", giro),
+                ElementsAre("01/02/2026 Deposit Giro 1", "3: \"46027\" is no date"));
     EXPECT_THAT(planned("Date,Type,Amount\n01/02/2026,Deposit,1.250\n03/13/2026,Deposit,2\n", giro),
                 ElementsAre("02/01/2026 Deposit Giro 1.25", "13/03/2026 Deposit Giro 2"));
     EXPECT_THAT(planned("Date,Settled,Type,Amount\n01/02/2026,01/13/2026,Deposit,2\n", giro),
