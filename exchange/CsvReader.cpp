@@ -30,7 +30,10 @@ double CsvReader::progress() const
 
 bool CsvReader::next()
 {
-    while (readLine()) {
+    for (std::size_t blank = 0; readLine(); ++blank) {
+        // A small zipped file may have gigabytes of them, which would keep the reader for minutes.
+        if (blank == kMostBlank)
+            fail("stands behind " + std::to_string(kMostBlank) + " empty lines: this is no table");
         // A malformed line is left without fields: the table tells it by its number and goes on.
         if (!split())
             fields_.clear();

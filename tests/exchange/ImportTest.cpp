@@ -92,6 +92,7 @@ TEST_F(ImportTest, CsvRecordsFollowRfc4180WithLineNumbers)
     EXPECT_THAT(records("\"a;b\",c\n"), ElementsAre("1:a;b|c")) << "a quoted semicolon separates nothing";
     EXPECT_THAT(records("\"a \"\"b\"\"\",\"\",\ne,f\"g\n"), ElementsAre("1:a \"b\"||", "2:e|f\"g"));
     EXPECT_THAT(records("\"a\"b,c\nd,e\n"), ElementsAre("1:!", "2:d|e")) << "text behind the closing quote";
+    EXPECT_THROW(records("a,b\n" + std::string(1'000'001, '\n') + "c,d"), std::runtime_error) << "no end of blanks";
     const std::string longest(CsvReader::kLongestLine, 'x');
     EXPECT_THAT(records("a,b\n" + longest + "\nc"), ElementsAre("1:a|b", "2:" + longest, "3:c"));
 }
