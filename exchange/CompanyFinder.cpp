@@ -1,7 +1,7 @@
 #include "exchange/CompanyFinder.h"
 
 #include "exchange/Table.h"
-#include "exchange/TextForms.h"
+#include "foundation/FoldedText.h"
 #include "market/Catalogue.h"
 #include "market/Company.h"
 #include "market/Market.h"
@@ -35,8 +35,8 @@ CompanyFinder::CompanyFinder(const Catalogue& catalogue)
             const bool hasNames = market->getName().hasText() && company->getAbbreviation().hasText();
             if (!hasNames || !taken.emplace(market->getName().comparedBytes(), ticker).second)
                 continue;
-            byTicker_[lowerCased(ticker)].push_back(company);
-            byName_[lowerCased(company->getName().comparedBytes())].push_back(company);
+            byTicker_[foldedText(ticker)].push_back(company);
+            byName_[foldedText(company->getName().comparedBytes())].push_back(company);
         }
 }
 
@@ -47,13 +47,13 @@ Company* CompanyFinder::find(std::string_view market, std::string_view ticker, s
         throw UnusableRow("names no company");
     const auto& index = ticker.empty() ? byName_ : byTicker_;
     const std::string_view text = ticker.empty() ? name : ticker;
-    const auto found = index.find(lowerCased(text));
+    const auto found = index.find(foldedText(text));
     if (found == index.end())
         throw UnusableRow("the market file has no company " + shown(text));
     Companies companies = found->second;
     if (!market.empty()) {
-        const std::string key = lowerCased(market);
-        std::erase_if(companies, [&](const Company* company) { return lowerCased(marketOf(company)) != key; });
+        const std::string key = foldedText(market);
+        std::erase_if(companies, [&](const Company* company) { return foldedText(marketOf(company)) != key; });
         if (companies.empty())
             throw UnusableRow("the market file has no company " + shown(text) + " at " + shown(market));
         prefer(&companies, [&](const Company* company) { return marketOf(company) == market; });

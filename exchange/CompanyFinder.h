@@ -9,8 +9,8 @@ class Catalogue;
 class Company;
 class Currency;
 
-/// Finds the company that a line of a statement means, by what it has of market, ticker and name. Case does not matter,
-/// but between two tickers that differ in it the one that is written alike is meant.
+/// Finds the company that a line of a statement means, by what it has of market, ticker and name. Case and accents do
+/// not matter, but between two that differ in them the one that is written alike is meant.
 ///
 /// Only companies that a portfolio file can name are found: a second one of the same market and ticker is not.
 class CompanyFinder {
@@ -26,6 +26,6 @@ public:
 private:
     using Companies = std::vector<Company*>; // in the order of the file
 
-    std::unordered_map<std::string, Companies> byTicker_; // in lower case, both
+    std::unordered_map<std::string, Companies> byTicker_; // folded, both
     std::unordered_map<std::string, Companies> byName_;
 };

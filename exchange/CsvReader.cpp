@@ -1,5 +1,6 @@
 #include "exchange/CsvReader.h"
 
+#include "exchange/TextForms.h"
 #include "storage/InputFile.h"
 
 #include <algorithm>
@@ -29,7 +30,10 @@ double CsvReader::progress() const
 
 bool CsvReader::next()
 {
-    while (readLine()) {
+    for (std::size_t blank = 0; readLine(); ++blank) {
+        // A small zipped file may have gigabytes of them, which would keep the reader for minutes.
+        if (blank == kMostBlank)
+            fail("stands behind " + std::to_string(kMostBlank) + " empty lines: this is no table");
         // A malformed line is left without fields: the table tells it by its number and goes on.
         if (!split())
             fields_.clear();
@@ -39,6 +43,15 @@ bool CsvReader::next()
             return true;
     }
     return false;
+}
+
+void CsvReader::decode()
+{
+    const auto isAscii = [](char c) { return static_cast<unsigned char>(c) < 0x80; };
+    if (std::ranges::all_of(text_, isAscii) || isUtf8(text_))
+        return;
+    for (std::string& field : fields_)
+        field = fromWindows1252(field);
 }
 
 /// Afterwards `text_` is the line without its end, and `line_` its number.

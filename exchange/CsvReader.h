@@ -10,8 +10,9 @@
 ///
 /// The separator - tab, ';' or ',' - is guessed from the first record. A byte order mark of UTF-8 in front and CR LF
 /// line ends are taken. A file that is no such text throws std::runtime_error with one line for the user: one that
-/// cannot be opened or read to its end, that has zero bytes, as UTF-16 has, or a line longer than `kLongestLine`, or a
-/// quote that is not closed on its line. Whatever the file is, no more than a line of it is held.
+/// cannot be opened or read to its end, that has zero bytes, as UTF-16 has, or a line longer than `kLongestLine`,
+/// `kMostBlank` lines without text in a row, or a quote that is not closed on its line. Whatever the file is, no more
+/// than a line of it is held.
 class CsvReader {
 public:
     /// @param separator '\0' to guess it.
@@ -20,6 +21,8 @@ public:
     /// Goes to the next line that has a text in any field. @return false at the end of the file.
     bool next();
 
+    /// Makes UTF-8 of the fields of a line that is none, and so is in Windows-1252.
+    void decode();
     /// The fields of the line, without their quotes. None when the line is malformed: a quote is not closed at the end
     /// of its field.
     const std::vector<std::string>& fields() const { return fields_; }
@@ -29,6 +32,7 @@ public:
     /// How much of the file has been read, from 0 to 1.
     double progress() const;
 
+    static constexpr std::size_t kMostBlank = 1'000'000;
     static constexpr std::size_t kLongestLine = std::size_t{1} << 20; // bytes; a column each for 100,000 shares
 
 private:

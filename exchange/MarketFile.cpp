@@ -8,9 +8,68 @@
 #include "market/SplitCompanyEvent.h"
 
 #include <algorithm>
+#include <functional>
+#include <map>
 #include <stdexcept>
+#include <string_view>
 
 namespace {
+
+/// The records of a series that an import has changed. The model has one quote a day, by date; the file may have two of
+/// a day, of which the last counts, and days out of order. Those stay as they stand there.
+template <class Series>
+class Merge {
+public:
+    /// Both outlive this.
+    Merge(const std::string& former, const Series& series) : former_(former), series_(series)
+    {
+        for (std::size_t at = 0; at < former.size(); at += Quote::kFileSize)
+            days_.emplace_back().decode(reinterpret_cast<const unsigned char*>(former.data()) + at);
+    }
+
+    std::string records() const
+    {
+        if (std::ranges::adjacent_find(days_, std::greater_equal<>()) == days_.end())
+            return series_.quoteRecords();
+        std::map<PackedDate, std::string_view> last; // of each day the value that counted
+        for (std::size_t i = 0; i < days_.size(); ++i)
+            last[days_[i]] = valueIn(record(i));
+        std::string result;
+        const auto quotes = series_.quotes();
+        auto next = quotes.begin();
+        // A new day comes before the first record that is later.
+        const auto addNewWhile = [&](const auto& isMeant) {
+            for (; next != quotes.end() && isMeant((*next)->getPackedDate()); ++next)
+                if (!last.contains((*next)->getPackedDate()))
+                    result += recordOf(**next);
+        };
+        for (std::size_t i = 0; i < days_.size(); ++i) {
+            addNewWhile([&](const PackedDate& day) { return day < days_[i]; });
+            auto* quote = *std::ranges::lower_bound(quotes, days_[i], {}, [](auto* q) { return q->getPackedDate(); });
+            const std::string now = recordOf(*quote);
+            result += valueIn(now) == last.at(days_[i]) ? record(i) : std::string_view(now);
+        }
+        addNewWhile([](const PackedDate&) { return true; });
+        return result;
+    }
+
+private:
+    std::string_view record(std::size_t i) const
+    {
+        return std::string_view(former_).substr(i * Quote::kFileSize, Quote::kFileSize);
+    }
+    static std::string recordOf(const Quote& quote)
+    {
+        unsigned char bytes[Quote::kFileSize];
+        quote.encode(bytes);
+        return {std::begin(bytes), std::end(bytes)};
+    }
+    static std::string_view valueIn(std::string_view record) { return record.substr(Date::kFileSize); }
+
+    const std::string& former_;
+    const Series& series_;
+    std::vector<PackedDate> days_; // of the former records
+};
 
 /// Goes over the former file and the catalogue side by side. The catalogue has all that the file has, in its order, and
 /// behind that what is new.
@@ -80,9 +139,10 @@ private:
     {
         const auto former = std::uint64_t{static_cast<unsigned>(freadint(from_))} * Quote::kFileSize;
         if (changed_.contains(&series)) {
-            fseeko(from_, static_cast<off_t>(former), SEEK_CUR);
-            fwriteint(to_, static_cast<int>(series.getNbrQuotes()));
-            const std::string records = series.quoteRecords();
+            std::string records(former, '\0');
+            hasFailed_ = hasFailed_ || std::fread(records.data(), 1, former, from_) != former;
+            records = Merge(records, series).records();
+            fwriteint(to_, static_cast<int>(records.size() / Quote::kFileSize));
             std::fwrite(records.data(), 1, records.size(), to_);
             return;
         }

@@ -9,8 +9,9 @@
 
 /// A market data file that is there, to be added to: what it holds, and the writing of it anew.
 ///
-/// What nothing was added to is written byte by byte as it stands in the file, and not as the model has it: a series
-/// that is not in order, or has a day twice, is one that nobody has asked to change.
+/// What nothing was added to is written byte by byte as it stands in the file, and not as the model has it: nobody has
+/// asked to put a series in order that is not, or has a day twice. In one that does change, the days that were not
+/// named keep their records and places; of a day that has two, both get the new value.
 class MarketFile {
 public:
     /// Reads the file. Throws std::runtime_error with one line for the user when it is no market data file, or not

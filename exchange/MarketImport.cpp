@@ -265,8 +265,9 @@ MarketPlan MarketImport::plan()
 }
 
 /// The reference is worth 1 on every day for which any rate has come, where it has no value yet. Without rates one day
-/// is enough, the first of the quotes, since a single quote holds for ever. A reference with other rates of its own is
-/// left alone: its owner means something by them.
+/// is enough, the first of the quotes, since a single quote holds for ever; that is only done for a reference that is
+/// new or in which something is quoted. A reference with other rates of its own is left alone: its owner means
+/// something by them.
 void MarketImport::giveReferenceItsRates()
 {
     Currency& reference = *plan_.reference;
@@ -277,7 +278,12 @@ void MarketImport::giveReferenceItsRates()
     for (const auto& rates : plan_.rates)
         for (const DatedValue& rate : rates.values)
             days.push_back(rate.day);
-    if (days.empty() && reference.getNbrQuotes() == 0)
+    const auto isInReference = [&](const auto& quotes) {
+        return quotes.currency == &reference && !quotes.values.empty();
+    };
+    const bool isNew = !plan_.newCurrencies.empty() && plan_.newCurrencies.front().get() == &reference;
+    const bool isNamed = isNew || std::ranges::any_of(plan_.quotes, isInReference);
+    if (days.empty() && reference.getNbrQuotes() == 0 && isNamed)
         days.push_back(firstDayOf(plan_.quotes));
     std::ranges::sort(days);
     days.erase(std::unique(days.begin(), days.end()), days.end());
@@ -293,9 +299,13 @@ void MarketImport::checkRates() const
     for (const auto& rates : plan_.rates)
         if (!rates.values.empty())
             rated.insert(rates.owner);
+    // A currency whose rates are all 0 leaves a total at 0 as well.
+    const auto hasRate = [](const Currency& currency) {
+        return std::ranges::any_of(currency.quotes(), [](const auto* rate) { return rate->getValue() > 0; });
+    };
     std::string missing;
     for (const auto& quotes : plan_.quotes)
-        if (!quotes.values.empty() && quotes.currency->getNbrQuotes() == 0 && rated.insert(quotes.currency).second)
+        if (!quotes.values.empty() && !hasRate(*quotes.currency) && rated.insert(quotes.currency).second)
             missing += (missing.empty() ? "" : "; ") + std::string("no rate of ") +
                        shown(quotes.currency->getRepresentation().bytes()) + ", in which " +
                        shown(quotes.owner->getAbbreviation().bytes()) + " is quoted";

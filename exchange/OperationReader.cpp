@@ -1,10 +1,14 @@
 #include "exchange/OperationReader.h"
 
+#include "exchange/StatementWords.h"
 #include "exchange/Table.h"
+#include "exchange/TextForms.h"
+#include "foundation/FoldedText.h"
 #include "market/Catalogue.h"
 #include "market/Company.h"
 #include "market/Currency.h"
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
 
@@ -39,8 +43,8 @@ OperationReader::OperationReader(const StatementTable& table, const StatementPro
     : table_(table), profile_(profile), accounts_(accounts), companies_(catalogue)
 {
     for (const Currency* currency : catalogue.getCurrencies()) {
-        currencies_.try_emplace(std::string(currency->getRepresentation().comparedBytes()), currency);
-        currencies_.try_emplace(std::string(currency->getName().comparedBytes()), currency);
+        currencies_.try_emplace(foldedText(currency->getRepresentation().comparedBytes()), currency);
+        currencies_.try_emplace(foldedText(currency->getName().comparedBytes()), currency);
     }
 }
 
@@ -159,8 +163,8 @@ void OperationReader::readTrade(const Row& row, PlannedOperation* operation) con
     const auto amount = amountOf(row, account);
     if (quote && *quote < 0)
         throw UnusableRow("has a quote below 0");
-    // A quote of 0 beside an amount was only filled in.
-    if (quote && (*quote != 0 || !amount)) {
+    // A quote of 0 beside an amount was only filled in, unless the shares were for free.
+    if (quote && (*quote != 0 || amount.value_or(0) == 0)) {
         operation->quote = single(*quote);
         if (amount && !areEqualToACent(std::abs(*amount), std::abs(*quote * operation->quantity + costs)))
             operation->otherAmount = std::abs(*amount);
@@ -221,12 +225,23 @@ double OperationReader::sizeOf(const Row& row, StatementColumn column) const
     return figure ? std::abs(figure->value) : 0;
 }
 
-/// Money of another currency than the account's is refused, as far as `text` names one that is known.
+/// Money of another currency than the account's is refused, as far as `text` names one. The file need not have it: a
+/// line in francs is none in euros, whether or not anybody keeps their rate.
 void OperationReader::checkCurrency(std::string_view text, const PlannedAccount& account) const
 {
-    const auto found = currencies_.find(text);
-    if (found != currencies_.end() && found->second != account.currency &&
-        found->second->getRepresentation() != account.currency->getRepresentation())
+    const std::string_view own = account.currency->getRepresentation().comparedBytes();
+    if (text.empty() || text == own || text == account.currency->getName().comparedBytes())
+        return;
+    bool isOther = false;
+    const auto found = text != "GBp" ? currencies_.find(foldedText(text)) : currencies_.end(); // pence, not pounds
+    if (found != currencies_.end()) {
+        isOther = found->second->getRepresentation() != account.currency->getRepresentation();
+    } else if (currencyCodesOf(own) == own) {
+        // An account may be in what no code stands for; then nothing is known of it.
+        const std::vector<std::string_view> codes = splitAtBlanks(currencyCodesOf(text));
+        isOther = !codes.empty() && std::ranges::find(codes, own) == codes.end();
+    }
+    if (isOther)
         throw UnusableRow("is in " + shown(text) + ", but the account " + shown(account.name) + " is in " +
                           symbolOf(account.currency));
 }

@@ -47,5 +47,5 @@ private:
     const StatementProfile& profile_;
     const Accounts& accounts_;
     CompanyFinder companies_;
-    std::map<std::string, const Currency*, std::less<>> currencies_; // by symbol and by name
+    std::map<std::string, const Currency*, std::less<>> currencies_; // by folded symbol and name
 };

@@ -11,6 +11,7 @@
 namespace {
 
 constexpr std::size_t kLongestPreamble = 200; // lines in which the headings have to be found
+constexpr std::size_t kMostRows = 1'000'000;
 
 /// A field as UTF-8, taken by itself.
 std::string readable(const std::string& bytes)
@@ -55,7 +56,7 @@ StatementTable::StatementTable(const std::string& path, const StatementProfile& 
     const char separator = findSeparator(path, profile);
     readAll(path, separator);
     decode();
-    passOverEnd(path);
+    passOverEnd(path, profile);
     // From here on `rows_` are the lines that are meant to be read, and nothing is added to them.
     settleDates(path, profile);
     settleDecimalMarks(separator);
@@ -155,11 +156,16 @@ void StatementTable::failWithout(const std::string& path, const StatementProfile
 void StatementTable::readAll(const std::string& path, char separator)
 {
     CsvReader reader(path, separator);
-    while (reader.next())
+    while (reader.next()) {
         if (reader.line() < headerLine_)
             passedOver_.push_back({reader.line(), textOf(reader.fields()), "before the headings"});
         else if (reader.line() > headerLine_ && (reader.fields().empty() || !textOf(reader.fields()).empty()))
             rows_.push_back({reader.line(), reader.fields()});
+        // All of them are held, and a zipped file may have any number.
+        if (rows_.size() > kMostRows)
+            throw std::runtime_error(path + ": has more than " + std::to_string(kMostRows) +
+                                     " lines: this is no statement");
+    }
 }
 
 /// Text that is not UTF-8 is Windows-1252, all of it.
@@ -180,16 +186,21 @@ void StatementTable::decode()
 }
 
 /// Sums and remarks stand behind the last line with a date.
-void StatementTable::passOverEnd(const std::string& path)
+void StatementTable::passOverEnd(const std::string& path, const StatementProfile& profile)
 {
     // A line that cannot be cut may have had one.
     const auto isDated = [this](const Row& row) {
         return row.fields.empty() || WrittenDate::read(cell(row, StatementColumn::kDate)).has_value();
     };
-    const auto end = std::find_if(rows_.rbegin(), rows_.rend(), isDated).base();
-    if (end == rows_.begin() && !rows_.empty())
+    if (!rows_.empty() && std::ranges::none_of(rows_, isDated))
         throw std::runtime_error(path + ": no line has a date in the column " +
                                  shown(headingOf(StatementColumn::kDate)));
+    // One that has a type and numbers for a date is no sum but an operation; its date is refused when it is read.
+    const auto isMeant = [&](const Row& row) {
+        const bool hasNumbers = cell(row, StatementColumn::kDate).find_first_of("0123456789") != std::string_view::npos;
+        return isDated(row) || (hasNumbers && profile.typeOf(std::string(cell(row, StatementColumn::kType))));
+    };
+    const auto end = std::find_if(rows_.rbegin(), rows_.rend(), isMeant).base();
     for (auto row = end; row != rows_.end(); ++row)
         passedOver_.push_back({row->line, textOf(row->fields), "behind the last line with a date"});
     rows_.erase(end, rows_.end());
@@ -200,23 +211,37 @@ void StatementTable::settleDates(const std::string& path, const StatementProfile
     isMonthFirst_ = profile.isMonthFirst().value_or(false);
     if (profile.isMonthFirst())
         return;
-    const Row* dayFirst = nullptr; // one that shows it, as a number above 12 does that is no month
-    const Row* monthFirst = nullptr;
-    for (const Row& row : rows_) {
-        const auto written = WrittenDate::read(cell(row, StatementColumn::kDate));
+    // Rows that show it, as a number above 12 does that is no month.
+    struct Shown {
+        const Row* dayFirst = nullptr;
+        const Row* monthFirst = nullptr;
+    };
+    const auto lookAt = [](const Row& row, std::string_view text, Shown* shown) {
+        const auto written = WrittenDate::read(text);
         if (!written || written->isOrderKnown)
-            continue;
-        if (written->date(false).isUndefined() && !written->date(true).isUndefined() && monthFirst == nullptr)
-            monthFirst = &row;
-        if (written->date(true).isUndefined() && !written->date(false).isUndefined() && dayFirst == nullptr)
-            dayFirst = &row;
-    }
-    if (dayFirst != nullptr && monthFirst != nullptr)
-        throw std::runtime_error(path + ": " + lineText(*dayFirst) + " has the day first, " +
-                                 shown(cell(*dayFirst, StatementColumn::kDate)) + ", and " + lineText(*monthFirst) +
-                                 " the month, " + shown(cell(*monthFirst, StatementColumn::kDate)) +
+            return;
+        if (written->date(false).isUndefined() && !written->date(true).isUndefined() && shown->monthFirst == nullptr)
+            shown->monthFirst = &row;
+        if (written->date(true).isUndefined() && !written->date(false).isUndefined() && shown->dayFirst == nullptr)
+            shown->dayFirst = &row;
+    };
+    Shown dates;
+    for (const Row& row : rows_)
+        lookAt(row, cell(row, StatementColumn::kDate), &dates);
+    if (dates.dayFirst != nullptr && dates.monthFirst != nullptr)
+        throw std::runtime_error(path + ": " + lineText(*dates.dayFirst) + " has the day first, " +
+                                 shown(cell(*dates.dayFirst, StatementColumn::kDate)) + ", and " +
+                                 lineText(*dates.monthFirst) + " the month, " +
+                                 shown(cell(*dates.monthFirst, StatementColumn::kDate)) +
                                  ": --dates dmy or --dates mdy says which is meant");
-    isMonthFirst_ = monthFirst != nullptr;
+    isMonthFirst_ = dates.monthFirst != nullptr;
+    if (dates.dayFirst != nullptr || dates.monthFirst != nullptr)
+        return;
+    // A bank writes all its dates alike, those of the settlement too.
+    for (const Row& row : rows_)
+        for (const std::string& field : row.fields)
+            lookAt(row, field, &dates);
+    isMonthFirst_ = dates.monthFirst != nullptr && dates.dayFirst == nullptr;
 }
 
 void StatementTable::settleDecimalMarks(char separator)

@@ -64,7 +64,7 @@ private:
     [[noreturn]] void failWithout(const std::string& path, const StatementProfile& profile) const;
     void readAll(const std::string& path, char separator);
     void decode();
-    void passOverEnd(const std::string& path);
+    void passOverEnd(const std::string& path, const StatementProfile& profile);
     void settleDates(const std::string& path, const StatementProfile& profile);
     void settleDecimalMarks(char separator);
 

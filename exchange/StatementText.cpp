@@ -1,6 +1,8 @@
 #include "exchange/StatementText.h"
 
+#include "exchange/StatementWords.h"
 #include "exchange/TextForms.h"
+#include "foundation/FoldedText.h"
 
 #include <algorithm>
 #include <array>
@@ -43,7 +45,7 @@ std::string plainForm(std::string_view text)
 }
 
 /// Whether the letters beside a number belong to it: a currency's sign or code, or what shares are counted in.
-bool isUnit(const std::string& text)
+bool isUnit(std::string_view text)
 {
     constexpr std::string_view kCounted[] = {"st", "stk", "stuck", "shares", "units", "pcs", "titres", "parts"};
     constexpr std::size_t kCode = 3;
@@ -51,7 +53,7 @@ bool isUnit(const std::string& text)
     const auto isAscii = [](char c) { return static_cast<unsigned char>(c) < 0x80; };
     const bool isCode = text.size() == kCode && std::ranges::all_of(text, [](char c) { return c >= 'A' && c <= 'Z'; });
     return isCode || (text.size() <= kLongestSign && std::ranges::none_of(text, isAscii)) ||
-           std::ranges::find(kCounted, wordKey(text)) != std::end(kCounted);
+           std::ranges::find(kCounted, wordKey(text)) != std::end(kCounted) || !currencyCodesOf(text).empty();
 }
 
 } // namespace
@@ -89,8 +91,9 @@ bool WrittenNumber::isNone(std::string_view text)
 bool WrittenNumber::takeUnits(std::string_view front, std::string_view back)
 {
     int signs = 0;
-    int open = 0; // parentheses mean minus
-    for (const std::string_view part : {front, back})
+    int open = 0;      // parentheses mean minus
+    std::string words; // with blanks between
+    for (const std::string_view part : {front, back}) {
         for (const char c : part)
             if (c == '-' || c == '+') {
                 ++signs;
@@ -103,16 +106,25 @@ bool WrittenNumber::takeUnits(std::string_view front, std::string_view back)
                 isPercent_ = true;
             } else if (isDigit(c) || c == ',' || c == '/') {
                 return false;
-            } else if (c != ' ' && c != '.' && c != '$') {
-                unit_ += c;
+            } else if (c != '.') {
+                words += c;
             }
-    // Banks of the continent set "S" (Soll) and "H" (Haben) behind, others "DR" and "CR".
-    const std::string key = lowerCased(unit_);
-    if (key == "s" || key == "dr" || key == "h" || key == "cr") {
-        isNegative_ = isNegative_ || key == "s" || key == "dr";
-        unit_.clear();
+        words += ' ';
     }
-    return signs <= 1 && open == 0 && isUnit(unit_);
+    for (const std::string_view word : splitAtBlanks(words)) {
+        // Banks of the continent set "S" (Soll) and "H" (Haben) behind, others "DR" and "CR".
+        const std::string key = foldedText(word);
+        const bool isDebit = key == "s" || key == "dr";
+        isNegative_ = isNegative_ || isDebit;
+        if (isDebit || key == "h" || key == "cr")
+            continue;
+        // "$5 USD" is one unit, of which the code tells more.
+        if (!isUnit(word) || (!unit_.empty() && unit_ != "$" && word != "$"))
+            return false;
+        if (unit_.empty() || unit_ == "$")
+            unit_ = word;
+    }
+    return signs <= 1 && open == 0;
 }
 
 char WrittenNumber::decimalMark() const

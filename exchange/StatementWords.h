@@ -46,3 +46,7 @@ std::optional<StatementType> typeOfWord(std::string_view key);
 /// "deposit", "withdrawal", ..., "charge".
 const char* nameOf(StatementType type);
 std::optional<StatementType> typeNamed(std::string_view name);
+
+/// The codes of the currencies that a code, sign or word beside an amount may mean, with blanks between: "EUR" for "€",
+/// several for "$". Empty for what means none.
+std::string_view currencyCodesOf(std::string_view text);

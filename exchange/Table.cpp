@@ -1,5 +1,6 @@
 #include "exchange/Table.h"
 
+#include "exchange/StatementText.h"
 #include "foundation/DateText.h"
 #include "foundation/PrintableText.h"
 
@@ -44,7 +45,7 @@ std::string shown(std::string_view text)
 
 // The reader is always one record ahead: `more_` says whether `reader_.fields()` is a row that nobody has taken yet.
 // The constructor reads the first record to see whether it is a header, `forEach` takes the rows from there on.
-Table::Table(const std::string& path, const TableForm& form) : path_(path), reader_(path), more_(reader_.next())
+Table::Table(const std::string& path, const TableForm& form) : path_(path), reader_(path), more_(next())
 {
     const bool header = takeHeader(form);
     // What looked like headings by accident is forgotten again: the columns are where the plain form has them.
@@ -62,7 +63,16 @@ Table::Table(const std::string& path, const TableForm& form) : path_(path), read
             throw std::runtime_error(path + ": the header line names no column for the " + describe(form.plain[i]));
     // The header line is no row: the first one is behind it. Without a header the record read is a row.
     if (header)
-        more_ = reader_.next();
+        more_ = next();
+}
+
+/// Goes to the next record. @return false at the end of the file.
+bool Table::next()
+{
+    if (!reader_.next())
+        return false;
+    reader_.decode();
+    return true;
 }
 
 /// Finds the columns by the headings in the first record. @return whether it is a header line: it names a column of
@@ -120,7 +130,7 @@ std::size_t Table::forEach(const std::function<void()>& take, const TableWatch& 
     std::size_t refused = 0;
     // A row that throws leaves the table as it was: the next one is read as if this one had never been there. Other
     // errors are the file's, and end the reading.
-    for (std::size_t row = 0; more_; more_ = reader_.next(), ++row) {
+    for (std::size_t row = 0; more_; more_ = next(), ++row) {
         if (row % kRowsOfAStep == 0 && watch.progress)
             watch.progress(path_, reader_.progress());
         try {
@@ -159,8 +169,12 @@ std::string_view Table::cell(const WideColumn& column) const
 Date Table::date() const
 {
     const std::string_view text = cell(Column::kDate);
-    const std::optional<Date> date = parseDate(text);
-    if (!date)
+    std::optional<Date> date = parseDate(text);
+    // Of all other forms those that can be read in one way only: with points the day comes first.
+    if (const auto written = date ? std::nullopt : WrittenDate::read(text))
+        if (written->isOrderKnown || text.find('.') == text.find_first_not_of("0123456789"))
+            date = written->date(false);
+    if (!date || date->isUndefined())
         throw UnusableRow(shown(text) + " is no date as YYYY-MM-DD or DD/MM/YYYY");
     return *date;
 }

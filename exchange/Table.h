@@ -86,6 +86,7 @@ private:
 
     std::size_t& place(Column column) { return places_[static_cast<std::size_t>(column)]; }
     std::size_t place(Column column) const { return places_[static_cast<std::size_t>(column)]; }
+    bool next();
     bool takeHeader(const TableForm& form);
     void takeWideColumns(const TableForm& form);
     std::string_view field(std::size_t i) const;

@@ -1,5 +1,7 @@
 #include "exchange/TextForms.h"
 
+#include "foundation/FoldedText.h"
+
 #include <algorithm>
 #include <array>
 #include <cstddef>
@@ -37,39 +39,12 @@ bool isIn(char32_t c, char32_t first, char32_t last)
     return c >= first && c <= last;
 }
 
-char32_t lowerCase(char32_t c)
-{
-    constexpr char32_t kTimes = 0xD7; // stands among the capital letters
-    if (isIn(c, 'A', 'Z') || (isIn(c, 0xC0, 0xDE) && c != kTimes) || isIn(c, 0x391, 0x3A9) || isIn(c, 0x410, 0x42F))
-        return c + 32;
-    if (isIn(c, 0x400, 0x40F))
-        return c + 80;
-    // The other Latin letters stand in pairs; which one of a pair is the capital changes twice.
-    if (isIn(c, 0x100, 0x137) || isIn(c, 0x14A, 0x177))
-        return c | 1;
-    if (isIn(c, 0x139, 0x148) || isIn(c, 0x179, 0x17E))
-        return c + c % 2;
-    return c == 0x178 ? 0xFF : c;
-}
-
-/// The letters that a small letter of Western Europe is without its accent; null for any other character.
-const char* withoutAccent(char32_t c)
-{
-    constexpr std::array<const char*, 33> kLetters = {"ss", "a", "a", "a", "a", "a", "a", "ae", "c", "e",  "e",
-                                                      "e",  "e", "i", "i", "i", "i", "d", "n",  "o", "o",  "o",
-                                                      "o",  "o", "",  "o", "u", "u", "u", "u",  "y", "th", "y"};
-    constexpr char32_t kFirst = 0xDF;
-    if (isIn(c, kFirst, kFirst + kLetters.size() - 1))
-        return kLetters[c - kFirst];
-    return c == 0x153 ? "oe" : nullptr;
-}
-
-/// Whether a character of a heading is passed over: marks of any kind, and accents that stand behind their letter.
+/// Whether a character of a folded heading is passed over: marks of any kind.
 bool isMark(char32_t c)
 {
     if (c < 0x80)
         return !isIn(c, 'a', 'z') && !isIn(c, '0', '9');
-    return isIn(c, 0x80, 0xBF) || isIn(c, 0x300, 0x36F) || isIn(c, 0x2000, 0x206F);
+    return isIn(c, 0x80, 0xBF) || isIn(c, 0x2000, 0x206F);
 }
 
 } // namespace
@@ -122,29 +97,15 @@ std::string fromWindows1252(std::string_view bytes)
     return utf8;
 }
 
-std::string lowerCased(std::string_view utf8)
-{
-    std::string result;
-    while (!utf8.empty()) {
-        const char first = utf8.front();
-        const char32_t c = takeCharacter(utf8);
-        if (c == kBrokenCharacter)
-            result += first;
-        else
-            append(&result, lowerCase(c));
-    }
-    return result;
-}
-
 std::string wordKey(std::string_view utf8)
 {
     std::string key;
-    for (std::string_view rest = utf8; !rest.empty();) {
-        const char32_t c = lowerCase(takeCharacter(rest));
-        if (const char* letters = withoutAccent(c))
-            key += letters;
-        else if (c != kBrokenCharacter && !isMark(c))
-            append(&key, c);
+    const std::string folded = foldedText(utf8);
+    for (std::string_view rest = folded; !rest.empty();) {
+        const char* at = rest.data();
+        const char32_t c = takeCharacter(rest);
+        if (c != kBrokenCharacter && !isMark(c))
+            key.append(at, rest.data());
     }
     return key.empty() ? std::string(withoutBlanks(utf8)) : key;
 }

@@ -16,10 +16,7 @@ bool isUtf8(std::string_view bytes);
 /// five that have none become control characters, as every browser has it.
 std::string fromWindows1252(std::string_view bytes);
 
-/// Letters of Latin, Greek and Cyrillic in lower case. What is not UTF-8 stays as it is.
-std::string lowerCased(std::string_view utf8);
-
-/// What is left of a heading or word when case, accents, blanks and marks do not matter: "Date d'Opération" is
+/// What `foldedText` leaves of a heading or word when blanks and marks do not matter either: "Date d'Opération" is
 /// "datedoperation". Of a text without letters and digits, the text itself without blanks.
 std::string wordKey(std::string_view utf8);
 

@@ -19,8 +19,9 @@ const char* const kTables = R"(The tables are CSV files, plain or gzipped, with 
            or wide, a column a ticker: Date,AAPL,MSFT,...
   rates    date,currency,rate, likewise; or wide, as central banks publish them: Date,USD,JPY,...
   listing  ticker,market,currency,name, likewise; cells may be empty
-In a wide table an empty cell, N/A, NA or - is no value. Only ordinary files are read, no pipes. Dates are YYYY-MM-DD
-or DD/MM/YYYY. Numbers may have a decimal comma where commas do not separate the fields.
+In a wide table an empty cell, N/A, NA or - is no value. Only ordinary files are read, no pipes. Dates are
+YYYY-MM-DD, DD/MM/YYYY, DD.MM.YYYY or 2 January 2026, perhaps with a time behind. Numbers may have a decimal comma where
+commas do not separate the fields. Text that is not UTF-8 is Windows-1252.
 What a row of the quotes says comes before the listing, the listing before the options. Of two values for the same
 day the later line counts. A line that cannot be used is reported with its number and skipped.
 

@@ -92,6 +92,7 @@ TEST_F(ImportTest, CsvRecordsFollowRfc4180WithLineNumbers)
     EXPECT_THAT(records("\"a;b\",c\n"), ElementsAre("1:a;b|c")) << "a quoted semicolon separates nothing";
     EXPECT_THAT(records("\"a \"\"b\"\"\",\"\",\ne,f\"g\n"), ElementsAre("1:a \"b\"||", "2:e|f\"g"));
     EXPECT_THAT(records("\"a\"b,c\nd,e\n"), ElementsAre("1:!", "2:d|e")) << "text behind the closing quote";
+    EXPECT_THROW(records("a,b\n" + std::string(1'000'001, '\n') + "c,d"), std::runtime_error) << "no end of blanks";
     const std::string longest(CsvReader::kLongestLine, 'x');
     EXPECT_THAT(records("a,b\n" + longest + "\nc"), ElementsAre("1:a|b", "2:" + longest, "3:c"));
 }
@@ -222,15 +223,30 @@ TEST_F(ImportTest, AWideTableHasAColumnACurrencyOrTicker)
     EXPECT_EQ(plan.rateCounts.added, 4U) << "without those of the reference";
 }
 
-/// A catalogue in which names come several times. The pound has no rate.
+TEST_F(ImportTest, DatesAndTextsAreTakenAsOtherProgramsWriteThem)
+{
+    MarketImport importer = import(catalogue_);
+    // The daily table of a central bank, and a spreadsheet of a Windows program.
+    importer.addRates(folder_.write("r.csv", "Date, USD, \n3 January 2005, 1.25, \n"));
+    importer.addQuotes(folder_.write("q.csv",
+                                     "date;ticker;close;name\n03.01.2005;A;1,5;Caf\xE9\n20050104;A;2\n"
+                                     "2005-01-05T00:00:00;A;3\n05-01-2005;A;4\n01/02/05;A;4\n31.02.2005;A;4\n"));
+    MarketPlan plan = importer.plan();
+    plan.carryOut(catalogue_);
+    EXPECT_THAT(companies(), ElementsAre("NYSE/A/Caf\xC3\xA9/USD 03/01/2005=1.5 04/01/2005=2 05/01/2005=3"));
+    EXPECT_EQ(plan.refused, 3U) << "which could be other days, or are none";
+}
+
+/// A catalogue in which names come several times. The pound has no rate, the yen none that counts.
 void fillWithNamesakes(Catalogue& catalogue)
 {
-    for (const char* symbol : {"EUR", "USD", "GBP", "EUR"})
+    for (const char* symbol : {"EUR", "USD", "GBP", "EUR", "JPY"})
         catalogue.addCurrency(new Currency(symbol, symbol, nullptr));
     catalogue.setReferenceCurrency(catalogue.getCurrencies()[0]);
     const Date day(3, 1, 2005);
     new CurrencyQuote(catalogue.getCurrencies()[0], day, 1);
     new CurrencyQuote(catalogue.getCurrencies()[1], day, 0.8F);
+    new CurrencyQuote(catalogue.getCurrencies()[4], day, 0);
     const std::tuple<int, const char*, std::vector<const char*>> markets[] = {
         {0, "Paris", {"ALP"}}, {0, "LSE", {"DUO", "DUO"}}, {1, "LSE", {"DUO", "ONE"}}, {2, "LSE", {"PND"}}};
     for (const auto& [currency, name, tickers] : markets) {
@@ -259,6 +275,7 @@ TEST_F(ImportTest, ARowMeansTheFirstThatBearsItsNames)
         {"NEW,2,LSE,USD,", "3 LSE/NEW/NEW/USD", "or the first in that currency"},
         {"NEW,2,Rome,EUR,", "4 Rome/NEW/NEW/EUR", "a new market of the first euro"},
         {"PND,2,LSE,GBP,", "no rate of \"GBP\", in which \"PND\" is quoted", "worth nothing"},
+        {"NEW,2,Tokyo,JPY,", "no rate of \"JPY\", in which \"NEW\" is quoted", "the same"},
         {"NEW,2,LSE,CHF,", refused, "no market of that name trades in it"},
         {"ALP,2,,USD,", refused, "the only company is quoted in another"},
         {"NEW,2,,CHF,", refused, "no market, and not the option's currency"},
@@ -348,6 +365,22 @@ TEST_F(ImportTest, IntoAFileGoesWhatIsNewAndNothingElseChanges)
               "quotes: 0 new, 0 changed, 2 equal\nrates: 0 new, 0 changed, 2 equal\nrefused: 1\n");
     EXPECT_EQ(folder_.content("f"), after);
     EXPECT_EQ(backups().size(), 1U) << "nothing has changed";
+
+    // A series in disorder that does change: on its own days only.
+    folder_.write("b.csv", "date,ticker,close\n2005-01-03,B,1.5\n2005-01-02,B,2\n2005-01-09,B,2\n");
+    EXPECT_EQ(ToolRun(PELORIN_IMPORT, "--into f --quotes b.csv", folder_).status, 0);
+    EXPECT_THAT(
+        folder_.content("f"),
+        HasSubstr(bytesOf("05 00 00 00  02 00 01 00 D5 07 00 00 00 00 00 40  04 00 01 00 D5 07 00 00 00 00 C0 3F "
+                          "03 00 01 00 D5 07 00 00 00 00 C0 3F  04 00 01 00 D5 07 00 00 00 00 80 3F "
+                          "09 00 01 00 D5 07 00 00 00 00 00 40 ")))
+        << "of two quotes of a day that nobody named both stay";
+    folder_.write("b.csv", "date,ticker,close\n2005-01-04,B,2\n");
+    EXPECT_EQ(ToolRun(PELORIN_IMPORT, "--into f --quotes b.csv", folder_).status, 0);
+    EXPECT_THAT(folder_.content("f"), HasSubstr(bytesOf("04 00 01 00 D5 07 00 00 00 00 00 40 "
+                                                        "03 00 01 00 D5 07 00 00 00 00 C0 3F "
+                                                        "04 00 01 00 D5 07 00 00 00 00 00 40 ")))
+        << "and of the day that is named both change";
 }
 
 TEST_F(ImportTest, TablesInPartsGiveWhatTheyGiveInOneGo)
@@ -385,16 +418,22 @@ TEST_F(ImportTest, TheReferenceGetsTheDaysThatItLacks)
         {{1, 1}, "2005-01-02,USD,2\n2005-01-04,USD,2\n", " 02/01/2005=1 03/01/2005=1 04/01/2005=1", "all are 1"},
         {{1, 2}, "2005-01-02,USD,2\n", " 03/01/2005=1 04/01/2005=2", "it means something else"},
         {{}, "2005-01-02,USD,2\n", " 02/01/2005=1", "it had none"},
+        {{}, "date,ticker,close,market,currency\n2005-01-02,Q,2,Rome,EUR\n", " 02/01/2005=1", "it is quoted in"},
+        {{}, "date,ticker,close\n2005-01-02,Q,2\n", "", "no table names it"},
     };
     for (const auto& c : cases) {
         Catalogue catalogue;
         auto* euro = new Currency("Euro", "EUR", nullptr);
         catalogue.addCurrency(euro);
         catalogue.setReferenceCurrency(euro);
+        auto* dollar = new Currency("Dollar", "USD", nullptr);
+        catalogue.addCurrency(dollar);
+        new CurrencyQuote(dollar, Date(1, 1, 2005), 0.5F);
         for (short day = 3; const float rate : c.own)
             new CurrencyQuote(euro, Date(day++, 1, 2005), rate);
         MarketImport importer = import(catalogue);
-        importer.addRates(folder_.write("r.csv", c.tables));
+        const std::string table = folder_.write("t.csv", c.tables);
+        std::string_view(c.tables).starts_with("date") ? importer.addQuotes(table) : importer.addRates(table);
         importer.plan().carryOut(catalogue);
         EXPECT_EQ(quotes(*euro), c.rates) << c.why;
     }

@@ -7,6 +7,7 @@
 #include "valuation/State.h"
 
 #include <gmock/gmock.h>
+#include <set>
 #include <sstream>
 
 using testing::ElementsAre;
@@ -101,6 +102,10 @@ TEST_F(StatementTest, NumbersAreReadByTheDecimalMarkOfTheirColumn)
                  {"12.50-", '.', -12.5},
                  {"31,00 S", ',', -31},
                  {"EUR +7.5", '.', 7.5},
+                 {"US$ 7.5 DR", '.', -7.5},
+                 {"1.234,5 Euro", ',', 1234.5},
+                 {"$7 USD", '.', 7},
+                 {"EUR 7 USD", '.', kNone},
                  {"\xE2\x88\x92"
                   "3",
                   '.', -3},
@@ -148,11 +153,21 @@ TEST_F(StatementTest, WordsAreTheSameInAnyCaseAccentAndEncoding)
 {
     EXPECT_EQ(wordKey("Date d\xE2\x80\x99Op\xC3\xA9ration"), "datedoperation");
     EXPECT_EQ(wordKey("GEB\xC3\x9CHR"), wordKey("Gebu\xCC\x88hr")) << "an accent may stand behind its letter";
-    EXPECT_EQ(lowerCased("\xC3\x89T\xC3\x89 \xCE\xA9 \xD0\x96 \xC5\x81 \xC3\x97"),
-              "\xC3\xA9t\xC3\xA9 \xCF\x89 \xD0\xB6 \xC5\x82 \xC3\x97");
     EXPECT_EQ(fromWindows1252("\x80 \xFC\x9F"), "\xE2\x82\xAC \xC3\xBC\xC5\xB8");
     for (const char* broken : {"\xC3", "\xC0\x80", "\xE0\x80\x80", "\xED\xA0\x80", "\xF4\x90\x80\x80", "\xF8", "\x80"})
         EXPECT_FALSE(isUtf8(broken));
+}
+
+TEST_F(StatementTest, EachHeadingCanBeFoundAndMeansOneColumn)
+{
+    std::set<std::string_view> all;
+    for (std::size_t i = 0; i < kStatementColumns; ++i)
+        for (const std::string_view heading : headingsOf(static_cast<StatementColumn>(i))) {
+            EXPECT_TRUE(all.insert(heading).second) << heading;
+            EXPECT_EQ(wordKey(heading), heading) << "as a table's heading is looked for";
+        }
+    EXPECT_EQ(typeOfWord(wordKey("Frais de garde")), StatementType::kCharge);
+    EXPECT_EQ(typeOfWord(wordKey("Virement entrant")), StatementType::kDeposit);
 }
 
 TEST_F(StatementTest, EachLineBecomesTheOperationThatItMeans)
@@ -177,9 +192,10 @@ TEST_F(StatementTest, EachLineBecomesTheOperationThatItMeans)
         {"Buy;Giro;;Paris;AC;;20;61,4;-1.234,50;;;6,5;;;;", "Buy Giro 20 Paris/Alpha at 61.4 cost 6.5"},
         {"Sell;Giro;;Paris;AC;;20;61,4;;;1.221,50;6,5;;;;", "Sell Giro 20 Paris/Alpha at 61.4 cost 6.5"},
         {"Buy;Giro;;;GM;;-60;;1.515,95;;;5,95;;;;", "Buy Giro 60 Paris/G\xC3\xA4mma SA at 25.1667 cost 5.95"},
-        {"Sell;Giro;;;;g\xC3\x84MMA sa;-30;;;;818,05;5,95;;;;EUR",
-         "Sell Giro 30 Paris/G\xC3\xA4mma SA at 27.4667 cost 5.95"},
+        {"Sell;Giro;;;;GAMMA sa;-30;;;;818,05;5,95;;;;euro", "Sell Giro 30 Paris/G\xC3\xA4mma SA at 27.4667 cost 5.95"},
         {"Buy;Broker;;;AC;;2 St;USD 9;;;;;;;;", "Buy Broker 2 York/Beta at 9"},
+        {"Buy;Broker;;;AC;;2;0,00;0,00;;;;;;;", "Buy Broker 2 York/Beta at 0"}, // for free
+        {"Buy;Broker;;;AC;;2;0,00;18,00;;;;;;;", "Buy Broker 2 York/Beta at 9"},
         {"Buy;Broker;;;gm;;2;9;;;;;;;;", "Buy Broker 2 York/Gamma at 9"},
     };
     std::string csv = kHeadings;
@@ -205,6 +221,9 @@ TEST_F(StatementTest, ALineThatCannotBeBookedIsRefusedWithItsNumberAndReason)
                  {"01.02.2026;Deposit;Giro;;;;;;;x;;;;;;;", "\"x\" in the column \"Amount\" is no number"},
                  {"01.02.2026;Deposit;Giro;;;;;;;1;;;;;;;USD", "is in \"USD\", but the account \"Giro\" is in \"EUR\""},
                  {"01.02.2026;Deposit;Giro;;;;;;;USD 1;;;;;;;", "is in \"USD\", but"},
+                 {"01.02.2026;Deposit;Giro;;;;;;;1;;;;;;;CHF", "is in \"CHF\", but"},
+                 {"01.02.2026;Deposit;Giro;;;;;;;$1;;;;;;;", "is in \"$\", but"},
+                 {"01.02.2026;Deposit;Broker;;;;;;;1;;;;;;;\xE2\x82\xAC", "but the account \"Broker\" is in \"USD\""},
                  {"01.02.2026;Fee;Giro;;;;;;;0,00;;;;;;;", "has an amount of 0"},
                  {"01.02.2026;Transfer;Giro;;;;;;;1;;;;;;;", "names no account to transfer to"},
                  {"01.02.2026;Transfer;Giro;Giro;;;;;;1;;;;;;;", "to the account that it comes from"},
@@ -240,8 +259,13 @@ TEST_F(StatementTest, WhatCountsForTheWholeTableIsFoundAnywhereInIt)
                         giro),
                 ElementsAre("01/02/2026 Deposit Giro 1234", "02/02/2026 Deposit Giro 5.5"));
     EXPECT_THAT(passedOver_, ElementsAre(1, 7));
+    EXPECT_THAT(planned("Date;Type;Amount\n01.02.2026;Deposit;1\n46027;Deposit;2\nTotal 2;;3\n", giro),
+                ElementsAre("01/02/2026 Deposit Giro 1", "3: \"46027\" is no date"));
     EXPECT_THAT(planned("Date,Type,Amount\n01/02/2026,Deposit,1.250\n03/13/2026,Deposit,2\n", giro),
                 ElementsAre("02/01/2026 Deposit Giro 1.25", "13/03/2026 Deposit Giro 2"));
+    EXPECT_THAT(planned("Date,Settled,Type,Amount\n01/02/2026,01/13/2026,Deposit,2\n", giro),
+                ElementsAre("02/01/2026 Deposit Giro 2"))
+        << "any date shows the order";
     EXPECT_THAT(planned("Date;Type;Amount\n01/02/2026;Deposit;1,250\n", giro),
                 ElementsAre(HasSubstr("2: \"1,250\" in the column \"Amount\" may be a thousand times too large")));
 
