@@ -252,6 +252,13 @@ double lastEuros(const char* program, const std::string& arguments, const Tempor
     if (run.status != 0 || !run.err.empty() || end == run.out.npos) {
         ADD_FAILURE() << program << ' ' << arguments << ": " << run.err;
         return NAN;
+    EXPECT_THAT(ToolRun(PELORIN_EXPORT, "data/Companies/Sample --to tables", folder).err,
+                HasSubstr("tables/accounts.csv: is from before"));
+    for (const std::string form : {"csv", "ledger"})
+        EXPECT_THAT(ToolRun("ulimit", "-f 64; '" PELORIN_EXPORT "' " + sample + " --to full --as " + form, folder).err,
+                    HasSubstr(": cannot be written: File too large"))
+            << form;
+    EXPECT_TRUE(std::filesystem::is_empty(folder / "full"));
     }
     return std::stod(run.out.substr(begin + 1));
 }
