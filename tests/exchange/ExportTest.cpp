@@ -161,7 +161,7 @@ void importFrom(const std::string& folder, Loaded& loaded)
 {
     FolderImport tables(folder);
     tables.readMarketData(loaded.catalogue);
-    tables.readPortfolio(loaded.wallet);
+    tables.readPortfolio(loaded.wallet, loaded.catalogue);
 }
 
 } // namespace
@@ -174,6 +174,10 @@ TEST(ExportTest, WhatIsReadBackIsWhatWasThereByteForByte)
         Loaded before{RandomFiles(seed)};
         exportTo(folder.path, before);
         Loaded after;
+        importFrom(folder.path, after);
+        ASSERT_TRUE(after.market() == before.market()) << seed;
+        ASSERT_TRUE(after.portfolio() == before.portfolio()) << seed;
+        // And it stays so when they are read once more: what bears the name of another one is told from it.
         importFrom(folder.path, after);
         ASSERT_TRUE(after.market() == before.market()) << seed;
         ASSERT_TRUE(after.portfolio() == before.portfolio()) << seed;
@@ -213,6 +217,10 @@ TEST(ExportTest, TablesAddWhatIsNewToFilesThatAreThereAndRefuseTheRest)
     EXPECT_EQ(folder.content("market").size(), market.size() + 2 * 12 + 4 + 3 + 4 + 1 + 4 + 4);
     EXPECT_EQ(folder.content("wallet").size(), wallet.size() + 13);
 
+    // From here on the tables also have a currency and a market that are called like others.
+    append("tables/currencies.csv", "EUX,Euro,,\n");
+    append("tables/markets.csv", "Paris,EUX,\n");
+    append("tables/listing.csv", "VMBC,Paris,EUX,,\n");
     folder.write("foreign/quotes.csv", "Date,Ticker,Close\n");
     folder.write("dollar",
                  bytesOf("03000000'USD' 01000000 0000000000000000 03000000'USD' 03000000'USD' 00000000 00000000"));
@@ -222,7 +230,10 @@ TEST(ExportTest, TablesAddWhatIsNewToFilesThatAreThereAndRefuseTheRest)
     } cases[] = {
         {into, "rates.csv", "2020-07-20,XXX,1\n", "\"XXX\" under Currency is in no other table"},
         {into, "rates.csv", "2020-07-20,USD,\n", "\"\" is no number with a decimal point"},
-        {into, "accounts.csv", "Savings,USD,,,,\n", "accounts.csv, line 6: has the account \"Savings\" in \"USD\""},
+        {into, "accounts.csv", "Savings,USD,,,,\n", "accounts.csv, line 6: names the account \"Savings\" once more"},
+        {into, "accounts.csv", "New,EUX,,,,\n", "cannot refer to the currency \"EUX\" by the name \"Euro\""},
+        {into, "holdings.csv", "2025-07-20,Paris,VMBC,EUX,,,,,,\n",
+         "cannot refer to the market of the company \"VMBC\" by the name \"Paris\""},
         {" --from tables --into dollar", "rates.csv", "",
          "has the reference currency \"EUR\", and the market file has \"USD\""},
         {" --from foreign --into market", "rates.csv", "", "foreign/currencies.csv: cannot be opened"},
@@ -236,6 +247,8 @@ TEST(ExportTest, TablesAddWhatIsNewToFilesThatAreThereAndRefuseTheRest)
         EXPECT_EQ(run.status, 1) << c.message;
         EXPECT_THAT(run.err, HasSubstr(c.message));
     }
+    folder.write("tables/accounts.csv", "Account,Currency,Default Transfer,Cash,Value,Original\nSavings,USD,,,,\n");
+    EXPECT_THAT(import(into).err, HasSubstr("accounts.csv, line 2: has the account \"Savings\" in \"USD\""));
     EXPECT_TRUE(folder.content("market") + folder.content("wallet") == now);
     EXPECT_THAT(ToolRun(PELORIN_EXPORT, sample + " --to foreign", folder).err, HasSubstr("was not made by an export"));
     EXPECT_EQ(folder.content("foreign/quotes.csv"), "Date,Ticker,Close\n");
