@@ -2,6 +2,7 @@
 
 #include "exchange/CsvReader.h"
 #include "storage/InputFile.h"
+#include "storage/Writing.h"
 
 #include <filesystem>
 #include <stdexcept>
@@ -63,7 +64,7 @@ CsvWriter::CsvWriter(const std::string& path, const std::vector<std::string>& he
     : path_(checked(path, headings)), file_(path, AtomicFile::Existing::kReplace)
 {
     putRow(&line_, headings);
-    std::fwrite(line_.data(), 1, line_.size(), file_.stream());
+    write();
 }
 
 bool CsvWriter::add(const std::vector<std::string>& cells)
@@ -72,7 +73,13 @@ bool CsvWriter::add(const std::vector<std::string>& cells)
     if (line_.size() > CsvReader::kLongestLine)
         return false;
     ++rows_;
-    // A failure stays marked on the file, and `commit` asks for it.
-    std::fwrite(line_.data(), 1, line_.size(), file_.stream());
+    write();
     return true;
+}
+
+void CsvWriter::write()
+{
+    // Told here, where the reason is known still.
+    if (std::fwrite(line_.data(), 1, line_.size(), file_.stream()) != line_.size())
+        failWriting(path_);
 }

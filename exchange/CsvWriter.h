@@ -25,6 +25,8 @@ public:
     std::size_t rows() const { return rows_; }
 
 private:
+    void write();
+
     std::string path_;
     std::size_t rows_ = 0;
     std::string line_;

@@ -33,6 +33,9 @@ inline const ExportTable kOperations{"operations.csv",
 inline const ExportTable kParameters{"parameters.csv", {"Parameter", "Value"}};
 inline const ExportTable kEvolution{"evolution.csv", {"Date", "Total Value"}};
 
+/// What an export has of a portfolio.
+inline const ExportTable* const kOfPortfolio[] = {&kAccounts, &kHoldings, &kOperations, &kParameters, &kEvolution};
+
 /// By the numbers of `Wallet::Parameter`.
 inline constexpr const char* kParameterNames[] = {"Buy Cost",
                                                   "Sell Cost",

@@ -28,7 +28,7 @@ bool ExportedTable::next()
     if (!reader_.next())
         return false;
     if (reader_.fields().empty())
-        refuse("has a quote that is not closed, or is too long");
+        refuse("has text behind a closing quote");
     return true;
 }
 

@@ -66,13 +66,12 @@ void FolderImport::readMarketData(Catalogue& catalogue)
 void FolderImport::readCurrencies(Catalogue& catalogue)
 {
     enum { kSymbol, kName, kReference, kOriginal };
-    // The tables may have several of a symbol: only those that were there before are matched.
-    std::unordered_map<std::string, Currency*> before;
+    Before<Currency> before;
     for (Currency* currency : catalogue.getCurrencies())
-        before.try_emplace(std::string(currency->getRepresentation().comparedBytes()), currency);
+        before.emplace(Key{nullptr, currency->getRepresentation().comparedBytes()}, currency);
     for (ExportedTable row(folder_, kCurrencies); row.next();) {
         const std::string symbol = TableNames::originalOf(row.cell(kOriginal), row.cell(kSymbol));
-        Currency* currency = found(before, symbol);
+        Currency* currency = take(before, {nullptr, symbol});
         if (currency == nullptr) {
             currency = new Currency(toString(unescaped(row.cell(kName))), toString(symbol), nullptr);
             catalogue.addCurrency(currency);
@@ -84,7 +83,7 @@ void FolderImport::readCurrencies(Catalogue& catalogue)
         if (catalogue.getReferenceCurrency() != nullptr && catalogue.getReferenceCurrency() != currency)
             row.refuse("has the reference currency " + shown(symbol) + ", and the market file has " +
                        shown(catalogue.getReferenceCurrency()->getRepresentation().bytes()) +
-                       ": change it there (--reference), or name a file that is new");
+                       ": change it there, or name a file that is new");
         // No rate is divided: they come as they are in this currency.
         catalogue.setReferenceCurrency(currency);
     }
@@ -96,13 +95,13 @@ void FolderImport::readCurrencies(Catalogue& catalogue)
 void FolderImport::readMarkets(const Catalogue& catalogue)
 {
     enum { kMarket, kCurrency, kOriginal };
-    Named<Market> before;
+    Before<Market> before;
     for (Market* market : catalogue.getMarkets())
-        before.try_emplace({market->currency(), std::string(market->getName().comparedBytes())}, market);
+        before.emplace(Key{market->currency(), market->getName().comparedBytes()}, market);
     for (ExportedTable row(folder_, kMarkets); row.next();) {
         Currency* currency = currencyOf(row, kCurrency);
         const std::string name = TableNames::originalOf(row.cell(kOriginal), row.cell(kMarket));
-        Market* market = found(before, {currency, name});
+        Market* market = take(before, {currency, name});
         if (market == nullptr) {
             market = new Market(toString(name)); // owned by its currency
             market->setCurrency(currency);
@@ -115,14 +114,14 @@ void FolderImport::readMarkets(const Catalogue& catalogue)
 void FolderImport::readListing(const Catalogue& catalogue)
 {
     enum { kTicker, kMarket, kCurrency, kName, kOriginal };
-    Named<Company> before;
+    Before<Company> before;
     for (Market* market : catalogue.getMarkets())
         for (Company* company : market->companies())
-            before.try_emplace({market, std::string(company->getAbbreviation().comparedBytes())}, company);
+            before.emplace(Key{market, company->getAbbreviation().comparedBytes()}, company);
     for (ExportedTable row(folder_, kListing); row.next();) {
         Market* market = marketOf(row, kMarket, kCurrency);
         const std::string ticker = TableNames::originalOf(row.cell(kOriginal), row.cell(kTicker));
-        Company* company = found(before, {market, ticker});
+        Company* company = take(before, {market, ticker});
         if (company == nullptr)
             company = new Company(market, toString(unescaped(row.cell(kName))), toString(ticker));
         if (!companies_.try_emplace({market, row.cell(kTicker)}, company).second)

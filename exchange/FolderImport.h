@@ -32,8 +32,9 @@ public:
 
     /// Throws, too, when the catalogue has another reference currency than the tables.
     void readMarketData(Catalogue& catalogue);
-    /// Comes behind `readMarketData`; the wallet has been read with that catalogue as it was before, or is new.
-    void readPortfolio(Wallet& wallet);
+    /// Comes behind `readMarketData`; the wallet has been read with that catalogue as it was before, or is new, and
+    /// knows it as it is now afterwards. Throws, too, when a file of the wallet would refer to something else than it.
+    void readPortfolio(Wallet& wallet, const Catalogue& catalogue);
 
     const ValueCounts& quotes() const { return quotes_; }
     /// Without those of the reference currency.
@@ -42,9 +43,22 @@ public:
     const ValueCounts& operations() const { return operations_; }
 
 private:
+    /// A name, and what it is a name in.
+    using Key = std::pair<const void*, std::string>;
     /// What the row of a table names.
     template <class T>
-    using Named = std::map<std::pair<const void*, std::string>, T*>;
+    using Named = std::map<Key, T*>;
+    /// What was there before, those of one name in their order.
+    template <class T>
+    using Before = std::multimap<Key, T*>;
+    /// Takes the first of that name, so that the next row of it, which the table calls otherwise, gets the second.
+    /// @return null when there is none left.
+    template <class T>
+    static T* take(Before<T>& before, const Key& key)
+    {
+        const auto first = before.extract(key);
+        return first ? first.mapped() : nullptr;
+    }
 
     void readCurrencies(Catalogue& catalogue);
     void readMarkets(const Catalogue& catalogue);
@@ -59,6 +73,7 @@ private:
     Operation* makeTrade(const ExportedTable& row, Account* account, bool isBuy) const;
     Operation* makeTransfer(const ExportedTable& row, Account* account) const;
     void readParameters(Wallet& wallet);
+    static void checkNames(const Wallet& wallet);
 
     Currency* currencyOf(const ExportedTable& row, std::size_t column) const;
     Market* marketOf(const ExportedTable& row, std::size_t market, std::size_t currency) const;

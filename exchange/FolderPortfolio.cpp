@@ -4,6 +4,7 @@
 #include "exchange/Table.h"
 #include "exchange/TableNames.h"
 #include "exchange/TableText.h"
+#include "market/Catalogue.h"
 #include "market/Currency.h"
 #include "market/Market.h"
 #include "portfolio/DepositAccountOperation.h"
@@ -13,6 +14,7 @@
 #include "portfolio/Wallet.h"
 
 #include <algorithm>
+#include <stdexcept>
 
 using namespace export_tables;
 
@@ -38,7 +40,7 @@ enum {
 
 } // namespace
 
-void FolderImport::readPortfolio(Wallet& wallet)
+void FolderImport::readPortfolio(Wallet& wallet, const Catalogue& catalogue)
 {
     const bool isNew = wallet.getNbrAccounts() == 0 && wallet.getNbrShares() == 0;
     BookedOperations before(wallet);
@@ -49,20 +51,46 @@ void FolderImport::readPortfolio(Wallet& wallet)
     // Those of a portfolio that is there are its owner's.
     if (isNew)
         readParameters(wallet);
+    wallet.setCatalogue(catalogue);
+    checkNames(wallet);
+}
+
+/// Throws where a reader of the portfolio's file, which has nothing but names, would find something else by them than
+/// is meant: what the tables have brought may be called like what is there.
+void FolderImport::checkNames(const Wallet& wallet)
+{
+    const auto refuse = [](const std::string& what, const String& name) {
+        throw std::runtime_error("a portfolio cannot refer to " + what + " by the name " + shown(name.bytes()) +
+                                 ", since another one has it, or it is none: rename one of them");
+    };
+    for (const Account* account : wallet.accounts()) {
+        Currency* named;
+        const Currency* currency = account->currency();
+        if (currency->getName().isUndefined() || wallet.getCurrency(currency->getName(), &named) != 0 ||
+            named != currency)
+            refuse("the currency " + shown(currency->getRepresentation().bytes()), currency->getName());
+    }
+    for (const Share* share : wallet.shares()) {
+        Company* named;
+        if (wallet.getCompany(share->getMarketName(), share->getCompanyAbbreviation(), &named) != 0 ||
+            named != share->company())
+            refuse("the market of the company " + shown(share->getCompanyAbbreviation().bytes()),
+                   share->getMarketName());
+    }
 }
 
 void FolderImport::readAccounts(Wallet& wallet)
 {
     enum { kAccount, kCurrency, kDefault, kCash, kValue, kOriginal };
-    std::unordered_map<std::string, Account*> before;
+    Before<Account> before;
     for (Account* account : wallet.accounts())
-        before.try_emplace(std::string(account->getName().comparedBytes()), account);
+        before.emplace(Key{nullptr, account->getName().comparedBytes()}, account);
     for (ExportedTable row(folder_, kAccounts); row.next();) {
         Currency* currency = currencyOf(row, kCurrency);
         const std::string name = TableNames::originalOf(row.cell(kOriginal), row.cell(kAccount));
-        const auto known = before.find(name);
-        Account* account = known != before.end() ? known->second : new Account(String(name.c_str()));
-        if (known == before.end()) {
+        Account* account = take(before, {nullptr, name});
+        if (account == nullptr) {
+            account = new Account(String(name.c_str()));
             account->setWallet(&wallet);
             account->setCurrency(currency);
             account->setDefaultTransferAccount(row.cell(kDefault) == kYes);

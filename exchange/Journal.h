@@ -54,7 +54,8 @@ private:
     void addRounding(const std::string& account, double difference, const String& symbol, Transaction* transaction);
     void addPrices();
     void addPricesOf(const Company& company);
-    void addPricesOf(const Currency& currency);
+    /// Of one that nothing is in that of the day alone.
+    void addPricesOf(const Currency& currency, bool isUsed);
     /// In the reference currency; where they change on days of the company's quotes or the currency's rates.
     void addDirectPricesOf(const Company& company, const Currency& currency);
     template <class Series, class ValueOf>
@@ -76,7 +77,7 @@ private:
     std::vector<const Company*> companies_;
     JournalNames names_;
 
-    std::vector<const Currency*> currencies_; // those that anything is in, the first of each symbol
+    std::vector<const Currency*> currencies_; // the first of each symbol
     std::vector<Transaction> transactions_;
     std::map<std::string, Date> opened_; // accounts, with the day of their first posting
     std::unordered_map<const Account*, Units> cash_;

@@ -1,6 +1,6 @@
 #include "exchange/JournalForm.h"
 
-#include "exchange/TableText.h"
+#include "exchange/TextForms.h"
 #include "exchange/UniqueNames.h"
 
 #include <algorithm>
@@ -35,21 +35,26 @@ std::string cut(std::string text, std::size_t length)
     return text.substr(0, length);
 }
 
-/// The letters of Western Europe without their accents; of other characters that are not ASCII each is a '-', or stays.
+/// One line of UTF-8 with the letters of Western Europe without their accents, and blanks of any width as plain ones;
+/// of other characters that are not ASCII each is a '-', or stays.
 std::string plain(std::string_view name, bool keepsOthers)
 {
-    // U+00C0 to U+00FF, the two-byte characters that begin with C3.
+    constexpr char32_t kFirst = 0xC0;
     constexpr std::string_view kLetters = "AAAAAAACEEEEIIIIDNOOOOO-OUUUUYTsaaaaaaaceeeeiiiidnooooo-ouuuuyty";
     std::string text;
     while (!name.empty()) {
-        const std::size_t length = std::max<std::size_t>(characterLength(name), 1);
-        if (length == 2 && name[0] == '\xC3')
-            text += kLetters[static_cast<unsigned char>(name[1]) - 0x80U];
+        const std::string_view rest = name;
+        const char32_t c = takeCharacter(name);
+        if (isBlank(c))
+            text += ' ';
+        else if (c >= kFirst && c < kFirst + kLetters.size())
+            text += kLetters[c - kFirst];
+        else if (c < 0x80 || c == kBrokenCharacter || keepsOthers)
+            text += rest.substr(0, rest.size() - name.size());
         else
-            text += length == 1 || keepsOthers ? name.substr(0, length) : "-";
-        name.remove_prefix(length);
+            text += '-';
     }
-    return text;
+    return cleanName(text);
 }
 
 std::string quoted(const std::string& text)
@@ -68,8 +73,8 @@ public:
     std::string head() const override { return "; A portfolio of Pelorin, for ledger and hledger."; }
     std::string symbol(std::string_view name) const override
     {
-        // It stands between quotes, where these would end it.
-        return cut(replaced(name, "\";"), kLongestSymbol);
+        // It stands between quotes, where these would end it or hide their end.
+        return cut(replaced(name, "\";\\"), kLongestSymbol);
     }
     std::string accountPart(std::string_view name) const override { return replaced(name, ":;"); }
     std::vector<std::string> reserved() const override { return {"s", "m", "h", "%"}; } // units of time
@@ -106,7 +111,7 @@ private:
     static std::string replaced(std::string_view name, std::string_view characters)
     {
         // Without accents it is read whatever the locale, in which hledger takes a file to be.
-        std::string text = plain(cleanName(name), true);
+        std::string text = plain(name, true);
         std::ranges::replace_if(
             text, [characters](char c) { return characters.find(c) != characters.npos; }, '-');
         return text;
@@ -118,9 +123,9 @@ public:
     std::string head() const override { return ";; A portfolio of Pelorin, for beancount."; }
     std::string symbol(std::string_view name) const override
     {
-        std::string text = upper(plain(cleanName(name), false));
+        std::string text = upper(plain(name, false));
         std::ranges::replace_if(
-            text, [](char c) { return !isLetterOrDigit(c) && c != '.' && c != '_' && c != '\''; }, '-');
+            text, [](char c) { return !isLetterOrDigit(c) && c != '.' && c != '_'; }, '-'); // queries quote with '
         // It begins with a letter, has two characters at least, and ends with a letter or a digit.
         if (!isUpper(text.front()) || text.size() == 1)
             text = 'X' + text;
@@ -129,7 +134,7 @@ public:
     }
     std::string accountPart(std::string_view name) const override
     {
-        std::string text = plain(cleanName(name), false);
+        std::string text = plain(name, false);
         std::ranges::replace_if(
             text, [](char c) { return !isLetterOrDigit(c); }, '-');
         text[0] = upper(text.substr(0, 1))[0];

@@ -31,17 +31,15 @@ void Journal::addPrices()
         used.insert(account->getCurrencyRepresentation().comparedBytes());
     for (const Company* company : companies_)
         used.insert(company->getCurrencyRepresentation().comparedBytes());
-    const Currency* reference = catalogue_.getReferenceCurrency();
-    if (reference != nullptr)
-        used.insert(reference->getRepresentation().comparedBytes());
     // Of several of a symbol the first has the rates that count.
+    std::set<std::string_view> known;
     for (const Currency* currency : catalogue_.getCurrencies())
-        if (used.erase(currency->getRepresentation().comparedBytes()) > 0)
+        if (known.insert(currency->getRepresentation().comparedBytes()).second)
             currencies_.push_back(currency);
-    if (reference == nullptr)
+    if (catalogue_.getReferenceCurrency() == nullptr)
         remarks_.push_back("the market file has no reference currency, so that no currency has a price");
     for (const Currency* currency : currencies_)
-        addPricesOf(*currency);
+        addPricesOf(*currency, used.contains(currency->getRepresentation().comparedBytes()));
     for (const Company* company : companies_)
         addPricesOf(*company);
 }
@@ -57,14 +55,18 @@ void Journal::addSeries(const Series& series, const std::string& commodity, cons
     putPrice(day_, commodity, valueOf(day_, series.getRealQuote(day_)), in);
 }
 
-void Journal::addPricesOf(const Currency& currency)
+void Journal::addPricesOf(const Currency& currency, bool isUsed)
 {
     const Currency* reference = catalogue_.getReferenceCurrency();
     if (reference == nullptr || currency.getRepresentation() == reference->getRepresentation())
         return;
-    addSeries(currency, names_.ofCurrency(currency.getRepresentation()),
-              names_.ofCurrency(reference->getRepresentation()),
-              [reference](const Date& day, double rate) { return rate / reference->getRealQuote(day); });
+    const std::string& commodity = names_.ofCurrency(currency.getRepresentation());
+    const std::string& in = names_.ofCurrency(reference->getRepresentation());
+    const auto price = [reference](const Date& day, double rate) { return rate / reference->getRealQuote(day); };
+    if (isUsed)
+        addSeries(currency, commodity, in, price);
+    else
+        putPrice(day_, commodity, price(day_, currency.getRealQuote(day_)), in);
 }
 
 void Journal::addPricesOf(const Company& company)

@@ -22,10 +22,10 @@ public:
     template <class T>
     void take(const T& object, const String& name)
     {
-        const std::string& taken = unique_.take(cleanName(name.bytes()));
+        const std::string& taken = unique_.take(cleanName(name.comparedBytes()));
         all_.names_.emplace(&object, taken);
         if (taken != name.bytes())
-            all_.changes_.push_back(std::string("a ") + kind_ + " called \"" + printable(name.bytes()) + "\" is \"" +
+            all_.changes_.push_back(std::string(kind_) + " called \"" + printable(name.bytes()) + "\" is \"" +
                                     printable(taken) + "\" in the tables");
     }
 
@@ -37,29 +37,31 @@ private:
 
 TableNames::TableNames(const Catalogue& catalogue, const Wallet* wallet)
 {
-    Taker symbols(this, "currency");
+    Taker symbols(this, "a currency");
     for (const Currency* currency : catalogue.getCurrencies()) {
         symbols.take(*currency, currency->getRepresentation());
-        Taker markets(this, "market");
+        Taker markets(this, "a market");
         for (const Market* market : currency->markets()) {
             markets.take(*market, market->getName());
-            Taker tickers(this, "company");
+            Taker tickers(this, "a company");
             for (const Company* company : market->companies())
                 tickers.take(*company, company->getAbbreviation());
         }
     }
     if (wallet == nullptr)
         return;
-    Taker accounts(this, "account");
+    Taker accounts(this, "an account");
     for (const Account* account : wallet->accounts())
         accounts.take(*account, account->getName());
 }
 
 std::string TableNames::original(const String& name, const std::string& inTables)
 {
-    if (name.bytes() == inTables)
+    // What stands behind a zero byte is nowhere compared, nor shown.
+    const std::string_view text = name.comparedBytes();
+    if (text == inTables)
         return {};
-    return name.isUndefined() ? kEmptyName : escaped(name.bytes());
+    return text.empty() ? kEmptyName : escaped(text);
 }
 
 std::string TableNames::originalOf(const std::string& cell, const std::string& inTables)

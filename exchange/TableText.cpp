@@ -1,5 +1,7 @@
 #include "exchange/TableText.h"
 
+#include "exchange/TextForms.h"
+
 #include <charconv>
 #include <cstdio>
 #include <cstdlib>
@@ -16,11 +18,6 @@ std::optional<Number> readWhole(std::string_view text)
     if (error != std::errc() || end != text.data() + text.size())
         return std::nullopt;
     return number;
-}
-
-bool isControl(char c)
-{
-    return static_cast<unsigned char>(c) < ' ' || c == '\x7F';
 }
 
 /// The byte that "\xHH" at the beginning of `text` stands for; -1 for another text.
@@ -78,43 +75,20 @@ std::optional<Date> readTableDate(std::string_view text)
     return Date(day, month, year);
 }
 
-std::size_t characterLength(std::string_view text)
-{
-    if (text.empty())
-        return 0;
-    const auto byte = [text](std::size_t i) { return static_cast<unsigned char>(text[i]); };
-    const unsigned char lead = byte(0);
-    if (lead < 0x80)
-        return 1;
-    const std::size_t length = lead >= 0xF0 ? 4 : lead >= 0xE0 ? 3 : 2;
-    // 80..C1 and F5..FF begin no character.
-    if (lead < 0xC2 || lead > 0xF4 || text.size() < length)
-        return 0;
-    for (std::size_t i = 1; i < length; ++i)
-        if ((byte(i) & 0xC0) != 0x80)
-            return 0;
-    // Overlong forms, surrogates and what is beyond the last character.
-    const bool isOdd = (lead == 0xE0 && byte(1) < 0xA0) || (lead == 0xED && byte(1) > 0x9F) ||
-                       (lead == 0xF0 && byte(1) < 0x90) || (lead == 0xF4 && byte(1) > 0x8F);
-    return isOdd ? 0 : length;
-}
-
 std::string escaped(std::string_view bytes)
 {
     std::string text;
-    for (std::size_t i = 0; i < bytes.size();) {
-        const char c = bytes[i];
-        const std::size_t length = characterLength(bytes.substr(i));
+    while (!bytes.empty()) {
+        const std::string_view rest = bytes;
+        const char32_t c = takeCharacter(bytes);
         if (c == '\\' || c == '\n') {
             text += c == '\n' ? "\\n" : "\\\\";
-        } else if (length == 0 || isControl(c)) {
-            const auto byte = static_cast<unsigned char>(c);
+        } else if (c == kBrokenCharacter || c < ' ' || c == '\x7F') {
+            const auto byte = static_cast<unsigned char>(rest.front());
             text += {'\\', 'x', kHexDigits[byte >> 4], kHexDigits[byte & 0xF]};
         } else {
-            text += bytes.substr(i, length);
-            i += length - 1;
+            text += rest.substr(0, rest.size() - bytes.size());
         }
-        ++i;
     }
     return text;
 }

@@ -26,6 +26,3 @@ std::optional<Date> readTableDate(std::string_view text);
 std::string escaped(std::string_view bytes);
 /// What `escaped` was made of; what begins like no such sign stands for itself.
 std::string unescaped(std::string_view text);
-
-/// Length of the character of UTF-8 at the beginning of `text`; 0 when there is none.
-std::size_t characterLength(std::string_view text);

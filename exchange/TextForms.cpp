@@ -123,7 +123,8 @@ std::vector<std::string_view> splitAtBlanks(std::string_view text)
 
 bool isBlank(char32_t c)
 {
-    return c == ' ' || c == '\t' || c == 0xA0 || isIn(c, 0x2000, 0x200B) || c == 0x202F || c == 0x3000;
+    return c == ' ' || c == '\t' || c == 0xA0 || c == 0x1680 || isIn(c, 0x2000, 0x200B) || c == 0x202F || c == 0x205F ||
+           c == 0x3000;
 }
 
 std::string_view withoutBlanks(std::string_view utf8)

@@ -1,20 +1,17 @@
 #include "exchange/UniqueNames.h"
 
-#include "exchange/TableText.h"
-
-#include <algorithm>
+#include "exchange/TextForms.h"
 
 std::string cleanName(std::string_view bytes)
 {
     std::string name;
     while (!bytes.empty()) {
-        const std::size_t length = characterLength(bytes);
-        const bool isText = length > 0 && static_cast<unsigned char>(bytes.front()) > ' ' && bytes.front() != '\x7F';
-        if (isText)
-            name += bytes.substr(0, length);
+        const std::string_view rest = bytes;
+        const char32_t c = takeCharacter(bytes);
+        if (c > ' ' && c != '\x7F' && c != kBrokenCharacter)
+            name += rest.substr(0, rest.size() - bytes.size());
         else if (!name.empty() && name.back() != ' ')
             name += ' ';
-        bytes.remove_prefix(std::max<std::size_t>(length, 1));
     }
     if (name.ends_with(' '))
         name.pop_back();

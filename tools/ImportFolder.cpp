@@ -97,7 +97,7 @@ void ImportFolder::run(const CLI::App& app, const ImportArguments& arguments)
     FolderImport import(folder_);
     import.readMarketData(catalogue);
     if (hasPortfolio)
-        import.readPortfolio(wallet);
+        import.readPortfolio(wallet, catalogue);
     // Nothing is written before all is read. The portfolio names what the market file has, and so comes behind it.
     if (!arguments.dryRun) {
         save(arguments.into, marketStamp, catalogue);

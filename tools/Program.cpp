@@ -13,6 +13,7 @@ int runProgram(CLI::App& app, int argc, char** argv, const std::function<void()>
     constexpr int kBadArguments = 2;
     // A reader that leaves early is to be a failed write like any other.
     std::signal(SIGPIPE, SIG_IGN);
+    std::signal(SIGXFSZ, SIG_IGN); // so is a file that grows past the user's limit
     // Names are UTF-8 whatever the user's locale; without it they lose what is not ASCII in messages and tables.
     std::setlocale(LC_CTYPE, "C.UTF-8");
     app.set_version_flag("--version", PELORIN_VERSION);

@@ -1,7 +1,10 @@
 #include "exchange/ExportFolder.h"
+#include "exchange/ExportTables.h"
 #include "exchange/Journal.h"
 #include "foundation/Today.h"
+#include "storage/FileStamp.h"
 #include "storage/Folders.h"
+#include "storage/Writing.h"
 #include "tools/Program.h"
 #include "tools/Valuation.h"
 
@@ -68,6 +71,10 @@ void writeTables(const Arguments& arguments, Valuation& valuation)
     for (const auto& made : folder.commit())
         std::cout << made.path << ": " << made.rows << " rows\n";
     remark(folder.remarks());
+    if (!hasPortfolio)
+        for (const ExportTable* table : export_tables::kOfPortfolio)
+            if (const std::string path = arguments.folder + '/' + table->file; FileStamp::of(path))
+                remark({path + ": is from before, and of a portfolio that may not go with the other tables"});
 }
 
 void writeJournal(const Arguments& arguments, const Valuation& valuation)
@@ -77,7 +84,10 @@ void writeJournal(const Arguments& arguments, const Valuation& valuation)
     const Journal journal(valuation.catalogue(), valuation.wallet(), valuation.state(), form);
     checkReplaceable(path, form.head());
     AtomicFile file(path, AtomicFile::Existing::kReplace);
-    journal.write(file.stream());
+    fill(file.stream(), path, [&journal](FILE* stream) {
+        journal.write(stream);
+        return 0;
+    });
     file.commit();
     std::cout << path << ": " << journal.transactions() << " transactions, " << journal.prices() << " prices\n";
     remark(journal.remarks());
