@@ -102,8 +102,7 @@ bool StatementTable::isHeader(const Places& places, const StatementProfile& prof
 /// Finds the headings. @return the separator with which they are found.
 char StatementTable::findSeparator(const std::string& path, const StatementProfile& profile)
 {
-    std::size_t most = 0;
-    std::vector<std::string> closest; // to headings
+    std::pair<std::size_t, std::size_t> most; // columns that were found, and fields with a text
     places_.fill(kNowhere);
     for (const char separator : {'\t', ';', '|', ','}) {
         CsvReader reader(path, separator);
@@ -111,8 +110,10 @@ char StatementTable::findSeparator(const std::string& path, const StatementProfi
             const Places places = placesIn(reader.fields(), profile);
             const std::size_t found =
                 kStatementColumns - static_cast<std::size_t>(std::ranges::count(places, kNowhere));
-            if (found > most) {
-                most = found;
+            const auto texts = static_cast<std::size_t>(
+                std::ranges::count_if(reader.fields(), [](const auto& field) { return !field.empty(); }));
+            if (std::pair(found, texts) > most) {
+                most = {found, texts};
                 places_ = places;
                 headings_ = reader.fields();
             }
@@ -145,11 +146,23 @@ void StatementTable::failWithout(const std::string& path, const StatementProfile
         headings += (headings.empty() ? "" : ", ") + shown(readable(headings_[i]));
     if (headings_.size() > kMostTold)
         headings += ", ...";
-    throw std::runtime_error(path + ": no line has the headings of a statement: " +
-                             (missing.empty()
-                                  ? "they are on no single line"
-                                  : "there is no column for " + missing + ", which --column COLUMN=HEADING can name") +
-                             (headings.empty() ? "" : "; found were " + headings));
+    fail(path,
+         std::string("no line has the headings of a statement: ") +
+             (missing.empty() ? "they are on no single line" : "there is no column for " + missing),
+         (missing.empty() ? "" : ", which --column COLUMN=HEADING can name") +
+             (headings.empty() ? "" : "; found were " + headings));
+}
+
+/// @param remedy what the command line can do about it, to go on from the reason.
+void StatementTable::fail(const std::string& path, const std::string& reason, const std::string& remedy) const
+{
+    UnfitStatement unfit(path + ": " + reason + remedy);
+    unfit.reason = reason;
+    std::ranges::transform(headings_, std::back_inserter(unfit.headings), readable);
+    for (std::size_t i = 0; i < kStatementColumns; ++i)
+        if (places_[i] != kNowhere)
+            unfit.columns[i] = withoutBlanks(unfit.headings[places_[i]]);
+    throw unfit;
 }
 
 void StatementTable::readAll(const std::string& path, char separator)
@@ -188,8 +201,7 @@ void StatementTable::passOverEnd(const std::string& path)
     };
     const auto end = std::find_if(rows_.rbegin(), rows_.rend(), isDated).base();
     if (end == rows_.begin() && !rows_.empty())
-        throw std::runtime_error(path + ": no line has a date in the column " +
-                                 shown(headingOf(StatementColumn::kDate)));
+        fail(path, "no line has a date in the column " + shown(headingOf(StatementColumn::kDate)), "");
     for (auto row = end; row != rows_.end(); ++row)
         passedOver_.push_back({row->line, textOf(row->fields), "behind the last line with a date"});
     rows_.erase(end, rows_.end());
@@ -212,10 +224,10 @@ void StatementTable::settleDates(const std::string& path, const StatementProfile
             dayFirst = &row;
     }
     if (dayFirst != nullptr && monthFirst != nullptr)
-        throw std::runtime_error(path + ": " + lineText(*dayFirst) + " has the day first, " +
-                                 shown(cell(*dayFirst, StatementColumn::kDate)) + ", and " + lineText(*monthFirst) +
-                                 " the month, " + shown(cell(*monthFirst, StatementColumn::kDate)) +
-                                 ": --dates dmy or --dates mdy says which is meant");
+        fail(path,
+             lineText(*dayFirst) + " has the day first, " + shown(cell(*dayFirst, StatementColumn::kDate)) + ", and " +
+                 lineText(*monthFirst) + " the month, " + shown(cell(*monthFirst, StatementColumn::kDate)),
+             ": --dates dmy or --dates mdy says which is meant");
     isMonthFirst_ = monthFirst != nullptr;
 }
 
