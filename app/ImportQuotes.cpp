@@ -33,12 +33,12 @@ std::span<const NamedColumn> columnsOf(bool areRates)
 }
 
 const std::vector<ListColumn> kListColumns = {{"Becomes", 72},
-                                              {"Line", 64, B_ALIGN_RIGHT},
+                                              {"Line", 56, B_ALIGN_RIGHT},
                                               {"Of", 70},
                                               {"Name", 96},
-                                              {"Market", 96},
+                                              {"Market", 90},
                                               {"New", 62, B_ALIGN_RIGHT},
-                                              {"Changed", 62, B_ALIGN_RIGHT},
+                                              {"Changed", 68, B_ALIGN_RIGHT},
                                               {"Equal", 62, B_ALIGN_RIGHT},
                                               {"Note", kRemainingWidth}};
 
@@ -170,8 +170,10 @@ void ImportQuotes::read()
         areRates_ ? import.addRates(path_) : import.addQuotes(path_);
         plan_ = import.plan();
     } catch (const MissingRate& missing) {
-        problem_ = std::string("Refused: ") + missing.what() + ". Import its rates first, on the page Currency" +
-                   (window().getReferenceCurrency() == nullptr ? ", or make it the reference currency below." : ".");
+        problem_ = withoutPath(missing.what());
+        problem_.back() = ':';
+        problem_ += std::string(" import its rates first") +
+                    (window().getReferenceCurrency() == nullptr ? ", or make it the reference currency." : ".");
     } catch (const std::runtime_error& error) {
         problem_ = withoutPath(error.what());
     }

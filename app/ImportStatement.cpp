@@ -29,7 +29,7 @@ const std::vector<ListColumn> kListColumns = {{"Becomes", 90},
                                               {"Date", 78},
                                               {"Type", 76},
                                               {"Account", 70},
-                                              {"What", 80},
+                                              {"What", 72},
                                               {"Quantity", 62, B_ALIGN_RIGHT},
                                               {"Quote/Sum", 78, B_ALIGN_RIGHT},
                                               {"Cost", 46, B_ALIGN_RIGHT},
@@ -435,9 +435,11 @@ void ImportStatement::fillRows(ImportSheet& sheet) const
     for (const auto& operation : plan_->booked())
         sheet.rows.push_back(rowOf(operation, false));
     // Where all are on one account, the notes have its room.
-    sheet.columns[kAccountColumn].isHidden = std::ranges::adjacent_find(sheet.rows, [](const auto& a, const auto& b) {
-                                                 return a[kAccountColumn].text != b[kAccountColumn].text;
-                                             }) == sheet.rows.end();
+    std::set<std::string> accounts;
+    for (const auto& row : sheet.rows)
+        accounts.insert(row[kAccountColumn].text);
+    accounts.erase("");
+    sheet.columns[kAccountColumn].isHidden = accounts.size() < 2;
     for (const auto& line : table_->passedOver())
         sheet.rows.push_back(rowOf(line));
 }

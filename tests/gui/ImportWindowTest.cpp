@@ -97,7 +97,8 @@ protected:
                written([&](FILE* f) { wallet().wrt(f, stamp); });
     }
     /// The import of what the window shows is one step, which leads back and on to the same bytes.
-    void importAndReturn(const std::string& before, const std::string& label)
+    void importAndReturn(
+        const std::string& before, const std::string& label, const std::function<void()>& look = [] {})
     {
         EXPECT_EQ(bytes(), before) << "changed by looking at it";
         const auto steps = window().changeSerial();
@@ -108,6 +109,7 @@ protected:
         EXPECT_EQ(window().history().undoLabel(), label);
         const std::string after = bytes();
         EXPECT_NE(after, before);
+        look(); // at what the pages show
         pressUndo("btnUndo");
         EXPECT_EQ(bytes(), before);
         pressUndo("btnRedo");
@@ -216,7 +218,7 @@ TEST_F(ImportWindowTest, PricesAndRatesComeInWithAllThatIsNew)
     answer(
         {{"importColumn", "Date"}, {"importHeading", "Tag"}, {"importColumn", "Price"}, {"importHeading", "Schluss"}});
     EXPECT_THAT(line("txtImportNote"),
-                HasSubstr("no rate of \"CHF\", in which \"NEU\" is quoted. Import its rates first"));
+                HasSubstr("No rate of \"CHF\", in which \"NEU\" is quoted: import its rates first"));
     EXPECT_FALSE(canImport());
     press("btnCancel");
     EXPECT_EQ(bytes(), before);
@@ -239,16 +241,16 @@ TEST_F(ImportWindowTest, PricesAndRatesComeInWithAllThatIsNew)
     EXPECT_THAT(table("lstImport"),
                 ElementsAre("New\t\tMarket\tZürich\tCHF\t\t\t\t", "Changed\t\tCompany\tAL\tParis, EUR\t0\t1\t1\t",
                             "New\t\tCompany\tNEU\tZürich, CHF\t1\t0\t0\t"));
-    importAndReturn(withRates, "Import quotes from prices.csv");
-    show(kCompanyPage);
-    EXPECT_THAT(rows("lstMarkets"), Contains(StartsWith("Zürich")));
-    EXPECT_THAT(rows("lstQuotes"), Contains("01/03/2024\t11.00"));
+    importAndReturn(withRates, "Import quotes from prices.csv", [this] {
+        EXPECT_THAT(rows("lstMarkets"), Contains(StartsWith("Zürich")));
+        EXPECT_THAT(rows("lstQuotes"), Contains("01/03/2024\t11.00"));
+    });
 }
 
 TEST_F(ImportWindowTest, AnEmptyCatalogueGetsItsReferenceFromAnImport)
 {
     open(kCompanyPage, file("ALP.csv", "Date,Close\n2024-01-02,40\n"));
-    EXPECT_THAT(line("txtImportNote"), HasSubstr("or make it the reference currency below"));
+    EXPECT_THAT(line("txtImportNote"), HasSubstr("or make it the reference currency"));
     answer({{"txtImportReference", "USD"}, {"txtImportMarket", "New York"}});
     importAndReturn(bytes(), "Import quotes from ALP.csv");
     ASSERT_EQ(window().catalogue().getMarkets().size(), 1U);

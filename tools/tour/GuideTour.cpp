@@ -113,6 +113,7 @@ void showImport(TourHand& hand)
     hand.chooseInFront("importAccount", "Main");
     hand.pictureInFront("guide-import");
     hand.pressInFront("btnCancel");
+    hand.turnTo(kPortoFolio);
 }
 
 /// Simulates the sale of a holding with profit. The portfolio is of no use afterwards.
