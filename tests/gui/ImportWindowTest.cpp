@@ -224,13 +224,15 @@ TEST_F(ImportWindowTest, PricesAndRatesComeInWithAllThatIsNew)
     EXPECT_EQ(bytes(), before);
 
     // The page says what a table without headings is of; the second line is none.
-    open(kCurrencyPage, file("rates.csv", "2024-01-01,CHF,2\n2024-01-02,CHF,x\n"));
+    open(kCurrencyPage, file("rates.csv", "2024-01-01,CHF,2\n2024-01-02,CHF,x\n2024-01-03,USD,3\n"));
     EXPECT_THAT(table("lstImport"),
                 ElementsAre(StartsWith("Refused\t2\t\t\t\t\t\t\t\"x\" is no positive number"),
                             "New\t\tCurrency\tCHF\t\t\t\t\t", StartsWith("New\t\tRates\tCHF\t\t1\t0\t0"),
-                            StartsWith("Equal\t\tRates\tEUR\t\t0\t0\t1")));
+                            StartsWith("Changed\t\tRates\tUSD\t\t1\t0\t0"),
+                            StartsWith("Changed\t\tRates\tEUR\t\t1\t0\t1")));
     answer("importRates", "EUR for one unit");
-    importAndReturn(before, "Import rates from rates.csv");
+    importAndReturn(before, "Import rates from rates.csv",
+                    [this] { EXPECT_THAT(rows("lstQuotes"), ElementsAre("01/01/2024\t2.00", "03/01/2024\t3.00")); });
     EXPECT_EQ(window().getCurrencyByRepresentation("CHF")->quotes().back()->getValue(), 2);
 
     const std::string withRates = bytes();
