@@ -9,9 +9,11 @@
 #include "foundation/Today.h"
 #include "platform/Alert.h"
 #include "platform/Application.h"
+#include "platform/Button.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
 #include "views/FieldNotice.h"
+#include "views/ImportWindow.h"
 #include "views/OperationView.h"
 #include "views/ParameterView.h"
 #include "views/SplitWindow.h"
@@ -124,6 +126,9 @@ static_assert(std::size(kCommands) == 65);
 constexpr Command kOwnCommands[] = {
     {'CBAs', [](PLWindow& w, BMessage*) { w.OpenSplit(); }}, // the company page
     {SplitWindow::kApplied, [](PLWindow& w, BMessage* m) { w.ApplySplit(m); }, "Apply split"},
+    {'TImp', [](PLWindow& w, BMessage*) { w.AskForImport(); }},
+    {ImportAssistant::kChosen, [](PLWindow& w, BMessage* m) { w.OpenImport(m); }},
+    {ImportWindow::kImported, [](PLWindow& w, BMessage*) { w.CarryOutImport(); }, "Import"},
     {'HUnd', [](PLWindow& w, BMessage*) { w.Undo(); }},
     {'HRed', [](PLWindow& w, BMessage*) { w.Redo(); }},
     {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
@@ -184,6 +189,8 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     events_ = std::make_unique<EventEditor>(*this, *companyView_);
     operations_ = std::make_unique<OperationEditor>(*this, *operationView_, *companyView_);
     split_ = std::make_unique<SplitAssistant>(*this, *companyView_, *operationView_);
+    import_ = std::make_unique<ImportAssistant>(*this, *tabView_, *companyView_, *currencyView_, folder);
+    tabView_->SetSelectionHook([this] { importButton_->SetEnabled(import_->isPossible()); });
     makeCompletions();
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     walletView_->setDate(today());
@@ -213,8 +220,26 @@ void PLWindow::makePages()
     messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
+    makeTableButtons();
     makeUndoButtons();
     AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // last: in front of the edges of both
+}
+
+/// Left of those of undo, on every page.
+void PLWindow::makeTableButtons()
+{
+    constexpr float kWidth = 92;
+    constexpr float kHeight = 22;
+    constexpr float kRight = 660;
+    const auto add = [this](float left, const char* name, const char* label, const char* tip, uint32 code) {
+        auto* button = new BButton({left, 1, left + kWidth, 1 + kHeight}, name, label, new BMessage(code));
+        button->SetToolTip(tip);
+        AddChild(button); // which the window owns
+        return button;
+    };
+    importButton_ =
+        add(kRight - 2 * kWidth - 3, "btnImportTable", "Import...",
+            "Brings in a table: prices on the page Company, rates on Currency, operations on the next two", 'TImp');
 }
 
 void PLWindow::makeCompletions()

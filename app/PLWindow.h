@@ -3,6 +3,7 @@
 #include "app/DataFiles.h"
 #include "app/EventEditor.h"
 #include "app/History.h"
+#include "app/ImportAssistant.h"
 #include "app/Notice.h"
 #include "app/OperationEditor.h"
 #include "app/QuoteEditor.h"
@@ -104,7 +105,7 @@ public:
     std::uint64_t changeSerial() const { return history_->serial(); }
     const History& history() const { return *history_; }
     /// From here on the command that runs is a step of that name.
-    void nameStep(const char* name) { command_ = name; }
+    void nameStep(const std::string& name) { command_ = name; }
     /// Takes note of what the command has changed until now.
     void noteStep() { noteStep(command_); }
     /// To be told before a file of that kind is saved.
@@ -116,6 +117,11 @@ public:
     /// The answer of the save panel. @return `B_OK`; what is missing in the message.
     status_t Save(BMessage* message) { return files_->save(message); }
     void Save(const String& path) { files_->save(path); }
+
+    // Tables of other programs.
+    void AskForImport() { import_->ask(); }
+    void OpenImport(const BMessage* message) { import_->open(message); }
+    void CarryOutImport() { import_->carryOut(); }
 
     // Markets (MarketCommands.cpp).
     void AddMarket();
@@ -192,6 +198,7 @@ private:
     /// The page in front.
     BView& front() const;
     void makeUndoButtons();
+    void makeTableButtons();
     void makeCompletions();
     /// Compares what is here with what there was after the last command, and keeps what has changed. `command` names
     /// the step; commands know nothing of it, so that none can forget it.
@@ -228,6 +235,7 @@ private:
     ParameterView* parameterView_ = nullptr;
     BButton* undoButton_ = nullptr;
     BButton* redoButton_ = nullptr;
+    BButton* importButton_ = nullptr;
     std::unique_ptr<History> history_; // null while the window is made
     RepeatGuard repeats_;
     std::string command_;                     // that runs; empty when it has no name for a step
@@ -239,6 +247,7 @@ private:
     std::unique_ptr<EventEditor> events_;
     std::unique_ptr<SplitAssistant> split_;
     std::unique_ptr<OperationEditor> operations_;
+    std::unique_ptr<ImportAssistant> import_;
     std::unique_ptr<Completions> completions_;
     std::unique_ptr<Shortcuts> shortcuts_;
     std::unique_ptr<Rescue> rescue_; // the last one to come and the first to go: its last copy needs all of the above

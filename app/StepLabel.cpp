@@ -89,6 +89,9 @@ std::string subjectOf(const Moment& before, const Moment& after)
 
 std::string stepLabel(const std::string& command, const Moment& before, const Moment& after)
 {
+    // An import names its file, and may be about many things.
+    if (command.starts_with("Import "))
+        return command;
     std::string subject = subjectOf(*before.catalogue, *after.catalogue);
     if (subject.empty())
         subject = subjectOf(before, after);

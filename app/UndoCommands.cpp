@@ -92,7 +92,7 @@ void PLWindow::Redo()
 void PLWindow::restore(const Moment& moment)
 {
     repeats_.forget();
-    for (const char* key : {kDoneNotice, "operation", "split"})
+    for (const char* key : {kDoneNotice, "operation", "split", "import"})
         dropNotice(key); // they tell of what may no longer be so
     // First no row, no selection and no portfolio refers to anything in the catalogue.
     replaceWallet();

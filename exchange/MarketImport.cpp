@@ -1,5 +1,6 @@
 #include "exchange/MarketImport.h"
 
+#include "foundation/DateText.h"
 #include "market/Catalogue.h"
 
 #include <algorithm>
@@ -29,6 +30,36 @@ const std::vector<TableForm::Headings> kRateHeadings = {
 const TableForm kQuotes = {kQuoteHeadings, {Column::kDate, Column::kTicker, Column::kValue}, 3, true};
 const TableForm kRates = {kRateHeadings, {Column::kDate, Column::kCurrency, Column::kValue}, 3, true};
 const TableForm kListing = {kQuoteHeadings, {Column::kTicker, Column::kMarket, Column::kCurrency, Column::kName}, 1};
+
+/// `form` with the columns where a person has told them to be.
+TableForm formWith(TableForm form, const std::map<Column, std::string>& keys)
+{
+    for (auto& [column, names] : form.headings) {
+        for (const auto& [told, key] : keys)
+            std::erase(names, key); // it means what it was told to mean, and nothing else
+        if (const auto told = keys.find(column); told != keys.end())
+            names.assign(told->second.empty() ? 0 : 1, told->second);
+    }
+    return form;
+}
+
+/// As `Table` compares them.
+std::map<Column, std::string> keysOf(const std::map<Column, std::string>& columns)
+{
+    std::map<Column, std::string> keys;
+    for (const auto& [column, heading] : columns)
+        keys[column] = Table::headingOf(heading);
+    return keys;
+}
+
+/// The fields of the first line, unless that has a date, and so values. None of them means anything yet.
+std::vector<std::string> unknownHeadings(const std::string& path)
+{
+    CsvReader reader(path);
+    const auto isDate = [](const std::string& field) { return parseDate(field).has_value(); };
+    const bool hasValues = !reader.next() || std::ranges::any_of(reader.fields(), isDate);
+    return hasValues ? std::vector<std::string>() : reader.fields();
+}
 
 /// "folder/BRK.B.csv.gz" holds the quotes of BRK.B.
 std::string tickerOf(const std::string& path)
@@ -81,6 +112,24 @@ MarketImport::MarketImport(const ImportOptions& options, const Catalogue& catalo
         plan_.reference = places_.currency(options_.reference);
 }
 
+MarketTableHead MarketImport::headOf(const std::string& path, bool areRates, const std::map<Column, std::string>& told)
+{
+    const auto keys = keysOf(told);
+    // Nothing is required, so that whatever the first line says can be told.
+    TableForm form = formWith(areRates ? kRates : kQuotes, keys);
+    form.required = 0;
+    const Table table(path, form);
+    MarketTableHead head{table.headings(), {}, {}};
+    if (head.headings.empty())
+        head.headings = unknownHeadings(path);
+    for (const auto& entry : form.headings)
+        if (std::string heading = table.heading(entry.column); !heading.empty())
+            head.columns[entry.column] = std::move(heading);
+    for (const Table::WideColumn& column : table.wideColumns())
+        head.wide.push_back(column.name);
+    return head;
+}
+
 void MarketImport::addListing(const std::string& path)
 {
     Table table(path, kListing);
@@ -89,7 +138,8 @@ void MarketImport::addListing(const std::string& path)
 
 void MarketImport::addRates(const std::string& path)
 {
-    Table table(path, kRates);
+    const auto told = keysOf(options_.columns);
+    Table table(path, formWith(kRates, told));
     const bool units = areUnits(table, path);
     const bool isWide = !table.wideColumns().empty();
     for (const Table::WideColumn& column : table.wideColumns())
@@ -99,7 +149,8 @@ void MarketImport::addRates(const std::string& path)
 
 void MarketImport::addQuotes(const std::string& path)
 {
-    Table table(path, options_.tickerFromName ? kQuotesOfOneTicker : kQuotes);
+    const auto told = keysOf(options_.columns);
+    Table table(path, formWith(options_.tickerFromName ? kQuotesOfOneTicker : kQuotes, told));
     // A table that has a ticker column goes by it, whatever its file is called.
     const std::string tickerOfFile = table.has(Column::kTicker) ? std::string() : tickerOf(path);
     const bool isWide = !table.wideColumns().empty();

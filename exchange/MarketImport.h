@@ -3,7 +3,10 @@
 #include "exchange/MarketPlaces.h"
 #include "exchange/Table.h"
 
+#include <map>
 #include <stdexcept>
+#include <string>
+#include <vector>
 
 /// The form of a table of one ticker's closing prices: date, close.
 extern const TableForm kQuotesOfOneTicker;
@@ -15,6 +18,15 @@ struct ImportOptions {
     std::string market = "NYSE";       // of a ticker for which neither a table tells it nor the catalogue
     std::optional<bool> ratesAreUnits; // per unit of the reference, else prices in it; without it as the heading says
     bool tickerFromName = false;       // a quotes file without a ticker column is named after its ticker
+    /// Under which headings columns stand that are not recognised; an empty one says that there is no such column.
+    std::map<Column, std::string> columns = {};
+};
+
+/// What the first line of a table says of its columns, to be shown and corrected.
+struct MarketTableHead {
+    std::vector<std::string> headings;     // known or not; none when the first line has values already
+    std::map<Column, std::string> columns; // the headings of those that are recognised
+    std::vector<std::string> wide;         // tickers or currencies of a wide table
 };
 
 /// Quotes are in currencies of which no rate is known: all that they say would count for nothing.
@@ -30,6 +42,9 @@ struct MissingRate : std::runtime_error {
 /// std::runtime_error with one line for the user.
 class MarketImport {
 public:
+    /// Throws std::runtime_error for a file that cannot be read, and for nothing else.
+    static MarketTableHead headOf(const std::string& path, bool areRates, const std::map<Column, std::string>& told);
+
     /// `catalogue` stays as it is until the plan is carried out. `options.reference` is its reference, where it has
     /// one.
     MarketImport(const ImportOptions& options, const Catalogue& catalogue, TableWatch watch);

@@ -77,15 +77,20 @@ void bringIn(SeriesValues<Owner>& series)
 
 void MarketPlan::settle()
 {
-    const auto settleAll = [&](auto& all, const auto& countsOf) {
+    const auto settleAll = [&](auto& all, auto& tallies, const auto& countsOf) {
         for (auto& series : all) {
+            if (series.values.empty())
+                continue;
             replaced += sortByDay(series.values);
-            dropEqual(series, countsOf(series));
+            Counts counts;
+            dropEqual(series, counts);
+            countsOf(series) += counts;
+            tallies.push_back({series.owner, series.currency, series.isNew, counts});
         }
         std::erase_if(all, [](const auto& series) { return series.values.empty(); });
     };
-    settleAll(quotes, [this](const auto&) -> Counts& { return quoteCounts; });
-    settleAll(rates, [this](const auto& series) -> Counts& {
+    settleAll(quotes, quoteTallies, [this](const auto&) -> Counts& { return quoteCounts; });
+    settleAll(rates, rateTallies, [this](const auto& series) -> Counts& {
         return series.owner == reference ? referenceCounts : rateCounts;
     });
 }

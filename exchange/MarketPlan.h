@@ -34,6 +34,14 @@ public:
         std::size_t added = 0;
         std::size_t changed = 0;
         std::size_t equal = 0; // to what is there
+
+        Counts& operator+=(const Counts& other)
+        {
+            added += other.added;
+            changed += other.changed;
+            equal += other.equal;
+            return *this;
+        }
     };
     struct NewMarket {
         std::unique_ptr<Market> market;
@@ -42,6 +50,14 @@ public:
     struct NewCompany {
         std::unique_ptr<Company> company;
         Market* market;
+    };
+    /// What came for one company or currency. Those are told of, too, that had all of it.
+    template <class Owner>
+    struct Tally {
+        const Owner* owner;
+        const Currency* currency;
+        bool isNew;
+        Counts counts;
     };
     using Owners = std::unordered_set<const Serializable*>;
 
@@ -65,6 +81,8 @@ public:
     std::deque<SeriesValues<Currency>> rates;
     Currency* reference = nullptr; // of the catalogue from then on
 
+    std::vector<Tally<Company>> quoteTallies; // once `settle` is done
+    std::vector<Tally<Currency>> rateTallies;
     Counts quoteCounts;
     Counts rateCounts; // without those of the reference
     Counts referenceCounts;

@@ -88,8 +88,10 @@ OperationPlan::OperationPlan(const StatementTable& table, const StatementProfile
         try {
             const PlannedOperation operation = reader.read(row);
             (before.take(operation) ? booked_ : operations_).push_back(operation);
+        } catch (const UntoldRow& reason) {
+            refused_.push_back({row.line, reason.what(), reason.about});
         } catch (const UnusableRow& reason) {
-            refused_.push_back({row.line, reason.what()});
+            refused_.push_back({row.line, reason.what(), std::nullopt});
         }
 }
 

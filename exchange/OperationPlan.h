@@ -21,6 +21,7 @@ public:
     struct Refusal {
         unsigned long line;
         std::string reason; // in words that go on from "line 7: "
+        std::optional<UntoldRow::About> untold;
     };
 
     /// An account to be made that is there already, in the same currency, is no new one. Throws std::runtime_error,

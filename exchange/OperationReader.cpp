@@ -1,7 +1,5 @@
 #include "exchange/OperationReader.h"
 
-#include "exchange/StatementWords.h"
-#include "exchange/Table.h"
 #include "exchange/TextForms.h"
 #include "foundation/FoldedText.h"
 #include "market/Catalogue.h"
@@ -76,7 +74,7 @@ StatementType OperationReader::typeOf(const Row& row) const
         throw UnusableRow("has no type");
     if (const auto type = profile_.typeOf(word))
         return *type;
-    throw UnusableRow("the type " + shown(word) + " is not known: --type WORD=TYPE says what it means");
+    throw UntoldRow("the type " + shown(word) + " is not known", UntoldRow::About::kType);
 }
 
 const PlannedAccount& OperationReader::accountNamed(std::string_view name) const
@@ -84,10 +82,10 @@ const PlannedAccount& OperationReader::accountNamed(std::string_view name) const
     if (name.empty())
         name = profile_.account();
     if (name.empty())
-        throw UnusableRow("names no account: --account NAME says which is meant");
+        throw UntoldRow("names no account", UntoldRow::About::kAccount);
     const auto found = accounts_.find(name);
     if (found == accounts_.end())
-        throw UnusableRow("there is no account " + shown(name) + ": --new-account NAME=SYMBOL makes one");
+        throw UntoldRow("there is no account " + shown(name), UntoldRow::About::kNewAccount);
     if (found->second.currency == nullptr)
         throw UnusableRow("the account " + shown(name) + " has no currency");
     return found->second;

@@ -3,6 +3,7 @@
 #include "exchange/CompanyFinder.h"
 #include "exchange/PlannedOperation.h"
 #include "exchange/StatementTable.h"
+#include "exchange/Table.h"
 
 #include <functional>
 #include <map>
@@ -11,6 +12,14 @@
 #include <string_view>
 
 class Catalogue;
+
+/// A line that could be booked if a person told what it leaves open.
+struct UntoldRow : UnusableRow {
+    enum class About { kType, kAccount, kNewAccount }; // what a word means; whose line it is; an account to be made
+
+    UntoldRow(const std::string& reason, About open) : UnusableRow(reason), about(open) {}
+    About about;
+};
 
 /// Makes operations of the lines of a statement: finds accounts and companies, settles signs, and takes the quote out
 /// of a total where the line has no quote.

@@ -24,6 +24,8 @@ public:
     void addType(const std::string& text);
     /// "dmy" or "mdy"
     void setDates(const std::string& text);
+    /// Back to what the table itself shows.
+    void forgetDates() { isMonthFirst_.reset(); }
     void setAccount(const std::string& name) { account_ = name; }
 
     /// Throws std::runtime_error, naming the file and the line, for what cannot be read or is not understood.

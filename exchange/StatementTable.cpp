@@ -103,8 +103,7 @@ bool StatementTable::isHeader(const Places& places, const StatementProfile& prof
 /// Finds the headings. @return the separator with which they are found.
 char StatementTable::findSeparator(const std::string& path, const StatementProfile& profile)
 {
-    std::size_t most = 0;
-    std::vector<std::string> closest; // to headings
+    std::pair<std::size_t, std::size_t> most; // columns that were found, and fields with a text
     places_.fill(kNowhere);
     for (const char separator : {'\t', ';', '|', ','}) {
         CsvReader reader(path, separator);
@@ -112,8 +111,10 @@ char StatementTable::findSeparator(const std::string& path, const StatementProfi
             const Places places = placesIn(reader.fields(), profile);
             const std::size_t found =
                 kStatementColumns - static_cast<std::size_t>(std::ranges::count(places, kNowhere));
-            if (found > most) {
-                most = found;
+            const auto texts = static_cast<std::size_t>(
+                std::ranges::count_if(reader.fields(), [](const auto& field) { return !field.empty(); }));
+            if (std::pair(found, texts) > most) {
+                most = {found, texts};
                 places_ = places;
                 headings_ = reader.fields();
             }
@@ -146,11 +147,23 @@ void StatementTable::failWithout(const std::string& path, const StatementProfile
         headings += (headings.empty() ? "" : ", ") + shown(readable(headings_[i]));
     if (headings_.size() > kMostTold)
         headings += ", ...";
-    throw std::runtime_error(path + ": no line has the headings of a statement: " +
-                             (missing.empty()
-                                  ? "they are on no single line"
-                                  : "there is no column for " + missing + ", which --column COLUMN=HEADING can name") +
-                             (headings.empty() ? "" : "; found were " + headings));
+    fail(path,
+         std::string("no line has the headings of a statement: ") +
+             (missing.empty() ? "they are on no single line" : "there is no column for " + missing),
+         (missing.empty() ? "" : ", which --column COLUMN=HEADING can name") +
+             (headings.empty() ? "" : "; found were " + headings));
+}
+
+/// @param remedy what the command line can do about it, to go on from the reason.
+void StatementTable::fail(const std::string& path, const std::string& reason, const std::string& remedy) const
+{
+    UnfitStatement unfit(path + ": " + reason + remedy);
+    unfit.reason = reason;
+    std::ranges::transform(headings_, std::back_inserter(unfit.headings), readable);
+    for (std::size_t i = 0; i < kStatementColumns; ++i)
+        if (places_[i] != kNowhere)
+            unfit.columns[i] = withoutBlanks(unfit.headings[places_[i]]);
+    throw unfit;
 }
 
 void StatementTable::readAll(const std::string& path, char separator)
@@ -193,8 +206,7 @@ void StatementTable::passOverEnd(const std::string& path, const StatementProfile
         return row.fields.empty() || WrittenDate::read(cell(row, StatementColumn::kDate)).has_value();
     };
     if (!rows_.empty() && std::ranges::none_of(rows_, isDated))
-        throw std::runtime_error(path + ": no line has a date in the column " +
-                                 shown(headingOf(StatementColumn::kDate)));
+        fail(path, "no line has a date in the column " + shown(headingOf(StatementColumn::kDate)), "");
     // One that has a type and numbers for a date is no sum but an operation; its date is refused when it is read.
     const auto isMeant = [&](const Row& row) {
         const bool hasNumbers = cell(row, StatementColumn::kDate).find_first_of("0123456789") != std::string_view::npos;
@@ -229,11 +241,11 @@ void StatementTable::settleDates(const std::string& path, const StatementProfile
     for (const Row& row : rows_)
         lookAt(row, cell(row, StatementColumn::kDate), &dates);
     if (dates.dayFirst != nullptr && dates.monthFirst != nullptr)
-        throw std::runtime_error(path + ": " + lineText(*dates.dayFirst) + " has the day first, " +
-                                 shown(cell(*dates.dayFirst, StatementColumn::kDate)) + ", and " +
-                                 lineText(*dates.monthFirst) + " the month, " +
-                                 shown(cell(*dates.monthFirst, StatementColumn::kDate)) +
-                                 ": --dates dmy or --dates mdy says which is meant");
+        fail(path,
+             lineText(*dates.dayFirst) + " has the day first, " + shown(cell(*dates.dayFirst, StatementColumn::kDate)) +
+                 ", and " + lineText(*dates.monthFirst) + " the month, " +
+                 shown(cell(*dates.monthFirst, StatementColumn::kDate)),
+             ": --dates dmy or --dates mdy says which is meant");
     isMonthFirst_ = dates.monthFirst != nullptr;
     if (dates.dayFirst != nullptr || dates.monthFirst != nullptr)
         return;

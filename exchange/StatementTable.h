@@ -5,15 +5,27 @@
 
 #include <array>
 #include <optional>
+#include <stdexcept>
 #include <string>
 #include <string_view>
 #include <vector>
 
+/// A statement of which a person has to tell more before its lines mean anything: which column is which, or the order
+/// of day and month.
+struct UnfitStatement : std::runtime_error {
+    using std::runtime_error::runtime_error; // all of it, for the command line
+    std::string reason;                      // by itself
+    /// Of the line that may be the headings, in UTF-8; none when there is no such line.
+    std::vector<std::string> headings;
+    std::array<std::string, kStatementColumns> columns; // the heading of each that was found
+};
+
 /// The lines of a statement: a table that a bank has written, with headings somewhere at its beginning.
 ///
 /// The whole file is looked at before any line is understood: its encoding, what its decimal mark is, and whether its
-/// dates have the day or the month first, show in some lines and count for all. Throws std::runtime_error, with one
-/// line for the user, for a file that cannot be read or has no headings.
+/// dates have the day or the month first, show in some lines and count for all. Throws UnfitStatement for a file
+/// without headings, dates or an order of them, and std::runtime_error, with one line for the user, for one that cannot
+/// be read.
 class StatementTable {
 public:
     StatementTable(const std::string& path, const StatementProfile& profile);
@@ -62,6 +74,7 @@ private:
     static bool isHeader(const Places& places, const StatementProfile& profile);
     char findSeparator(const std::string& path, const StatementProfile& profile);
     [[noreturn]] void failWithout(const std::string& path, const StatementProfile& profile) const;
+    [[noreturn]] void fail(const std::string& path, const std::string& reason, const std::string& remedy) const;
     void readAll(const std::string& path, char separator);
     void decode();
     void passOverEnd(const std::string& path, const StatementProfile& profile);

@@ -62,8 +62,10 @@ Table::Table(const std::string& path, const TableForm& form) : path_(path), read
         if (!has(form.plain[i]))
             throw std::runtime_error(path + ": the header line names no column for the " + describe(form.plain[i]));
     // The header line is no row: the first one is behind it. Without a header the record read is a row.
-    if (header)
+    if (header) {
+        headings_ = reader_.fields();
         more_ = next();
+    }
 }
 
 /// Goes to the next record. @return false at the end of the file.
@@ -113,6 +115,12 @@ void Table::takeWideColumns(const TableForm& form)
         if (const std::string_view name = trimmed(fields[i]);
             !name.empty() && std::ranges::find(places_, i) == places_.end())
             wide_.push_back({i, std::string(name)});
+}
+
+std::string Table::heading(Column column) const
+{
+    const std::size_t i = place(column);
+    return i < headings_.size() ? std::string(trimmed(headings_[i])) : std::string();
 }
 
 std::string Table::headingOf(std::string_view text)

@@ -60,6 +60,9 @@ public:
     const std::vector<WideColumn>& wideColumns() const { return wide_; }
 
     bool has(Column column) const { return place(column) != kNowhere; }
+    /// The fields of the header line as they stand; none without one. And the one that a column stands under.
+    const std::vector<std::string>& headings() const { return headings_; }
+    std::string heading(Column column) const;
     /// The heading of the value column; empty without a header line.
     const std::string& valueHeading() const { return valueHeading_; }
     /// Lower case, without blanks, '_', '-' and '.'.
@@ -98,6 +101,7 @@ private:
     std::array<std::size_t, kColumns> places_;
     std::size_t mostFields_ = kNowhere;
     std::string valueHeading_;
+    std::vector<std::string> headings_;
     std::vector<WideColumn> wide_;
     char decimalMark_ = '\0'; // not settled yet
 };

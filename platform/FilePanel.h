@@ -35,6 +35,8 @@ public:
     /// Without it the panel begins in the person's home folder.
     void SetPanelDirectory(const char* path);
     const std::string& PanelDirectory() const { return directory_; }
+    /// "Load" or "Save" until it is set. In the kits it is the panel's window that has one.
+    void SetTitle(const char* title) { title_ = title; }
     /// The name that a save panel comes up with, none when it is empty. `ending` is added to a name that is typed
     /// without one, unless it is empty.
     void SetSaveText(const char* text, const char* ending = "");
@@ -48,6 +50,7 @@ private:
 
     file_panel_mode mode_;
     BMessenger target_;
+    std::string title_;
     std::string directory_;
     std::string saveText_;
     std::string saveEnding_;

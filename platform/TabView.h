@@ -3,6 +3,7 @@
 #include "platform/Tab.h"
 #include "platform/View.h"
 
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -20,6 +21,8 @@ public:
     int32 CountTabs() const { return static_cast<int32>(tabs_.size()); }
     BTab* TabAt(int32 index) const;
     virtual void Select(int32 index);
+    /// `hook` is called whenever another tab was chosen, in whatever way. The kits have `Select` do that.
+    void SetSelectionHook(const std::function<void()>& hook);
     /// Index of the tab that is shown, negative without any.
     int32 Selection() const;
 

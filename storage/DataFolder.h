@@ -23,9 +23,13 @@ public:
     /// Files that a save has replaced. The user's alone: they may come from folders that nobody else can look into.
     std::string backups(std::string* error) const { return need(kBackups, kPrivateMode, error); }
 
+    /// What was told of the statements of banks.
+    std::string profiles(std::string* error) const { return need(kProfiles, kPrivateMode, error); }
+
     static constexpr const char* kCompanies = "/Companies";
     static constexpr const char* kPortoFolios = "/PortoFolios";
     static constexpr const char* kBackups = "/Backups";
+    static constexpr const char* kProfiles = "/Profiles";
     static constexpr const char* kUnsaved = "/Backups/Unsaved"; // copies of unsaved work
 
 private:

@@ -68,6 +68,22 @@ CLI::Validator checkedBy(const Take& take)
     return {check, ""};
 }
 
+/// The option that tells what a line leaves open, to go on from the reason.
+std::string remedyFor(const OperationPlan::Refusal& refusal)
+{
+    if (!refusal.untold)
+        return {};
+    switch (*refusal.untold) {
+    case UntoldRow::About::kType:
+        return ": --type WORD=TYPE says what it means";
+    case UntoldRow::About::kAccount:
+        return ": --account NAME says which is meant";
+    case UntoldRow::About::kNewAccount:
+        return ": --new-account NAME=SYMBOL makes one";
+    }
+    return {};
+}
+
 OperationPlan::NewAccount newAccountOf(const std::string& text)
 {
     const std::size_t mark = text.rfind('=');
@@ -214,7 +230,7 @@ void ImportOperations::tellLines(const StatementTable& table, const OperationPla
     std::cout << "operations: " << plan.operations().size() << " new, " << plan.booked().size() << " booked already\n"
               << "refused: " << plan.refused().size() << std::endl; // before what goes to the other stream
     for (const OperationPlan::Refusal& refusal : plan.refused())
-        std::cerr << table_ << ", line " << refusal.line << ": " << refusal.reason << '\n';
+        std::cerr << table_ << ", line " << refusal.line << ": " << refusal.reason << remedyFor(refusal) << '\n';
 }
 
 void ImportOperations::refuse(const OperationPlan& plan) const

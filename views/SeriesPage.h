@@ -68,6 +68,16 @@ public:
         noteQuoteChange();
     }
 
+    /// Quotes of `series` have come or changed, many perhaps.
+    void RefreshQuotes(Series* series)
+    {
+        if (isShown(series)) {
+            quotes_->showQuotes(series);
+            UpdateQuotesChart();
+        }
+        noteQuoteChange();
+    }
+
     /// Shows the quotes of `series`, which stay as they are when they are shown already; null shows none, in the chart
     /// either.
     void SetQuoteList(Series* series)

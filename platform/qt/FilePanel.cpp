@@ -15,7 +15,7 @@
 
 BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const entry_ref* start, uint32,
                        BMessage* message, bool modal)
-    : mode_(mode), target_(target != nullptr ? *target : BMessenger()),
+    : mode_(mode), target_(target != nullptr ? *target : BMessenger()), title_(mode == B_OPEN_PANEL ? "Load" : "Save"),
       message_(message != nullptr ? message : new BMessage(mode == B_OPEN_PANEL ? B_REFS_RECEIVED : B_SAVE_REQUESTED)),
       modal_(modal)
 {
@@ -34,7 +34,7 @@ QFileDialog& BFilePanel::dialog()
     auto* window = target_.IsValid() ? dynamic_cast<BWindow*>(target_.Target()->Looper()) : nullptr;
     dialog_ = std::make_unique<QFileDialog>(window != nullptr ? &window->widget() : nullptr);
     dialog_->setObjectName(mode_ == B_OPEN_PANEL ? "OpenPanel" : "SavePanel");
-    dialog_->setWindowTitle(mode_ == B_OPEN_PANEL ? "Load" : "Save");
+    dialog_->setWindowTitle(QString::fromStdString(title_));
     // The desktop's own panel takes no part in this program's event loop and cannot be found by tests.
     dialog_->setOption(QFileDialog::DontUseNativeDialog);
     dialog_->setAcceptMode(mode_ == B_OPEN_PANEL ? QFileDialog::AcceptOpen : QFileDialog::AcceptSave);

@@ -23,6 +23,7 @@ BMenuField::BMenuField(BRect frame, const char* name, const char* label, BMenu* 
     field_->setObjectName(QString::fromUtf8(Name()));
     field_->setAccessibleName(QString::fromUtf8(label));
     caption_->setBuddy(field_);
+    widget()->setFocusProxy(field_);
     layOut();
     // From here on the field follows the menu, whoever changes it.
     fill();

@@ -58,6 +58,11 @@ void BTabView::Select(int32 index)
     tabWidget().setCurrentIndex(index);
 }
 
+void BTabView::SetSelectionHook(const std::function<void()>& hook)
+{
+    QObject::connect(&tabWidget(), &QTabWidget::currentChanged, widget(), [hook] { hook(); });
+}
+
 int32 BTabView::Selection() const
 {
     return tabWidget().currentIndex();

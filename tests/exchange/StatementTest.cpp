@@ -213,10 +213,10 @@ TEST_F(StatementTest, ALineThatCannotBeBookedIsRefusedWithItsNumberAndReason)
     const struct {
         std::string row;
         const char* reason;
-    } cases[] = {{"01.02.2026;Split;Giro;;;;;;;1;;;;;;;", "the type \"Split\" is not known: --type WORD=TYPE"},
+    } cases[] = {{"01.02.2026;Split;Giro;;;;;;;1;;;;;;;", "the type \"Split\" is not known"},
                  {"01.02.2026;;Giro;;;;;;;1;;;;;;;", "has no type"},
-                 {"01.02.2026;Deposit;;;;;;;;1;;;;;;;", "names no account: --account"},
-                 {"01.02.2026;Deposit;Sparbuch;;;;;;;1;;;;;;;", "no account \"Sparbuch\": --new-account"},
+                 {"01.02.2026;Deposit;;;;;;;;1;;;;;;;", "names no account"},
+                 {"01.02.2026;Deposit;Sparbuch;;;;;;;1;;;;;;;", "no account \"Sparbuch\""},
                  {"01.02.2026;Deposit;Giro;;;;;;;;;;;;;;", "has no amount"},
                  {"01.02.2026;Deposit;Giro;;;;;;;x;;;;;;;", "\"x\" in the column \"Amount\" is no number"},
                  {"01.02.2026;Deposit;Giro;;;;;;;1;;;;;;;USD", "is in \"USD\", but the account \"Giro\" is in \"EUR\""},

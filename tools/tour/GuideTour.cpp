@@ -105,6 +105,17 @@ void addDollars(TourHand& hand)
     hand.picture("guide-two-currencies", {0, 0, 800, 420});
 }
 
+/// The panel gives a statement.
+void showImport(TourHand& hand)
+{
+    hand.turnTo(kOperations);
+    hand.pressInFront("btnImportTable");
+    hand.chooseInFront("importAccount", "Main");
+    hand.pictureInFront("guide-import");
+    hand.pressInFront("btnCancel");
+    hand.turnTo(kPortoFolio);
+}
+
 /// Simulates the sale of a holding with profit. The portfolio is of no use afterwards.
 void showPrevisions(TourHand& hand)
 {
@@ -184,6 +195,7 @@ void tourGuide(TourHand& hand)
 {
     makeFirstPortfolio(hand);
     addDollars(hand);
+    showImport(hand);
     showPrevisions(hand);
     split(hand);
     showMistakes(hand);

@@ -68,9 +68,19 @@ void TourHand::tick(const char* box, bool on)
 
 void TourHand::choose(const char* menu, const char* item)
 {
-    BMenuItem* chosen = find<BMenuField>(menu).Menu()->FindItem(item);
+    choose(find<BMenuField>(menu), item);
+}
+
+void TourHand::chooseInFront(const char* menu, const char* item)
+{
+    choose(dynamic_cast<BMenuField&>(*BWindow::newest()->FindView(menu)), item);
+}
+
+void TourHand::choose(BMenuField& menu, const char* item)
+{
+    BMenuItem* chosen = menu.Menu()->FindItem(item);
     if (chosen == nullptr)
-        throw std::runtime_error(std::string(item) + ": is not in the menu " + menu);
+        throw std::runtime_error(std::string(item) + ": is not in the menu " + menu.Name());
     chosen->SetMarked(true);
     chosen->Invoke();
     handle_pending_messages();

@@ -7,6 +7,7 @@
 #include <utility>
 #include <vector>
 
+class BMenuField;
 class BWindow;
 
 /// Works the window by the names of its controls, as a person does by mouse and keyboard, and takes pictures of it.
@@ -37,9 +38,11 @@ public:
 
     // The same of the window that has come up before the other one.
     void pressInFront(const char* button);
+    void chooseInFront(const char* menu, const char* item);
     void pictureInFront(const char* name);
 
 private:
+    static void choose(BMenuField& menu, const char* item);
     void writePicture(const BWindow& window, const char* name, BRect part);
     template <class View>
     View& find(const char* name);

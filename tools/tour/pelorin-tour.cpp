@@ -8,6 +8,7 @@
 #include "tools/tour/GuideTour.h"
 #include "tools/tour/TourHand.h"
 
+#include <fstream>
 #include <functional>
 #include <iostream>
 #include <stdexcept>
@@ -18,11 +19,29 @@ namespace {
 
 const BRect kWindow(0, 0, 800, 800);
 
-/// The files of the tour are `Sample` in both folders.
+/// Writes a statement for the portfolio of the guide. @return its path.
+std::string makeStatement(const DataFolder& folder)
+{
+    const std::string path = folder.path() + "/northern-bank.csv";
+    std::ofstream(path) << "Northern Bank;Account 4711\n"
+                           "Booking Date;Action;Symbol;Shares;Price;Fees;Amount\n"
+                           "05/01/2026;Deposit;;;;;5,000.00\n"
+                           "20/02/2026;Bought;ALP;5;41.50;4.95;-212.45\n"
+                           "31/03/2026;Safekeeping;;;;;-7.50\n"
+                           "18/05/2026;Dividend;ALP;;;;31.00\n"
+                           "19/06/2026;Sold;ALP;10;45.25;4.95;447.55\n"
+                           "Balance;;;;;;5,258.60\n";
+    return path;
+}
+
+/// The files of the tour are `Sample` in both folders; a panel that was told of no folder is for the statement.
 void answerFor(const DataFolder& folder)
 {
     DialogAnswers::current().alert = [](const char*, const char*) { return 1; }; // Continue
-    DialogAnswers::current().panel = [folder](const BFilePanel& panel) {
+    const std::string statement = makeStatement(folder);
+    DialogAnswers::current().panel = [folder, statement](const BFilePanel& panel) {
+        if (panel.PanelDirectory().empty())
+            return statement;
         const std::string portfolios = folder.path() + DataFolder::kPortoFolios;
         const bool isPortfolio = panel.PanelDirectory() == portfolios;
         return (isPortfolio ? portfolios : folder.path() + DataFolder::kCompanies) + "/Sample";
