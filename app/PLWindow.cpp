@@ -9,6 +9,7 @@
 #include "foundation/Today.h"
 #include "platform/Alert.h"
 #include "platform/Application.h"
+#include "platform/Button.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
 #include "views/FieldNotice.h"
@@ -124,6 +125,9 @@ static_assert(std::size(kCommands) == 65);
 constexpr Command kOwnCommands[] = {
     {'CBAs', [](PLWindow& w, BMessage*) { w.OpenSplit(); }}, // the company page
     {SplitWindow::kApplied, [](PLWindow& w, BMessage* m) { w.ApplySplit(m); }, "Apply split"},
+    {'TExp', [](PLWindow& w, BMessage*) { w.OpenExport(); }},
+    {ExportAssistant::kChosen, [](PLWindow& w, BMessage* m) { w.AskExport(m); }},
+    {ExportAssistant::kPlaced, [](PLWindow& w, BMessage* m) { w.WriteExport(m); }},
     {'HUnd', [](PLWindow& w, BMessage*) { w.Undo(); }},
     {'HRed', [](PLWindow& w, BMessage*) { w.Redo(); }},
     {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
@@ -184,6 +188,9 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     events_ = std::make_unique<EventEditor>(*this, *companyView_);
     operations_ = std::make_unique<OperationEditor>(*this, *operationView_, *companyView_);
     split_ = std::make_unique<SplitAssistant>(*this, *companyView_, *operationView_);
+    export_ = std::make_unique<ExportAssistant>(
+        *this, *tabView_, *files_, folder,
+        ExportOffers(*this, *files_, *companyView_, *currencyView_, *walletView_, *operationView_));
     makeCompletions();
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     walletView_->setDate(today());
@@ -213,8 +220,24 @@ void PLWindow::makePages()
     messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
+    makeTableButtons();
     makeUndoButtons();
     AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // last: in front of the edges of both
+}
+
+/// At the left of those for undo and redo, in the row of the tabs.
+void PLWindow::makeTableButtons()
+{
+    constexpr float kWidth = 92;
+    constexpr float kRight = 661;
+    exportButton_ = new BButton({kRight - kWidth, 1, kRight, 23}, "btnExport", "Export...", new BMessage('TExp'));
+    exportButton_->SetToolTip("Writes what this page shows as a table for other programs");
+    AddChild(exportButton_); // which the window owns
+}
+
+void PLWindow::OpenExport()
+{
+    export_->open(*exportButton_);
 }
 
 void PLWindow::makeCompletions()

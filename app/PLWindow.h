@@ -2,6 +2,7 @@
 
 #include "app/DataFiles.h"
 #include "app/EventEditor.h"
+#include "app/ExportAssistant.h"
 #include "app/History.h"
 #include "app/Notice.h"
 #include "app/OperationEditor.h"
@@ -117,6 +118,11 @@ public:
     status_t Save(BMessage* message) { return files_->save(message); }
     void Save(const String& path) { files_->save(path); }
 
+    // Tables and journals for other programs.
+    void OpenExport();
+    void AskExport(const BMessage* message) { export_->ask(message); }
+    void WriteExport(const BMessage* message) { export_->write(message); }
+
     // Markets (MarketCommands.cpp).
     void AddMarket();
     void AddMarket(Market* market, bool selected);
@@ -189,6 +195,7 @@ private:
     static constexpr const char* kDoneNotice = "done";
 
     void makePages();
+    void makeTableButtons();
     /// The page in front.
     BView& front() const;
     void makeUndoButtons();
@@ -226,6 +233,7 @@ private:
     WalletView* walletView_ = nullptr;
     OperationView* operationView_ = nullptr;
     ParameterView* parameterView_ = nullptr;
+    BButton* exportButton_ = nullptr;
     BButton* undoButton_ = nullptr;
     BButton* redoButton_ = nullptr;
     std::unique_ptr<History> history_; // null while the window is made
@@ -238,6 +246,7 @@ private:
     std::unique_ptr<QuoteEditor<Currency>> currencyQuotes_;
     std::unique_ptr<EventEditor> events_;
     std::unique_ptr<SplitAssistant> split_;
+    std::unique_ptr<ExportAssistant> export_;
     std::unique_ptr<OperationEditor> operations_;
     std::unique_ptr<Completions> completions_;
     std::unique_ptr<Shortcuts> shortcuts_;

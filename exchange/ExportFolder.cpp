@@ -3,6 +3,8 @@
 #include "market/Catalogue.h"
 #include "market/Currency.h"
 #include "market/Market.h"
+#include "valuation/ShareState.h"
+#include "valuation/State.h"
 
 using namespace export_tables;
 
@@ -58,7 +60,8 @@ void ExportFolder::addMarketData()
 void ExportFolder::addPortfolio(const State& state, const std::vector<EvolutionPoint>& evolution)
 {
     rows_.addAccounts(begin(kAccounts), state);
-    rows_.addHoldings(begin(kHoldings), state);
+    // Those that are sold, too: the order of all of them is part of a value.
+    rows_.addHoldings(begin(kHoldings), state.shareStates());
     rows_.addOperations(begin(kOperations), ExportRows::allOperations(*wallet_));
     rows_.addParameters(begin(kParameters));
     rows_.addEvolution(begin(kEvolution), evolution);

@@ -74,10 +74,9 @@ void ExportRows::addAccounts(CsvWriter& table, const State& state)
     }
 }
 
-void ExportRows::addHoldings(CsvWriter& table, const State& state)
+void ExportRows::addHoldings(CsvWriter& table, std::span<const ShareState* const> holdings)
 {
-    // Those that are sold, too: the order of all of them is part of a value.
-    for (const ShareState* holding : state.shareStates())
+    for (const ShareState* holding : holdings)
         addHolding(table, *holding);
 }
 

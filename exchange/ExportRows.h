@@ -4,6 +4,7 @@
 #include "exchange/ExportTables.h"
 #include "exchange/TableNames.h"
 
+#include <span>
 #include <string>
 #include <vector>
 
@@ -32,9 +33,9 @@ public:
     void addQuotes(CsvWriter& table, const Company& company);
     void addEvents(CsvWriter& table, const Company& company);
 
-    // Of the portfolio. `state` is one of the wallet's.
+    // Of the portfolio. What is held, and when, is of one of the wallet's states.
     void addAccounts(CsvWriter& table, const State& state);
-    void addHoldings(CsvWriter& table, const State& state);
+    void addHoldings(CsvWriter& table, std::span<const ShareState* const> holdings);
     /// Those of `operations` that are not automatic, in their order.
     void addOperations(CsvWriter& table, const std::vector<const Operation*>& operations);
     void addParameters(CsvWriter& table);
