@@ -95,6 +95,7 @@ void ExportAssistant::ask(const BMessage* message)
     const bool isFolder = offer->ending.empty();
     const std::string name =
         isFolder ? freeName(panel_.PanelDirectory(), offer->name) : offer->name + '.' + offer->ending;
+    panel_.SetTitle(("Export: " + offer->label).c_str());
     panel_.SetSaveText(name.c_str(), offer->ending.c_str());
     panel_.Show();
 }

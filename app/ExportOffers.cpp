@@ -190,6 +190,7 @@ ExportOffers::Offers ExportOffers::ofPortfolio() const
                            [this](ExportRows& rows, CsvWriter& file) {
                                rows.addEvolution(file, evolutionByDate(*window_.getWallet(), window_.catalogue()));
                            }));
+    // Everything, without what is simulated: as if it was saved and loaded again.
     offers.push_back(folder());
     offers.push_back(journal("ledger and hledger", "ledger", ledgerForm()));
     offers.push_back(journal("Beancount", "beancount", beancountForm()));
@@ -199,8 +200,11 @@ ExportOffers::Offers ExportOffers::ofPortfolio() const
 ExportOffers::Offers ExportOffers::ofOperations() const
 {
     const auto offer = [this](const char* label, const std::vector<const Operation*>& written) {
-        return table({label, "operations " + tableDate(today()), counting("operation", "operations")}, kOperations,
-                     std::ranges::any_of(written, isManual),
+        const auto manual = static_cast<std::size_t>(std::ranges::count_if(written, isManual));
+        // A table of them is for being imported, and what a valuation makes up would become real by that.
+        const std::string left = manual < written.size() ? " (without the automatic ones)" : "";
+        return table({label, "operations " + tableDate(today()), counting("operation", "operations", left)},
+                     kOperations, manual > 0,
                      [=](ExportRows& rows, CsvWriter& file) { rows.addOperations(file, written); });
     };
     return {offer("Operations shown", operations_.shownOperations()),

@@ -39,6 +39,8 @@ public:
     /// without one, unless it is empty.
     void SetSaveText(const char* text, const char* ending = "");
     const std::string& SaveText() const { return saveText_; }
+    /// In place of "Load" or "Save".
+    void SetTitle(const char* title) { title_ = title; }
     void Show();
 
 private:
@@ -52,6 +54,7 @@ private:
     std::string saveText_;
     std::string saveEnding_;
     std::unique_ptr<BMessage> message_;
+    std::string title_;
     bool modal_;
     std::unique_ptr<QFileDialog> dialog_; // made when first shown: that takes its time
 };

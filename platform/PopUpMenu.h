@@ -12,7 +12,8 @@ public:
     /// @return the item that was chosen; null without one, also when the window was closed meanwhile with all its
     /// views.
     BMenuItem* Go(BPoint where) const;
-    /// Comes up at `where` on the screen, with the keyboard on the first item that can be chosen, and returns at once:
-    /// a choice sends the item's message, and marks nothing. The menu itself is not needed any more then.
+    /// Comes up at `where` on the screen, or so far to the left of it that it stays before the window, with the
+    /// keyboard on the first item that can be chosen. Returns at once: a choice sends the item's message, and marks
+    /// nothing. The menu itself is not needed any more then.
     void Open(BPoint where) const;
 };

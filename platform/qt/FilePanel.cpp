@@ -17,7 +17,7 @@ BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const ent
                        BMessage* message, bool modal)
     : mode_(mode), target_(target != nullptr ? *target : BMessenger()),
       message_(message != nullptr ? message : new BMessage(mode == B_OPEN_PANEL ? B_REFS_RECEIVED : B_SAVE_REQUESTED)),
-      modal_(modal)
+      title_(mode == B_OPEN_PANEL ? "Load" : "Save"), modal_(modal)
 {
     BPath path;
     if (start != nullptr && BEntry(start).GetPath(&path) == B_OK)
@@ -34,7 +34,6 @@ QFileDialog& BFilePanel::dialog()
     auto* window = target_.IsValid() ? dynamic_cast<BWindow*>(target_.Target()->Looper()) : nullptr;
     dialog_ = std::make_unique<QFileDialog>(window != nullptr ? &window->widget() : nullptr);
     dialog_->setObjectName(mode_ == B_OPEN_PANEL ? "OpenPanel" : "SavePanel");
-    dialog_->setWindowTitle(mode_ == B_OPEN_PANEL ? "Load" : "Save");
     // The desktop's own panel takes no part in this program's event loop and cannot be found by tests.
     dialog_->setOption(QFileDialog::DontUseNativeDialog);
     dialog_->setAcceptMode(mode_ == B_OPEN_PANEL ? QFileDialog::AcceptOpen : QFileDialog::AcceptSave);
@@ -73,6 +72,7 @@ void BFilePanel::Show()
     }
     // The kit remembers the folder and the dialog does not: from here on it shows what the kit has.
     QFileDialog& shown = dialog();
+    shown.setWindowTitle(QString::fromStdString(title_));
     shown.setDirectory(directory_.empty() ? QDir::homePath() : QString::fromStdString(directory_));
     if (mode_ == B_SAVE_PANEL) {
         shown.setDefaultSuffix(QString::fromStdString(saveEnding_));

@@ -7,6 +7,8 @@
 #include <QMenu>
 #include <QPointer>
 
+#include <algorithm>
+
 namespace {
 
 /// The menu of the kits stays as it is: this shows its items once, and the numbers lead back. The window owns it, and
@@ -59,6 +61,11 @@ void BPopUpMenu::Open(BPoint where) const
             QObject::connect(action, &QAction::triggered,
                              [to = item.Messenger(), message = *item.Message()] { to.SendMessage(&message); });
     }
-    shown->popup(placeOf(where));
+    QPoint place = placeOf(where);
+    // It stays before the window where it can.
+    if (const QWidget* window = shown->parentWidget())
+        place.rx() -= std::clamp(place.x() + shown->sizeHint().width() - window->geometry().right() - 1, 0,
+                                 std::max(place.x() - window->geometry().left(), 0));
+    shown->popup(place);
     shown->setActiveAction(first);
 }
