@@ -105,6 +105,13 @@ void addDollars(TourHand& hand)
     hand.picture("guide-two-currencies", {0, 0, 800, 420});
 }
 
+void showExport(TourHand& hand)
+{
+    hand.pressInFront("btnExport");
+    hand.picture("guide-export", {0, 0, 800, 300});
+    hand.closeMenu();
+}
+
 /// Simulates the sale of a holding with profit. The portfolio is of no use afterwards.
 void showPrevisions(TourHand& hand)
 {
@@ -184,6 +191,7 @@ void tourGuide(TourHand& hand)
 {
     makeFirstPortfolio(hand);
     addDollars(hand);
+    showExport(hand);
     showPrevisions(hand);
     split(hand);
     showMistakes(hand);
