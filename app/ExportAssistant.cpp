@@ -36,7 +36,7 @@ std::string nameOf(const std::string& path)
     return std::filesystem::path(path).filename();
 }
 
-/// A name that nothing in the folder has: a panel would go into a folder of that name.
+/// A name that nothing in the folder has: tables of a former export are replaced only where a person has named them.
 std::string freeName(const std::string& folder, const std::string& wanted)
 {
     std::error_code error; // of a place that cannot be looked at; the export tells it
@@ -95,6 +95,7 @@ void ExportAssistant::ask(const BMessage* message)
     const bool isFolder = offer->ending.empty();
     const std::string name =
         isFolder ? freeName(panel_.PanelDirectory(), offer->name) : offer->name + '.' + offer->ending;
+    panel_.SetNodeFlavors(isFolder ? B_FILE_NODE | B_DIRECTORY_NODE : B_FILE_NODE);
     panel_.SetTitle(("Export: " + offer->label).c_str());
     panel_.SetSaveText(name.c_str(), offer->ending.c_str());
     panel_.Show();
