@@ -295,20 +295,24 @@ void DataFiles::saveOrAsk()
     savePanel_.Show();
 }
 
+status_t DataFiles::chosenPath(const BMessage& message, BPath* path)
+{
+    entry_ref folder;
+    const char* name = nullptr;
+    status_t status = message.FindRef("directory", &folder);
+    if (status == B_OK)
+        status = message.FindString("name", &name);
+    if (status == B_OK)
+        status = BEntry(&folder).GetPath(path);
+    return status == B_OK ? path->Append(name) : status;
+}
+
 status_t DataFiles::save(BMessage* message)
 {
     if (message == nullptr)
         return B_ERROR;
-    entry_ref folder;
-    const char* name = nullptr;
-    status_t status = message->FindRef("directory", &folder);
-    if (status == B_OK)
-        status = message->FindString("name", &name);
     BPath path;
-    if (status == B_OK)
-        status = BEntry(&folder).GetPath(&path);
-    if (status == B_OK)
-        status = path.Append(name);
+    const status_t status = chosenPath(*message, &path);
     const auto kind = kindInFront();
     if (status != B_OK || !kind)
         return status;

@@ -12,6 +12,7 @@
 #include <string>
 
 class BMessage;
+class BPath;
 class BTabView;
 class InputFile;
 class PLWindow;
@@ -74,6 +75,8 @@ public:
     /// The answer of the save panel. @return `B_OK`; what is missing in the message.
     status_t save(BMessage* message);
     void save(const String& path);
+    /// What a save panel was left with. `*path` is set with `B_OK`; otherwise something is missing in the message.
+    static status_t chosenPath(const BMessage& message, BPath* path);
     /// The next save of the portfolio asks for a name.
     void forgetWallet();
 

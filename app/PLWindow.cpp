@@ -129,6 +129,9 @@ constexpr Command kOwnCommands[] = {
     {'TImp', [](PLWindow& w, BMessage*) { w.AskForImport(); }},
     {ImportAssistant::kChosen, [](PLWindow& w, BMessage* m) { w.OpenImport(m); }},
     {ImportWindow::kImported, [](PLWindow& w, BMessage*) { w.CarryOutImport(); }, "Import"},
+    {'TExp', [](PLWindow& w, BMessage*) { w.OpenExport(); }},
+    {ExportAssistant::kChosen, [](PLWindow& w, BMessage* m) { w.AskExport(m); }},
+    {ExportAssistant::kPlaced, [](PLWindow& w, BMessage* m) { w.WriteExport(m); }},
     {'HUnd', [](PLWindow& w, BMessage*) { w.Undo(); }},
     {'HRed', [](PLWindow& w, BMessage*) { w.Redo(); }},
     {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
@@ -191,6 +194,9 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     split_ = std::make_unique<SplitAssistant>(*this, *companyView_, *operationView_);
     import_ = std::make_unique<ImportAssistant>(*this, *tabView_, *companyView_, *currencyView_, folder);
     tabView_->SetSelectionHook([this] { importButton_->SetEnabled(import_->isPossible()); });
+    export_ = std::make_unique<ExportAssistant>(
+        *this, *tabView_, *files_, folder,
+        ExportOffers(*this, *files_, *companyView_, *currencyView_, *walletView_, *operationView_));
     makeCompletions();
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     walletView_->setDate(today());
@@ -240,6 +246,13 @@ void PLWindow::makeTableButtons()
     importButton_ =
         add(kRight - 2 * kWidth - 3, "btnImportTable", "Import...",
             "Brings in a table: prices on the page Company, rates on Currency, operations on the next two", 'TImp');
+    exportButton_ = add(kRight - kWidth + 1, "btnExport", "Export...",
+                        "Writes what this page shows as a table for other programs", 'TExp');
+}
+
+void PLWindow::OpenExport()
+{
+    export_->open(*exportButton_);
 }
 
 void PLWindow::makeCompletions()

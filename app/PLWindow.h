@@ -2,6 +2,7 @@
 
 #include "app/DataFiles.h"
 #include "app/EventEditor.h"
+#include "app/ExportAssistant.h"
 #include "app/History.h"
 #include "app/ImportAssistant.h"
 #include "app/Notice.h"
@@ -118,10 +119,13 @@ public:
     status_t Save(BMessage* message) { return files_->save(message); }
     void Save(const String& path) { files_->save(path); }
 
-    // Tables of other programs.
+    // Tables and journals of other programs, and for them.
     void AskForImport() { import_->ask(); }
     void OpenImport(const BMessage* message) { import_->open(message); }
     void CarryOutImport() { import_->carryOut(); }
+    void OpenExport();
+    void AskExport(const BMessage* message) { export_->ask(message); }
+    void WriteExport(const BMessage* message) { export_->write(message); }
 
     // Markets (MarketCommands.cpp).
     void AddMarket();
@@ -195,6 +199,7 @@ private:
     static constexpr const char* kDoneNotice = "done";
 
     void makePages();
+    void makeTableButtons();
     /// The page in front.
     BView& front() const;
     void makeUndoButtons();
@@ -233,6 +238,7 @@ private:
     WalletView* walletView_ = nullptr;
     OperationView* operationView_ = nullptr;
     ParameterView* parameterView_ = nullptr;
+    BButton* exportButton_ = nullptr;
     BButton* undoButton_ = nullptr;
     BButton* redoButton_ = nullptr;
     BButton* importButton_ = nullptr;
@@ -246,6 +252,7 @@ private:
     std::unique_ptr<QuoteEditor<Currency>> currencyQuotes_;
     std::unique_ptr<EventEditor> events_;
     std::unique_ptr<SplitAssistant> split_;
+    std::unique_ptr<ExportAssistant> export_;
     std::unique_ptr<OperationEditor> operations_;
     std::unique_ptr<ImportAssistant> import_;
     std::unique_ptr<Completions> completions_;

@@ -60,8 +60,8 @@ void checkReplaceable(const std::string& path, std::string_view firstLine)
         throw std::runtime_error(path + ": is there already, was not made by an export, and is left as it is");
 }
 
-CsvWriter::CsvWriter(const std::string& path, const std::vector<std::string>& headings)
-    : path_(checked(path, headings)), file_(path, AtomicFile::Existing::kReplace)
+CsvWriter::CsvWriter(const std::string& path, const std::vector<std::string>& headings, Foreign foreign)
+    : path_(foreign == Foreign::kKeep ? checked(path, headings) : path), file_(path, AtomicFile::Existing::kReplace)
 {
     putRow(&line_, headings);
     write();

@@ -10,11 +10,15 @@
 /// A table that is written: headings, then rows of cells with commas between, quoted where they have to be, as in
 /// RFC 4180. The file appears with `commit`.
 ///
-/// A file of the name that begins with the same headings is from an earlier export, and replaced; any other stays.
 /// Whatever fails throws std::runtime_error with one line for the user.
 class CsvWriter {
 public:
-    CsvWriter(const std::string& path, const std::vector<std::string>& headings);
+    /// What becomes of a file of that name that does not begin with the same headings. One that does is from an
+    /// earlier export, and replaced.
+    enum class Foreign { kKeep, kReplace };
+
+    /// Throws when there is one to be kept.
+    CsvWriter(const std::string& path, const std::vector<std::string>& headings, Foreign foreign = Foreign::kKeep);
 
     /// @return false for a row that a reader would find too long; it is not written.
     bool add(const std::vector<std::string>& cells);

@@ -1,21 +1,12 @@
 #pragma once
 
 #include "exchange/CsvWriter.h"
-#include "exchange/ExportTables.h"
-#include "exchange/TableNames.h"
+#include "exchange/ExportRows.h"
 
 #include <cstddef>
 #include <memory>
 #include <string>
 #include <vector>
-
-class Catalogue;
-class Operation;
-class ShareState;
-class State;
-class String;
-class Wallet;
-struct EvolutionPoint;
 
 /// Writes market data and a portfolio as tables into a folder, from which FolderImport makes files that value to the
 /// same bits.
@@ -40,27 +31,14 @@ public:
     std::vector<Made> commit();
 
     /// A line for each thing that the tables cannot hold, or hold otherwise.
-    const std::vector<std::string>& remarks() const { return remarks_; }
+    std::vector<std::string> remarks() const;
 
 private:
     CsvWriter& begin(const ExportTable& table);
-    void add(CsvWriter& table, const std::vector<std::string>& cells);
-
-    void addCurrencies();
-    void addListing();
-    void addSeries();
-    void addEvents();
-    void addAccounts(const State& state);
-    void addHoldings(const State& state);
-    void addHolding(CsvWriter& table, const ShareState& holding);
-    void addOperations();
-    void addOperation(CsvWriter& table, const Operation& operation);
-    std::string value(double amount, const String& symbol, const State& state) const;
 
     std::string folder_;
     const Catalogue& catalogue_;
     const Wallet* wallet_;
-    TableNames names_;
+    ExportRows rows_;
     std::vector<std::unique_ptr<CsvWriter>> tables_;
-    std::vector<std::string> remarks_;
 };

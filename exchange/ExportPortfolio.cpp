@@ -1,6 +1,6 @@
-// The tables of the portfolio.
+// The rows of the portfolio.
 
-#include "exchange/ExportFolder.h"
+#include "exchange/ExportRows.h"
 #include "exchange/TableText.h"
 #include "market/Catalogue.h"
 #include "market/Currency.h"
@@ -51,21 +51,8 @@ void setTransfer(OperationCells* cells, const TransferAccountOperation& transfer
 
 } // namespace
 
-void ExportFolder::addPortfolio(const State& state, const std::vector<EvolutionPoint>& evolution)
-{
-    addAccounts(state);
-    addHoldings(state);
-    addOperations();
-    CsvWriter& parameters = begin(kParameters);
-    for (int i = 0; i < Wallet::kParameterCount; ++i)
-        add(parameters, {kParameterNames[i], numberText(wallet_->getParameter(static_cast<Wallet::Parameter>(i)))});
-    CsvWriter& points = begin(kEvolution);
-    for (const EvolutionPoint& point : evolution)
-        add(points, {tableDate(point.date), numberText(point.totalValue)});
-}
-
 /// An amount in the first currency of that symbol, in the reference currency; empty when that has no answer.
-std::string ExportFolder::value(double amount, const String& symbol, const State& state) const
+std::string ExportRows::value(double amount, const String& symbol, const State& state) const
 {
     const Currency* reference = catalogue_.getReferenceCurrency();
     const Currency* currency = catalogue_.getCurrencyByRepresentation(symbol);
@@ -75,32 +62,29 @@ std::string ExportFolder::value(double amount, const String& symbol, const State
     return numberText(static_cast<float>(amount * currency->getRealQuote(day) / reference->getRealQuote(day)));
 }
 
-void ExportFolder::addAccounts(const State& state)
+void ExportRows::addAccounts(CsvWriter& table, const State& state)
 {
-    CsvWriter& accounts = begin(kAccounts);
     for (const AccountState* cash : state.accountStates()) {
         const Account& account = *cash->account();
         const std::string& name = names_.of(account);
-        add(accounts, {name, account.currency() != nullptr ? names_.of(*account.currency()) : "",
-                       account.isDefaultTransferAccount() ? kYes : "", numberText(cash->getCash()),
-                       value(cash->getCash(), account.getCurrencyRepresentation(), state),
-                       TableNames::original(account.getName(), name)});
+        add(table, {name, account.currency() != nullptr ? names_.of(*account.currency()) : "",
+                    account.isDefaultTransferAccount() ? kYes : "", numberText(cash->getCash()),
+                    value(cash->getCash(), account.getCurrencyRepresentation(), state),
+                    TableNames::original(account.getName(), name)});
     }
 }
 
-void ExportFolder::addHoldings(const State& state)
+void ExportRows::addHoldings(CsvWriter& table, std::span<const ShareState* const> holdings)
 {
-    // Those that are sold, too: the order of all of them is part of a value.
-    CsvWriter& holdings = begin(kHoldings);
-    for (const ShareState* holding : state.shareStates())
-        addHolding(holdings, *holding);
+    for (const ShareState* holding : holdings)
+        addHolding(table, *holding);
 }
 
-void ExportFolder::addHolding(CsvWriter& table, const ShareState& holding)
+void ExportRows::addHolding(CsvWriter& table, const ShareState& holding)
 {
     const Company* company = holding.share()->company();
     if (company == nullptr || company->market() == nullptr || company->market()->currency() == nullptr) {
-        remarks_.push_back("a holding of a company in no market is left out");
+        leftOut_.push_back("a holding of a company in no market is left out");
         return;
     }
     const Market& market = *company->market();
@@ -112,20 +96,24 @@ void ExportFolder::addHolding(CsvWriter& table, const ShareState& holding)
          end.isUndefined() ? "" : tableDate(end)});
 }
 
-void ExportFolder::addOperations()
+std::vector<const Operation*> ExportRows::allOperations(const Wallet& wallet)
 {
     std::vector<const Operation*> operations;
-    for (const Account* account : wallet_->accounts())
+    for (const Account* account : wallet.accounts())
         operations.insert(operations.end(), account->operations().begin(), account->operations().end());
     // Those of one day stay in the order of the accounts and, on each, in that of the file, on which its cash depends.
     std::ranges::stable_sort(operations, {}, &Operation::getDate);
-    CsvWriter& table = begin(kOperations);
+    return operations;
+}
+
+void ExportRows::addOperations(CsvWriter& table, const std::vector<const Operation*>& operations)
+{
     for (const Operation* operation : operations)
         if (!operation->isAutomatic()) // what a valuation has made up is no news to anybody
             addOperation(table, *operation);
 }
 
-void ExportFolder::addOperation(CsvWriter& table, const Operation& operation)
+void ExportRows::addOperation(CsvWriter& table, const Operation& operation)
 {
     const OperationKind kind = kindOf(operation);
     OperationCells cells;
@@ -141,7 +129,7 @@ void ExportFolder::addOperation(CsvWriter& table, const Operation& operation)
         const auto& trade = static_cast<const ShareOperation&>(operation);
         const Company* company = trade.share() != nullptr ? trade.share()->company() : nullptr;
         if (company == nullptr || company->market() == nullptr) {
-            remarks_.push_back("the trade of " + cells.date + " on " + cells.account +
+            leftOut_.push_back("the trade of " + cells.date + " on " + cells.account +
                                " has no company and is left out");
             return;
         }
@@ -153,7 +141,7 @@ void ExportFolder::addOperation(CsvWriter& table, const Operation& operation)
     } else {
         const auto& transfer = static_cast<const TransferAccountOperation&>(operation);
         if (transfer.recipient() == nullptr) {
-            remarks_.push_back("the transfer of " + cells.date + " from " + cells.account +
+            leftOut_.push_back("the transfer of " + cells.date + " from " + cells.account +
                                " has lost its recipient and is left out");
             return;
         }
@@ -162,4 +150,16 @@ void ExportFolder::addOperation(CsvWriter& table, const Operation& operation)
         setTransfer(&cells, transfer, kind);
     }
     add(table, cells.row());
+}
+
+void ExportRows::addParameters(CsvWriter& table)
+{
+    for (int i = 0; i < Wallet::kParameterCount; ++i)
+        add(table, {kParameterNames[i], numberText(wallet_->getParameter(static_cast<Wallet::Parameter>(i)))});
+}
+
+void ExportRows::addEvolution(CsvWriter& table, const std::vector<EvolutionPoint>& points)
+{
+    for (const EvolutionPoint& point : points)
+        add(table, {tableDate(point.date), numberText(point.totalValue)});
 }

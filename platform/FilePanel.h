@@ -11,8 +11,8 @@ struct entry_ref;
 
 enum file_panel_mode { B_OPEN_PANEL, B_SAVE_PANEL };
 
-/// Which entries a panel lets a person choose: files.
-enum : uint32 { B_FILE_NODE = 1 };
+/// Which entries a panel lets a person choose: files, and in a save panel also folders.
+enum : uint32 { B_FILE_NODE = 1, B_DIRECTORY_NODE = 2 };
 
 /// The dialog in which a person chooses a file. It answers with a message to its target.
 ///
@@ -20,8 +20,8 @@ enum : uint32 { B_FILE_NODE = 1 };
 /// folder as the reference "directory" and the file's name as the string "name"; a save panel has asked before when
 /// there is such a file already. A panel that is left without a choice sends nothing.
 ///
-/// One file is chosen, and the panel hides when that is done. Folders are for going into and cannot be chosen, whatever
-/// `nodeFlavors` says, and there is no filter.
+/// One file is chosen, and the panel hides when that is done. Folders are for going into; where they can be chosen,
+/// that is done by their names. There is no filter.
 class BFilePanel {
 public:
     /// `target` is copied; `start` may be null. `message`, owned from now on, replaces the code above.
@@ -41,6 +41,7 @@ public:
     /// without one, unless it is empty.
     void SetSaveText(const char* text, const char* ending = "");
     const std::string& SaveText() const { return saveText_; }
+    void SetNodeFlavors(uint32 flavors) { flavors_ = flavors; }
     void Show();
 
 private:
@@ -55,6 +56,7 @@ private:
     std::string saveText_;
     std::string saveEnding_;
     std::unique_ptr<BMessage> message_;
+    uint32 flavors_;
     bool modal_;
     std::unique_ptr<QFileDialog> dialog_; // made when first shown: that takes its time
 };

@@ -20,6 +20,7 @@ public:
     /// Does not own `target`, which may die before. A view that is told none sends to its window.
     void SetTarget(const BHandler* target) { target_ = BMessenger(target); }
     bool HasTarget() const { return target_.IsValid(); }
+    BMessenger Messenger() const { return target_; }
 
     /// Sends a copy of `message`, or of its own one when that is null, to the target.
     virtual status_t Invoke(const BMessage* message = nullptr)

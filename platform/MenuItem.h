@@ -16,11 +16,22 @@ public:
     bool IsMarked() const { return marked_; }
     /// In a pop-up menu at most one item is marked. Sends no message.
     void SetMarked(bool marked);
+    /// A pop-up menu that comes up by itself shows one that is not enabled grey, and it cannot be chosen there. A menu
+    /// field does not look at this.
+    void SetEnabled(bool enabled) { enabled_ = enabled; }
+    bool IsEnabled() const { return enabled_; }
 
 private:
     friend class BMenu;
 
     std::string label_;
     bool marked_ = false;
+    bool enabled_ = true;
     BMenu* menu_ = nullptr;
+};
+
+/// A line between the items of a pop-up menu that comes up by itself.
+class BSeparatorItem final : public BMenuItem {
+public:
+    BSeparatorItem() : BMenuItem("", nullptr) { SetEnabled(false); }
 };

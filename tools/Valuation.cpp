@@ -5,7 +5,6 @@
 #include "storage/InputFile.h"
 #include "valuation/State.h"
 
-#include <algorithm>
 #include <stdexcept>
 
 namespace {
@@ -58,12 +57,8 @@ void Valuation::compute(const Date& date, bool previsions, bool evolution)
     checkOutcome(outcome);
     // Of an earlier computation.
     evolution_.clear();
-    if (!evolution)
-        return;
-    evolution_ = evolutionPoints(wallet_, catalogue_);
-    // The current state comes first in the wallet's list, before the days that lead to it.
-    const auto isEarlier = [](const EvolutionPoint& a, const EvolutionPoint& b) { return a.date < b.date; };
-    std::stable_sort(evolution_.begin(), evolution_.end(), isEarlier);
+    if (evolution)
+        evolution_ = evolutionByDate(wallet_, catalogue_);
 }
 
 void Valuation::checkOutcome(EvolutionOutcome outcome) const

@@ -5,6 +5,7 @@
 #include "valuation/DailyStates.h"
 #include "valuation/State.h"
 
+#include <algorithm>
 #include <cstdint>
 
 namespace {
@@ -62,5 +63,13 @@ std::vector<EvolutionPoint> evolutionPoints(const Wallet& wallet, const Catalogu
     points.reserve(wallet.getNbrStates());
     for (const State* state : wallet.states())
         points.push_back({state->getDate(), appraisal.totalValue(*state), state->getTotalDeposit()});
+    return points;
+}
+
+std::vector<EvolutionPoint> evolutionByDate(const Wallet& wallet, const Catalogue& catalogue)
+{
+    // The current state comes first in the wallet's list, before the days that lead to it.
+    std::vector<EvolutionPoint> points = evolutionPoints(wallet, catalogue);
+    std::ranges::stable_sort(points, {}, &EvolutionPoint::date);
     return points;
 }

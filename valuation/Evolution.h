@@ -36,3 +36,5 @@ struct EvolutionPoint {
 /// The totals of every state of the wallet, in the order of its list: the current state first, then the daily
 /// ones. Empty without a reference currency.
 std::vector<EvolutionPoint> evolutionPoints(const Wallet& wallet, const Catalogue& catalogue);
+/// The same by ascending date; of two of a day the current state first.
+std::vector<EvolutionPoint> evolutionByDate(const Wallet& wallet, const Catalogue& catalogue);

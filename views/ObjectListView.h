@@ -134,6 +134,15 @@ public:
         const BListItem* item = ItemAt(index);
         return item != nullptr ? static_cast<const Row*>(item)->object() : nullptr;
     }
+    /// The objects of all rows that are shown, from the top.
+    std::vector<const Object*> allShown() const
+    {
+        std::vector<const Object*> objects;
+        for (int32 i = 0; i < CountItems(); ++i)
+            if (const Object* object = objectAt(i))
+                objects.push_back(object);
+        return objects;
+    }
     /// The first selected object, null when there is none.
     Object* selected() const { return objectAt(CurrentSelection()); }
     /// All selected objects, from the top.

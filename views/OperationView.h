@@ -60,6 +60,8 @@ public:
     void restoreSelection(const ListPlaces& places) { operations_->restoreSelection(places); }
     /// The operation of the fields shows again, and is the selected one: hidden it would be added a second time.
     void AboutToUpdate() override;
+    /// Those that the filters let through, in the order in which they show.
+    std::vector<const Operation*> shownOperations() const { return operations_->allShown(); }
     /// Takes the filters away.
     void ShowAllOperations();
     /// Takes the rows of removed operations out of a list that is not filled again.

@@ -9,6 +9,7 @@
 #include "views/StateLists.h"
 
 #include <utility>
+#include <vector>
 
 class BButton;
 class BSearchControl;
@@ -48,6 +49,9 @@ public:
                          EvolutionOutcome outcome);
     /// Without the tick there is no chart, and the list of holdings has its room.
     void ClearEvolution();
+
+    /// The holdings that the filter lets through, in the order in which they show.
+    std::vector<const ShareState*> shownHoldings() const { return shares_->allShown(); }
 
     String getAccountName() const { return accountName_->Text(); }
     void setAccountName(const String& name) { showText(*accountName_, name); }

@@ -8,16 +8,41 @@
 #include "platform/qt/WindowWidget.h"
 
 #include <QFileDialog>
+#include <QFileInfo>
 #include <QLineEdit>
 #include <QTreeView>
 
 #include <filesystem>
 
-BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const entry_ref* start, uint32,
+namespace {
+
+class Dialog final : public QFileDialog {
+public:
+    /// `flavors` is looked at when a choice is made.
+    Dialog(QWidget* parent, const uint32& flavors) : QFileDialog(parent), flavors_(flavors) {}
+
+protected:
+    void accept() override
+    {
+        // The dialog would go into a folder that is named; one without a name is the folder that it is in.
+        const QFileInfo chosen(selectedFiles().value(0));
+        if ((flavors_ & B_DIRECTORY_NODE) != 0 && chosen.isDir() && chosen != QFileInfo(directory().absolutePath()))
+            QDialog::accept();
+        else
+            QFileDialog::accept();
+    }
+
+private:
+    const uint32& flavors_;
+};
+
+} // namespace
+
+BFilePanel::BFilePanel(file_panel_mode mode, const BMessenger* target, const entry_ref* start, uint32 nodeFlavors,
                        BMessage* message, bool modal)
     : mode_(mode), target_(target != nullptr ? *target : BMessenger()), title_(mode == B_OPEN_PANEL ? "Load" : "Save"),
       message_(message != nullptr ? message : new BMessage(mode == B_OPEN_PANEL ? B_REFS_RECEIVED : B_SAVE_REQUESTED)),
-      modal_(modal)
+      flavors_(nodeFlavors), modal_(modal)
 {
     BPath path;
     if (start != nullptr && BEntry(start).GetPath(&path) == B_OK)
@@ -32,9 +57,8 @@ QFileDialog& BFilePanel::dialog()
         return *dialog_;
     // A panel belongs to the window that it answers to, which keeps it in front of that.
     auto* window = target_.IsValid() ? dynamic_cast<BWindow*>(target_.Target()->Looper()) : nullptr;
-    dialog_ = std::make_unique<QFileDialog>(window != nullptr ? &window->widget() : nullptr);
+    dialog_ = std::make_unique<Dialog>(window != nullptr ? &window->widget() : nullptr, flavors_);
     dialog_->setObjectName(mode_ == B_OPEN_PANEL ? "OpenPanel" : "SavePanel");
-    dialog_->setWindowTitle(QString::fromStdString(title_));
     // The desktop's own panel takes no part in this program's event loop and cannot be found by tests.
     dialog_->setOption(QFileDialog::DontUseNativeDialog);
     dialog_->setAcceptMode(mode_ == B_OPEN_PANEL ? QFileDialog::AcceptOpen : QFileDialog::AcceptSave);
@@ -73,6 +97,7 @@ void BFilePanel::Show()
     }
     // The kit remembers the folder and the dialog does not: from here on it shows what the kit has.
     QFileDialog& shown = dialog();
+    shown.setWindowTitle(QString::fromStdString(title_));
     shown.setDirectory(directory_.empty() ? QDir::homePath() : QString::fromStdString(directory_));
     if (mode_ == B_SAVE_PANEL) {
         shown.setDefaultSuffix(QString::fromStdString(saveEnding_));

@@ -5,6 +5,7 @@
 #include "platform/qt/WindowWidget.h"
 
 #include <QApplication>
+#include <QPainter>
 #include <QPixmap>
 #include <QSaveFile>
 #include <QScreen>
@@ -13,8 +14,10 @@ status_t save_screenshot(const BWindow& window, BRect part, const char* path)
 {
     WindowWidget& shown = window.widget();
     const QRect place = QRectF(part.left, part.top, part.Width(), part.Height()).toRect();
-    const QPixmap picture =
-        shown.screen()->grabWindow(shown.winId(), place.x(), place.y(), place.width(), place.height());
+    QPixmap picture = shown.screen()->grabWindow(shown.winId(), place.x(), place.y(), place.width(), place.height());
+    // It is a window of its own, which not every screen has on its picture of another one.
+    if (QWidget* menu = QApplication::activePopupWidget())
+        QPainter(&picture).drawPixmap(shown.mapFromGlobal(menu->pos()) - place.topLeft(), menu->grab());
     return picture.save(QString::fromUtf8(path), "PNG") ? B_OK : B_ERROR;
 }
 
@@ -24,6 +27,12 @@ status_t save_picture(BView& view, const char* path)
     QSaveFile file(QString::fromUtf8(path));
     const bool isWritten = file.open(QIODevice::WriteOnly) && view.picture().save(&file, "PNG") && file.commit();
     return isWritten ? B_OK : B_ERROR;
+}
+
+void close_menu()
+{
+    if (QWidget* menu = QApplication::activePopupWidget())
+        menu->close();
 }
 
 void handle_pending_messages()

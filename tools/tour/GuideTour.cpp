@@ -116,6 +116,13 @@ void showImport(TourHand& hand)
     hand.turnTo(kPortoFolio);
 }
 
+void showExport(TourHand& hand)
+{
+    hand.pressInFront("btnExport");
+    hand.picture("guide-export", {0, 0, 800, 300});
+    hand.closeMenu();
+}
+
 /// Simulates the sale of a holding with profit. The portfolio is of no use afterwards.
 void showPrevisions(TourHand& hand)
 {
@@ -196,6 +203,7 @@ void tourGuide(TourHand& hand)
     makeFirstPortfolio(hand);
     addDollars(hand);
     showImport(hand);
+    showExport(hand);
     showPrevisions(hand);
     split(hand);
     showMistakes(hand);

@@ -95,6 +95,12 @@ void TourHand::select(const char* list, int32 first, int32 last)
     handle_pending_messages();
 }
 
+void TourHand::closeMenu()
+{
+    close_menu();
+    handle_pending_messages();
+}
+
 void TourHand::dismissNotice()
 {
     window_.FindView("txtNotice")->MouseDown({});

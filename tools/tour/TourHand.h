@@ -31,6 +31,8 @@ public:
     /// Selects the rows of a list from `first` to `last`.
     void select(const char* list, int32 first, int32 last);
     void select(const char* list, int32 row) { select(list, row, row); }
+    /// Leaves the menu that a button has opened.
+    void closeMenu();
     /// Sends the notice away that is shown.
     void dismissNotice();
     /// Writes what the window shows within `part` as NAME.png, and tells the path on standard output.
