@@ -203,7 +203,6 @@ private:
     /// The page in front.
     BView& front() const;
     void makeUndoButtons();
-    void makeTableButtons();
     void makeCompletions();
     /// Compares what is here with what there was after the last command, and keeps what has changed. `command` names
     /// the step; commands know nothing of it, so that none can forget it.
