@@ -7,6 +7,7 @@
 #include "platform/PopUpMenu.h"
 #include "platform/TabView.h"
 #include "storage/Folders.h"
+#include "storage/Writing.h"
 
 #include <algorithm>
 #include <filesystem>
@@ -115,6 +116,7 @@ void ExportAssistant::write(const BMessage* message)
     if (isSameFile(path, open.markets.path) || isSameFile(path, open.wallet.path))
         return tellFailure(nameOf(path) + " is a file that is open here");
     try {
+        const SizeSignalIgnored ignored; // a limit on the size of files is a reason like any other
         const std::string text = written(*offer, path);
         window_.dropNotice(kNotice); // of a failure before
         window_.showNotice({kNotice, text, {}, true});

@@ -16,6 +16,7 @@
 #include "valuation/State.h"
 
 #include <algorithm>
+#include <cmath>
 
 using namespace export_tables;
 
@@ -34,6 +35,20 @@ struct OperationCells {
                 quote, amount, cost,    rateCost,  fromQuote, toQuote};
     }
 };
+
+/// As what a table has the operation. The cells of income and charges have no place for a zero with a sign, which a sum
+/// may keep.
+OperationKind kindInTable(const Operation& operation)
+{
+    const OperationKind kind = kindOf(operation);
+    if (kind != OperationKind::kIncome && kind != OperationKind::kCharge)
+        return kind;
+    const auto& transfer = static_cast<const TransferAccountOperation&>(operation);
+    const auto isSignedZero = [](float figure) { return figure == 0 && std::signbit(figure); };
+    const bool isOdd =
+        isSignedZero(transfer.getAmount()) || isSignedZero(transfer.getCost()) || isSignedZero(transfer.getRateCost());
+    return isOdd ? OperationKind::kTransfer : kind;
+}
 
 void setTransfer(OperationCells* cells, const TransferAccountOperation& transfer, OperationKind kind)
 {
@@ -115,7 +130,7 @@ void ExportRows::addOperations(CsvWriter& table, const std::vector<const Operati
 
 void ExportRows::addOperation(CsvWriter& table, const Operation& operation)
 {
-    const OperationKind kind = kindOf(operation);
+    const OperationKind kind = kindInTable(operation);
     OperationCells cells;
     cells.date = tableDate(operation.getDate());
     cells.type = nameOf(kind);

@@ -15,8 +15,9 @@ class Wallet;
 /// What currencies, markets, companies and accounts are called in the tables of an export.
 ///
 /// The symbol, the name or the ticker that the file has, unless somebody else is called so already: two accounts "Main"
-/// are "Main" and "Main #2". Currencies and accounts are told apart among all, markets among those of their currency,
-/// companies among those of their market. What is no line of text is made one. Which are called otherwise is told.
+/// are "Main" and "Main #2". Currencies and accounts are told apart among all, companies among those of their market.
+/// Markets are told apart among those of their currency, and from all of other names. What is no line of text is made
+/// one. Which are called otherwise is told.
 class TableNames {
 public:
     /// `wallet` may be null. Both stay as they are, as long as this object is there.
