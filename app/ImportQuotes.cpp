@@ -166,6 +166,9 @@ void ImportQuotes::read()
         // A table of one company is named after it.
         options_.tickerFromName = !areRates_ && head_.wide.empty() && !head_.columns.contains(Column::kTicker) &&
                                   head_.columns.contains(Column::kValue);
+        // Else prices would be taken for tickers, whatever the headings say.
+        if (!head_.headings.empty() && head_.columns.empty())
+            throw std::runtime_error("no heading is known: choose below where the date stands, and the other columns");
         MarketImport import(options_, window().catalogue(), watch);
         areRates_ ? import.addRates(path_) : import.addQuotes(path_);
         plan_ = import.plan();
