@@ -338,7 +338,7 @@ void ImportQuotes::choose(const std::string& question, std::size_t item)
     } else if (question == "importRates") {
         options_.ratesAreUnits = item == 0;
     } else if (question == "importHeading") {
-        const std::string heading = item > 0 ? head_.headings.at(item - 1) : "";
+        const std::string heading = item > 0 && item <= head_.headings.size() ? head_.headings[item - 1] : "";
         tellHeading(columnsTold_, columnsOf(areRates_)[column_].column, heading);
     }
     read();

@@ -292,6 +292,15 @@ TEST_F(ImportWindowTest, AFileThatCannotBeReadIsToldAndChangesNothing)
             }
             EXPECT_EQ(bytes(), before);
         }
+    for (const Page page : {kCompanyPage, kOperationPage}) {
+        const std::string path = file("gone.csv", "Date,Type,Amount,Close\n1/2/2024,Deposit,5,3\n");
+        open(page, path);
+        std::filesystem::remove(path);
+        answer(page == kCompanyPage ? "importKind" : "importDates", page == kCompanyPage ? "exchange" : "with the day");
+        EXPECT_THAT(line("txtImportNote"), HasSubstr("No such file"));
+        EXPECT_FALSE(canImport());
+        press("btnCancel");
+    }
     const std::filesystem::path place(folder());
     const entry_ref ref{place.parent_path(), place.filename()};
     BMessage message(ImportAssistant::kChosen);
