@@ -166,6 +166,9 @@ void ImportQuotes::read()
         // A table of one company is named after it.
         options_.tickerFromName = !areRates_ && head_.wide.empty() && !head_.columns.contains(Column::kTicker) &&
                                   head_.columns.contains(Column::kValue);
+        // Else prices would be taken for tickers, whatever the headings say.
+        if (!head_.headings.empty() && head_.columns.empty())
+            throw std::runtime_error("no heading is known: choose below where the date stands, and the other columns");
         MarketImport import(options_, window().catalogue(), watch);
         areRates_ ? import.addRates(path_) : import.addQuotes(path_);
         plan_ = import.plan();
@@ -335,7 +338,7 @@ void ImportQuotes::choose(const std::string& question, std::size_t item)
     } else if (question == "importRates") {
         options_.ratesAreUnits = item == 0;
     } else if (question == "importHeading") {
-        const std::string heading = item > 0 ? head_.headings.at(item - 1) : "";
+        const std::string heading = item > 0 && item <= head_.headings.size() ? head_.headings[item - 1] : "";
         tellHeading(columnsTold_, columnsOf(areRates_)[column_].column, heading);
     }
     read();

@@ -129,17 +129,6 @@ int itemOf(const std::vector<std::string>& items, const std::string& text)
 
 } // namespace
 
-std::string importedName(const std::string& path)
-{
-    constexpr std::size_t kLongest = 60; // bytes
-    return shortened(path.substr(path.rfind('/') + 1), kLongest);
-}
-
-std::string importedCount(std::size_t n, const char* what)
-{
-    return countText(static_cast<int>(n)) + ' ' + what + (n == 1 ? "" : "s");
-}
-
 ImportStatement::ImportStatement(PLWindow& window, const DataFolder& folder, const std::string& path)
     : ImportTask(window), path_(path), folder_(folder), profiles_(folder.path() + DataFolder::kProfiles)
 {
@@ -190,6 +179,16 @@ void ImportStatement::read()
         heading = withoutBlanks(std::string(heading));
     std::erase(headings_, "");
     makePlan();
+}
+
+/// The file may be gone by now.
+void ImportStatement::readAgain()
+{
+    try {
+        read();
+    } catch (const std::runtime_error& error) {
+        problem_ = capitalised(error.what());
+    }
 }
 
 void ImportStatement::makePlan()
@@ -479,9 +478,10 @@ void ImportStatement::choose(const std::string& question, std::size_t item)
     else if (question == "importMissing")
         missing_ = item;
     else if (question == "importHeading") {
-        tellHeading(columnsTold_, static_cast<StatementColumn>(column_), item > 0 ? headings_.at(item - 1) : "");
+        tellHeading(columnsTold_, static_cast<StatementColumn>(column_),
+                    item > 0 && item <= headings_.size() ? headings_[item - 1] : "");
         isTold_ = true;
-        read();
+        readAgain();
     } else if (question == "importType")
         tellWord(item);
     else if (question == "importCurrency")
@@ -548,7 +548,7 @@ void ImportStatement::tellDates(std::size_t item)
     if (item > 0)
         profile_.setDates(item == 1 ? "dmy" : "mdy");
     isTold_ = true;
-    read();
+    readAgain();
 }
 
 std::string ImportStatement::stepName() const

@@ -32,6 +32,7 @@ private:
     /// All that is known of such tables.
     StatementProfile profile() const;
     void read();
+    void readAgain();
     void makePlan();
     std::string problem() const;
     std::string note() const;

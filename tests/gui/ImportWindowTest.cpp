@@ -258,6 +258,12 @@ TEST_F(ImportWindowTest, AnEmptyCatalogueGetsItsReferenceFromAnImport)
     ASSERT_EQ(window().catalogue().getMarkets().size(), 1U);
     EXPECT_EQ(window().catalogue().getMarkets()[0]->companies()[0]->getAbbreviation().bytes(), "ALP");
     EXPECT_EQ(window().getReferenceCurrency()->getRepresentation().bytes(), "USD");
+    // Of a wide table the date has to be told, or its prices would pass for tickers.
+    open(kCompanyPage, file("wide.csv", "Tag;AAA;BBB\n2024-01-02;40,5;50\n"));
+    EXPECT_FALSE(canImport()) << line("txtImport");
+    answer("importHeading", "Tag");
+    EXPECT_THAT(line("txtImport"), HasSubstr("2 new, 0 changed, 0 equal quotes"));
+    press("btnCancel");
     show(kParameterPage);
     EXPECT_FALSE(window().widget().findChild<QWidget*>("btnImportTable")->isEnabled());
 }
@@ -286,6 +292,15 @@ TEST_F(ImportWindowTest, AFileThatCannotBeReadIsToldAndChangesNothing)
             }
             EXPECT_EQ(bytes(), before);
         }
+    for (const Page page : {kCompanyPage, kOperationPage}) {
+        const std::string path = file("gone.csv", "Date,Type,Amount,Close\n1/2/2024,Deposit,5,3\n");
+        open(page, path);
+        std::filesystem::remove(path);
+        answer(page == kCompanyPage ? "importKind" : "importDates", page == kCompanyPage ? "exchange" : "with the day");
+        EXPECT_THAT(line("txtImportNote"), HasSubstr("No such file"));
+        EXPECT_FALSE(canImport());
+        press("btnCancel");
+    }
     const std::filesystem::path place(folder());
     const entry_ref ref{place.parent_path(), place.filename()};
     BMessage message(ImportAssistant::kChosen);
