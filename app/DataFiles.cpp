@@ -58,12 +58,11 @@ DataFiles::DataFiles(PLWindow& window, const BTabView& tabs, const DataFolder& f
 
 std::optional<FileKind> DataFiles::kindInFront() const
 {
-    // The order of the tabs is that of `PLWindow::makePages`.
     switch (tabs_.Selection()) {
-    case 0:
-    case 1:
+    case PLWindow::kCompanyTab:
+    case PLWindow::kCurrencyTab:
         return FileKind::kMarkets;
-    case 2:
+    case PLWindow::kPortoFolioTab:
         return FileKind::kWallet;
     default:
         return std::nullopt;

@@ -91,15 +91,14 @@ private:
 
 std::vector<ExportOffer> ExportOffers::of(int tab) const
 {
-    // The order of the tabs is that of `PLWindow::makePages`.
     switch (tab) {
-    case 0:
+    case PLWindow::kCompanyTab:
         return ofCompanies();
-    case 1:
+    case PLWindow::kCurrencyTab:
         return ofCurrencies();
-    case 2:
+    case PLWindow::kPortoFolioTab:
         return ofPortfolio();
-    case 3:
+    case PLWindow::kOperationTab:
         return ofOperations();
     default:
         return ofParameters();

@@ -14,11 +14,6 @@
 
 namespace {
 
-// The order of the tabs is that of `PLWindow::makePages`.
-constexpr int32 kCurrencyTab = 1;
-constexpr int32 kFirstOfWallet = 2;
-constexpr int32 kParameterTab = 4;
-
 BFilePanel makePanel(PLWindow& window)
 {
     const BMessenger target(&window);
@@ -44,19 +39,19 @@ void ImportAssistant::tell(const std::string& text, bool isPassing)
 
 bool ImportAssistant::isPossible() const
 {
-    return tabs_.Selection() < kParameterTab;
+    return tabs_.Selection() != PLWindow::kParameterTab;
 }
 
 void ImportAssistant::ask()
 {
     if (!isPossible() || dialog_.IsValid())
         return;
-    kind_ = tabs_.Selection() < kFirstOfWallet ? FileKind::kMarkets : FileKind::kWallet;
-    areRates_ = tabs_.Selection() == kCurrencyTab;
+    kind_ = tabs_.Selection() <= PLWindow::kCurrencyTab ? FileKind::kMarkets : FileKind::kWallet;
+    areRates_ = tabs_.Selection() == PLWindow::kCurrencyTab;
     panel_.Show();
 }
 
-std::shared_ptr<ImportTask> ImportAssistant::taskFor(const std::string& path) const
+std::shared_ptr<PendingImport> ImportAssistant::pendingFor(const std::string& path) const
 {
     if (kind_ == FileKind::kWallet)
         return std::make_shared<ImportStatement>(window_, folder_, path);
@@ -71,26 +66,26 @@ void ImportAssistant::open(const BMessage* message)
         return;
     window_.dropNotice("import"); // it tells of another table
     try {
-        task_ = taskFor(path.Path());
+        pending_ = pendingFor(path.Path());
     } catch (const std::runtime_error& error) {
         return tell(std::string("Not imported: ") + error.what(), false);
     }
     constexpr float kBelow = 24; // the tabs stay in sight
     BView* page = tabs_.TabAt(tabs_.Selection())->View();
     const BPoint middle = page->ConvertToScreen({page->Bounds().Width() / 2, kBelow});
-    auto* dialog = new ImportWindow(middle, task_, task_->sheet(), BMessenger(&window_)); // owns itself
+    auto* dialog = new ImportWindow(middle, pending_, pending_->sheet(), BMessenger(&window_)); // owns itself
     dialog_ = BMessenger(dialog);
     dialog->Show();
 }
 
 void ImportAssistant::carryOut()
 {
-    const std::shared_ptr<ImportTask> task = std::exchange(task_, nullptr);
-    if (task == nullptr)
+    const std::shared_ptr<PendingImport> pending = std::exchange(pending_, nullptr);
+    if (pending == nullptr)
         return;
-    if (task->isStale())
+    if (pending->isStale())
         return tell("Not imported: portfolio or market data have changed meanwhile.", true);
-    window_.nameStep(task->stepName());
-    if (const std::string done = task->carryOut(); !done.empty())
-        tell(done, true);
+    window_.nameStep(pending->stepName());
+    const std::string done = pending->carryOut();
+    tell(done.empty() ? "Not imported: the table cannot be imported as it was shown last." : done, true);
 }

@@ -12,7 +12,7 @@ class BMessage;
 class BTabView;
 class CompanyView;
 class CurrencyView;
-class ImportTask;
+class PendingImport;
 class PLWindow;
 
 /// Brings tables of other programs in: asks for the file, has a window show what it would bring, and carries that out.
@@ -36,10 +36,12 @@ public:
     void open(const BMessage* message);
     /// The answer of the window. What has been shown is done, or nothing when the model is not what it was.
     void carryOut();
+    /// The window was left: its plan goes, which may be large.
+    void drop() { pending_.reset(); }
 
 private:
     void tell(const std::string& text, bool isPassing);
-    std::shared_ptr<ImportTask> taskFor(const std::string& path) const;
+    std::shared_ptr<PendingImport> pendingFor(const std::string& path) const;
 
     PLWindow& window_;
     const BTabView& tabs_;
@@ -47,8 +49,8 @@ private:
     CurrencyView& currencies_;
     DataFolder folder_;
     BFilePanel panel_;
-    FileKind kind_ = FileKind::kMarkets; // of what the panel asks for
-    bool areRates_ = false;              // and on which page of the market data
-    BMessenger dialog_;                  // valid while the window is open
-    std::shared_ptr<ImportTask> task_;   // that it shows; shared with it
+    FileKind kind_ = FileKind::kMarkets;     // of what the panel asks for
+    bool areRates_ = false;                  // and on which page of the market data
+    BMessenger dialog_;                      // valid while the window is open
+    std::shared_ptr<PendingImport> pending_; // that it shows; shared with it
 };

@@ -11,6 +11,8 @@
 #include <cctype>
 #include <span>
 #include <stdexcept>
+#include <unordered_map>
+#include <unordered_set>
 
 namespace {
 
@@ -90,7 +92,7 @@ std::string countsText(const char* what, const MarketPlan::Counts& counts)
 
 ImportQuotes::ImportQuotes(PLWindow& window, CompanyView& companies, CurrencyView& currencies, const std::string& path,
                            bool areRates)
-    : ImportTask(window), companies_(companies), currencies_(currencies), path_(path)
+    : PendingImport(window), companies_(companies), currencies_(currencies), path_(path)
 {
     chooseDefaults();
     areRates_ = looksLikeRates(areRates);
@@ -278,13 +280,13 @@ void ImportQuotes::askForPlaces(ImportSheet& sheet) const
     };
     if (!areRates_) {
         ask("txtImportMarket", "New tickers are at", true, options_.market,
-            "The market of tickers that are new and for which the table names none");
+            "The market of tickers that are new and for which the table names none; Enter takes what is typed");
         ask("txtImportCurrency", "in", false, options_.currency,
-            "The currency of markets that are new and for which the table names none");
+            "The currency of markets that are new and for which the table names none; Enter takes what is typed");
     }
     if (window().getReferenceCurrency() == nullptr)
         ask("txtImportReference", "Reference currency", true, options_.reference,
-            "The currency that all rates and totals are given in from now on");
+            "The currency that all rates and totals are given in from now on; Enter takes what is typed");
 }
 
 void ImportQuotes::fillRows(ImportSheet& sheet) const
@@ -300,8 +302,11 @@ void ImportQuotes::fillRows(ImportSheet& sheet) const
             refusedRow("", 1e300, "and " + importedCount(refusedCount_ - refused_.size(), "line") + " more"));
     if (!plan_)
         return;
-    for (const auto& currency : plan_->newCurrencies)
+    std::unordered_set<const Currency*> made;
+    for (const auto& currency : plan_->newCurrencies) {
+        made.insert(currency.get());
         sheet.rows.push_back(rowOf("New", "Currency", textOf(currency->getRepresentation()), "", nullptr));
+    }
     for (const auto& [market, currency] : plan_->newMarkets)
         sheet.rows.push_back(
             rowOf("New", "Market", textOf(market->getName()), textOf(currency->getRepresentation()), nullptr));
@@ -314,11 +319,8 @@ void ImportQuotes::fillRows(ImportSheet& sheet) const
             rowOf(becomesOf(tally.counts, tally.isNew), "Company", textOf(tally.owner->getAbbreviation()),
                   textOf(market->getName()) + ", " + textOf(tally.currency->getRepresentation()), &tally.counts));
     }
-    const auto isNew = [this](const Currency* currency) {
-        return std::ranges::any_of(plan_->newCurrencies, [=](const auto& made) { return made.get() == currency; });
-    };
     for (const auto& tally : plan_->rateTallies)
-        sheet.rows.push_back(rowOf(becomesOf(tally.counts, isNew(tally.owner)), "Rates",
+        sheet.rows.push_back(rowOf(becomesOf(tally.counts, made.contains(tally.owner)), "Rates",
                                    textOf(tally.owner->getRepresentation()), "", &tally.counts));
 }
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "app/ImportTask.h"
+#include "app/PendingImport.h"
 #include "exchange/MarketImport.h"
 
 #include <deque>
@@ -12,7 +12,7 @@ class CompanyView;
 class CurrencyView;
 
 /// The import of closing prices or exchange rates.
-class ImportQuotes final : public ImportTask {
+class ImportQuotes final : public PendingImport {
 public:
     /// `areRates` is what the table is taken for where its headings leave that open. Throws std::runtime_error, with
     /// one line for the user, for a file that cannot be read or has no lines. The pages outlive this.

@@ -130,7 +130,7 @@ int itemOf(const std::vector<std::string>& items, const std::string& text)
 } // namespace
 
 ImportStatement::ImportStatement(PLWindow& window, const DataFolder& folder, const std::string& path)
-    : ImportTask(window), path_(path), folder_(folder), profiles_(folder.path() + DataFolder::kProfiles)
+    : PendingImport(window), path_(path), folder_(folder), profiles_(folder.path() + DataFolder::kProfiles)
 {
     if (auto kept = profiles_.find(path)) {
         knownAs_ = kept->name;
@@ -497,12 +497,10 @@ void ImportStatement::tellWord(std::size_t item)
     const auto words = unknownWords();
     if (item == 0 || words.empty())
         return;
-    const std::size_t told = std::min(word_, words.size() - 1);
-    profile_.addType(words[told] + '=' + nameOf(static_cast<StatementType>(item - 1)));
+    // The menu stays with its word: each key that goes through the types is an answer.
+    word_ = std::min(word_, words.size() - 1);
+    profile_.addType(words[word_] + '=' + nameOf(static_cast<StatementType>(item - 1)));
     isTold_ = true;
-    // On to the next one that means nothing yet.
-    const auto open = std::ranges::find_if(words, [this](const auto& word) { return !profile_.typeOf(word); });
-    word_ = open != words.end() ? static_cast<std::size_t>(open - words.begin()) : told;
     makePlan();
 }
 
@@ -511,14 +509,8 @@ void ImportStatement::tellMissing(std::size_t item)
     const auto missing = missingAccounts();
     if (missing.empty())
         return;
-    tellCurrency(missing[std::min(missing_, missing.size() - 1)], item);
-    // On to the next one that is not made.
-    const auto isMade = [this](const std::string& name) {
-        return std::ranges::find(newAccounts_, name, &OperationPlan::NewAccount::name) != newAccounts_.end();
-    };
-    const auto open = std::ranges::find_if_not(missing, isMade);
-    if (open != missing.end() && item > 0)
-        missing_ = static_cast<std::size_t>(open - missing.begin());
+    missing_ = std::min(missing_, missing.size() - 1);
+    tellCurrency(missing[missing_], item);
 }
 
 /// An item of 0 makes no account of that name.

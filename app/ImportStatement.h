@@ -1,6 +1,6 @@
 #pragma once
 
-#include "app/ImportTask.h"
+#include "app/PendingImport.h"
 #include "exchange/OperationPlan.h"
 #include "exchange/ProfileFolder.h"
 #include "exchange/StatementTable.h"
@@ -16,7 +16,7 @@
 ///
 /// What a person tells of columns, words, account and dates is kept in a profile when the import is done, and taken for
 /// the next table of the same headings.
-class ImportStatement final : public ImportTask {
+class ImportStatement final : public PendingImport {
 public:
     /// Throws std::runtime_error, with one line for the user, for a file that cannot be read or has no lines.
     ImportStatement(PLWindow& window, const DataFolder& folder, const std::string& path);

@@ -129,6 +129,7 @@ constexpr Command kOwnCommands[] = {
     {'TImp', [](PLWindow& w, BMessage*) { w.AskForImport(); }},
     {ImportAssistant::kChosen, [](PLWindow& w, BMessage* m) { w.OpenImport(m); }},
     {ImportWindow::kImported, [](PLWindow& w, BMessage*) { w.CarryOutImport(); }, "Import"},
+    {ImportWindow::kLeft, [](PLWindow& w, BMessage*) { w.DropImport(); }},
     {'TExp', [](PLWindow& w, BMessage*) { w.OpenExport(); }},
     {ExportAssistant::kChosen, [](PLWindow& w, BMessage* m) { w.AskExport(m); }},
     {ExportAssistant::kPlaced, [](PLWindow& w, BMessage* m) { w.WriteExport(m); }},
@@ -217,7 +218,7 @@ void PLWindow::makePages()
         tab->SetToolTip(("Alt+" + std::to_string(tabView_->CountTabs() + 1)).c_str());
         tabView_->AddTab(page, tab);
     };
-    // `DataFiles` and `showHistory` go by this order.
+    // In the order of `Tab`.
     add(companyView_ = new CompanyView(kPageFrame, "CompanyView", this), "Company");
     add(currencyView_ = new CurrencyView(kPageFrame, "CurrencyView", this), "Currency");
     add(walletView_ = new WalletView(kPageFrame, "WalletView", this), "PortoFolio");

@@ -39,6 +39,9 @@ class WalletView;
 /// classes that they are handed on to, and in the files named beside the others.
 class PLWindow : public BWindow {
 public:
+    /// The tabs, from the left.
+    enum Tab : int32 { kCompanyTab, kCurrencyTab, kPortoFolioTab, kOperationTab, kParameterTab };
+
     /// `frame` in screen coordinates. `folder` is where the file panels open and where replaced files are kept.
     explicit PLWindow(BRect frame, const DataFolder& folder = DataFolder());
     ~PLWindow() override;
@@ -123,6 +126,7 @@ public:
     void AskForImport() { import_->ask(); }
     void OpenImport(const BMessage* message) { import_->open(message); }
     void CarryOutImport() { import_->carryOut(); }
+    void DropImport() { import_->drop(); }
     void OpenExport();
     void AskExport(const BMessage* message) { export_->ask(message); }
     void WriteExport(const BMessage* message) { export_->write(message); }

@@ -201,7 +201,7 @@ void Journal::addTrade(const ShareOperation& trade, Transaction* transaction)
                           trade.getQuote() > 0;
     if (company != nullptr) {
         const std::string& shares = form_.inAmount(names_.of(*company));
-        const int quantity = trade.isBuy() ? trade.getQuantity() : -trade.getQuantity();
+        const long long quantity = trade.isBuy() ? trade.getQuantity() : -static_cast<long long>(trade.getQuantity());
         transaction->text += ' ' + std::to_string(trade.getQuantity()) + ' ' + nameText(company->getName());
         std::string held = std::to_string(quantity) + ' ' + shares;
         if (isPriced)
@@ -253,7 +253,7 @@ void Journal::addRounding(const std::string& account, double difference, const S
 
 Journal::Units Journal::unitsOf(double amount, const Operation& operation) const
 {
-    // Beyond this a sum of them could leave the range of the units.
+    // Beyond this a double has no cents.
     constexpr double kMost = 1e13;
     if (!(std::abs(amount) <= kMost))
         throw std::runtime_error(described(operation) + " moves an amount that is too large for a journal");
@@ -264,7 +264,8 @@ void Journal::move(const Account& account, Units units, Transaction* transaction
 {
     if (account.currency() == nullptr)
         return; // such an account is not replayed
-    cash_[&account] += units;
+    if (Units& cash = cash_[&account]; __builtin_add_overflow(cash, units, &cash))
+        throw std::runtime_error("the account " + names_.of(account) + " has too much cash for a journal");
     post(transaction, names_.of(account), amount(units, names_.ofCurrency(account.getCurrencyRepresentation())));
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "exchange/ValueCounts.h"
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "market/Market.h"
@@ -29,20 +30,7 @@ struct SeriesValues {
 /// catalogue's with `carryOut`.
 class MarketPlan {
 public:
-    /// Values, one a day and series.
-    struct Counts {
-        std::size_t added = 0;
-        std::size_t changed = 0;
-        std::size_t equal = 0; // to what is there
-
-        Counts& operator+=(const Counts& other)
-        {
-            added += other.added;
-            changed += other.changed;
-            equal += other.equal;
-            return *this;
-        }
-    };
+    using Counts = ValueCounts;
     struct NewMarket {
         std::unique_ptr<Market> market;
         Currency* currency;

@@ -1,6 +1,7 @@
 #include "exchange/ProfileFolder.h"
 
 #include "exchange/CsvReader.h"
+#include "exchange/StatementTable.h"
 #include "exchange/TextForms.h"
 #include "storage/AtomicFile.h"
 #include "storage/InputFile.h"
@@ -15,7 +16,6 @@
 namespace {
 
 constexpr const char* kMark = "# for headings ";
-constexpr std::size_t kLongestPreamble = 200; // lines in which headings are looked for
 
 /// A number made of headings, by the formula of Fowler, Noll and Vo (FNV-1a) over the bytes of their keys.
 std::string numberOf(const std::vector<std::string>& headings)
@@ -68,9 +68,9 @@ std::optional<ProfileFolder::Kept> ProfileFolder::find(const std::string& table)
 {
     const auto files = filesIn(path_);
     std::set<std::string> numbers; // of all lines that may be headings
-    for (const char separator : {'\t', ';', '|', ','}) {
+    for (const char separator : StatementTable::kSeparators) {
         CsvReader reader(table, separator);
-        for (std::size_t i = 0; i < kLongestPreamble && !files.empty() && reader.next(); ++i)
+        for (std::size_t i = 0; i < StatementTable::kLongestPreamble && !files.empty() && reader.next(); ++i)
             numbers.insert(numberOf(reader.fields()));
     }
     for (const auto& file : files)

@@ -1,18 +1,11 @@
 #pragma once
 
+#include "exchange/ValueCounts.h"
 #include "market/Quote.h"
 
 #include <algorithm>
 #include <cmath>
-#include <cstddef>
 #include <vector>
-
-/// How the values of tables compare with those of a file, one a day.
-struct ValueCounts {
-    std::size_t added = 0;
-    std::size_t changed = 0;
-    std::size_t equal = 0;
-};
 
 /// Gives `series` the values of these days, of two of a day the later one, and leaves those of all others.
 template <class Series>

@@ -10,7 +10,7 @@
 
 namespace {
 
-constexpr std::size_t kLongestPreamble = 200; // lines in which the headings have to be found
+constexpr std::size_t kMostColumns = 1000; // no statement has so many
 constexpr std::size_t kMostRows = 1'000'000;
 
 /// A field as UTF-8, taken by itself.
@@ -105,9 +105,11 @@ char StatementTable::findSeparator(const std::string& path, const StatementProfi
 {
     std::pair<std::size_t, std::size_t> most; // columns that were found, and fields with a text
     places_.fill(kNowhere);
-    for (const char separator : {'\t', ';', '|', ','}) {
+    for (const char separator : kSeparators) {
         CsvReader reader(path, separator);
         for (std::size_t n = 0; n < kLongestPreamble && reader.next(); ++n) {
+            if (reader.fields().size() > kMostColumns)
+                continue;
             const Places places = placesIn(reader.fields(), profile);
             const std::size_t found =
                 kStatementColumns - static_cast<std::size_t>(std::ranges::count(places, kNowhere));

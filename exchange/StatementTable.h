@@ -28,6 +28,10 @@ struct UnfitStatement : std::runtime_error {
 /// be read.
 class StatementTable {
 public:
+    // Where headings are looked for:
+    static constexpr std::size_t kLongestPreamble = 200; // lines
+    static constexpr char kSeparators[] = {'\t', ';', '|', ','};
+
     StatementTable(const std::string& path, const StatementProfile& profile);
 
     /// A line behind the headings, in UTF-8.

@@ -52,34 +52,6 @@ BStringView* addLine(BView* parent, BRect frame, const char* name, const std::st
     return line;
 }
 
-BView* addMenu(BView* parent, BRect frame, const ImportSheet::Question& question)
-{
-    auto* field = new BMenuField(frame, question.name, question.label.c_str(), new BPopUpMenu(question.name));
-    field->SetDivider(kDivider);
-    field->SetAlignment(B_ALIGN_RIGHT);
-    for (std::size_t i = 0; i < question.items.size(); ++i) {
-        BMessage* message = new BMessage(kChosen);
-        message->AddInt32("item", static_cast<int32>(i));
-        message->AddString("name", question.name);
-        field->Menu()->AddItem(new BMenuItem(question.items[i].c_str(), message));
-    }
-    if (BMenuItem* marked = field->Menu()->ItemAt(question.marked))
-        marked->SetMarked(true);
-    parent->AddChild(field);
-    return field;
-}
-
-BView* addField(BView* parent, BRect frame, const ImportSheet::Question& question)
-{
-    auto* message = new BMessage(kTyped);
-    message->AddString("name", question.name);
-    auto* field = new BTextControl(frame, question.name, question.label.c_str(), question.text.c_str(), message);
-    field->SetDivider(kDivider);
-    field->SetAlignment(B_ALIGN_RIGHT, B_ALIGN_LEFT);
-    parent->AddChild(field);
-    return field;
-}
-
 const char* nameIn(const BMessage& message)
 {
     const char* name = "";
@@ -117,6 +89,7 @@ void ImportWindow::show(ImportSheet sheet)
     const BView* focus = CurrentFocus();
     const std::string focused = focus != nullptr ? focus->Name() : "";
     delete panel_;
+    ++sheet_;
     panel_ = new PageView(Bounds(), "ImportView");
     AddChild(panel_);
     BRect area = Bounds().InsetByCopy(kMargin, kMargin); // what is left, from above
@@ -129,6 +102,40 @@ void ImportWindow::show(ImportSheet sheet)
     makeButtons(buttons, sheet);
     if (BView* view = focused.empty() ? nullptr : panel_->FindView(focused.c_str()))
         view->MakeFocus();
+}
+
+BMessage ImportWindow::answer(uint32 code, const char* control) const
+{
+    BMessage message(code);
+    message.AddInt32("sheet", sheet_);
+    message.AddString("name", control);
+    return message;
+}
+
+BView* ImportWindow::makeMenu(BRect frame, const ImportSheet::Question& question)
+{
+    auto* field = new BMenuField(frame, question.name, question.label.c_str(), new BPopUpMenu(question.name));
+    field->SetDivider(kDivider);
+    field->SetAlignment(B_ALIGN_RIGHT);
+    for (std::size_t i = 0; i < question.items.size(); ++i) {
+        auto* message = new BMessage(answer(kChosen, question.name));
+        message->AddInt32("item", static_cast<int32>(i));
+        field->Menu()->AddItem(new BMenuItem(question.items[i].c_str(), message));
+    }
+    if (BMenuItem* marked = field->Menu()->ItemAt(question.marked))
+        marked->SetMarked(true);
+    panel_->AddChild(field);
+    return field;
+}
+
+BView* ImportWindow::makeField(BRect frame, const ImportSheet::Question& question)
+{
+    auto* field = new BTextControl(frame, question.name, question.label.c_str(), question.text.c_str(),
+                                   new BMessage(answer(kTyped, question.name)));
+    field->SetDivider(kDivider);
+    field->SetAlignment(B_ALIGN_RIGHT, B_ALIGN_LEFT);
+    panel_->AddChild(field);
+    return field;
 }
 
 float ImportWindow::makeLines(BRect area, const ImportSheet& sheet)
@@ -151,7 +158,7 @@ float ImportWindow::makeQuestions(BRect area, const ImportSheet& sheet)
         left = question.isFirst ? area.left : area.left + width + kMargin;
         top += question.isFirst ? kRow : 0;
         const BRect frame(left, top, left + width, top + kFieldHeight);
-        BView* control = question.items.empty() ? addField(panel_, frame, question) : addMenu(panel_, frame, question);
+        BView* control = question.items.empty() ? makeField(frame, question) : makeMenu(frame, question);
         control->SetToolTip(question.toolTip);
     }
     return top + kRow + kGap;
@@ -182,21 +189,26 @@ void ImportWindow::makeLists(BRect area, ImportSheet& sheet)
 void ImportWindow::makeButtons(BRect area, const ImportSheet& sheet)
 {
     const float left = area.right - 2 * kButtonWidth - kGap;
-    if (sheet.asksToSkip)
-        PageView::addCheckBox(panel_, {area.left, area.top, left - kMargin, area.bottom}, "cbxImportOthers",
-                              "Import the other lines when some are refused", kSkipTicked)
-            ->SetValue(sheet.skips ? B_CONTROL_ON : B_CONTROL_OFF);
+    if (sheet.asksToSkip) {
+        auto* box = PageView::addCheckBox(panel_, {area.left, area.top, left - kMargin, area.bottom}, "cbxImportOthers",
+                                          "Import the other lines when some are refused", kSkipTicked);
+        box->SetMessage(new BMessage(answer(kSkipTicked)));
+        box->SetValue(sheet.skips ? B_CONTROL_ON : B_CONTROL_OFF);
+    }
     area.left = left;
     PageView::addButtons(panel_, area,
                          {{"btnImport", "Import", kImportPressed}, {"btnCancel", "Cancel", B_QUIT_REQUESTED}});
     auto* import = static_cast<BButton*>(panel_->FindView("btnImport"));
+    import->SetMessage(new BMessage(answer(kImportPressed)));
     import->SetEnabled(sheet.problem.empty());
     import->SetToolTip(sheet.problem.c_str());
 }
 
 void ImportWindow::MessageReceived(BMessage* message)
 {
-    int32 item = 0;
+    int32 sheet = 0, item = 0;
+    if (message->FindInt32("sheet", &sheet) == B_OK && sheet != sheet_)
+        return;
     switch (message->what) {
     case kChosen:
         if (message->FindInt32("item", &item) == B_OK)
@@ -216,10 +228,19 @@ void ImportWindow::MessageReceived(BMessage* message)
     case kImportPressed: {
         const BMessage imported(kImported);
         target_.SendMessage(&imported);
+        isImported_ = true;
         askToClose();
         break;
     }
     default:
         BWindow::MessageReceived(message);
     }
+}
+
+bool ImportWindow::QuitRequested()
+{
+    const BMessage left(kLeft);
+    if (!isImported_)
+        target_.SendMessage(&left);
+    return true;
 }

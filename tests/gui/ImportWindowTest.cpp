@@ -135,29 +135,34 @@ TEST_F(ImportWindowTest, AStatementIsAssignedShownAndBookedInOneStepAndRemembere
     const std::string head = "Bank\nTag;Typ;Depot;Symbol;Stück;Kurs;Summe\n";
     const std::string before = bytes();
     open(kOperationPage, file("may.csv", head + "2.5.2024;Einzahlung;;;;;1.000,00\n3.5.2024;Kauf;;AL;10;20,50;\n"
-                                                "4.5.2024;Spende;;;;;7,50\n5.5.2024;Einzahlung;Notgroschen;;;;5,00\n"));
+                                                "4.5.2024;Spende;;;;;7,50\n5.5.2024;Einzahlung;Notgroschen;;;;5,00\n"
+                                                "6.5.2024;Gabe;;;;;1,00\n"));
     ASSERT_NE(dialog(), nullptr);
     EXPECT_THAT(line("txtImportNote"),
                 StartsWith("No line has the headings of a statement: there is no column for date"));
     EXPECT_FALSE(canImport());
     EXPECT_THAT(table("lstImport"), ElementsAre());
     answer({{"importColumn", "Date"}, {"importHeading", "Tag"}, {"importAccount", "Cash"}});
-    EXPECT_THAT(line("txtImport"), HasSubstr("2 new operations, 0 already there, 2 refused"));
+    EXPECT_THAT(line("txtImport"), HasSubstr("2 new operations, 0 already there, 3 refused"));
     EXPECT_THAT(table("lstImport"),
                 ElementsAre("Refused\t5\t4.5.2024\tSpende\t\t\t\t7,50\t\tthe type \"Spende\" is not known",
                             "Refused\t6\t5.5.2024\tEinzahlung\tNotgroschen\t\t\t5,00\t\tthere is no account "
                             "\"Notgroschen\"",
+                            "Refused\t7\t6.5.2024\tGabe\t\t\t\t1,00\t\tthe type \"Gabe\" is not known",
                             "New\t3\t02/05/2024\tDeposit\tCash\t\t\t1,000.00\t\t",
                             "New\t4\t03/05/2024\tBuy\tCash\tAL\t10\t20.50\t\t",
                             "Passed over\t1\t\t\t\t\t\t\t\tbefore the headings: Bank"));
     EXPECT_THAT(line("txtImportNote"), HasSubstr("choose what they leave open"));
-    answer({{"importType", "Charge"}, {"importCurrency", "EUR"}});
-    EXPECT_THAT(line("txtImport"), HasSubstr("4 new operations, 0 already there, 0 refused"));
-    EXPECT_THAT(table("lstImportCash"), ElementsAre("Cash\tEUR\t0.00\t787.15", "Notgroschen\tEUR\t0.00\t5.00"));
+    // On the way to the last type each key is an answer, for the word that is shown.
+    answer({{"importType", "Charge"}, {"importCurrency", "EUR"}, {"importWord", "Gabe"}, {"importType", "Income"}});
+    EXPECT_THAT(line("txtImport"), HasSubstr("5 new operations, 0 already there, 0 refused"));
+    EXPECT_THAT(table("lstImportCash"), ElementsAre("Cash\tEUR\t0.00\t788.15", "Notgroschen\tEUR\t0.00\t5.00"));
     importAndReturn(before, "Import operations from may.csv");
     show(kOperationPage);
     EXPECT_THAT(rows("lstOperations"), Contains(HasSubstr("Charge")));
     EXPECT_EQ(wallet().accounts().size(), 2U);
+
+    EXPECT_EQ(window().unsavedChanges(FileKind::kWallet), 2U); // with the account
 
     // Of the next table all is known, and one of its lines is there already.
     open(kPortoFolioPage, file("june.csv", head + "4.5.2024;Spende;;;;;7,50\n5.6.2024;Spende;;;;;1,00\n"));
@@ -243,6 +248,11 @@ TEST_F(ImportWindowTest, PricesAndRatesComeInWithAllThatIsNew)
     EXPECT_THAT(table("lstImport"),
                 ElementsAre("New\t\tMarket\tZürich\tCHF\t\t\t\t", "Changed\t\tCompany\tAL\tParis, EUR\t0\t1\t1\t",
                             "New\t\tCompany\tNEU\tZürich, CHF\t1\t0\t0\t"));
+    // A click from a field that was typed in shows first what that changes.
+    part<QLineEdit>("txtImportMarket")->setFocus();
+    QTest::keyClicks(part<QLineEdit>("txtImportMarket"), "X");
+    press("btnImport");
+    ASSERT_NE(dialog(), nullptr);
     importAndReturn(withRates, "Import quotes from prices.csv", [this] {
         EXPECT_THAT(rows("lstMarkets"), Contains(StartsWith("Zürich")));
         EXPECT_THAT(rows("lstQuotes"), Contains("01/03/2024\t11.00"));
@@ -275,7 +285,7 @@ TEST_F(ImportWindowTest, AFileThatCannotBeReadIsToldAndChangesNothing)
         std::string bytes;
         const char* told;
     } cases[] = {
-        {"", "no"},
+        {"", "no "},
         {std::string("D\0a\0t\0e\0\n\0", 10), "zero byte"},
         {"Date,Type,Amount\n2024-01-02,\"Deposit\n", "quote"},
     };

@@ -1,4 +1,4 @@
-#include "app/ImportTask.h"
+#include "app/PendingImport.h"
 
 #include "foundation/NumberText.h"
 #include "platform/ShortText.h"

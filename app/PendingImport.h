@@ -12,9 +12,9 @@
 /// A table that is about to be imported: what the window of an import shows, and then carrying it out.
 ///
 /// It refers to the model as that was when it was made. As soon as that is another one, nothing is looked at any more.
-class ImportTask : public ImportPreview {
+class PendingImport : public ImportPreview {
 public:
-    explicit ImportTask(PLWindow& window) : window_(window), serial_(window.changeSerial()) {}
+    explicit PendingImport(PLWindow& window) : window_(window), serial_(window.changeSerial()) {}
 
     /// Whether portfolio or market data have changed since it was made.
     bool isStale() const { return window_.changeSerial() != serial_; }
