@@ -141,5 +141,5 @@ std::string ExportAssistant::written(const ExportOffer& offer, const std::string
 void ExportAssistant::tellFailure(const std::string& reason)
 {
     // It stays until it is seen.
-    window_.showNotice({kNotice, "Not written: " + reason, {}});
+    window_.showNotice({kNotice, "Not written: " + reason, {}, false, false, true});
 }

@@ -37,8 +37,8 @@ std::string inFileName(const String& name)
 {
     std::string text = shown(name);
     std::ranges::replace(text, '/', '-');
-    if (text.starts_with('.'))
-        text.front() = '-'; // else nobody would see the file
+    if (text.starts_with('.') || text.starts_with('-'))
+        text.front() = '_'; // else nobody would see the file, or commands would take it for an option
     return text;
 }
 

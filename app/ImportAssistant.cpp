@@ -14,6 +14,8 @@
 
 namespace {
 
+constexpr const char* kNotice = "import";
+
 BFilePanel makePanel(PLWindow& window)
 {
     const BMessenger target(&window);
@@ -34,7 +36,7 @@ ImportAssistant::~ImportAssistant() = default;
 
 void ImportAssistant::tell(const std::string& text, bool isPassing)
 {
-    window_.showNotice({"import", text, {}, isPassing});
+    window_.showNotice({kNotice, text, {}, isPassing, false, true});
 }
 
 bool ImportAssistant::isPossible() const
@@ -64,7 +66,7 @@ void ImportAssistant::open(const BMessage* message)
     BPath path;
     if (dialog_.IsValid() || message->FindRef("refs", &ref) != B_OK || BEntry(&ref).GetPath(&path) != B_OK)
         return;
-    window_.dropNotice("import"); // it tells of another table
+    window_.dropNotice(kNotice); // it tells of another table
     try {
         pending_ = pendingFor(path.Path());
     } catch (const std::runtime_error& error) {

@@ -1,6 +1,7 @@
 #include "app/ImportQuotes.h"
 
 #include "app/Holds.h"
+#include "foundation/DateText.h"
 #include "foundation/NumberText.h"
 #include "views/CompanyView.h"
 #include "views/CurrencyView.h"
@@ -37,11 +38,11 @@ std::span<const NamedColumn> columnsOf(bool areRates)
 const std::vector<ListColumn> kListColumns = {{"Becomes", 72},
                                               {"Line", 56, B_ALIGN_RIGHT},
                                               {"Of", 70},
-                                              {"Name", 96},
+                                              {"Name", 80},
                                               {"Market", 90},
-                                              {"New", 62, B_ALIGN_RIGHT},
-                                              {"Changed", 68, B_ALIGN_RIGHT},
-                                              {"Equal", 62, B_ALIGN_RIGHT},
+                                              {"New", 50, B_ALIGN_RIGHT},
+                                              {"Changed", 62, B_ALIGN_RIGHT},
+                                              {"Equal", 50, B_ALIGN_RIGHT},
                                               {"Note", kRemainingWidth}};
 
 Cell countCell(std::size_t n, rgb_color color)
@@ -50,20 +51,33 @@ Cell countCell(std::size_t n, rgb_color color)
 }
 
 std::vector<Cell> rowOf(const char* becomes, const char* what, const std::string& name, const std::string& place,
-                        const MarketPlan::Counts* counts)
+                        const MarketPlan::Counts* counts, const std::string& note = {})
 {
     const bool isSame = counts != nullptr && counts->added + counts->changed == 0;
     const rgb_color color = isSame ? look::kFaint : look::kText;
     std::vector<Cell> row = {{becomes, color}, {}, {what, color}, {name, color}, {place, color}};
     for (const auto count : {&MarketPlan::Counts::added, &MarketPlan::Counts::changed, &MarketPlan::Counts::equal})
         row.push_back(counts != nullptr ? countCell(counts->*count, color) : Cell{});
-    row.emplace_back();
+    row.push_back({note, color});
     return row;
 }
 
 const char* becomesOf(const MarketPlan::Counts& counts, bool isNew)
 {
     return isNew ? "New" : counts.added + counts.changed > 0 ? "Changed" : "Equal";
+}
+
+/// Of each series the last value that it gets, by which a person sees how days and values were read.
+template <class Owner>
+std::unordered_map<const Owner*, std::string> lastValues(const std::deque<SeriesValues<Owner>>& all)
+{
+    std::unordered_map<const Owner*, std::string> texts;
+    for (const auto& series : all)
+        if (!series.values.empty()) {
+            const DatedValue& last = series.values.back();
+            texts.emplace(series.owner, "last: " + exactText(last.value) + " on " + dateText(last.day.date()));
+        }
+    return texts;
 }
 
 std::vector<Cell> refusedRow(const std::string& line, double number, const std::string& reason)
@@ -97,10 +111,10 @@ ImportQuotes::ImportQuotes(PLWindow& window, CompanyView& companies, CurrencyVie
     chooseDefaults();
     areRates_ = looksLikeRates(areRates);
     head_ = MarketImport::headOf(path_, areRates_, {});
-    setProgress([&window](const std::string& text) { window.SetMessage(text.c_str()); });
+    setProgress([&window](const std::string& text) { window.showProgress(text); });
     read();
     setProgress(nullptr);
-    window.SetMessage("");
+    window.showProgress("");
     if (!plan_ && head_.headings.empty() && refusedCount_ == 0)
         throw std::runtime_error(path + ": is no table of prices or rates");
 }
@@ -217,7 +231,8 @@ ImportSheet ImportQuotes::sheet()
     if (plan_)
         sheet.headline +=
             ":  " + (areRates_ ? countsText("rates", plan_->rateCounts) : countsText("quotes", plan_->quoteCounts));
-    sheet.headline += std::string(plan_ ? ", " : ":  ") + importedCount(refusedCount_, "line") + " refused";
+    if (plan_ || refusedCount_ > 0)
+        sheet.headline += std::string(plan_ ? ", " : ":  ") + importedCount(refusedCount_, "line") + " refused";
     if (refusedCount_ > 0)
         sheet.note = "Lines that are refused are left out.";
     if (options_.tickerFromName)
@@ -313,15 +328,19 @@ void ImportQuotes::fillRows(ImportSheet& sheet) const
     std::unordered_map<const Company*, const Market*> marketOf; // of those that have none yet
     for (const auto& [company, market] : plan_->newCompanies)
         marketOf.emplace(company.get(), market);
+    auto lastQuotes = lastValues(plan_->quotes);
     for (const auto& tally : plan_->quoteTallies) {
         const Market* market = tally.isNew ? marketOf.at(tally.owner) : tally.owner->market();
-        sheet.rows.push_back(
-            rowOf(becomesOf(tally.counts, tally.isNew), "Company", textOf(tally.owner->getAbbreviation()),
-                  textOf(market->getName()) + ", " + textOf(tally.currency->getRepresentation()), &tally.counts));
+        sheet.rows.push_back(rowOf(becomesOf(tally.counts, tally.isNew), "Company",
+                                   textOf(tally.owner->getAbbreviation()),
+                                   textOf(market->getName()) + ", " + textOf(tally.currency->getRepresentation()),
+                                   &tally.counts, lastQuotes[tally.owner]));
     }
+    auto lastRates = lastValues(plan_->rates);
     for (const auto& tally : plan_->rateTallies)
         sheet.rows.push_back(rowOf(becomesOf(tally.counts, made.contains(tally.owner)), "Rates",
-                                   textOf(tally.owner->getRepresentation()), "", &tally.counts));
+                                   textOf(tally.owner->getRepresentation()), "", &tally.counts,
+                                   lastRates[tally.owner]));
 }
 
 void ImportQuotes::choose(const std::string& question, std::size_t item)
@@ -376,7 +395,7 @@ std::string ImportQuotes::carryOut()
         markets.push_back(entry.market.get());
     for (const auto& entry : plan_->newCompanies)
         companies.push_back(entry.company.get());
-    window().SetMessage(("Importing " + importedName(path_) + " ...").c_str());
+    window().showProgress("Importing " + importedName(path_) + " ...");
     plan_->carryOut(window().catalogue());
     // From here on the plan is of what was: it is only told from.
     show(currencies, markets, companies);
@@ -391,7 +410,7 @@ std::string ImportQuotes::carryOut()
     tell(currencies.size(), " new currency", " new currencies");
     tell(refusedCount_, " line refused", " lines refused");
     plan_.reset();
-    window().SetMessage("");
+    window().showProgress("");
     return text;
 }
 

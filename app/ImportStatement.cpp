@@ -328,7 +328,9 @@ void ImportStatement::askForAccount(ImportSheet& sheet) const
     for (const Account* account : window().getWallet()->accounts())
         names.emplace_back(account->getName().comparedBytes());
     lines.items.insert(lines.items.end(), names.begin(), names.end());
-    for (const std::string& symbol : symbols)
+    // An account of that name would be taken, and none made.
+    const bool isFree = std::ranges::find(names, accountToMake()) == names.end();
+    for (const std::string& symbol : isFree ? symbols : std::vector<std::string>())
         lines.items.push_back("a new one, " + accountToMake() + ", in " + symbol);
     lines.marked = profile_.account().empty() ? 0 : itemOf(names, profile_.account());
     const auto made = std::ranges::find(newAccounts_, accountToMake(), &OperationPlan::NewAccount::name);
@@ -439,6 +441,10 @@ void ImportStatement::fillRows(ImportSheet& sheet) const
         accounts.insert(row[kAccountColumn].text);
     accounts.erase("");
     sheet.columns[kAccountColumn].isHidden = accounts.size() < 2;
+    // So have they that of columns without any text.
+    for (std::size_t i = kAccountColumn + 1; i + 1 < sheet.columns.size(); ++i)
+        sheet.columns[i].isHidden =
+            std::ranges::all_of(sheet.rows, [i](const auto& row) { return row[i].text.empty(); });
     for (const auto& line : table_->passedOver())
         sheet.rows.push_back(rowOf(line));
 }
@@ -461,6 +467,8 @@ void ImportStatement::fillCash(ImportSheet& sheet) const
                               numberCell(amountText(former), former, look::kText),
                               numberCell(amountText(after[i]), after[i], look::kText)});
     }
+    // Those that are changed, or made, show without scrolling.
+    std::ranges::stable_partition(sheet.cash, [](const auto& row) { return row[2].text != row[3].text; });
     sheet.cashTitle = "Cash after All Operations";
     if (wallet.getBuyRateCost() != 0 || wallet.getSellRateCost() != 0)
         sheet.cashTitle += ", with the portfolio's rate costs of " + finePercentText(wallet.getBuyRateCost()) +

@@ -17,4 +17,5 @@ struct Notice {
     std::vector<Button> buttons; ///< at most two; pressing one also takes the notice away
     bool isPassing = false;      ///< goes by itself after some seconds, and does not queue
     bool isRemark = false;       ///< a passing one that is told behind another one which comes within a second
+    bool isAnswer = false;       ///< to what was just done: goes before those that wait
 };

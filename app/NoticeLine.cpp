@@ -120,7 +120,11 @@ void NoticeLine::show(Notice notice)
         expiry_ = std::make_unique<BMessageRunner>(BMessenger(this), &expired, kPassingTime);
     } else {
         const auto same = std::ranges::find(waiting_, notice.key, &Notice::key);
-        if (same != waiting_.end())
+        if (notice.isAnswer) {
+            if (same != waiting_.end())
+                waiting_.erase(same);
+            waiting_.push_front(std::move(notice));
+        } else if (same != waiting_.end())
             *same = std::move(notice);
         else
             waiting_.push_back(std::move(notice));

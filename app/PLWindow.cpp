@@ -314,6 +314,18 @@ void PLWindow::SetMessage(const char* text, const char* toolTip)
     messageView_->SetMessage(text);
 }
 
+void PLWindow::showProgress(const std::string& text)
+{
+    const WindowLock lock(*this);
+    if (!lock.isHeld())
+        return;
+    const char* message = messageView_->Message();
+    if (!text.empty() && !formerMessage_)
+        formerMessage_ = message != nullptr ? message : "";
+    const std::string former = text.empty() ? std::exchange(formerMessage_, std::nullopt).value_or("") : "";
+    messageView_->SetMessage((text.empty() ? former : text).c_str());
+}
+
 void PLWindow::showNotice(Notice notice)
 {
     const WindowLock lock(*this);

@@ -54,6 +54,8 @@ public:
 
     /// Shows `text` in the status line, at once; `toolTip` says more of it.
     void SetMessage(const char* text, const char* toolTip = "");
+    /// Shows `text` in the status line while a command lasts; an empty one brings back what stood there.
+    void showProgress(const std::string& text);
     /// Shows `notice` in the line above the status line, or lets it wait until those before it are dismissed.
     void showNotice(Notice notice);
     /// Takes the notice of that key away, shown or waiting; its reason is gone.
@@ -247,9 +249,10 @@ private:
     BButton* importButton_ = nullptr;
     std::unique_ptr<History> history_; // null while the window is made
     RepeatGuard repeats_;
-    std::string command_;                     // that runs; empty when it has no name for a step
-    std::vector<const Operation*> simulated_; // sales that the last valuation made up; sorted, never looked into
-    bool isValued_ = false;                   // there was a valuation since the wallet came
+    std::optional<std::string> formerMessage_; // while progress is shown
+    std::string command_;                      // that runs; empty when it has no name for a step
+    std::vector<const Operation*> simulated_;  // sales that the last valuation made up; sorted, never looked into
+    bool isValued_ = false;                    // there was a valuation since the wallet came
     std::unique_ptr<DataFiles> files_;
     std::unique_ptr<QuoteEditor<Company>> companyQuotes_;
     std::unique_ptr<QuoteEditor<Currency>> currencyQuotes_;

@@ -22,11 +22,11 @@ inline const ExportTable kQuotes{"quotes.csv", {"Date", "Ticker", "Close", "Mark
 inline const ExportTable kEvents{
     "events.csv", {"Date", "Ticker", "Market", "Currency", "Type", "Title", "Text", "Numerator", "Divider"}};
 
-inline const ExportTable kAccounts{"accounts.csv",
-                                   {"Account", "Currency", "Default Transfer", "Cash", "Value", "Original"}};
-inline const ExportTable kHoldings{
-    "holdings.csv",
-    {"Date", "Market", "Ticker", "Currency", "Name", "Quantity", "Buy Quote", "Quote", "Value", "End Date"}};
+inline const ExportTable kAccounts{
+    "accounts.csv", {"Account", "Currency", "Default Transfer", "Cash", "Value in Reference", "Original"}};
+inline const ExportTable kHoldings{"holdings.csv",
+                                   {"Date", "Market", "Ticker", "Currency", "Name", "Quantity", "Buy Quote", "Quote",
+                                    "Value in Reference", "End Date"}};
 inline const ExportTable kOperations{"operations.csv",
                                      {"Date", "Type", "Account", "To Account", "Market", "Ticker", "Quantity", "Quote",
                                       "Amount", "Cost", "Rate Cost", "From Quote", "To Quote"}};

@@ -174,14 +174,21 @@ std::string_view Table::cell(const WideColumn& column) const
     return text == "N/A" || text == "NA" || text == "-" ? std::string_view() : text;
 }
 
-Date Table::date() const
+Date Table::date()
 {
     const std::string_view text = cell(Column::kDate);
     std::optional<Date> date = parseDate(text);
+    const auto written = WrittenDate::read(text);
+    const bool isOpen = written && !written->isOrderKnown;
     // Of all other forms those that can be read in one way only: with points the day comes first.
-    if (const auto written = date ? std::nullopt : WrittenDate::read(text))
-        if (written->isOrderKnown || text.find('.') == text.find_first_not_of("0123456789"))
-            date = written->date(false);
+    if (!date && written && (!isOpen || text.find('.') == text.find_first_not_of("0123456789")))
+        date = written->date(false);
+    constexpr int kMonths = 12;
+    hasDayFirst_ = hasDayFirst_ || (isOpen && written->first > kMonths);
+    // The lines before it, which fit both orders, have been read wrongly.
+    if (isOpen && !hasDayFirst_ && written->date(false).isUndefined() && !written->date(true).isUndefined())
+        throw std::runtime_error(path_ + ", line " + std::to_string(reader_.line()) + ": " + shown(text) +
+                                 " has the month first; the dates have to be as YYYY-MM-DD or DD/MM/YYYY");
     if (!date || date->isUndefined())
         throw UnusableRow(shown(text) + " is no date as YYYY-MM-DD or DD/MM/YYYY");
     return *date;

@@ -74,7 +74,8 @@ public:
     std::string_view cell(Column column) const { return field(place(column)); }
     /// The same of a column of a wide table; empty also for what stands for no value there: "N/A", "NA" and "-".
     std::string_view cell(const WideColumn& column) const;
-    Date date() const;
+    /// Of 3/4/2026 the day is 3. A table that has the month first ends the import at the first date that shows it.
+    Date date();
     /// The positive finite number that `cell` is, or its inverse, as a float.
     ///
     /// Where commas do not separate the fields, the file's first number with a decimal mark settles whether that is '.'
@@ -103,7 +104,8 @@ private:
     std::string valueHeading_;
     std::vector<std::string> headings_;
     std::vector<WideColumn> wide_;
-    char decimalMark_ = '\0'; // not settled yet
+    char decimalMark_ = '\0';  // not settled yet
+    bool hasDayFirst_ = false; // some date shows it
 };
 
 /// A piece of the input for a message.

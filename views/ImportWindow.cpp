@@ -114,16 +114,18 @@ BMessage ImportWindow::answer(uint32 code, const char* control) const
 
 BView* ImportWindow::makeMenu(BRect frame, const ImportSheet::Question& question)
 {
-    auto* field = new BMenuField(frame, question.name, question.label.c_str(), new BPopUpMenu(question.name));
-    field->SetDivider(kDivider);
-    field->SetAlignment(B_ALIGN_RIGHT);
+    // Filled before a field shows it, which fills itself anew with each change of its menu.
+    auto* menu = new BPopUpMenu(question.name);
     for (std::size_t i = 0; i < question.items.size(); ++i) {
         auto* message = new BMessage(answer(kChosen, question.name));
         message->AddInt32("item", static_cast<int32>(i));
-        field->Menu()->AddItem(new BMenuItem(question.items[i].c_str(), message));
+        menu->AddItem(new BMenuItem(question.items[i].c_str(), message));
     }
-    if (BMenuItem* marked = field->Menu()->ItemAt(question.marked))
+    if (BMenuItem* marked = menu->ItemAt(question.marked))
         marked->SetMarked(true);
+    auto* field = new BMenuField(frame, question.name, question.label.c_str(), menu);
+    field->SetDivider(kDivider);
+    field->SetAlignment(B_ALIGN_RIGHT);
     panel_->AddChild(field);
     return field;
 }

@@ -24,9 +24,14 @@ public:
 protected:
     void accept() override
     {
-        // The dialog would go into a folder that is named; one without a name is the folder that it is in.
+        // The dialog would go into a folder that is named; one without a name is the folder that it is in. One that is
+        // only selected in the list is gone into.
         const QFileInfo chosen(selectedFiles().value(0));
-        if ((flavors_ & B_DIRECTORY_NODE) != 0 && chosen.isDir() && chosen != QFileInfo(directory().absolutePath()))
+        const auto* field = findChild<QLineEdit*>("fileNameEdit");
+        const bool isNamed = field != nullptr && !field->text().isEmpty() &&
+                             chosen == QFileInfo(directory(), field->text());
+        if ((flavors_ & B_DIRECTORY_NODE) != 0 && isNamed && chosen.isDir() &&
+            chosen != QFileInfo(directory().absolutePath()))
             QDialog::accept();
         else
             QFileDialog::accept();

@@ -252,7 +252,8 @@ TEST(ExportTest, TablesAddWhatIsNewToFilesThatAreThereAndRefuseTheRest)
         EXPECT_EQ(run.status, 1) << c.message;
         EXPECT_THAT(run.err, HasSubstr(c.message));
     }
-    folder.write("tables/accounts.csv", "Account,Currency,Default Transfer,Cash,Value,Original\nSavings,USD,,,,\n");
+    folder.write("tables/accounts.csv",
+                 "Account,Currency,Default Transfer,Cash,Value in Reference,Original\nSavings,USD,,,,\n");
     EXPECT_THAT(import(into).err, HasSubstr("accounts.csv, line 2: has the account \"Savings\" in \"USD\""));
     EXPECT_TRUE(folder.content("market") + folder.content("wallet") == now);
     EXPECT_THAT(ToolRun(PELORIN_EXPORT, sample + " --to foreign", folder).err, HasSubstr("was not made by an export"));

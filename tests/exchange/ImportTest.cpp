@@ -450,6 +450,7 @@ TEST_F(ImportTest, WhatIsNoTableEndsTheImportInOneLineAndChangesNothing)
     folder_.write("nul", row + std::string("2005-01-05,U\0D,2\n", 18));
     folder_.write("long", row + std::string(10'000'000, '1') + "\n" + row);
     folder_.write("quote", row + "2005-01-05,\"U\nSD\",2\n");
+    folder_.write("month", "date,symbol,rate,ticker,close\n01/05/2005,USD,2,A,2\n01/14/2005,USD,2,A,2\n");
     folder_.write("empty", "");
     folder_.write("mark", "\xEF\xBB\xBF");
     folder_.write("headings", "date,currency,rate\n");
@@ -457,8 +458,8 @@ TEST_F(ImportTest, WhatIsNoTableEndsTheImportInOneLineAndChangesNothing)
     zipped("ones", std::string(100'000'000, '1'));
     zipped("cut", row + row);
     fs::resize_file(folder_ / "cut", fs::file_size(folder_ / "cut") - 9);
-    for (const std::string kind :
-         {"utf16", "nul", "long", "quote", "empty", "mark", "headings", "bomb", "ones", "cut", "folder", "none"})
+    for (const std::string kind : {"utf16", "nul", "long", "quote", "month", "empty", "mark", "headings", "bomb",
+                                   "ones", "cut", "folder", "none"})
         for (const std::string table : {"--rates ", "--quotes "}) {
             const ToolRun tool(PELORIN_IMPORT, "--into f " + table + kind, folder_);
             EXPECT_EQ(tool.status, 1) << table << kind;

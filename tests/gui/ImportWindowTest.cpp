@@ -145,13 +145,13 @@ TEST_F(ImportWindowTest, AStatementIsAssignedShownAndBookedInOneStepAndRemembere
     answer({{"importColumn", "Date"}, {"importHeading", "Tag"}, {"importAccount", "Cash"}});
     EXPECT_THAT(line("txtImport"), HasSubstr("2 new operations, 0 already there, 3 refused"));
     EXPECT_THAT(table("lstImport"),
-                ElementsAre("Refused\t5\t4.5.2024\tSpende\t\t\t\t7,50\t\tthe type \"Spende\" is not known",
-                            "Refused\t6\t5.5.2024\tEinzahlung\tNotgroschen\t\t\t5,00\t\tthere is no account "
+                ElementsAre("Refused\t5\t4.5.2024\tSpende\t\t\t\t7,50\tthe type \"Spende\" is not known",
+                            "Refused\t6\t5.5.2024\tEinzahlung\tNotgroschen\t\t\t5,00\tthere is no account "
                             "\"Notgroschen\"",
-                            "Refused\t7\t6.5.2024\tGabe\t\t\t\t1,00\t\tthe type \"Gabe\" is not known",
-                            "New\t3\t02/05/2024\tDeposit\tCash\t\t\t1,000.00\t\t",
-                            "New\t4\t03/05/2024\tBuy\tCash\tAL\t10\t20.50\t\t",
-                            "Passed over\t1\t\t\t\t\t\t\t\tbefore the headings: Bank"));
+                            "Refused\t7\t6.5.2024\tGabe\t\t\t\t1,00\tthe type \"Gabe\" is not known",
+                            "New\t3\t02/05/2024\tDeposit\tCash\t\t\t1,000.00\t",
+                            "New\t4\t03/05/2024\tBuy\tCash\tAL\t10\t20.50\t",
+                            "Passed over\t1\t\t\t\t\t\t\tbefore the headings: Bank"));
     EXPECT_THAT(line("txtImportNote"), HasSubstr("choose what they leave open"));
     // On the way to the last type each key is an answer, for the word that is shown.
     answer({{"importType", "Charge"}, {"importCurrency", "EUR"}, {"importWord", "Gabe"}, {"importType", "Income"}});
@@ -246,8 +246,9 @@ TEST_F(ImportWindowTest, PricesAndRatesComeInWithAllThatIsNew)
         {{"importColumn", "Date"}, {"importHeading", "Tag"}, {"importColumn", "Price"}, {"importHeading", "Schluss"}});
     EXPECT_THAT(line("txtImport"), HasSubstr("1 new, 1 changed, 1 equal quotes, 0 lines refused"));
     EXPECT_THAT(table("lstImport"),
-                ElementsAre("New\t\tMarket\tZürich\tCHF\t\t\t\t", "Changed\t\tCompany\tAL\tParis, EUR\t0\t1\t1\t",
-                            "New\t\tCompany\tNEU\tZürich, CHF\t1\t0\t0\t"));
+                ElementsAre("New\t\tMarket\tZürich\tCHF\t\t\t\t",
+                            "Changed\t\tCompany\tAL\tParis, EUR\t0\t1\t1\tlast: 11.00 on 01/03/2024",
+                            "New\t\tCompany\tNEU\tZürich, CHF\t1\t0\t0\tlast: 5.00 on 07/03/2024"));
     // A click from a field that was typed in shows first what that changes.
     part<QLineEdit>("txtImportMarket")->setFocus();
     QTest::keyClicks(part<QLineEdit>("txtImportMarket"), "X");
