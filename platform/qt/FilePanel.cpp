@@ -28,8 +28,8 @@ protected:
         // only selected in the list is gone into.
         const QFileInfo chosen(selectedFiles().value(0));
         const auto* field = findChild<QLineEdit*>("fileNameEdit");
-        const bool isNamed = field != nullptr && !field->text().isEmpty() &&
-                             chosen == QFileInfo(directory(), field->text());
+        const bool isNamed =
+            field != nullptr && !field->text().isEmpty() && chosen == QFileInfo(directory(), field->text());
         if ((flavors_ & B_DIRECTORY_NODE) != 0 && isNamed && chosen.isDir() &&
             chosen != QFileInfo(directory().absolutePath()))
             QDialog::accept();

@@ -5,7 +5,9 @@
 #include "tests/support/ToolRun.h"
 #include "views/ColumnListView.h"
 
+#include <QAbstractItemView>
 #include <QApplication>
+#include <QDialogButtonBox>
 #include <QFileDialog>
 #include <QLineEdit>
 #include <QMenu>
@@ -234,6 +236,22 @@ TEST_F(ExportWindowTest, NothingIsReplacedUnaskedAndAFailureLeavesAllAsItWas)
     EXPECT_THAT(place.content("mine.csv"), testing::StartsWith("Parameter,Value\n"));
     EXPECT_EQ(notice(), "10 parameters written to mine.csv");
 
+    // A folder that is selected in the list, and not named, is gone into.
+    show(kPortoFolioPage);
+    chooseExport("All tables into a folder...");
+    auto* panel = qobject_cast<QFileDialog*>(QApplication::activeModalWidget());
+    ASSERT_NE(panel, nullptr);
+    panel->setDirectory(QString::fromStdString(place.path));
+    auto* list = panel->findChild<QAbstractItemView*>("treeView");
+    ASSERT_TRUE(QTest::qWaitFor([list] { return list->model()->rowCount(list->rootIndex()) > 0; }));
+    list->setCurrentIndex(list->model()->index(0, 0, list->rootIndex()));
+    ASSERT_EQ(list->currentIndex().data().toString(), "folder");
+    QTest::mouseClick(panel->findChild<QDialogButtonBox*>("buttonBox")->buttons().front(), Qt::LeftButton);
+    settle();
+    EXPECT_TRUE(panel->isVisible());
+    EXPECT_EQ(panel->directory().dirName(), "folder");
+    panel->reject();
+
     const std::string market = contentOf(marketFile());
     const struct {
         Page page;
@@ -248,6 +266,7 @@ TEST_F(ExportWindowTest, NothingIsReplacedUnaskedAndAFailureLeavesAllAsItWas)
         {kPortoFolioPage, place / "folder", "All tables into a folder...",
          "folder/quotes.csv: is there already, was not made by an export, and is left as it is"},
     };
+    window().showNotice({"other", "a notice that waits for its time", {}});
     for (const auto& c : cases) {
         show(c.page);
         EXPECT_THAT(exportOver(c.path, c.label), HasSubstr(std::string("Not written: ") + c.reason)) << c.path;
@@ -258,6 +277,7 @@ TEST_F(ExportWindowTest, NothingIsReplacedUnaskedAndAFailureLeavesAllAsItWas)
         left.push_back(file.path().filename());
     EXPECT_THAT(left, testing::UnorderedElementsAre("mine.csv", "folder", "quotes.csv"));
     EXPECT_EQ(place.content("folder/quotes.csv"), "mine");
+    window().dropNotice("other");
     // A success takes the notice of the failure away.
     show(kPortoFolioPage);
     EXPECT_THAT(exportOver(place / "accounts.csv", "Accounts at 21/11/2024..."), HasSubstr("4 accounts"));
