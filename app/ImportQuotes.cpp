@@ -37,11 +37,11 @@ std::span<const NamedColumn> columnsOf(bool areRates)
 
 const std::vector<ListColumn> kListColumns = {{"Becomes", 72},
                                               {"Line", 56, B_ALIGN_RIGHT},
-                                              {"Of", 70},
-                                              {"Name", 80},
+                                              {"Of", 66},
+                                              {"Name", 78},
                                               {"Market", 90},
                                               {"New", 50, B_ALIGN_RIGHT},
-                                              {"Changed", 62, B_ALIGN_RIGHT},
+                                              {"Changed", 68, B_ALIGN_RIGHT},
                                               {"Equal", 50, B_ALIGN_RIGHT},
                                               {"Note", kRemainingWidth}};
 
