@@ -38,28 +38,28 @@ const std::string& ExportedTable::cell(std::size_t column) const
     return place < reader_.fields().size() ? reader_.fields()[place] : none_;
 }
 
+template <class Read>
+auto ExportedTable::read(std::size_t column, const Read& reader, const char* what) const
+{
+    const auto value = reader(cell(column));
+    if (!value)
+        refuse(shown(cell(column)) + " is no " + what);
+    return *value;
+}
+
 Date ExportedTable::date(std::size_t column) const
 {
-    const auto date = readTableDate(cell(column));
-    if (!date)
-        refuse(shown(cell(column)) + " is no date as YYYY-MM-DD");
-    return *date;
+    return read(column, readTableDate, "date as YYYY-MM-DD");
 }
 
 float ExportedTable::number(std::size_t column) const
 {
-    const auto number = readNumberText(cell(column));
-    if (!number)
-        refuse(shown(cell(column)) + " is no number with a decimal point");
-    return *number;
+    return read(column, readNumberText, "number with a decimal point");
 }
 
 int ExportedTable::count(std::size_t column) const
 {
-    const auto count = readCountText(cell(column));
-    if (!count)
-        refuse(shown(cell(column)) + " is no whole number");
-    return *count;
+    return read(column, readCountText, "whole number");
 }
 
 short ExportedTable::smallCount(std::size_t column) const

@@ -33,6 +33,10 @@ public:
     [[noreturn]] void refuseUnknown(std::size_t column) const;
 
 private:
+    /// What `reader` makes of the cell; `what` says for a refusal what it should be.
+    template <class Read>
+    auto read(std::size_t column, const Read& reader, const char* what) const;
+
     std::string path_;
     const ExportTable& table_;
     CsvReader reader_;

@@ -4,6 +4,7 @@
 #include "market/Catalogue.h"
 
 #include <algorithm>
+#include <optional>
 #include <utility>
 
 namespace {
@@ -71,26 +72,16 @@ std::string tickerOf(const std::string& path)
     return name;
 }
 
-/// The latest day of all values; the undefined one without any.
+/// The earliest and the latest day of all values; undefined ones without any.
 template <class Series>
-PackedDate lastDayOf(const Series& all)
+std::pair<PackedDate, PackedDate> daysOf(const Series& all)
 {
-    PackedDate last;
+    std::optional<std::pair<PackedDate, PackedDate>> days;
     for (const auto& series : all)
         for (const DatedValue& value : series.values)
-            last = std::max(last, value.day);
-    return last;
-}
-
-/// The same of the earliest.
-template <class Series>
-PackedDate firstDayOf(const Series& all)
-{
-    PackedDate first = lastDayOf(all);
-    for (const auto& series : all)
-        for (const DatedValue& value : series.values)
-            first = std::min(first, value.day);
-    return first;
+            days = days ? std::pair(std::min(days->first, value.day), std::max(days->second, value.day))
+                        : std::pair(value.day, value.day);
+    return days.value_or(std::pair<PackedDate, PackedDate>());
 }
 
 template <class Series>
@@ -309,7 +300,7 @@ MarketPlan MarketImport::plan()
     // Until here the values are only gathered, in the order of the lines.
     giveReferenceItsRates();
     checkRates();
-    latestDay_ = std::max(lastDayOf(plan_.quotes), lastDayOf(plan_.rates)).date();
+    latestDay_ = std::max(daysOf(plan_.quotes).second, daysOf(plan_.rates).second).date();
     plan_.settle();
     plan_.dropUnused();
     return std::move(plan_);
@@ -335,7 +326,7 @@ void MarketImport::giveReferenceItsRates()
     const bool isNew = !plan_.newCurrencies.empty() && plan_.newCurrencies.front().get() == &reference;
     const bool isNamed = isNew || std::ranges::any_of(plan_.quotes, isInReference);
     if (days.empty() && reference.getNbrQuotes() == 0 && isNamed)
-        days.push_back(firstDayOf(plan_.quotes));
+        days.push_back(daysOf(plan_.quotes).first);
     std::ranges::sort(days);
     days.erase(std::unique(days.begin(), days.end()), days.end());
     // What the tables themselves say of the reference is 1 as well, so that the days alone tell all.
