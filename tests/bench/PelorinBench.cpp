@@ -21,6 +21,7 @@
 #include "tests/bench/FigureReporter.h"
 #include "tests/bench/GeneratedFiles.h"
 #include "valuation/Evolution.h"
+#include "valuation/Returns.h"
 #include "valuation/State.h"
 #include "views/OperationListView.h"
 
@@ -113,6 +114,23 @@ bool evolve(Portfolio& portfolio, const Files&)
     EvolutionOutcome outcome;
     refreshStates(portfolio.wallet, Portfolio::lastDay(), false, &outcome);
     return outcome == EvolutionOutcome::kBuilt;
+}
+
+/// With the values that its chart shows.
+bool evolveToPoints(Portfolio& portfolio, const Files& files)
+{
+    return evolve(portfolio, files) && !evolutionByDate(portfolio.wallet, portfolio.catalogue).empty();
+}
+
+bool evolveToReturns(Portfolio& portfolio, const Files& files)
+{
+    if (!evolve(portfolio, files))
+        return false;
+    const auto points = evolutionByDate(portfolio.wallet, portfolio.catalogue);
+    const Date first = portfolio.wallet.states()[0]->getFirstOperationDate();
+    const Returns returns(portfolio.wallet, portfolio.catalogue, points, first, {});
+    // The first operations buy more than there is, so that a time-weighted return is not known: it costs the same.
+    return returns.moneyWeighted.isKnown() && returns.timeWeighted.kind != AnnualReturn::Kind::kNoDay;
 }
 
 bool loadAndEvolve(Portfolio& portfolio, const Files& files)
@@ -322,6 +340,8 @@ PELORIN_BENCHMARK(BM_Files, load_market, kLarge, quotesOf(kLarge), doNothing, lo
 PELORIN_BENCHMARK(BM_Files, evolve_10_years, small(10), shareStatesOf(small(10)), load, evolve);
 PELORIN_BENCHMARK(BM_Files, evolve_20_years, small(20), shareStatesOf(small(20)), load, evolve);
 PELORIN_BENCHMARK(BM_Files, evolve_40_years, small(40), shareStatesOf(small(40)), load, evolve);
+PELORIN_BENCHMARK(BM_Files, evolve_to_points, small(20), shareStatesOf(small(20)), load, evolveToPoints);
+PELORIN_BENCHMARK(BM_Files, evolve_to_returns, small(20), shareStatesOf(small(20)), load, evolveToReturns);
 PELORIN_BENCHMARK(BM_Files, evolve_again, small(20), shareStatesOf(small(20)), loadAndEvolve, evolve);
 PELORIN_BENCHMARK(BM_Files, replay, small(20), kReplays* small(20).holdings, load, replay);
 PELORIN_BENCHMARK(BM_Files, remove_10_years, small(10), shareStatesOf(small(10)), loadAndEvolve, removeStates);
