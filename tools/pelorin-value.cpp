@@ -31,7 +31,8 @@ A kind is "deposit", "transfer", "buy", "sell", "income" or "charge"; of the las
 The totals are in the reference currency, annualRevenue and the returns are fractions per year; reference
 and currency are symbols. A return is null when no rate says it, or several do; the tables say which.
 What was bought and sold, and the gains, are without the costs, in the currency of the holding and, each
-operation at the rate of its day, in the reference currency. Transfers that --previsions has suggested are gone again with --evolution.
+operation at the rate of its day, in the reference currency. Simulated sales are no part of them, nor of
+the returns. Transfers that --previsions has suggested are gone again with --evolution.
 
 Exit status: 0, 1 when a file cannot be read or the result not be written, 2 for bad arguments.)";
 
