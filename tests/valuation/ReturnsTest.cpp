@@ -32,109 +32,76 @@ void expectReturn(const AnnualReturn& found, Kind kind, double rate, double digi
 
 } // namespace
 
+// Published are:
+//   XIRR       the documentation of XIRR in Microsoft Excel
+//   IRR        Wikipedia, Internal rate of return
+//   CFA 1      CFA Institute, Quantitative Methods: shares for 200 and 225, dividends of 5, both sold for 235
+//   CFA 3      CFA Institute, Evaluating Portfolio Performance: 30 days at 0.0009536 a day
+//   Oil pump   Lorie and Savage, Three Problems in Rationing Capital (1955): 25 % and 400 %
+//   Two, none  Hirshleifer, On the Theory of Optimal Investment Decision (1958): 100 % and 200 %; no rate
 TEST(ReturnsTest, MoneyWeightedOnesAreThoseOfPublishedExamples)
 {
+    using enum Kind;
     const struct {
-        const char* source;
-        std::vector<MoneyWeightedReturn::Payment> payments; // put in
+        const char* what;
+        std::vector<MoneyWeightedReturn::Payment> paid; // into it
         Kind kind;
         double rate = 0, digits = 0;
     } cases[] = {
-        {"the documentation of XIRR in Microsoft Excel, dates from 01/01/2008 to 01/04/2009",
-         {{0, 10000}, {60, -2750}, {303, -4250}, {411, -3250}, {456, -2750}},
-         Kind::kRate,
-         0.373362535,
-         5e-9},
-        {"Wikipedia, Internal rate of return",
-         {{0, 123400}, {kYear, -36200}, {2 * kYear, -54800}, {3 * kYear, -48100}},
-         Kind::kRate,
-         0.0596,
-         5e-5},
-        {"CFA Institute, Quantitative Methods: a share for 200, one for 225, dividends of 5, both sold for 235",
-         {{0, 200}, {kYear, 225}, {kYear, -5}, {2 * kYear, -480}},
-         Kind::kRate,
-         0.0939,
-         5e-5},
-        {"CFA Institute, Evaluating Portfolio Performance: 30 days at 0.0009536 a day",
-         {{0, 1000000}, {5, 30000}, {16, 20000}, {30, -1080000}},
-         Kind::kRate,
-         std::pow(1.0009536, kYear) - 1,
-         5e-5},
-        {"Lorie and Savage, Three Problems in Rationing Capital (1955): the oil pump, 25 % and 400 %",
-         {{0, 1600}, {kYear, -10000}, {2 * kYear, 10000}},
-         Kind::kSeveralRates},
-        {"Hirshleifer, On the Theory of Optimal Investment Decision (1958): 100 % and 200 %",
-         {{0, 1}, {kYear, -5}, {2 * kYear, 6}},
-         Kind::kSeveralRates},
-        {"the same, no rate", {{0, 1}, {kYear, -3}, {2 * kYear, 2.5}}, Kind::kNoRate},
-        // Not published:
-        {"10 % twice over is one rate", {{0, 100}, {kYear, -220}, {2 * kYear, 121}}, Kind::kRate, 0.1, 1e-6},
-        {"three rates", {{0, 1000}, {kYear, -3600}, {2 * kYear, 4310}, {3 * kYear, -1716}}, Kind::kSeveralRates},
-        {"one rate at three changes of sign",
-         {{0, 90}, {10, -20}, {20, 30}, {kYear, -110}},
-         Kind::kRate,
-         0.101159,
-         1e-6},
-        {"nothing gained", {{0, 100}, {7, 50}, {30, -150}}, Kind::kRate, 0, 0},
-        {"a loss", {{0, 100}, {2 * kYear, -25}}, Kind::kRate, -0.5, 1e-15},
-        {"days, in any order", {{1, -120}, {0, 100}}, Kind::kRate, std::pow(1.2, kYear) - 1, 1e16},
-        {"beyond all numbers", {{0, 1}, {1, -10}}, Kind::kNoRate},
-        {"everything lost", {{0, 100}, {10, 20}}, Kind::kNoRate},
-        {"nothing at all", {{0, 0}}, Kind::kNoRate}};
+        {"XIRR", {{0, 10000}, {60, -2750}, {303, -4250}, {411, -3250}, {456, -2750}}, kRate, 0.373362535, 5e-9},
+        {"IRR", {{0, 123400}, {kYear, -36200}, {2 * kYear, -54800}, {3 * kYear, -48100}}, kRate, 0.0596, 5e-5},
+        {"CFA 1", {{0, 200}, {kYear, 225}, {kYear, -5}, {2 * kYear, -480}}, kRate, 0.0939, 5e-5},
+        {"CFA 3", {{0, 1e6}, {5, 30000}, {16, 20000}, {30, -1.08e6}}, kRate, std::pow(1.0009536, kYear) - 1, 5e-5},
+        {"Oil pump", {{0, 1600}, {kYear, -10000}, {2 * kYear, 10000}}, kSeveralRates},
+        {"Two", {{0, 1}, {kYear, -5}, {2 * kYear, 6}}, kSeveralRates},
+        {"None", {{0, 1}, {kYear, -3}, {2 * kYear, 2.5}}, kNoRate},
+        {"10 % twice over is one rate", {{0, 100}, {kYear, -220}, {2 * kYear, 121}}, kRate, 0.1, 1e-6},
+        {"three rates", {{0, 1000}, {kYear, -3600}, {2 * kYear, 4310}, {3 * kYear, -1716}}, kSeveralRates},
+        {"one, at three signs", {{0, 90}, {10, -20}, {20, 30}, {kYear, -110}}, kRate, 0.101159, 1e-6},
+        {"nothing gained", {{0, 100}, {7, 50}, {30, -150}}, kRate, 0, 0},
+        {"a loss", {{0, 100}, {2 * kYear, -25}}, kRate, -0.5, 1e-15},
+        {"days, in any order", {{1, -120}, {0, 100}}, kRate, std::pow(1.2, kYear) - 1, 1e16},
+        {"beyond all numbers", {{0, 1}, {1, -10}}, kNoRate},
+        {"everything lost", {{0, 100}, {10, 20}}, kNoRate},
+        {"nothing at all", {{0, 0}}, kNoRate}};
     for (const auto& c : cases)
-        expectReturn(MoneyWeightedReturn(c.payments).result(), c.kind, c.rate, c.digits, c.source);
+        expectReturn(MoneyWeightedReturn(c.paid).result(), c.kind, c.rate, c.digits, c.what);
 }
 
+// Published are, besides those above:
+//   Adds, withdraws   Investopedia, Time-Weighted Rate of Return: 9.79 % for both investors
+//   CFA 1             15 % and 6.67 %, 10.76 % a year
+//   CFA 3             2.92 % in 30 days
 TEST(ReturnsTest, TimeWeightedOnesAreThoseOfPublishedExamples)
 {
     struct Day {
         double value, deposited, withdrawn;
     };
+    using enum Kind;
     const struct {
-        const char* source;
+        const char* what;
         std::vector<Day> days;
         int length;
         Kind kind;
         double growth = 0, digits = 0; // within the range, and not within a year
     } cases[] = {
-        {"Investopedia, Time-Weighted Rate of Return, the investor who adds",
-         {{1000000, 1000000, 0}, {1162484, 0, 0}, {1262484, 100000, 0}, {1192328, 0, 0}},
-         kYear,
-         Kind::kRate,
-         0.0979,
-         5e-5},
-        {"the same, the investor who withdraws",
-         {{1000000, 1000000, 0}, {1162484, 0, 0}, {1062484, 0, 100000}, {1003440, 0, 0}},
-         kYear,
-         Kind::kRate,
-         0.0979,
-         5e-5},
-        {"CFA Institute, Quantitative Methods: 15 % and 6.67 % are 10.76 % a year",
-         {{200, 200, 0}, {225, 0, 5}, {450, 225, 0}, {0, 0, 480}},
-         2 * kYear,
-         Kind::kRate,
-         1.1076 * 1.1076 - 1,
-         1.2e-4},
-        {"CFA Institute, Evaluating Portfolio Performance: 2.92 % in 30 days",
-         {{1000000, 1000000, 0},
-          {1015000, 0, 0},
-          {1045000, 30000, 0},
-          {1040000, 0, 0},
-          {1060000, 20000, 0},
-          {1080000, 0, 0}},
+        {"Adds", {{1e6, 1e6, 0}, {1162484, 0, 0}, {1262484, 1e5, 0}, {1192328, 0, 0}}, kYear, kRate, 0.0979, 5e-5},
+        {"Withdraws", {{1e6, 1e6, 0}, {1162484, 0, 0}, {1062484, 0, 1e5}, {1003440, 0, 0}}, kYear, kRate, 0.0979, 5e-5},
+        {"CFA 1", {{200, 200, 0}, {225, 0, 5}, {450, 225, 0}, {0, 0, 480}}, 2 * kYear, kRate, 0.22678, 1.2e-4},
+        {"CFA 3",
+         {{1e6, 1e6, 0}, {1.015e6, 0, 0}, {1.045e6, 3e4, 0}, {1.04e6, 0, 0}, {1.08e6, 2e4, 0}},
          30,
-         Kind::kRate,
+         kRate,
          0.0292,
          5e-5},
-        // Not published:
-        {"both on one day, 0.9 of what was there", {{100, 100, 0}, {60, 50, 75}}, kYear, Kind::kRate, -0.1, 1e-15},
-        {"days without anything", {{0, 0, 0}, {100, 100, 0}, {0, 0, 110}, {0, 0, 0}}, kYear, Kind::kRate, 0.1, 1e-15},
-        {"nothing left but rounding", {{100, 100, 0}, {-0.00005, 0, 110}, {0, 0, 0}}, kYear, Kind::kRate, 0.1, 1e-6},
-        {"everything lost", {{100, 100, 0}, {0, 0, 0}, {0, 0, 0}}, kYear, Kind::kRate, -1, 0},
-        {"something out of nothing", {{1, 0, 0}}, kYear, Kind::kNoRate},
-        {"debts", {{100, 100, 0}, {-1, 0, 0}}, kYear, Kind::kNoRate},
-        {"debts, and out of them", {{-1, 0, 1}, {100, 0, 0}}, kYear, Kind::kNoRate},
-        {"no day", {{110, 100, 0}}, 0, Kind::kNoDay}};
+        {"both on one day, 0.9 is left", {{100, 100, 0}, {60, 50, 75}}, kYear, kRate, -0.1, 1e-15},
+        {"days without anything", {{0, 0, 0}, {100, 100, 0}, {0, 0, 110}, {0, 0, 0}}, kYear, kRate, 0.1, 1e-15},
+        {"only rounding left", {{100, 100, 0}, {-0.00005, 0, 110}, {0, 0, 0}}, kYear, kRate, 0.1, 1e-6},
+        {"everything lost", {{100, 100, 0}, {0, 0, 0}, {0, 0, 0}}, kYear, kRate, -1, 0},
+        {"something out of nothing", {{1, 0, 0}}, kYear, kNoRate},
+        {"debts", {{100, 100, 0}, {-1, 0, 0}}, kYear, kNoRate},
+        {"debts, and out of them", {{-1, 0, 1}, {100, 0, 0}}, kYear, kNoRate},
+        {"no day", {{110, 100, 0}}, 0, kNoDay}};
     for (const auto& c : cases) {
         TimeWeightedReturn growth;
         for (const Day& day : c.days)
@@ -142,7 +109,7 @@ TEST(ReturnsTest, TimeWeightedOnesAreThoseOfPublishedExamples)
         AnnualReturn result = growth.result(c.length);
         if (result.isKnown())
             result.rate = std::pow(1 + result.rate, static_cast<double>(c.length) / kYear) - 1;
-        expectReturn(result, c.kind, c.growth, c.digits, c.source);
+        expectReturn(result, c.kind, c.growth, c.digits, c.what);
     }
 }
 
