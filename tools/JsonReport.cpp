@@ -85,6 +85,9 @@ void addTotals(const Valuation& valuation, ObjectWriter& report)
     report.add("totalValue", known(totals.totalValue));
     report.add("profit", known(totals.profit));
     report.add("annualRevenue", known(totals.annualRevenue));
+    const auto rate = [](const AnnualReturn& annual) { return annual.isKnown() ? Json(annual.rate) : Json(); };
+    report.add("moneyWeightedReturn", rate(valuation.returns().moneyWeighted));
+    report.add("timeWeightedReturn", rate(valuation.returns().timeWeighted));
 }
 
 Json describeAccount(const AccountState* cash)
@@ -96,17 +99,30 @@ Json describeAccount(const AccountState* cash)
             {"defaultTransfer", account != nullptr && account->isDefaultTransferAccount()}};
 }
 
-Json describeHolding(const ShareState* holding)
+Json describeSums(const HoldingSums& sums)
+{
+    return {{"bought", sums.bought},
+            {"sold", sums.sold},
+            {"costs", sums.costs},
+            {"income", sums.income},
+            {"realisedGain", sums.realisedGain},
+            {"unrealisedGain", sums.unrealisedGain ? Json(*sums.unrealisedGain) : Json()}};
+}
+
+Json describeHolding(const ShareState* holding, const HoldingFigures& figures)
 {
     const Share* share = holding->share();
-    return {{"market", share != nullptr ? text(share->getMarketName()) : ""},
-            {"ticker", text(holding->getCompanyAbbreviation())},
-            {"name", text(holding->getCompanyName())},
-            {"quantity", holding->getQuantity()},
-            {"buyQuote", holding->getBuyQuote()},
-            {"quote", holding->getQuote()},
-            {"endDate", day(holding->getEndDate())},
-            {"currency", text(holding->getCurrencyRepresentation())}};
+    Json json = {{"market", share != nullptr ? text(share->getMarketName()) : ""},
+                 {"ticker", text(holding->getCompanyAbbreviation())},
+                 {"name", text(holding->getCompanyName())},
+                 {"quantity", holding->getQuantity()},
+                 {"buyQuote", holding->getBuyQuote()},
+                 {"quote", holding->getQuote()},
+                 {"endDate", day(holding->getEndDate())},
+                 {"currency", text(holding->getCurrencyRepresentation())}};
+    json.update(describeSums(figures.own));
+    json["inReference"] = figures.inReference ? describeSums(*figures.inReference) : Json();
+    return json;
 }
 
 Json describe(const TransferAccountOperation& transfer)
@@ -170,7 +186,9 @@ void writeJsonReport(const Valuation& valuation, FILE* out)
     addTotals(valuation, report);
     report.add("firstOperationDate", day(state.getFirstOperationDate()));
     report.addList("accounts", state.accountStates(), describeAccount);
-    report.addList("shares", state.shareStates(), describeHolding);
+    auto figures = valuation.figures().begin(); // of each, in the same order
+    report.addList("shares", state.shareStates(),
+                   [&figures](const ShareState* holding) { return describeHolding(holding, *figures++); });
     // A view, and no list: a portfolio may have millions of operations.
     const auto operations = valuation.wallet().accounts() | std::views::transform(&Account::operations);
     report.addList("operations", operations | std::views::join, describeOperation);

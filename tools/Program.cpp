@@ -31,7 +31,7 @@ int runProgram(CLI::App& app, int argc, char** argv, const std::function<void()>
     }
 }
 
-void addDate(CLI::App& app, Date& date, const std::string& purpose)
+void addDate(CLI::App& app, const std::string& name, Date& date, const std::string& purpose)
 {
     const auto check = [](const std::string& text) {
         const bool isDate = text.find('/') != std::string::npos && parseDate(text);
@@ -40,7 +40,7 @@ void addDate(CLI::App& app, Date& date, const std::string& purpose)
     // Runs when the check has passed, so there is a date. Without the option `date` stays what the caller has put
     // there.
     const auto take = [&date](const std::string& text) { date = *parseDate(text); };
-    app.add_option_function<std::string>("--date", take, purpose)->type_name("DD/MM/YYYY")->check(check);
+    app.add_option_function<std::string>(name, take, purpose)->type_name("DD/MM/YYYY")->check(check);
 }
 
 CLI::Option* addText(CLI::App& app, const std::string& name, std::string& text, const std::string& type,

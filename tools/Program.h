@@ -11,11 +11,11 @@
 /// @return the exit status: 0; 1 when `run` failed, 2 for bad arguments.
 int runProgram(CLI::App& app, int argc, char** argv, const std::function<void()>& run);
 
-/// Adds the option `--date`, which sets `date`.
+/// Adds an option that sets `date`.
 ///
 /// The dates of a command line are DD/MM/YYYY, the form that the program shows and takes everywhere else; not the ISO
 /// form that tables may have.
-void addDate(CLI::App& app, Date& date, const std::string& purpose);
+void addDate(CLI::App& app, const std::string& name, Date& date, const std::string& purpose);
 
 /// Adds an option whose text must not be empty; `type` is what the help calls it.
 CLI::Option* addText(CLI::App& app, const std::string& name, std::string& text, const std::string& type,

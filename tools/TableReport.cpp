@@ -109,7 +109,7 @@ public:
 
     std::string make() const
     {
-        std::string text = header() + totals() + accounts() + holdings() + moves() + automaticOperations();
+        std::string text = header() + totals() + accounts() + holdings() + gains() + moves() + automaticOperations();
         return valuation_.hasEvolution() ? text + evolution() : text;
     }
 
@@ -131,11 +131,22 @@ private:
             table.addRow({"Total Value", amountText(totals.totalValue), referenceSymbol_});
             table.addRow({"Profit", amountText(totals.profit), referenceSymbol_});
             table.addRow({"Annual Revenu", amountText(totals.annualRevenue * 100.0), "%"});
+            addReturn("Money-weighted return", valuation_.returns().moneyWeighted, &table);
+            addReturn("Time-weighted return", valuation_.returns().timeWeighted, &table);
         }
         // The state gives a day after all others where there is no operation.
         const Date first = valuation_.state().getFirstOperationDate();
         table.addRow({"First operation", first == State::afterAllOperations() ? "none" : dateText(first), ""});
         return table.toString();
+    }
+
+    static void addReturn(const char* what, const AnnualReturn& annual, TextTable* table)
+    {
+        constexpr const char* kReasons[] = {"", "no day", "no rate", "several rates"}; // by kind
+        if (annual.isKnown())
+            table->addRow({what, amountText(annual.rate * 100), "%"});
+        else
+            table->addRow({what, kReasons[static_cast<int>(annual.kind)], ""});
     }
 
     /// An amount in the currency of that symbol, in the reference currency; empty when that has no answer.
@@ -185,6 +196,37 @@ private:
                           isHeld ? dateText(state->getEndDate()) : ""});
         }
         return table.isEmpty() ? "" : '\n' + table.toString();
+    }
+
+    /// Of each holding a row in its currency and, where that is another one, a row in the reference currency.
+    std::string gains() const
+    {
+        TextTable table({{"Gains, without costs"},
+                         {"Bought", kRight},
+                         {"Sold", kRight},
+                         {"Costs", kRight},
+                         {"Income", kRight},
+                         {"Realised", kRight},
+                         {"Unrealised", kRight},
+                         {""}});
+        auto figures = valuation_.figures().begin(); // of each, in the same order
+        for (const ShareState* state : valuation_.state().shareStates()) {
+            const HoldingFigures& holding = *figures++;
+            if (holding.isEmpty())
+                continue;
+            const std::string symbol = plain(state->getCurrencyRepresentation());
+            addGains(plain(state->getCompanyName()), holding.own, symbol, &table);
+            if (holding.inReference && symbol != referenceSymbol_)
+                addGains("", *holding.inReference, referenceSymbol_, &table);
+        }
+        return table.isEmpty() ? "" : '\n' + table.toString();
+    }
+
+    static void addGains(const std::string& name, const HoldingSums& sums, const std::string& symbol, TextTable* table)
+    {
+        table->addRow({name, amountText(sums.bought), amountText(sums.sold), amountText(sums.costs),
+                       amountText(sums.income), amountText(sums.realisedGain),
+                       sums.unrealisedGain ? amountText(*sums.unrealisedGain) : "", symbol});
     }
 
     std::string moves() const

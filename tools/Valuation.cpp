@@ -61,6 +61,22 @@ void Valuation::compute(const Date& date, bool previsions, bool evolution)
         evolution_ = evolutionByDate(wallet_, catalogue_);
 }
 
+void Valuation::computeReturns(const Date& date, const Date& from, bool previsions, bool evolution)
+{
+    hasEvolution_ = evolution;
+    EvolutionOutcome outcome;
+    state_ = refreshStates(wallet_, date, false, &outcome);
+    evolution_ = evolutionByDate(wallet_, catalogue_);
+    // Both before anything is simulated. An evolution that is refused leaves the day alone, which is told only to those
+    // who have asked for the days.
+    returns_ = Returns(wallet_, catalogue_, evolution_, state_->getFirstOperationDate(), from);
+    figures_ = holdingFigures(*state_, catalogue_, from);
+    if (previsions)
+        compute(date, previsions, evolution);
+    else if (evolution)
+        checkOutcome(outcome);
+}
+
 void Valuation::checkOutcome(EvolutionOutcome outcome) const
 {
     if (outcome == EvolutionOutcome::kBuilt)

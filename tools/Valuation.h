@@ -3,6 +3,8 @@
 #include "market/Catalogue.h"
 #include "portfolio/Wallet.h"
 #include "valuation/Evolution.h"
+#include "valuation/HoldingFigures.h"
+#include "valuation/Returns.h"
 #include "valuation/Totals.h"
 
 #include <string>
@@ -21,6 +23,10 @@ public:
     /// Values the portfolio on `date`, a valid one: with automatic sales when `previsions` is set, with every day from
     /// the first operation on when `evolution` is set. Comes before the queries below.
     void compute(const Date& date, bool previsions, bool evolution);
+    /// The same, with the returns and the figures of the holdings, which begin later than the first operation when
+    /// `from` is later. What the search for automatic sales makes up is no part of these: as it changes nothing in the
+    /// totals of the day, it changes no return.
+    void computeReturns(const Date& date, const Date& from, bool previsions, bool evolution);
 
     const Catalogue& catalogue() const { return catalogue_; }
     const Wallet& wallet() const { return wallet_; }
@@ -31,6 +37,11 @@ public:
     bool hasEvolution() const { return hasEvolution_; }
     /// By ascending date; empty without a reference currency.
     const std::vector<EvolutionPoint>& evolution() const { return evolution_; }
+
+    /// Empty without a reference currency, and when they have not been asked for.
+    const Returns& returns() const { return returns_; }
+    /// Of each holding of the state; none when they have not been asked for.
+    const std::vector<HoldingFigures>& figures() const { return figures_; }
 
     /// One line on a portfolio file that could be read but cannot be right; empty without a doubt.
     const std::string& doubt() const { return doubt_; }
@@ -48,4 +59,6 @@ private:
     const State* state_ = nullptr; // owned by the wallet
     bool hasEvolution_ = false;
     std::vector<EvolutionPoint> evolution_;
+    Returns returns_;
+    std::vector<HoldingFigures> figures_;
 };

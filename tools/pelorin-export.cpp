@@ -49,7 +49,7 @@ void describe(CLI::App& app, Arguments& arguments)
     app.add_option("MARKET_FILE", arguments.market, "Currencies, markets and companies with their quotes")->required();
     app.add_option("PORTFOLIO_FILE", arguments.portfolio, "Accounts and holdings with their operations");
     addText(app, "--to", arguments.folder, "FOLDER", "Folder to write into; made when it is missing")->required();
-    addDate(app, arguments.date, "Day of holdings, cash and journal; without it today");
+    addDate(app, "--date", arguments.date, "Day of holdings, cash and journal; without it today");
     app.add_option("--as", arguments.form, "What is written; see below")
         ->check(CLI::IsMember({kCsv, kLedger, kBeancount}))
         ->capture_default_str();

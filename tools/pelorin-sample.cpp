@@ -42,7 +42,7 @@ void describe(CLI::App& app, Arguments& arguments)
     app.footer(kOutput);
     addText(app, "FOLDER", arguments.folder, "TEXT",
             "Data folder, made when it is missing; without it the one that Pelorin keeps your files in");
-    addDate(app, arguments.date, "Day up to which there are quotes and rates; without it today");
+    addDate(app, "--date", arguments.date, "Day up to which there are quotes and rates; without it today");
     addText(app, "--quotes", arguments.quotes, "FOLDER",
             "Folder of tables TICKER.csv to write; made when it is missing");
     app.add_flag("--quiet", arguments.quiet, "Do not tell what was written");

@@ -16,17 +16,23 @@ const char* const kPurpose = "Values a Pelorin portfolio on a day.\n"
                              "Example: pelorin-value Companies/Sample PortoFolios/Sample --date 31/12/2024";
 
 const char* const kOutput = R"(The JSON is one object; dates are DD/MM/YYYY, and what has no value is null:
-  {"date", "reference", "totalDeposit", "totalValue", "profit", "annualRevenue", "firstOperationDate",
+  {"date", "reference", "totalDeposit", "totalValue", "profit", "annualRevenue", "moneyWeightedReturn",
+   "timeWeightedReturn", "firstOperationDate",
    "accounts": [{"name", "currency", "cash", "defaultTransfer"}],
-   "shares": [{"market", "ticker", "name", "quantity", "buyQuote", "quote", "endDate", "currency"}],
+   "shares": [{"market", "ticker", "name", "quantity", "buyQuote", "quote", "endDate", "currency",
+       "bought", "sold", "costs", "income", "realisedGain", "unrealisedGain",
+       "inReference": {the same six}}],
    "operations": [{"account", "type", "kind", "date", "automatic", and by type
        deposit:   "amount"
        transfer:  "recipient", "amount", "rateCost", "cost", "fromCurrencyQuote", "toCurrencyQuote"
        buy, sell: "market", "ticker", "quantity", "quote", "operationCost"}],
    "evolution": [{"date", "totalValue"}]}
 A kind is "deposit", "transfer", "buy", "sell", "income" or "charge"; of the last two the type is "transfer".
-The totals are in the reference currency, annualRevenue is a fraction per year; reference and currency
-are symbols. Transfers that --previsions has suggested are gone again with --evolution.
+The totals are in the reference currency, annualRevenue and the returns are fractions per year; reference
+and currency are symbols. A return is null when no rate says it, or several do; the tables say which.
+What was bought and sold, and the gains, are without the costs, in the currency of the holding and, each
+operation at the rate of its day, in the reference currency. Simulated sales are no part of them, nor of
+the returns. Transfers that --previsions has suggested are gone again with --evolution.
 
 Exit status: 0, 1 when a file cannot be read or the result not be written, 2 for bad arguments.)";
 
@@ -34,6 +40,7 @@ struct Arguments {
     std::string market;
     std::string portfolio;
     Date date = today();
+    Date from;
     bool previsions = false;
     bool evolution = false;
     bool json = false;
@@ -44,7 +51,9 @@ void describe(CLI::App& app, Arguments& arguments)
     app.footer(kOutput);
     app.add_option("MARKET_FILE", arguments.market, "Currencies, markets and companies with their quotes")->required();
     app.add_option("PORTFOLIO_FILE", arguments.portfolio, "Accounts and holdings with their operations")->required();
-    addDate(app, arguments.date, "Day to value the portfolio on; without it today");
+    addDate(app, "--date", arguments.date, "Day to value the portfolio on; without it today");
+    addDate(app, "--from", arguments.from,
+            "Begin the returns and the gains behind this day; without it with the first operation");
     app.add_flag("--previsions", arguments.previsions, "Search the automatic sales that the trend lines suggest");
     app.add_flag("--evolution", arguments.evolution,
                  "Also give the total value of every day since the first operation");
@@ -61,7 +70,7 @@ void checkOutput()
 void run(const Arguments& arguments)
 {
     Valuation valuation(arguments.market, arguments.portfolio);
-    valuation.compute(arguments.date, arguments.previsions, arguments.evolution);
+    valuation.computeReturns(arguments.date, arguments.from, arguments.previsions, arguments.evolution);
     if (arguments.json)
         writeJsonReport(valuation, stdout);
     else

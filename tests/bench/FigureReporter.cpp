@@ -23,6 +23,7 @@ constexpr Figure kFigures[] = {
     {"Evolution of 20 years", "BM_Files/evolve_20_years", nullptr, "ms", "< 1000"},
     {"Evolution, cost of a day, 10 / 20 years", "BM_Files/evolve_10_years", "BM_Files/evolve_20_years", "", "about 1"},
     {"Evolution, cost of a day, 40 / 20 years", "BM_Files/evolve_40_years", "BM_Files/evolve_20_years", "", "about 1"},
+    {"Returns of 20 years / their evolution", "BM_Evolved/returns_20_years", "BM_Files/evolve_20_years", "", "< 0.1"},
     {"A second valuation / the first", "BM_Files/evolve_again", "BM_Files/evolve_20_years", "", "< 0.7"},
     {"Full replay of a day / a day of the evolution", "BM_Files/replay", "BM_Files/evolve_20_years", "", ""},
     {"Memory of an evolution, per holding and day", "BM_Files/evolve_20_years", nullptr, "B", "< 250"},

@@ -21,6 +21,7 @@
 #include "tests/bench/FigureReporter.h"
 #include "tests/bench/GeneratedFiles.h"
 #include "valuation/Evolution.h"
+#include "valuation/Returns.h"
 #include "valuation/State.h"
 #include "views/OperationListView.h"
 
@@ -29,6 +30,7 @@
 #include <cstring>
 #include <memory>
 #include <string>
+#include <vector>
 
 namespace {
 
@@ -118,6 +120,25 @@ bool evolve(Portfolio& portfolio, const Files&)
 bool loadAndEvolve(Portfolio& portfolio, const Files& files)
 {
     return load(portfolio, files) && evolve(portfolio, files);
+}
+
+/// A portfolio with the daily values that its chart shows.
+struct Evolved : Portfolio {
+    std::vector<EvolutionPoint> points;
+};
+
+bool evolveToPoints(Evolved& subject, const Files& files)
+{
+    const bool isEvolved = loadAndEvolve(subject, files);
+    subject.points = evolutionByDate(subject.wallet, subject.catalogue);
+    return isEvolved && !subject.points.empty();
+}
+
+bool makeReturns(Evolved& subject, const Files&)
+{
+    const Returns returns(subject.wallet, subject.catalogue, subject.points, subject.points.front().date, {});
+    // The first operations buy more than there is, so that a time-weighted return is not known: it costs the same.
+    return returns.moneyWeighted.isKnown() && returns.timeWeighted.kind != AnnualReturn::Kind::kNoDay;
 }
 
 bool removeStates(Portfolio& portfolio, const Files&)
@@ -311,6 +332,7 @@ void measure(benchmark::State& state, const DataSize& size, double items, bool (
 }
 
 constexpr auto BM_Files = measure<Portfolio>;
+constexpr auto BM_Evolved = measure<Evolved>;
 constexpr auto BM_Undo = measure<Remembered>;
 constexpr auto BM_Window = measure<Desktop>;
 
@@ -329,6 +351,7 @@ PELORIN_BENCHMARK(BM_Files, remove_20_years, small(20), shareStatesOf(small(20))
 PELORIN_BENCHMARK(BM_Files, remove_40_years, small(40), shareStatesOf(small(40)), loadAndEvolve, removeStates);
 PELORIN_BENCHMARK(BM_Files, chart_small, small(20), 1, doNothing, makeChart);
 PELORIN_BENCHMARK(BM_Files, chart_large, kLarge, 1, doNothing, makeChart);
+PELORIN_BENCHMARK(BM_Evolved, returns_20_years, small(20), shareStatesOf(small(20)), evolveToPoints, makeReturns);
 PELORIN_BENCHMARK(BM_Undo, note_nothing, kLarge, 1, loadAndNote, note);
 PELORIN_BENCHMARK(BM_Undo, note_a_quote_of_15000, kLong, 1, loadAndNote, changeQuote);
 PELORIN_BENCHMARK(BM_Undo, remove_markets, kLarge, quotesOf(kLarge), loadAndNote, removeMarkets);

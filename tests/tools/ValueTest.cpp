@@ -71,7 +71,9 @@ protected:
 // 100 shares at 10 take 1000 + 1.70 + 29.95 = 1031.65, 40 at 12 give 480 - 0.816 - 29.95 = 449.234; the transfer takes
 // 200 and gives (200 * 0.99 - 5) / 2 = 96.5. Cash: 5000 - 200 - 1031.65 + 449.234 = 4217.584 and 1096.5, which is worth
 // 2193; shares: 60 * 12 = 720. So the value is 7130.584 of 7000 paid in, 130.584 more within 10 days: 36.525 * 130.584
-// / 7000 = 0.68137 a year. The last digits are those of the nearest floats.
+// / 7000 = 0.68137 a year. 5000 that grow by q a day for 10 days and 2000 for 9 are the value, and all of it is from
+// 7000 in 10 days: q to the power 365, and 7130.584 / 7000 to the power 36.5. The last digits are those of the nearest
+// floats.
 TEST_F(ValueTest, JsonIsWhatTheSumsByHandGive)
 {
     const float values[] = {5000, 7000, 6993, 6961.3501F, 7130.58398F}; // of the first days, and of the last
@@ -84,14 +86,20 @@ TEST_F(ValueTest, JsonIsWhatTheSumsByHandGive)
   "totalValue": 7130.58398,
   "profit": 130.583984,
   "annualRevenue": 0.681368589,
+  "moneyWeightedReturn": 1.00262177,
+  "timeWeightedReturn": 0.96330452,
   "firstOperationDate": "01/01/1999",
   "accounts": [
     {"name": "Cash", "currency": "EUR", "cash": 4217.58398, "defaultTransfer": false},
     {"name": "Café \"�", "currency": "USD", "cash": 1096.5, "defaultTransfer": true}
   ],
   "shares": [
-    {"market": "Paris", "ticker": "AC", "name": "Alpha", "quantity": 60, "buyQuote": 10.0, "quote": 12.0, "endDate": "04/04/1999", "currency": "EUR"},
-    {"market": "York", "ticker": "AC", "name": "Beta", "quantity": 0, "buyQuote": 0.0, "quote": 0.0, "endDate": null, "currency": "USD"}
+    {"market": "Paris", "ticker": "AC", "name": "Alpha", "quantity": 60, "buyQuote": 10.0, "quote": 12.0, "endDate": "04/04/1999", "currency": "EUR",
+     "bought": 1000.0, "sold": 480.0, "costs": 62.4160004, "income": 0.0, "realisedGain": 80.0, "unrealisedGain": 120.0,
+     "inReference": {"bought": 1000.0, "sold": 480.0, "costs": 62.4160004, "income": 0.0, "realisedGain": 80.0, "unrealisedGain": 120.0}},
+    {"market": "York", "ticker": "AC", "name": "Beta", "quantity": 0, "buyQuote": 0.0, "quote": 0.0, "endDate": null, "currency": "USD",
+     "bought": 0.0, "sold": 0.0, "costs": 0.0, "income": 0.0, "realisedGain": 0.0, "unrealisedGain": null,
+     "inReference": {"bought": 0.0, "sold": 0.0, "costs": 0.0, "income": 0.0, "realisedGain": 0.0, "unrealisedGain": null}}
   ],
   "operations": [
     {"account": "Cash", "type": "deposit", "kind": "deposit", "date": "01/01/1999", "automatic": false, "amount": 5000.0},
@@ -119,11 +127,13 @@ TEST_F(ValueTest, TableColumnsAreAsWideOnTheTerminalAsTheirTexts)
     trade(unquoted, cash_, 3, 5, 10); // which shows no gain
     EXPECT_EQ(value("--date 11/01/1999").out, R"(Portfolio on 11/01/1999, in Euro (EUR)
 
-Total Deposit      7,000.00  EUR
-Total Value        7,080.50  EUR
-Profit                80.50  EUR
-Annual Revenu         42.00  %
-First operation  01/01/1999
+Total Deposit            7,000.00  EUR
+Total Value              7,080.50  EUR
+Profit                      80.50  EUR
+Annual Revenu               42.00  %
+Money-weighted return       53.67  %
+Time-weighted return        51.79  %
+First operation        01/01/1999
 
 Account      Cash       Value in EUR
 Cash     4,167.50  EUR      4,167.50
@@ -133,6 +143,10 @@ Holding  Ticker  Market  Quantity  Bought at  Quote         Gain  Value in EUR  
 Alpha    AC      Paris         60      10.00  12.00  EUR  +20.0%        720.00  04/04/1999
 Beta??   AC      York           0              0.00  USD
 Gamma    GA      Paris          5      10.00   0.00  EUR                  0.00  04/04/1999
+
+Gains, without costs    Bought    Sold  Costs  Income  Realised  Unrealised
+Alpha                 1,000.00  480.00  62.42    0.00     80.00      120.00  EUR
+Gamma                    50.00    0.00   0.09    0.00      0.00              EUR
 )");
 }
 
@@ -156,6 +170,30 @@ Income and charges
 )"));
 }
 
+TEST_F(ValueTest, ReturnsAreOfTheRangeAndDoNotSeeSimulatedSales)
+{
+    fill();
+    setTrend(alpha, 30);
+    const auto returns = [this](const std::string& options) {
+        const auto report = json("--date 11/01/1999 " + options);
+        return report["moneyWeightedReturn"].dump() + ' ' + report["timeWeightedReturn"].dump();
+    };
+    const std::string all = returns("");
+    EXPECT_EQ(returns("--from 31/12/1998 --previsions --evolution"), all);
+    const std::string later = returns("--from 05/01/1999");
+    EXPECT_NE(later, all);
+    EXPECT_EQ(json("--date 11/01/1999 --from 05/01/1999")["shares"][0]["bought"], 0);
+    EXPECT_EQ(returns("--from 11/01/1999"), "null null");
+    EXPECT_THAT(value("--date 11/01/1999 --from 11/01/1999").out,
+                HasSubstr("Money-weighted return      no day\nTime-weighted return       no day\n"));
+    deposit(cash_, 1, -20000);
+    EXPECT_EQ(returns(""), "null null");
+    EXPECT_THAT(value("--date 11/01/1999").out,
+                HasSubstr("Money-weighted return  several rates\nTime-weighted return         no rate\n"));
+    deposit(cash_, -800000, 1); // too many days, which are told to those who ask for them
+    EXPECT_EQ(value("--date 11/01/1999").status, 0);
+}
+
 TEST_F(ValueTest, WhatHasNoValueIsNull)
 {
     auto report = json("--date 11/01/1999");
@@ -165,7 +203,8 @@ TEST_F(ValueTest, WhatHasNoValueIsNull)
 
     catalogue.setReferenceCurrency(nullptr);
     report = json("--date 11/01/1999 --evolution");
-    for (const char* key : {"reference", "totalDeposit", "totalValue", "profit", "annualRevenue"})
+    for (const char* key : {"reference", "totalDeposit", "totalValue", "profit", "annualRevenue", "moneyWeightedReturn",
+                            "timeWeightedReturn"})
         EXPECT_EQ(report.at(key), nullptr) << key;
     EXPECT_EQ(report["evolution"], Json::array());
     EXPECT_THAT(value("").out, HasSubstr("without totals: the market file has no reference currency\n\nFirst op"));

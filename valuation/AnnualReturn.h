@@ -1,0 +1,31 @@
+#pragma once
+
+#include <cmath>
+#include <limits>
+
+/// A return per year of 365 days, or why there is none.
+struct AnnualReturn {
+    enum class Kind {
+        kRate,         ///< `rate` is it
+        kNoDay,        ///< the range has no day
+        kNoRate,       ///< none above -100 % says how the values came about, or none that a number can hold
+        kSeveralRates, ///< several do
+    };
+
+    Kind kind = Kind::kNoDay;
+    double rate = 0; ///< a fraction: 0.05 for 5 %
+
+    AnnualReturn() = default;
+    explicit AnnualReturn(Kind why) : kind(why) {}
+    /// A gain of a few days can be beyond all numbers within a year. What reports write is a float.
+    explicit AnnualReturn(double fraction)
+    {
+        if (std::abs(fraction) <= std::numeric_limits<float>::max()) {
+            kind = Kind::kRate;
+            rate = fraction;
+        } else
+            kind = Kind::kNoRate;
+    }
+
+    bool isKnown() const { return kind == Kind::kRate; }
+};

@@ -1,0 +1,90 @@
+#include "valuation/Dividends.h"
+
+#include "foundation/NumberText.h"
+#include "market/Catalogue.h"
+#include "market/Company.h"
+#include "market/Currency.h"
+#include "market/Market.h"
+#include "market/NoteCompanyEvent.h"
+#include "portfolio/Account.h"
+#include "portfolio/CashMove.h"
+#include "portfolio/OperationKind.h"
+#include "portfolio/Wallet.h"
+
+#include <string>
+#include <string_view>
+
+namespace {
+
+constexpr const char* kTitle = "Dividend";
+
+/// Incomes of a day and a text, and the companies with such a note.
+struct Alike {
+    Dividends::Payment payment;
+    std::size_t incomes = 0;
+    std::vector<const Company*> payers = {}; // one for each note
+};
+
+using ByText = std::unordered_map<std::string, Alike>;
+
+std::string keyOf(const Date& date, std::string_view text)
+{
+    return std::string(date.toString().bytes()) + '\n' + std::string(text);
+}
+
+/// What the note of an income says: the effect on the account.
+std::string noteOf(const Account& account, double amount)
+{
+    const std::string symbol(account.getCurrencyRepresentation().bytes());
+    return amountText(amount) + (symbol.empty() ? "" : ' ' + symbol) + " to " + std::string(account.getName().bytes());
+}
+
+void takeIncomes(const Account& account, ByText* alike)
+{
+    if (account.currency() == nullptr)
+        return; // such an account is not replayed
+    for (const Operation* operation : account.operations()) {
+        if (kindOf(*operation) != OperationKind::kIncome)
+            continue;
+        const double amount = cashMove(*operation, account);
+        const Dividends::Payment payment{operation->getDate(), amount, account.currency()};
+        ++alike->try_emplace(keyOf(payment.date, noteOf(account, amount)), Alike{payment}).first->second.incomes;
+    }
+}
+
+void takeNotes(const Company& company, ByText* alike)
+{
+    for (const CompanyEvent* event : company.events()) {
+        const auto* note = dynamic_cast<const NoteCompanyEvent*>(event);
+        if (note == nullptr || note->getTitle() != kTitle)
+            continue;
+        const auto found = alike->find(keyOf(note->getDate(), note->getText().bytes()));
+        if (found != alike->end())
+            found->second.payers.push_back(&company);
+    }
+}
+
+} // namespace
+
+Dividends::Dividends(const Wallet& wallet, const Catalogue& catalogue)
+{
+    ByText alike;
+    for (const Account* account : wallet.accounts())
+        takeIncomes(*account, &alike);
+    if (alike.empty())
+        return;
+    for (const Market* market : catalogue.getMarkets())
+        for (const Company* company : market->companies())
+            takeNotes(*company, &alike);
+    for (const auto& [key, found] : alike)
+        if (found.payers.size() <= found.incomes)
+            for (const Company* payer : found.payers)
+                payments_[payer].push_back(found.payment);
+}
+
+const std::vector<Dividends::Payment>& Dividends::of(const Company& company) const
+{
+    static const std::vector<Payment> none;
+    const auto found = payments_.find(&company);
+    return found != payments_.end() ? found->second : none;
+}

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "foundation/Date.h"
+
+#include <unordered_map>
+#include <vector>
+
+class Catalogue;
+class Company;
+class Currency;
+class Wallet;
+
+/// The income of a wallet by the company that paid it.
+///
+/// A file has no link between them: the company has a note titled "Dividend" of the day, with the text that tells the
+/// amount and the account, as the window leaves it. Where more notes look alike than incomes do, none of these can be
+/// told to be of an income, and none counts.
+class Dividends {
+public:
+    struct Payment {
+        Date date;
+        double amount;            ///< what arrived
+        const Currency* currency; ///< that of the account; never null
+    };
+
+    Dividends(const Wallet& wallet, const Catalogue& catalogue);
+
+    /// Not in the order of the days.
+    const std::vector<Payment>& of(const Company& company) const;
+
+private:
+    std::unordered_map<const Company*, std::vector<Payment>> payments_;
+};

@@ -1,0 +1,159 @@
+#include "valuation/HoldingFigures.h"
+
+#include "market/Catalogue.h"
+#include "market/Company.h"
+#include "market/Currency.h"
+#include "market/Market.h"
+#include "portfolio/Share.h"
+#include "portfolio/ShareOperation.h"
+#include "portfolio/Wallet.h"
+#include "valuation/Dividends.h"
+#include "valuation/Holding.h"
+#include "valuation/ShareState.h"
+#include "valuation/State.h"
+
+#include <cmath>
+
+namespace {
+
+/// The value of one unit on a day: of `unit` in `measure`, or 1 for the holding's own currency. No number without a
+/// rate.
+struct Measure {
+    const Currency* unit;
+    const Currency* measure; // null for the unit's own
+
+    double on(const Date& day) const
+    {
+        return measure != nullptr ? static_cast<double>(unit->getRealQuote(day)) / measure->getRealQuote(day) : 1;
+    }
+};
+
+/// A holding replayed in one currency.
+class Replay {
+public:
+    Replay(const Share& share, const Wallet& wallet, const Measure& measure)
+        : share_(share), wallet_(wallet), measure_(measure)
+    {}
+
+    /// Takes in the operations up to `day` that are still to come.
+    void moveTo(const Date& day)
+    {
+        const auto operations = share_.shareOperations();
+        for (; next_ < operations.size() && operations[next_]->getDate() <= day; ++next_)
+            take(*operations[next_]);
+    }
+    /// The sums up to here, without income and what is not realised.
+    HoldingSums sums() const
+    {
+        HoldingSums sums = sums_;
+        sums.realisedGain = sums.sold - sums.bought + paidForRest();
+        return sums;
+    }
+    double paidForRest() const { return average_ * holding_.quantity; }
+
+private:
+    void take(const ShareOperation& trade)
+    {
+        const double rate = measure_.on(trade.getDate()), quantity = trade.getQuantity();
+        const double amount = rate * trade.getQuote() * quantity;
+        sums_.costs += amount * (trade.isBuy() ? wallet_.getBuyRateCost() : wallet_.getSellRateCost()) +
+                       rate * trade.getOperationCost();
+        (trade.isBuy() ? sums_.bought : sums_.sold) += amount;
+        if (!trade.isBuy()) {
+            holding_.sell(trade);
+            return;
+        }
+        // As `Holding` has it for the buy quote.
+        const double total = quantity + holding_.quantity;
+        if (total != 0)
+            average_ = (amount + average_ * holding_.quantity) / total;
+        holding_.buy(trade, wallet_.getInvestementPeriod());
+    }
+
+    const Share& share_;
+    const Wallet& wallet_;
+    Measure measure_;
+    Holding holding_;
+    double average_ = 0; // purchase price
+    std::size_t next_ = 0;
+    HoldingSums sums_;
+};
+
+HoldingSums difference(const HoldingSums& end, const HoldingSums& begin)
+{
+    return {end.bought - begin.bought,
+            end.sold - begin.sold,
+            end.costs - begin.costs,
+            0,
+            end.realisedGain - begin.realisedGain,
+            {}};
+}
+
+/// The income within the range, each payment at the rates of its day.
+double incomeOf(const std::vector<Dividends::Payment>& payments, const Date& from, const Date& to,
+                const Currency& measure)
+{
+    double sum = 0;
+    for (const Dividends::Payment& payment : payments)
+        if (payment.date > from && payment.date <= to) {
+            const bool isSame = payment.currency == &measure;
+            sum += payment.amount * (isSame ? 1 : Measure{payment.currency, &measure}.on(payment.date));
+        }
+    return sum;
+}
+
+HoldingSums sumsOf(const ShareState& state, const Date& from, const Measure& measure)
+{
+    const Date day = state.getDate();
+    Replay replay(*state.share(), *state.state()->wallet(), measure);
+    if (!from.isUndefined())
+        replay.moveTo(from < day ? from : day);
+    const HoldingSums begin = replay.sums();
+    replay.moveTo(day);
+    HoldingSums sums = difference(replay.sums(), begin);
+    if (state.isHeld() && state.share()->company() != nullptr && state.share()->company()->getNbrQuotes() > 0)
+        sums.unrealisedGain = state.worth() * measure.on(day) - replay.paidForRest();
+    return sums;
+}
+
+bool isKnown(const HoldingSums& sums)
+{
+    return std::isfinite(sums.realisedGain) && std::isfinite(sums.income) &&
+           std::isfinite(sums.unrealisedGain.value_or(0));
+}
+
+HoldingFigures figuresOf(const ShareState& state, const Catalogue& catalogue, const Dividends& dividends,
+                         const Date& from)
+{
+    if (state.share() == nullptr)
+        return {};
+    HoldingFigures figures{sumsOf(state, from, {}), {}};
+    const Company* company = state.share()->company();
+    const Currency* currency =
+        company != nullptr && company->market() != nullptr ? company->market()->currency() : nullptr;
+    if (currency == nullptr)
+        return figures;
+    const auto& payments = dividends.of(*company);
+    figures.own.income = incomeOf(payments, from, state.getDate(), *currency);
+    const Currency* reference = catalogue.getReferenceCurrency();
+    if (reference == nullptr || currency->getNbrQuotes() == 0)
+        return figures;
+    HoldingSums sums = sumsOf(state, from, {currency, reference});
+    sums.income = incomeOf(payments, from, state.getDate(), *reference);
+    if (isKnown(sums))
+        figures.inReference = sums;
+    return figures;
+}
+
+} // namespace
+
+std::vector<HoldingFigures> holdingFigures(const State& state, const Catalogue& catalogue, const Date& from)
+{
+    std::vector<HoldingFigures> figures;
+    if (state.wallet() == nullptr)
+        return figures;
+    const Dividends dividends(*state.wallet(), catalogue);
+    for (const ShareState* share : state.shareStates())
+        figures.push_back(figuresOf(*share, catalogue, dividends, from));
+    return figures;
+}
