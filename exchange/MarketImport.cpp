@@ -71,28 +71,6 @@ std::string tickerOf(const std::string& path)
     return name;
 }
 
-/// The latest day of all values; the undefined one without any.
-template <class Series>
-PackedDate lastDayOf(const Series& all)
-{
-    PackedDate last;
-    for (const auto& series : all)
-        for (const DatedValue& value : series.values)
-            last = std::max(last, value.day);
-    return last;
-}
-
-/// The same of the earliest.
-template <class Series>
-PackedDate firstDayOf(const Series& all)
-{
-    PackedDate first = lastDayOf(all);
-    for (const auto& series : all)
-        for (const DatedValue& value : series.values)
-            first = std::min(first, value.day);
-    return first;
-}
-
 template <class Series>
 bool hasValues(const Series& all)
 {
@@ -307,41 +285,12 @@ MarketPlan MarketImport::plan()
     if (!hasValues(plan_.quotes) && !hasValues(plan_.rates))
         throw std::runtime_error("there is no usable quote or rate in the input");
     // Until here the values are only gathered, in the order of the lines.
-    giveReferenceItsRates();
+    plan_.giveReferenceItsRates(places_.ratesOf(plan_.reference)->values);
     checkRates();
-    latestDay_ = std::max(lastDayOf(plan_.quotes), lastDayOf(plan_.rates)).date();
+    latestDay_ = plan_.lastDay().date();
     plan_.settle();
     plan_.dropUnused();
     return std::move(plan_);
-}
-
-/// The reference is worth 1 on every day for which any rate has come, where it has no value yet. Without rates one day
-/// is enough, the first of the quotes, since a single quote holds for ever; that is only done for a reference that is
-/// new or in which something is quoted. A reference with other rates of its own is left alone: its owner means
-/// something by them.
-void MarketImport::giveReferenceItsRates()
-{
-    Currency& reference = *plan_.reference;
-    std::vector<DatedValue>& ones = places_.ratesOf(&reference)->values;
-    if (!std::ranges::all_of(reference.quotes(), [](const auto* rate) { return rate->getValue() == 1; }))
-        return;
-    std::vector<PackedDate> days;
-    for (const auto& rates : plan_.rates)
-        for (const DatedValue& rate : rates.values)
-            days.push_back(rate.day);
-    const auto isInReference = [&](const auto& quotes) {
-        return quotes.currency == &reference && !quotes.values.empty();
-    };
-    const bool isNew = !plan_.newCurrencies.empty() && plan_.newCurrencies.front().get() == &reference;
-    const bool isNamed = isNew || std::ranges::any_of(plan_.quotes, isInReference);
-    if (days.empty() && reference.getNbrQuotes() == 0 && isNamed)
-        days.push_back(firstDayOf(plan_.quotes));
-    std::ranges::sort(days);
-    days.erase(std::unique(days.begin(), days.end()), days.end());
-    // What the tables themselves say of the reference is 1 as well, so that the days alone tell all.
-    ones.clear();
-    for (const PackedDate& day : days)
-        ones.push_back({day, 1});
 }
 
 void MarketImport::checkRates() const

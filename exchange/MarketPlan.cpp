@@ -73,7 +73,57 @@ void bringIn(SeriesValues<Owner>& series)
     std::vector<DatedValue>().swap(series.values);
 }
 
+/// The latest day of all values; the undefined one without any.
+template <class Series>
+PackedDate lastDayOf(const Series& all)
+{
+    PackedDate last;
+    for (const auto& series : all)
+        for (const DatedValue& value : series.values)
+            last = std::max(last, value.day);
+    return last;
+}
+
+/// The same of the earliest.
+template <class Series>
+PackedDate firstDayOf(const Series& all)
+{
+    PackedDate first = lastDayOf(all);
+    for (const auto& series : all)
+        for (const DatedValue& value : series.values)
+            first = std::min(first, value.day);
+    return first;
+}
+
 } // namespace
+
+void MarketPlan::giveReferenceItsRates(std::vector<DatedValue>& ones)
+{
+    if (!std::ranges::all_of(reference->quotes(), [](const auto* rate) { return rate->getValue() == 1; }))
+        return;
+    std::vector<PackedDate> days;
+    for (const auto& series : rates)
+        for (const DatedValue& rate : series.values)
+            days.push_back(rate.day);
+    const auto isInReference = [&](const auto& series) {
+        return series.currency == reference && !series.values.empty();
+    };
+    const bool isNew = !newCurrencies.empty() && newCurrencies.front().get() == reference;
+    const bool isNamed = isNew || std::ranges::any_of(quotes, isInReference);
+    if (days.empty() && reference->getNbrQuotes() == 0 && isNamed)
+        days.push_back(firstDayOf(quotes));
+    std::ranges::sort(days);
+    days.erase(std::unique(days.begin(), days.end()), days.end());
+    // What the tables themselves say of the reference is 1 as well, so that the days alone tell all.
+    ones.clear();
+    for (const PackedDate& day : days)
+        ones.push_back({day, 1});
+}
+
+PackedDate MarketPlan::lastDay() const
+{
+    return std::max(lastDayOf(quotes), lastDayOf(rates));
+}
 
 void MarketPlan::settle()
 {
