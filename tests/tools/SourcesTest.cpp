@@ -200,6 +200,22 @@ TEST_F(SourcesTest, ATickerIsAskedForOnceADay)
     EXPECT_EQ(std::ranges::count(folder_.content("asked"), '\n'), 3) << "what is no ticker is not passed on";
 }
 
+TEST_F(SourcesTest, AHistoryIsWhatHasComeAndWhatWasThere)
+{
+    folder_.write("q/A.csv", "2026-01-01,7\n");
+    const ServerRun server(PELORIN_QUOTES, folder_ / "q", 0, command("days", "echo 2026-01-02,8; echo 2026-01-05,9"));
+    const QuoteServers before = quoteServers();
+    quoteServers() = {"localhost", "localhost", server.port(), std::chrono::seconds(20)};
+    Market market("NYSE");
+    auto* company = new Company(&market, "Company", "A"); // owned by the market
+    EXPECT_EQ(company->setInternetLastThreeMonthsQuote(), 0);
+    quoteServers() = before;
+    std::vector<float> closes;
+    for (const auto* quote : company->quotes())
+        closes.push_back(quote->getValue());
+    EXPECT_THAT(closes, ElementsAre(7, 8, 9));
+}
+
 TEST_F(SourcesTest, ABadSourceLeavesTheLastClose)
 {
     const struct {
