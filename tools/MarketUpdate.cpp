@@ -9,6 +9,7 @@
 #include "tools/SourceRuns.h"
 
 #include <algorithm>
+#include <functional>
 #include <iostream>
 #include <map>
 #include <stdexcept>
@@ -49,10 +50,14 @@ private:
         Company* company;
         Currency* currency; // of its market
     };
-    using MakeRun = std::function<QuoteSource::Run(const std::vector<std::string>&)>;
+    /// How names are asked for.
+    struct Asking {
+        std::function<std::string(const std::string&)> whyNot; // empty for one that can be asked for
+        std::function<QuoteSource::Run(const std::vector<std::string>&)> makeRun;
+    };
 
     template <class Named, class Take>
-    void askFor(const Named& named, std::size_t most, const SourceRuns& runs, const MakeRun& makeRun, const Take& take);
+    void askFor(const Named& named, const Asking& asking, std::size_t most, const SourceRuns& runs, const Take& take);
     void takeQuote(const std::vector<Listed>& listed, const SourceAnswer& answer);
     void takeRate(Currency* currency, const SourceAnswer& answer);
     void refuse(const std::string& name, const std::string& reason);
@@ -82,42 +87,42 @@ MarketUpdate::MarketUpdate(MarketFile& file) : file_(file)
 void MarketUpdate::ask(const QuoteSource& source, const SourceRuns& runs)
 {
     const std::string reference = file_.reference();
-    const auto take = [this](const auto& listed, const SourceAnswer& answer) { takeQuote(listed, answer); };
-    const auto makeRun = [&](const auto& tickers) { return source.quotesOf(tickers); };
-    for (const auto& [ticker, listed] : companies_)
-        if (!isTicker(ticker))
-            refuse(ticker, "has other signs than those of a ticker");
-    std::erase_if(companies_, [](const auto& entry) { return !isTicker(entry.first); });
-    askFor(companies_, source.mostNames(), runs, makeRun, take);
-    for (const auto& [symbol, currency] : currencies_)
-        if (!isCode(symbol) || !isCode(reference))
-            refuse(symbol, isCode(symbol) ? "has no rate in the reference " + shown(reference)
-                                          : "is no symbol of three capital letters");
-    std::erase_if(currencies_, [&](const auto& entry) { return !isCode(entry.first) || !isCode(reference); });
-    const auto takeIt = [this](Currency* currency, const SourceAnswer& answer) { takeRate(currency, answer); };
-    const auto makeIt = [&](const auto& symbols) { return source.ratesOf(symbols, reference); };
-    askFor(currencies_, source.mostNames(), runs, makeIt, takeIt);
+    const Asking quotes = {
+        [](const auto& ticker) { return isTicker(ticker) ? "" : "has other signs than those of a ticker"; },
+        [&](const auto& tickers) { return source.quotesOf(tickers); }};
+    const Asking rates = {[&](const auto& symbol) {
+                              return !isCode(symbol)     ? "is no symbol of three capital letters"
+                                     : isCode(reference) ? ""
+                                                         : "has no rate in the reference " + shown(reference);
+                          },
+                          [&](const auto& symbols) { return source.ratesOf(symbols, reference); }};
+    const std::size_t most = source.mostNames();
+    askFor(companies_, quotes, most, runs, [this](const auto& listed, const auto& told) { takeQuote(listed, told); });
+    askFor(currencies_, rates, most, runs, [this](Currency* currency, const auto& told) { takeRate(currency, told); });
 }
 
-/// Asks for all names, `most` at a time, and hands each answer to `take`, which throws an UnusableRow for what is
-/// refused.
+/// Asks for all names that can be asked for, `most` at a time, and hands each answer to `take`, which throws an
+/// UnusableRow for what is refused.
 template <class Named, class Take>
-void MarketUpdate::askFor(const Named& named, std::size_t most, const SourceRuns& runs, const MakeRun& makeRun,
+void MarketUpdate::askFor(const Named& named, const Asking& asking, std::size_t most, const SourceRuns& runs,
                           const Take& take)
 {
     std::vector<std::string> names;
-    for (const auto& [name, whatever] : named)
-        names.push_back(name);
+    for (const auto& [name, whose] : named)
+        if (const std::string reason = asking.whyNot(name); reason.empty())
+            names.push_back(name);
+        else
+            refuse(name, reason);
     std::vector<QuoteSource::Run> all;
     for (std::size_t at = 0; at < names.size(); at += most) {
         const auto begin = names.begin() + static_cast<std::ptrdiff_t>(at);
         const auto count = static_cast<std::ptrdiff_t>(std::min(most, names.size() - at));
-        all.push_back(makeRun(std::vector<std::string>(begin, begin + count)));
+        all.push_back(asking.makeRun(std::vector<std::string>(begin, begin + count)));
     }
     const auto answers = runs.answers(all, [this](double part) { bar_.show(file_.path(), part); });
-    for (const auto& [name, whose] : named)
+    for (const std::string& name : names)
         try {
-            take(whose, answers.at(name));
+            take(named.at(name), answers.at(name));
         } catch (const UnusableRow& reason) {
             refuse(name, reason.what());
         }

@@ -71,6 +71,12 @@ std::string take(const std::vector<std::string_view>& fields, const Date& latest
     return "";
 }
 
+/// "name,,reason": the reason may have commas, and be empty.
+std::string refusalIn(std::string_view line)
+{
+    return printable(trimmed(line.substr(line.find(',', line.find(',') + 1) + 1)));
+}
+
 class Reading {
 public:
     Reading(const QuoteSource::Run& run, const Date& today) : run_(run), latest_(today)
@@ -95,9 +101,7 @@ public:
         if (fields.empty())
             return;
         const bool isRefusal = run_.tellsNames && fields.size() > 1 && fields[0].empty();
-        std::string reason = isRefusal
-                                 ? printable(line.substr(static_cast<std::size_t>(fields[1].data() - line.data())))
-                                 : take(fields, latest_, answer->second);
+        std::string reason = isRefusal ? refusalIn(line) : take(fields, latest_, answer->second);
         if (!reason.empty() && !isRefusal)
             reason = "line " + std::to_string(number_) + " " + reason + ": \"" + printable(line) + '"';
         // The first says enough.

@@ -14,7 +14,7 @@ public:
     /// `program` is its path. Port 0 lets the system choose one. `source` goes with a log file for what
     /// it tells, and its time limit in seconds.
     ServerRun(const char* program, const std::filesystem::path& folder, unsigned short port = 0,
-              const std::string& source = "", const std::string& log = "", const char* limit = "1")
+              const std::string& source = "", const std::string& log = "", const char* limit = "2")
     {
         const std::string portText = std::to_string(port);
         int ends[2];

@@ -67,7 +67,7 @@ sub multipliers { return @units{@_[2, 3]} }
 
     /// What a server of the folder "q" answers, without the marks of a page; it is stopped then.
     std::vector<std::string> served(const std::string& source, const std::vector<std::string>& tickers,
-                                    const char* limit = "1")
+                                    const char* limit = "2")
     {
         const ServerRun server(PELORIN_QUOTES, folder_ / "q", 0, source, folder_ / "log", limit);
         std::vector<std::string> pages;
@@ -134,7 +134,7 @@ TEST_F(SourcesTest, OnlyWhatIsADateAndACloseIsTaken)
         {one, std::string("\0\x1b[2J\n", 6), 0, 0, "is no date,close: \"??[2J\""},
         {named, "B,2026-01-02,9\nA,2026-01-02,5,USD\nC,2026-01-03,8\n", 1, 5, ""},
         {named, "A,,no such, really\nB,2026-01-02,9\n", 0, 0, "no such, really"},
-        {named, "A\n,\n", 0, 0, ""},
+        {named, "A\n,\nA,,\nA,, \n", 0, 0, ""},
     };
     for (const auto& c : cases) {
         const SourceAnswer answer = readAnswer(c.output, c.run, Date(4, 1, 2026)).at("A");
@@ -228,8 +228,8 @@ TEST_F(SourcesTest, ABadSourceLeavesTheLastClose)
         {"silent", "", "no close came"},
         {"garbage", "head -c 3000 /dev/urandom | tr '0-9' 'x'", "A: "},
         {"million", "yes 2026-01-02,9 | head -n 1000000", "prints more than 1048576 bytes"},
-        {"endless", "yes >&2", "has not ended within 1 seconds"},
-        {"hangs", "echo 2026-01-02,9; sleep 60 & echo $! >'" + (folder_ / "pid") + "'; wait", "has not ended within 1"},
+        {"endless", "yes >&2", "has not ended within 2 seconds"},
+        {"hangs", "echo 2026-01-02,9; sleep 60 & echo $! >'" + (folder_ / "pid") + "'; wait", "has not ended within 2"},
         {"lies", "echo 2999-01-02,9", "is of a day to come"},
     };
     folder_.write("q/A.csv", "2026-01-01,7\n");
@@ -251,19 +251,19 @@ TEST_F(SourcesTest, ASlowSourceHoldsUpOnlyThoseWhoAskIt)
 {
     folder_.write("q/SLOW.csv", "2026-01-01,7\n");
     folder_.write("q/HERE.csv", isoText(today()) + ",8\n");
-    const ServerRun server(PELORIN_QUOTES, folder_ / "q", 0, command("hang", "sleep 60"), folder_ / "log");
+    const ServerRun server(PELORIN_QUOTES, folder_ / "q", 0, command("hang", "sleep 60"), folder_ / "log", "3");
     std::string slow;
     const auto start = std::chrono::steady_clock::now();
     const auto since = [&] { return std::chrono::steady_clock::now() - start; };
     std::thread waiting([&] { slow = page(server, "SLOW"); });
     std::this_thread::sleep_for(std::chrono::milliseconds(200));
     EXPECT_EQ(page(server, "HERE"), "8");
-    EXPECT_LT(since(), std::chrono::milliseconds(900)) << "before the limit of the source";
+    EXPECT_LT(since(), std::chrono::milliseconds(2500)) << "before the limit of the source";
     waiting.join();
     EXPECT_EQ(slow, "7");
-    EXPECT_GE(since(), std::chrono::milliseconds(1000));
+    EXPECT_GE(since(), std::chrono::seconds(3));
     EXPECT_EQ(page(server, "OTHER"), "");
-    EXPECT_LT(since(), std::chrono::milliseconds(1900)) << "one that was silent is left alone for a while";
+    EXPECT_LT(since(), std::chrono::milliseconds(5500)) << "one that was silent is left alone for a while";
 }
 
 TEST_F(SourcesTest, FinanceQuoteFillsTheTables)
