@@ -160,7 +160,7 @@ void ChildProgram::takeStatus(int status)
                                  : "was ended by signal " + std::to_string(WTERMSIG(status));
     const std::size_t first = complaint_.find_first_not_of(" \t\r\n");
     if (first != complaint_.npos)
-        failure_ += ": " + printable(complaint_.substr(first, complaint_.find_first_of("\r\n", first) - first));
+        failure_ += ": " + toldBy(complaint_.substr(first, complaint_.find_first_of("\r\n", first) - first));
 }
 
 /// The number of a process is not given to another one before it is reaped, so that the group is the right one.
@@ -171,4 +171,20 @@ void ChildProgram::killAll()
     kill(-process_, SIGKILL);
     waitpid(process_, nullptr, 0);
     process_ = 0;
+}
+
+/// Word by word, since an address in it may be long, and what comes behind that tells the reason.
+std::string toldBy(std::string_view text)
+{
+    constexpr std::string_view kBlanks = " \t\r\n";
+    constexpr std::size_t kLongest = 300;
+    std::string told;
+    for (std::size_t at = 0; (at = text.find_first_not_of(kBlanks, at)) != text.npos;) {
+        const std::size_t end = std::min(text.find_first_of(kBlanks, at), text.size());
+        if (told.size() > kLongest)
+            return told + " ...";
+        (told += told.empty() ? "" : " ") += printable(text.substr(at, end - at));
+        at = end;
+    }
+    return told;
 }

@@ -7,6 +7,7 @@
 #include <optional>
 #include <poll.h>
 #include <string>
+#include <string_view>
 #include <sys/types.h>
 #include <vector>
 
@@ -57,3 +58,6 @@ private:
     std::string failure_;
     bool hasTimedOut_ = false;
 };
+
+/// What a program has said, as one line for a person: printable, and cut where nobody would read on.
+std::string toldBy(std::string_view text);

@@ -18,7 +18,7 @@ open(my $answer, '>&', \*STDOUT) or die "standard output cannot be used: $!\n";
 open(STDOUT, '>&', \*STDERR) or die "standard error cannot be used: $!\n";
 $answer->autoflush(1);
 eval { require Finance::Quote; 1 }
-    or die "the Perl library Finance::Quote cannot be used; Debian has it as libfinance-quote-perl\n";
+    or die "the Perl library Finance::Quote is missing; Debian has it as libfinance-quote-perl\n";
 my ($what, $how, @names) = @ARGV;
 my (undef, undef, undef, $day, $month, $year) = localtime;
 my $today = sprintf '%04d-%02d-%02d', $year + 1900, $month + 1, $day;

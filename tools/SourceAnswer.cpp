@@ -74,7 +74,7 @@ std::string take(const std::vector<std::string_view>& fields, const Date& latest
 /// "name,,reason": the reason may have commas, and be empty.
 std::string refusalIn(std::string_view line)
 {
-    return printable(trimmed(line.substr(line.find(',', line.find(',') + 1) + 1)));
+    return toldBy(line.substr(line.find(',', line.find(',') + 1) + 1));
 }
 
 class Reading {

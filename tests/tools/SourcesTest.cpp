@@ -47,7 +47,7 @@ sub worked {
         die "a module that breaks\n" if $ticker eq 'DIES';
         sleep 60 if $ticker eq 'HANGS';
         $of{$ticker, 'success'} = $ticker ne 'NONE';
-        $of{$ticker, 'errormsg'} = 'unknown, there';
+        $of{$ticker, 'errormsg'} = 'unknown, there: which takes more than a few words to tell to the end';
         $of{$ticker, $ticker eq 'FUND' ? 'nav' : 'last'} = $ticker eq 'LIES' ? 'free' : 12.5;
         $of{$ticker, 'close'} = 1;
         $of{$ticker, 'currency'} = $ticker eq 'POUND' ? 'GBP' : 'USD';
@@ -271,7 +271,7 @@ TEST_F(SourcesTest, FinanceQuoteFillsTheTables)
     EXPECT_THAT(served("finance-quote:worked", {"IBM", "FUND", "NONE", "LIES", "DIES", "HANGS"}, "4"),
                 ElementsAre("12 <sup>1</sup>/<sub>2</sub>", "12 <sup>1</sup>/<sub>2</sub>", "", "", "", ""));
     EXPECT_EQ(folder_.content("q/IBM.csv"), "Date,Close\n2026-01-02,12.5\n");
-    EXPECT_EQ(folder_.content("log"), "NONE: unknown, there\n"
+    EXPECT_EQ(folder_.content("log"), "NONE: unknown, there: which takes more than a few words to tell to the end\n"
                                       "LIES: line 1 is no date,close: \"LIES,2026-01-02,free,USD\"\n"
                                       "DIES: a module that breaks\n"
                                       "HANGS: has not ended within 4 seconds\n");
@@ -291,7 +291,8 @@ TEST_F(SourcesTest, AnUpdateBringsTheLatestIntoTheMarketFile)
     const ToolRun run(PELORIN_QUOTES, "--update f --source finance-quote:worked", folder_);
     EXPECT_EQ(run.status, 0);
     EXPECT_EQ(run.out, "quotes: 2 new, 0 changed, 1 equal\nrates: 1 new, 0 changed, 0 equal\nrefused: 5\n");
-    EXPECT_EQ(run.err, "a;b: has other signs than those of a ticker\nNONE: unknown, there\n"
+    EXPECT_EQ(run.err, "a;b: has other signs than those of a ticker\nNONE: unknown, there: which takes more than a few "
+                       "words to tell to the end\n"
                        "POUND: comes in \"GBP\", and its market trades in \"USD\"\n"
                        "X: comes in \"USD\", and its market trades in \"EUR\"\nCHF: has no rate\n");
     MarketFile file(folder_ / "f");
