@@ -18,6 +18,7 @@ public:
     /// whole.
     explicit MarketFile(const std::string& path);
 
+    const std::string& path() const { return file_.path(); }
     Catalogue& catalogue() { return catalogue_; }
     /// The symbol of the reference as the file names it, even when it has no currency of that symbol; empty when it
     /// names none.

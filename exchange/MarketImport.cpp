@@ -72,18 +72,6 @@ std::string tickerOf(const std::string& path)
     return name;
 }
 
-/// The earliest and the latest day of all values; undefined ones without any.
-template <class Series>
-std::pair<PackedDate, PackedDate> daysOf(const Series& all)
-{
-    std::optional<std::pair<PackedDate, PackedDate>> days;
-    for (const auto& series : all)
-        for (const DatedValue& value : series.values)
-            days = days ? std::pair(std::min(days->first, value.day), std::max(days->second, value.day))
-                        : std::pair(value.day, value.day);
-    return days.value_or(std::pair<PackedDate, PackedDate>());
-}
-
 template <class Series>
 bool hasValues(const Series& all)
 {
@@ -298,41 +286,12 @@ MarketPlan MarketImport::plan()
     if (!hasValues(plan_.quotes) && !hasValues(plan_.rates))
         throw std::runtime_error("there is no usable quote or rate in the input");
     // Until here the values are only gathered, in the order of the lines.
-    giveReferenceItsRates();
+    plan_.giveReferenceItsRates(places_.ratesOf(plan_.reference)->values);
     checkRates();
-    latestDay_ = std::max(daysOf(plan_.quotes).second, daysOf(plan_.rates).second).date();
+    latestDay_ = plan_.lastDay().date();
     plan_.settle();
     plan_.dropUnused();
     return std::move(plan_);
-}
-
-/// The reference is worth 1 on every day for which any rate has come, where it has no value yet. Without rates one day
-/// is enough, the first of the quotes, since a single quote holds for ever; that is only done for a reference that is
-/// new or in which something is quoted. A reference with other rates of its own is left alone: its owner means
-/// something by them.
-void MarketImport::giveReferenceItsRates()
-{
-    Currency& reference = *plan_.reference;
-    std::vector<DatedValue>& ones = places_.ratesOf(&reference)->values;
-    if (!std::ranges::all_of(reference.quotes(), [](const auto* rate) { return rate->getValue() == 1; }))
-        return;
-    std::vector<PackedDate> days;
-    for (const auto& rates : plan_.rates)
-        for (const DatedValue& rate : rates.values)
-            days.push_back(rate.day);
-    const auto isInReference = [&](const auto& quotes) {
-        return quotes.currency == &reference && !quotes.values.empty();
-    };
-    const bool isNew = !plan_.newCurrencies.empty() && plan_.newCurrencies.front().get() == &reference;
-    const bool isNamed = isNew || std::ranges::any_of(plan_.quotes, isInReference);
-    if (days.empty() && reference.getNbrQuotes() == 0 && isNamed)
-        days.push_back(daysOf(plan_.quotes).first);
-    std::ranges::sort(days);
-    days.erase(std::unique(days.begin(), days.end()), days.end());
-    // What the tables themselves say of the reference is 1 as well, so that the days alone tell all.
-    ones.clear();
-    for (const PackedDate& day : days)
-        ones.push_back({day, 1});
 }
 
 void MarketImport::checkRates() const

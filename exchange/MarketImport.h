@@ -81,7 +81,6 @@ private:
 
     bool areUnits(const Table& rates, const std::string& path) const;
     SeriesValues<Company>* companyOf(const Table& row, const std::string& ticker);
-    void giveReferenceItsRates();
     void checkRates() const;
 
     ImportOptions options_;

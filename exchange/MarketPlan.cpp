@@ -3,6 +3,8 @@
 #include "market/Catalogue.h"
 
 #include <algorithm>
+#include <optional>
+#include <utility>
 
 namespace {
 
@@ -73,7 +75,47 @@ void bringIn(SeriesValues<Owner>& series)
     std::vector<DatedValue>().swap(series.values);
 }
 
+/// The earliest and the latest day of all values; undefined ones without any.
+template <class Series>
+std::pair<PackedDate, PackedDate> daysOf(const Series& all)
+{
+    std::optional<std::pair<PackedDate, PackedDate>> days;
+    for (const auto& series : all)
+        for (const DatedValue& value : series.values)
+            days = days ? std::pair(std::min(days->first, value.day), std::max(days->second, value.day))
+                        : std::pair(value.day, value.day);
+    return days.value_or(std::pair<PackedDate, PackedDate>());
+}
+
 } // namespace
+
+void MarketPlan::giveReferenceItsRates(std::vector<DatedValue>& ones)
+{
+    if (!std::ranges::all_of(reference->quotes(), [](const auto* rate) { return rate->getValue() == 1; }))
+        return;
+    std::vector<PackedDate> days;
+    for (const auto& series : rates)
+        for (const DatedValue& rate : series.values)
+            days.push_back(rate.day);
+    const auto isInReference = [&](const auto& series) {
+        return series.currency == reference && !series.values.empty();
+    };
+    const bool isNew = !newCurrencies.empty() && newCurrencies.front().get() == reference;
+    const bool isNamed = isNew || std::ranges::any_of(quotes, isInReference);
+    if (days.empty() && reference->getNbrQuotes() == 0 && isNamed)
+        days.push_back(daysOf(quotes).first);
+    std::ranges::sort(days);
+    days.erase(std::unique(days.begin(), days.end()), days.end());
+    // What the tables themselves say of the reference is 1 as well, so that the days alone tell all.
+    ones.clear();
+    for (const PackedDate& day : days)
+        ones.push_back({day, 1});
+}
+
+PackedDate MarketPlan::lastDay() const
+{
+    return std::max(daysOf(quotes).second, daysOf(rates).second);
+}
 
 void MarketPlan::settle()
 {

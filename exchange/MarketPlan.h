@@ -51,6 +51,17 @@ public:
 
     bool isEmpty() const { return quotes.empty() && rates.empty(); }
 
+    /// Gives the reference the rate 1 where it needs it; to be called when all other values are there.
+    ///
+    /// It is worth 1 on every day for which any rate has come, where it has no value yet. Without rates one day is
+    /// enough, the first of the quotes, since a single quote holds for ever; that is only done for a reference that is
+    /// new or in which something is quoted. A reference with other rates of its own is left alone: its owner means
+    /// something by them.
+    /// @param ones the values of the reference among `rates`.
+    void giveReferenceItsRates(std::vector<DatedValue>& ones);
+    /// The latest day of all values; undefined without any.
+    PackedDate lastDay() const;
+
     /// Sorts the values and counts them, and drops those of a day for which a later line has another, and those that
     /// change nothing.
     void settle();

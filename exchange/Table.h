@@ -63,6 +63,11 @@ public:
     /// The fields of the header line as they stand; none without one. And the one that a column stands under.
     const std::vector<std::string>& headings() const { return headings_; }
     std::string heading(Column column) const;
+    /// The place of a column in the rows, counted from 0; of one that is there.
+    std::size_t index(Column column) const { return place(column); }
+    char separator() const { return reader_.separator(); }
+    /// '.' or ','; '\0' as long as no number that was read has settled it.
+    char decimalMark() const { return decimalMark_; }
     /// The heading of the value column; empty without a header line.
     const std::string& valueHeading() const { return valueHeading_; }
     /// Lower case, without blanks, '_', '-' and '.'.

@@ -1,14 +1,9 @@
-#include "exchange/MarketFile.h"
 #include "exchange/MarketImport.h"
-#include "foundation/PrintableText.h"
 #include "storage/AtomicFile.h"
-#include "storage/DurableSave.h"
 #include "tools/ImportMode.h"
+#include "tools/ImportReport.h"
 #include "tools/ProgressBar.h"
 
-#include <algorithm>
-#include <cerrno>
-#include <cstring>
 #include <filesystem>
 #include <iostream>
 #include <vector>
@@ -17,53 +12,6 @@ namespace {
 
 const char* const kUnits = "units-per-reference";
 const char* const kValues = "value-in-reference";
-
-/// "new markets: NYSE, Paris"; of many names only the first ones. Empty when there are none.
-template <class Entries, class NameOf>
-std::string newText(const char* what, const Entries& entries, const NameOf& nameOf)
-{
-    constexpr std::size_t kTold = 20;
-    if (entries.empty())
-        return "";
-    std::string text = std::string("new ") + what + ':';
-    for (std::size_t i = 0; i < std::min(entries.size(), kTold); ++i)
-        text += (i == 0 ? " " : ", ") + printable(nameOf(entries[i]).bytes());
-    if (entries.size() > kTold)
-        text += " and " + std::to_string(entries.size() - kTold) + " more";
-    return text + '\n';
-}
-
-std::string countText(const char* what, const MarketPlan::Counts& counts)
-{
-    return std::string(what) + ": " + std::to_string(counts.added) + " new, " + std::to_string(counts.changed) +
-           " changed, " + std::to_string(counts.equal) + " equal\n";
-}
-
-/// What is to be told of a plan that is not carried out yet: figures for standard output, names beside them.
-struct Report {
-    explicit Report(const MarketPlan& plan)
-    {
-        names =
-            newText("currencies", plan.newCurrencies, [](const auto& made) { return made->getRepresentation(); }) +
-            newText("markets", plan.newMarkets, [](const auto& made) { return made.market->getName(); }) +
-            newText("companies", plan.newCompanies, [](const auto& made) { return made.company->getAbbreviation(); });
-        if (plan.replaced > 0)
-            names += "values of a day for which a later line has another: " + std::to_string(plan.replaced) + '\n';
-        figures = countText("quotes", plan.quoteCounts) + countText("rates", plan.rateCounts) +
-                  "refused: " + std::to_string(plan.refused) + '\n';
-    }
-
-    /// Throws when standard output takes nothing.
-    void print() const
-    {
-        std::cerr << names;
-        if (!(std::cout << figures << std::flush))
-            throw std::runtime_error(std::string("standard output: ") + std::strerror(errno));
-    }
-
-    std::string names;
-    std::string figures;
-};
 
 class ImportTables : public ImportMode {
 public:
@@ -129,7 +77,7 @@ void ImportTables::runNew(const ImportArguments& arguments)
     Catalogue catalogue;
     Date stamp;
     MarketPlan made = plan(catalogue, &stamp);
-    const Report report(made);
+    const ImportReport report(made);
     if (arguments.dryRun)
         return report.print();
     made.carryOut(catalogue);
@@ -154,20 +102,14 @@ void ImportTables::runInto(const ImportArguments& arguments)
     checkReference(path, file.reference());
     Date stamp;
     MarketPlan added = plan(file.catalogue(), &stamp);
-    const Report report(added);
+    const ImportReport report(added);
     if (arguments.dryRun)
         return report.print();
     if (added.isEmpty()) {
         std::cerr << path << ": has all of it, and is left as it is\n";
         return report.print();
     }
-    const MarketPlan::Owners changed = added.carryOut(file.catalogue());
-    // Tables of former days leave the date that later ones have given.
-    stamp = std::max(stamp, file.latestStamp());
-    const auto write = [&](FILE* to) { return file.write(to, changed, stamp); };
-    const auto result = DurableSave(DataFolder()).save(path, write, file.stamp());
-    if (result.outcome != DurableSave::Outcome::kSaved)
-        throw std::runtime_error(result.reason);
+    bringInto(file, added, stamp);
     report.print();
 }
 

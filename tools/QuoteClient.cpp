@@ -1,5 +1,6 @@
 #include "tools/QuoteClient.h"
 
+#include "tools/QuoteFetches.h"
 #include "tools/QuoteFolder.h"
 
 #include <cerrno>
@@ -22,16 +23,19 @@ QuoteClient::QuoteClient(std::unique_ptr<Socket> connection)
 
 pollfd QuoteClient::waiting() const
 {
-    return {connection_->descriptor(), static_cast<short>(page_.empty() ? POLLIN : POLLOUT), 0};
+    const int events = isWaitingForSource_ ? 0 : page_.empty() ? POLLIN : POLLOUT;
+    return {connection_->descriptor(), static_cast<short>(events), 0};
 }
 
-bool QuoteClient::proceed(const QuoteFolder& folder)
+bool QuoteClient::proceed(const QuoteShelf& shelf, short events)
 {
-    return page_.empty() ? receive(folder) : send();
+    if (isWaitingForSource_)
+        return waitForSource(shelf, events);
+    return page_.empty() ? receive(shelf) : send();
 }
 
 /// The request ends as a line that a `Socket` reads: with a line feed, or before a zero byte.
-bool QuoteClient::receive(const QuoteFolder& folder)
+bool QuoteClient::receive(const QuoteShelf& shelf)
 {
     char bytes[kLongestRequest];
     const ssize_t count = recv(connection_->descriptor(), bytes, sizeof bytes, MSG_DONTWAIT);
@@ -45,8 +49,29 @@ bool QuoteClient::receive(const QuoteFolder& folder)
         return false;
     if (end == come.npos)
         return true;
+    if (shelf.fetches == nullptr || !shelf.fetches->ask(std::string(QuoteFolder::tickerOf(request_))))
+        return answer(shelf);
+    isWaitingForSource_ = true;
+    deadline_ = Socket::Clock::now() + shelf.fetches->limit();
+    return true;
+}
+
+/// A source that has others to tell of first may take longer than a client waits: what comes later is for the next one.
+bool QuoteClient::waitForSource(const QuoteShelf& shelf, short events)
+{
+    if (events != 0)
+        return false;
+    if (shelf.fetches->isAsking(std::string(QuoteFolder::tickerOf(request_))) && Socket::Clock::now() < deadline_)
+        return true;
+    isWaitingForSource_ = false;
+    deadline_ = Socket::Clock::now() + kLimit;
+    return answer(shelf);
+}
+
+bool QuoteClient::answer(const QuoteShelf& shelf)
+{
     // A page is never empty, so from here on the client is one that takes its page.
-    page_ = folder.answer(request_);
+    page_ = shelf.folder.answer(request_);
     return send();
 }
 

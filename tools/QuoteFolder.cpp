@@ -3,6 +3,7 @@
 #include "exchange/MarketImport.h"
 #include "exchange/Table.h"
 #include "net/QuoteServers.h"
+#include "tools/QuoteTable.h"
 
 #include <optional>
 #include <ostream>
@@ -24,6 +25,21 @@ bool isFileName(std::string_view ticker)
     return !ticker.empty() && ticker.front() != '.' && ticker.find('/') == ticker.npos;
 }
 
+/// What a request line asks for.
+struct Asked {
+    explicit Asked(std::string_view request)
+    {
+        const std::string_view line = request.substr(0, request.find_first_of("\r\n"));
+        const std::string_view path = between(line, "GET ", "").value_or("");
+        latest = between(path, QuoteServers::kLatestPath, "");
+        history = between(path, QuoteServers::kHistoryPath, QuoteServers::kHistoryPathEnd);
+    }
+    std::string_view ticker() const { return latest.value_or(history.value_or("")); }
+
+    std::optional<std::string_view> latest;  // the ticker of which the latest close is asked for
+    std::optional<std::string_view> history; // that of which the history is
+};
+
 } // namespace
 
 QuoteFolder::QuoteFolder(const std::filesystem::path& folder, std::ostream& log) : folder_(folder), log_(log)
@@ -35,15 +51,33 @@ QuoteFolder::QuoteFolder(const std::filesystem::path& folder, std::ostream& log)
 
 std::string QuoteFolder::answer(std::string_view request) const
 {
-    const std::string_view line = request.substr(0, request.find_first_of("\r\n"));
-    const std::string_view path = between(line, "GET ", "").value_or("");
-    const auto latest = between(path, QuoteServers::kLatestPath, "");
-    const auto history = between(path, QuoteServers::kHistoryPath, QuoteServers::kHistoryPathEnd);
+    const Asked asked(request);
     // An empty ticker, as that of a request of neither kind, has no file.
-    const Closes closes = closesOf(latest.value_or(history.value_or("")));
+    const Closes closes = closesOf(asked.ticker());
     if (closes.empty())
         return noQuotesPage();
-    return latest ? latestQuotePage(closes.rbegin()->second) : historyPage(closes);
+    return asked.latest ? latestQuotePage(closes.rbegin()->second) : historyPage(closes);
+}
+
+std::string_view QuoteFolder::tickerOf(std::string_view request)
+{
+    return Asked(request).ticker();
+}
+
+bool QuoteFolder::reaches(std::string_view ticker, const Date& day) const
+{
+    const Closes closes = closesOf(ticker);
+    return !closes.empty() && closes.rbegin()->first >= day;
+}
+
+void QuoteFolder::add(const std::string& ticker, const Closes& closes) const
+{
+    addToQuoteTable(fileOf(ticker), ticker, closes);
+}
+
+std::filesystem::path QuoteFolder::fileOf(std::string_view ticker) const
+{
+    return folder_ / (std::string(ticker) + ".csv");
 }
 
 /// Of two prices of a day the later line counts.
@@ -52,7 +86,7 @@ Closes QuoteFolder::closesOf(std::string_view ticker) const
     constexpr std::size_t kRefusedTold = 20;
     Closes closes;
     std::size_t refused = 0;
-    const std::filesystem::path file = folder_ / (std::string(ticker) + ".csv");
+    const std::filesystem::path file = fileOf(ticker);
     std::error_code error;
     if (!isFileName(ticker) || !std::filesystem::exists(file, error))
         return closes;

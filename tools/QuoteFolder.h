@@ -17,7 +17,16 @@ public:
     /// folder has a price of gets `noQuotesPage`.
     std::string answer(std::string_view request) const;
 
+    /// The ticker that a request line asks for; empty when it is of no kind that is answered.
+    static std::string_view tickerOf(std::string_view request);
+    /// Whether there is a close of `day`, or of a later one.
+    bool reaches(std::string_view ticker, const Date& day) const;
+    /// Adds to the ticker's table what it does not have, or makes the table. Throws std::runtime_error with the reason
+    /// when that fails, and leaves the table as it was.
+    void add(const std::string& ticker, const Closes& closes) const;
+
 private:
+    std::filesystem::path fileOf(std::string_view ticker) const;
     Closes closesOf(std::string_view ticker) const;
 
     std::filesystem::path folder_;

@@ -1,5 +1,7 @@
 #include "tools/QuoteServer.h"
 
+#include "tools/QuoteFetches.h"
+
 #include <algorithm>
 #include <cerrno>
 #include <cstring>
@@ -13,7 +15,7 @@ enum Place : std::size_t { kListener, kStop, kClients };
 
 } // namespace
 
-QuoteServer::QuoteServer(Socket& listener, const QuoteFolder& folder) : listener_(listener), folder_(folder)
+QuoteServer::QuoteServer(Socket& listener, const QuoteShelf& shelf) : listener_(listener), shelf_(shelf)
 {
     // A client may be gone again before it is accepted; that must not become a wait for the next one.
     const int descriptor = listener.descriptor();
@@ -30,28 +32,36 @@ void QuoteServer::serve(const Descriptor& stop)
             throw std::runtime_error(std::strerror(errno));
         if (all[kStop].revents != 0)
             return;
-        // The clients first: those who come now would shift the places that `all` was made for.
+        // Before the clients, of whom some wait for what has come.
+        if (shelf_.fetches != nullptr)
+            shelf_.fetches->proceed();
+        // The clients that are there first: those who come now would shift the places that `all` was made for.
         proceed(all);
         if (all[kListener].revents != 0)
             acceptClients();
     }
 }
 
-/// The listener and `stop`, and behind them the clients in their order.
+/// The listener and `stop`, behind them the clients in their order, and then what the source is asked with.
 std::vector<pollfd> QuoteServer::waiting(const Descriptor& stop) const
 {
     std::vector<pollfd> all = {{listener_.descriptor(), POLLIN, 0}, {stop.number, POLLIN, 0}};
     for (const QuoteClient& client : clients_)
         all.push_back(client.waiting());
+    if (shelf_.fetches != nullptr)
+        shelf_.fetches->addWaiting(all);
     return all;
 }
 
-/// The milliseconds until the first client's time is over; -1, which `poll` takes for ever, when there is no client.
+/// The milliseconds until the first time is over; -1, which `poll` takes for ever, when there is none.
 int QuoteServer::timeLeft() const
 {
-    if (clients_.empty())
+    auto next = shelf_.fetches != nullptr ? shelf_.fetches->nextLook() : Socket::Clock::time_point::max();
+    for (const QuoteClient& client : clients_)
+        next = std::min(next, client.deadline());
+    if (next == Socket::Clock::time_point::max())
         return -1;
-    const auto left = clients_.front().deadline() - Socket::Clock::now();
+    const auto left = next - Socket::Clock::now();
     return std::max(static_cast<int>(std::chrono::ceil<std::chrono::milliseconds>(left).count()), 0);
 }
 
@@ -61,7 +71,8 @@ void QuoteServer::proceed(const std::vector<pollfd>& ready)
     for (std::size_t i = 0; i < clients_.size(); ++i) {
         QuoteClient& client = clients_[i];
         // Whom nothing has come from is only asked for the time; one that is ready may have come to its end.
-        const bool stays = ready[kClients + i].revents == 0 || client.proceed(folder_);
+        const short events = ready[kClients + i].revents;
+        const bool stays = (events == 0 && !client.isWaitingForSource()) || client.proceed(shelf_, events);
         if (stays && Socket::Clock::now() < client.deadline())
             staying.push_back(std::move(client));
     }

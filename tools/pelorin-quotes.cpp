@@ -1,6 +1,8 @@
 #include "net/QuoteServers.h"
 #include "net/Socket.h"
+#include "tools/MarketUpdate.h"
 #include "tools/Program.h"
+#include "tools/QuoteFetches.h"
 #include "tools/QuoteFolder.h"
 #include "tools/QuoteServer.h"
 #include "tools/StopSignals.h"
@@ -9,14 +11,19 @@
 #include <cerrno>
 #include <cstring>
 #include <iostream>
+#include <memory>
+#include <optional>
 #include <stdexcept>
 #include <string>
 
 namespace {
 
 const char* const kPurpose =
-    "Serves quotes to Pelorin out of a folder of tables, one file TICKER.csv for each ticker.\n"
-    "Example: pelorin-quotes ~/quotes --port 8064";
+    "Serves quotes to Pelorin out of a folder of tables, one file TICKER.csv for each ticker, and fetches them from\n"
+    "elsewhere into the folder, or into a market file.\n"
+    "Example: pelorin-quotes ~/quotes --port 8064\n"
+    "         pelorin-quotes ~/quotes --source finance-quote\n"
+    "         pelorin-quotes --update Companies/World --source 'command:my-quotes {ticker}'";
 
 const char* const kTables =
     R"(The tables are CSV files with a date and a closing price on each line, or with a header line that names such
@@ -26,20 +33,49 @@ there. A file may change at any time.
 
 The address that the program listens on is printed as one line. It serves until SIGINT or SIGTERM.
 
-Exit status: 0, 1 when the folder or the port cannot be used, 2 for bad arguments.)";
+A source tells what the tables do not have:
+  finance-quote            the Perl library Finance::Quote (Debian: libfinance-quote-perl), by its method yahoo_json
+  finance-quote:METHOD     the same, by another method: alphavantage, asx, ...
+  command:PROGRAM ARGUMENTS
+                           a program that prints a line date,close or date,close,currency for the ticker that stands in
+                           the place of {ticker}; the dates are YYYY-MM-DD. No shell reads it; quotes keep words together.
+A ticker is asked for once a day, when a client asks for it, and what comes is added to its table. When the source fails,
+or is too slow, the table answers as it is; the reason is told, and the ticker is asked for again after 15 minutes. Only
+tickers of letters, digits and .-^=_ that do not begin with '-' or '.' are asked for.
+
+--update asks for the latest quote of every company and the latest rate of every currency of a market file, adds them as
+pelorin-import --into does, prints the same figures, and ends. A rate is asked of a command under a ticker like USDEUR=X.
+What does not come is told with its reason.
+
+Exit status: 0, 1 when the folder, the port or the file cannot be used or nothing came for --update, 2 for bad
+arguments.)";
 
 constexpr unsigned kHighestPort = 65535;
+// A window gives up after 30 seconds; before that it is to have the last close of the folder.
+constexpr unsigned kUsualLimit = 20;
+constexpr unsigned kLongestLimit = 600;
 
 struct Arguments {
     std::string folder;
     unsigned port = quoteServers().port;
     std::string address = "127.0.0.1";
+    std::string source;
+    std::string market;           // the file of --update
+    unsigned limit = kUsualLimit; // of the source, in seconds
 };
 
 void describe(CLI::App& app, Arguments& arguments)
 {
     app.footer(kTables);
-    addText(app, "FOLDER", arguments.folder, "TEXT", "Folder of the tables")->required();
+    auto* folder = addText(app, "FOLDER", arguments.folder, "TEXT", "Folder of the tables");
+    addText(app, "--source", arguments.source, "SOURCE",
+            "Where quotes come from that the tables do not have; see below");
+    addText(app, "--update", arguments.market, "FILE", "Market file to bring up to date, instead of serving a folder")
+        ->excludes(folder);
+    app.add_option("--time-limit", arguments.limit, "How long the source may take for a quote")
+        ->type_name("SECONDS")
+        ->check(CLI::Range(1U, kLongestLimit))
+        ->capture_default_str();
     app.add_option("--port", arguments.port, "TCP port to listen on; 0 lets the system choose one")
         ->type_name("N")
         ->check(CLI::Range(0U, kHighestPort))
@@ -62,14 +98,41 @@ void listenOn(Socket& server, const Arguments& arguments)
     std::cout << where << port << std::endl;
 }
 
-void run(const Arguments& arguments)
+/// Throws CLI::ValidationError for a source that there is not.
+std::unique_ptr<QuoteSource> sourceOf(const Arguments& arguments)
+{
+    try {
+        return arguments.source.empty() ? nullptr : quoteSource(arguments.source);
+    } catch (const std::runtime_error& error) {
+        throw CLI::ValidationError("--source", error.what());
+    }
+}
+
+void serve(const Arguments& arguments, const QuoteSource* source, std::chrono::milliseconds limit)
 {
     const QuoteFolder folder(arguments.folder, std::cerr);
     // Before the address is told: whoever reads it may send a signal at once.
     const Descriptor stop = stopSignals();
+    std::optional<QuoteFetches> fetches;
+    if (source != nullptr)
+        fetches.emplace(*source, folder, limit, std::cerr);
     Socket server;
     listenOn(server, arguments);
-    QuoteServer(server, folder).serve(stop);
+    QuoteServer(server, {folder, fetches ? &*fetches : nullptr}).serve(stop);
+}
+
+void run(const Arguments& arguments)
+{
+    if (arguments.folder.empty() == arguments.market.empty())
+        throw CLI::RequiredError("Either FOLDER or --update");
+    const auto source = sourceOf(arguments);
+    if (!arguments.market.empty() && source == nullptr)
+        throw CLI::RequiredError("The --source of an --update");
+    const std::chrono::seconds limit(arguments.limit);
+    if (arguments.market.empty())
+        return serve(arguments, source.get(), limit);
+    const Descriptor stop = stopSignals();
+    updateMarket(arguments.market, *source, limit, stop);
 }
 
 } // namespace

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <csignal>
+#include <fcntl.h>
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <string>
@@ -10,8 +11,10 @@
 /// A running pelorin-quotes.
 class ServerRun {
 public:
-    /// `program` is its path. Port 0 lets the system choose one.
-    ServerRun(const char* program, const std::filesystem::path& folder, unsigned short port = 0)
+    /// `program` is its path. Port 0 lets the system choose one. `source` goes with a log file for what
+    /// it tells, and its time limit in seconds.
+    ServerRun(const char* program, const std::filesystem::path& folder, unsigned short port = 0,
+              const std::string& source = "", const std::string& log = "", const char* limit = "2")
     {
         const std::string portText = std::to_string(port);
         int ends[2];
@@ -20,7 +23,11 @@ public:
         if (pid_ == 0) {
             dup2(ends[1], STDOUT_FILENO);
             close(ends[0]);
-            execl(program, program, folder.c_str(), "--port", portText.c_str(), static_cast<char*>(nullptr));
+            if (!log.empty())
+                dup2(open(log.c_str(), O_WRONLY | O_CREAT | O_APPEND, 0600), STDERR_FILENO);
+            const char* end = source.empty() ? nullptr : "--source";
+            execl(program, program, folder.c_str(), "--port", portText.c_str(), end, source.c_str(), "--time-limit",
+                  limit, static_cast<char*>(nullptr));
             _exit(127);
         }
         close(ends[1]);
