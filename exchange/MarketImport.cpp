@@ -4,7 +4,6 @@
 #include "market/Catalogue.h"
 
 #include <algorithm>
-#include <optional>
 #include <utility>
 
 namespace {
