@@ -42,7 +42,9 @@ MoneyWeightedReturn::MoneyWeightedReturn(std::vector<Payment> payments)
 AnnualReturn MoneyWeightedReturn::result() const
 {
     const auto isNumber = [](const Term& term) { return std::isfinite(term.amount); };
-    if (signChanges() == 0 || !std::ranges::all_of(terms_, isNumber))
+    const auto isIn = [](const Term& term) { return term.amount > 0; };
+    const auto in = std::ranges::count_if(terms_, isIn);
+    if (in == 0 || in == std::ssize(terms_) || !std::ranges::all_of(terms_, isNumber))
         return AnnualReturn(AnnualReturn::Kind::kNoRate);
     // Far enough up, the first payment outweighs all others together, far enough down the last one does.
     double low = -1, high = 1;
@@ -50,12 +52,7 @@ AnnualReturn MoneyWeightedReturn::result() const
         high *= 2;
     while (!hasNone(Side::kBelow, low))
         low *= 2;
-    // All roots are between the two from here on, and neither is one. With opposite signs there is one at least.
-    if (haveOppositeSigns(valueAt(low), valueAt(high))) {
-        const double root = rootBetween(low, high);
-        if (signChanges() == 1 || isOnlyRoot(root))
-            return AnnualReturn(std::expm1(root));
-    }
+    // All roots are between the two from here on, and neither is one.
     std::vector<double> roots;
     unsigned effort = 0;
     const bool isTold = collectRoots(low, high, &roots, &effort);
@@ -76,15 +73,6 @@ double MoneyWeightedReturn::valueAt(double u) const
     for (const Term& term : terms_)
         sum += term.amount * weight(u, term.years);
     return sum;
-}
-
-/// There are no more roots than this (Descartes), and an even number less.
-unsigned MoneyWeightedReturn::signChanges() const
-{
-    unsigned changes = 0;
-    for (std::size_t i = 1; i < terms_.size(); ++i)
-        changes += haveOppositeSigns(terms_[i - 1].amount, terms_[i].amount) ? 1 : 0;
-    return changes;
 }
 
 /// True only when u is no root and none lies on that side of it: not when the weighted sums of the first payments, for
@@ -120,14 +108,6 @@ double MoneyWeightedReturn::rootBetween(double low, double high) const
         (valueAt(middle) > 0) == isLowPositive ? low = middle : high = middle;
     }
     return high;
-}
-
-bool MoneyWeightedReturn::isOnlyRoot(double u) const
-{
-    const double around = kApart / terms_.back().years;
-    Bounds value, slope;
-    boundsBetween(u - around, u + around, &value, &slope);
-    return slope.haveSign() && hasNone(Side::kAbove, u + around) && hasNone(Side::kBelow, u - around);
 }
 
 void MoneyWeightedReturn::Bounds::add(double factor, double least, double most)

@@ -40,10 +40,8 @@ private:
 
     double weight(double u, double years) const;
     double valueAt(double u) const;
-    unsigned signChanges() const;
     bool hasNone(Side side, double u) const;
     double rootBetween(double low, double high) const;
-    bool isOnlyRoot(double u) const;
     void boundsBetween(double low, double high, Bounds* value, Bounds* slope) const;
     bool touchesZero(double u) const;
     bool collectRoots(double low, double high, std::vector<double>* roots, unsigned* effort) const;

@@ -7,7 +7,7 @@
 /// all multiplied, to the power 365 / days, less 1. A day on which nothing is there, 0 / 0, counts 1.
 ///
 /// There is none when a divisor is 0 or less, or a dividend below 0. Values are sums of floats: of what was emptied,
-/// less than a millionth of the largest value so far can be left, below zero, too, and is nothing.
+/// less than a millionth of the largest value so far can be left below zero, and is nothing.
 class TimeWeightedReturn {
 public:
     /// `value` is that of the end of the day before the first one.
