@@ -69,8 +69,10 @@ void Valuation::computeReturns(const Date& date, const Date& from, bool previsio
     evolution_ = evolutionByDate(wallet_, catalogue_);
     // Both before anything is simulated. An evolution that is refused leaves the day alone, which is told only to those
     // who have asked for the days.
-    returns_ = Returns(wallet_, catalogue_, evolution_, state_->getFirstOperationDate(), from);
-    figures_ = holdingFigures(*state_, catalogue_, from);
+    const Date first = state_->getFirstOperationDate();
+    returns_ = Returns(wallet_, catalogue_, evolution_, first, from);
+    // One range for both: it begins behind a day only when that is later than the first one.
+    figures_ = holdingFigures(*state_, catalogue_, from > first ? from : Date());
     if (previsions)
         compute(date, previsions, evolution);
     else if (evolution)

@@ -183,6 +183,9 @@ TEST_F(ValueTest, ReturnsAreOfTheRangeAndDoNotSeeSimulatedSales)
     const std::string later = returns("--from 05/01/1999");
     EXPECT_NE(later, all);
     EXPECT_EQ(json("--date 11/01/1999 --from 05/01/1999")["shares"][0]["bought"], 0);
+    trade(share_, cash_, 0, 1, 10);
+    for (const char* from : {"31/12/1998", "01/01/1999"}) // neither is later than the first operation
+        EXPECT_EQ(json(std::string("--date 11/01/1999 --from ") + from)["shares"][0]["bought"], 1010) << from;
     EXPECT_EQ(returns("--from 11/01/1999"), "null null");
     EXPECT_THAT(value("--date 11/01/1999 --from 11/01/1999").out,
                 HasSubstr("Money-weighted return      no day\nTime-weighted return       no day\n"));
