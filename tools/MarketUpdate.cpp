@@ -159,7 +159,7 @@ void MarketUpdate::refuse(const std::string& name, const std::string& reason)
     ++plan_.refused;
     if (refused_.empty() || refused_.back().first != reason)
         refused_.push_back({reason, {}});
-    refused_.back().second.push_back(name);
+    refused_.back().second.push_back(name.empty() ? "\"\"" : name);
 }
 
 /// A source that fails does so for all that it is asked for: of those that follow each other the first are named.
