@@ -141,14 +141,14 @@ bool ChildProgram::proceed()
     return false;
 }
 
-/// @return whether the program has ended.
+/// @return whether the program has ended. What it has started ends with it.
 bool ChildProgram::reap()
 {
-    int status = 0;
-    if (waitpid(process_, &status, WNOHANG) != process_)
+    siginfo_t ended{};
+    const int error = waitid(P_PID, static_cast<id_t>(process_), &ended, WEXITED | WNOHANG | WNOWAIT);
+    if (error != 0 || ended.si_pid == 0)
         return false;
-    process_ = 0;
-    takeStatus(status);
+    takeStatus(killAll());
     return true;
 }
 
@@ -164,13 +164,16 @@ void ChildProgram::takeStatus(int status)
 }
 
 /// The number of a process is not given to another one before it is reaped, so that the group is the right one.
-void ChildProgram::killAll()
+/// @return how the program has ended; 0 when there is none any more.
+int ChildProgram::killAll()
 {
+    int status = 0;
     if (process_ == 0)
-        return;
+        return status;
     kill(-process_, SIGKILL);
-    waitpid(process_, nullptr, 0);
+    waitpid(process_, &status, 0);
     process_ = 0;
+    return status;
 }
 
 /// Word by word, since an address in it may be long, and what comes behind that tells the reason.

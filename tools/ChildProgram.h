@@ -14,7 +14,7 @@
 /// A program that is run for what it prints, without a shell, and watched by `poll`. Nothing here waits.
 ///
 /// It reads nothing, has none of our descriptors, and is the first of a process group of its own: when its time is
-/// over, when it prints more than `kMostOutput`, and when this object goes, the whole group is killed.
+/// over, when it prints more than `kMostOutput`, when it ends, and when this object goes, the whole group is killed.
 class ChildProgram {
 public:
     using Clock = std::chrono::steady_clock;
@@ -45,7 +45,7 @@ private:
     void start(const std::vector<std::string>& arguments);
     bool reap();
     void takeStatus(int status);
-    void killAll();
+    int killAll();
 
     std::string name_;
     std::chrono::milliseconds limit_;

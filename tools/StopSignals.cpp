@@ -12,6 +12,7 @@ Descriptor stopSignals()
     sigemptyset(&stopping);
     sigaddset(&stopping, SIGINT);
     sigaddset(&stopping, SIGTERM);
+    sigaddset(&stopping, SIGHUP); // of a terminal that is closed; programs that were started here do not get it
     // Blocked, a signal ends neither the program nor a read that is under way: it waits until somebody polls for it.
     sigprocmask(SIG_BLOCK, &stopping, nullptr);
     const int descriptor = signalfd(-1, &stopping, SFD_CLOEXEC);

@@ -31,7 +31,7 @@ columns: Date, Close, among others. Dates are YYYY-MM-DD or DD/MM/YYYY. A line t
 number and skipped. The latest close is that of the last day in the file, and the history goes back three months from
 there. A file may change at any time.
 
-The address that the program listens on is printed as one line. It serves until SIGINT or SIGTERM.
+The address that the program listens on is printed as one line. It serves until SIGINT, SIGTERM or SIGHUP.
 
 A source tells what the tables do not have:
   finance-quote            the Perl library Finance::Quote (Debian: libfinance-quote-perl), by its method yahoo_json

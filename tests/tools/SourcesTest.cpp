@@ -103,6 +103,20 @@ sub multipliers { return @units{@_[2, 3]} }
         return count;
     }
 
+    /// Whether the process whose number a script has left in "pid" ends soon.
+    bool isGone() const
+    {
+        const std::string status = "/proc/" + std::to_string(std::stoi(folder_.content("pid"))) + "/stat";
+        for (int tries = 0; tries < 200; ++tries) {
+            const std::string text = contentOf(status);
+            // Whoever inherits it may not have taken notice yet.
+            if (text.empty() || text.find(") Z ") != text.npos)
+                return true;
+            std::this_thread::sleep_for(std::chrono::milliseconds(10));
+        }
+        return false;
+    }
+
     TemporaryFolder folder_{"pelorin-sources-test"};
 };
 
@@ -241,10 +255,41 @@ TEST_F(SourcesTest, ABadSourceLeavesTheLastClose)
     EXPECT_THAT(served("command:no-such-program {ticker}", {"A"}), ElementsAre("7"));
     EXPECT_THAT(folder_.content("log"), HasSubstr("no-such-program cannot be run: No such file"));
     EXPECT_EQ(folder_.content("q/A.csv"), "2026-01-01,7\n");
-    // Whoever inherits what it has started may not have taken notice yet.
-    std::string pid = folder_.content("pid");
-    pid.pop_back();
-    EXPECT_THAT(contentOf("/proc/" + pid + "/stat"), testing::AnyOf("", HasSubstr(") Z "))) << "all of it is killed";
+    EXPECT_TRUE(isGone()) << "all of it is killed";
+}
+
+TEST_F(SourcesTest, NothingThatASourceHasStartedLivesOn)
+{
+    const struct {
+        const char* why;
+        std::string script;
+        bool isEnded;
+    } cases[] = {
+        {"left behind by one that ends", "sleep 60 >&- 2>&- & echo $! >'{pid}'; echo 2026-01-02,9", true},
+        {"under way when the terminal is closed", "echo $$ >'{pid}'; exec sleep 60", false},
+    };
+    for (const auto& c : cases) {
+        std::string script = c.script;
+        script.replace(script.find("{pid}"), 5, folder_ / "pid");
+        folder_.write("pid", "");
+        ServerRun server(PELORIN_QUOTES, folder_ / "q", 0, command("start", script), folder_ / "log", "20");
+        Socket client;
+        client.setTimeLimit(std::chrono::seconds(10));
+        ASSERT_EQ(client.connectTo("127.0.0.1", server.port()), 0);
+        ASSERT_EQ(client.writeLine(String((QuoteServers::kLatestPath + std::string("A")).insert(0, "GET ").c_str())),
+                  0);
+        String line;
+        if (c.isEnded) {
+            EXPECT_EQ(client.readLine(&line), 0);
+        }
+        for (int tries = 0; tries < 500 && folder_.content("pid").empty(); ++tries)
+            std::this_thread::sleep_for(std::chrono::milliseconds(10));
+        if (!c.isEnded) {
+            EXPECT_EQ(server.stop(SIGHUP), 0);
+        }
+        EXPECT_TRUE(isGone()) << c.why;
+        std::filesystem::remove(folder_.path / "q" / "A.csv");
+    }
 }
 
 TEST_F(SourcesTest, ASlowSourceHoldsUpOnlyThoseWhoAskIt)
