@@ -25,8 +25,12 @@ bool QuoteFetches::ask(const std::string& ticker)
     day_ = today();
     const auto asked = again_.find(ticker);
     const bool isEarly = asked != again_.end() && Clock::now() < asked->second;
-    if (isEarly || Clock::now() < sourceAgain_ || again_.size() >= kMostAsked || folder_.reaches(ticker, day_))
+    if (isEarly || again_.size() >= kMostAsked || folder_.reaches(ticker, day_))
         return false;
+    if (Clock::now() < sourceAgain_) {
+        tellOfSilence(ticker);
+        return false;
+    }
     again_[ticker] = Clock::time_point::max();
     waiting_.push_back(ticker);
     startWaiting();
@@ -84,9 +88,11 @@ void QuoteFetches::finish(const Fetch& fetch)
     const std::string& ticker = fetch.run.names.front();
     if (fetch.program.hasTimedOut()) {
         sourceAgain_ = Clock::now() + kSilence;
-        // Those whose turn has not come are not told of: whoever asks for them again later gets an answer then.
-        for (const std::string& other : waiting_)
+        // Whoever asks later for those whose turn has not come gets an answer then.
+        for (const std::string& other : waiting_) {
             again_.erase(other);
+            tellOfSilence(other);
+        }
         waiting_.clear();
     }
     const SourceAnswer answer = answersOf(fetch.program, fetch.run, day_).at(ticker);
@@ -106,4 +112,9 @@ void QuoteFetches::tell(const std::string& ticker, const std::string& reason)
 {
     log_ << ticker << ": " << reason << std::endl;
     again_[ticker] = Clock::now() + kPause;
+}
+
+void QuoteFetches::tellOfSilence(const std::string& ticker)
+{
+    log_ << ticker << ": is not asked for: the source has been silent" << std::endl;
 }

@@ -53,6 +53,7 @@ private:
     void startWaiting();
     void finish(const Fetch& fetch);
     void tell(const std::string& ticker, const std::string& reason);
+    void tellOfSilence(const std::string& ticker);
 
     const QuoteSource& source_;
     const QuoteFolder& folder_;

@@ -309,6 +309,8 @@ TEST_F(SourcesTest, ASlowSourceHoldsUpOnlyThoseWhoAskIt)
     EXPECT_GE(since(), std::chrono::seconds(3));
     EXPECT_EQ(page(server, "OTHER"), "");
     EXPECT_LT(since(), std::chrono::milliseconds(5500)) << "one that was silent is left alone for a while";
+    EXPECT_EQ(folder_.content("log"), "SLOW: has not ended within 3 seconds\n"
+                                      "OTHER: is not asked for: the source has been silent\n");
 }
 
 TEST_F(SourcesTest, FinanceQuoteFillsTheTables)
