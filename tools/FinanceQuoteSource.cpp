@@ -19,7 +19,7 @@ open(STDOUT, '>&', \*STDERR) or die "standard error cannot be used: $!\n";
 $answer->autoflush(1);
 eval { require Finance::Quote; 1 }
     or die "the Perl library Finance::Quote is missing; Debian has it as libfinance-quote-perl\n";
-my ($what, $how, @names) = @ARGV;
+my ($limit, $what, $how, @names) = @ARGV;
 my (undef, undef, undef, $day, $month, $year) = localtime;
 my $today = sprintf '%04d-%02d-%02d', $year + 1900, $month + 1, $day;
 my @order = ($ENV{ALPHAVANTAGE_API_KEY} ? 'AlphaVantage' : (), 'ECB');
@@ -41,7 +41,14 @@ sub quote {
     return ($of{$name, 'isodate'} || $today, $price, $of{$name, 'currency'} || '');
 }
 for my $name (@names) {
-    my @line = eval { $what eq 'rates' ? rate($name) : quote($name) };
+    local $SIG{ALRM} = sub { die "has not answered within $limit seconds\n" };
+    my @line = eval {
+        alarm $limit;
+        my @told = $what eq 'rates' ? rate($name) : quote($name);
+        alarm 0;
+        @told;
+    };
+    alarm 0; # of one that has failed
     @line = ('', $@) if $@;
     s/\s+/ /g, s/ $// for @line;
     print $answer join(',', $name, @line), "\n";
@@ -50,7 +57,8 @@ for my $name (@names) {
 
 } // namespace
 
-FinanceQuoteSource::FinanceQuoteSource(const std::string& method) : method_(method)
+FinanceQuoteSource::FinanceQuoteSource(const std::string& method, std::chrono::seconds limit)
+    : method_(method), limit_(limit)
 {
     if (method.empty() || method.find_first_not_of("abcdefghijklmnopqrstuvwxyz0123456789_") != method.npos)
         throw std::runtime_error("is no method of Finance::Quote: " + printable(method));
@@ -70,7 +78,7 @@ QuoteSource::Run FinanceQuoteSource::ratesOf(const std::vector<std::string>& cur
 QuoteSource::Run FinanceQuoteSource::run(const char* what, const std::string& how,
                                          const std::vector<std::string>& names) const
 {
-    Run run{names, {"perl", "-e", kScript, "--", what, how}, true};
+    Run run{names, {"perl", "-e", kScript, "--", std::to_string(limit_.count()), what, how}, true};
     run.arguments.insert(run.arguments.end(), names.begin(), names.end());
     return run;
 }

@@ -9,7 +9,8 @@ public:
     static constexpr const char* kUsualMethod = "yahoo_json";
 
     /// @param method of the library: lower case letters, digits and '_'. Throws std::runtime_error for any other text.
-    explicit FinanceQuoteSource(const std::string& method);
+    /// @param limit of a name, so that one that hangs leaves the others of its run their time.
+    FinanceQuoteSource(const std::string& method, std::chrono::seconds limit);
 
     /// Loading the library takes longer than asking it once.
     std::size_t mostNames() const override { return 20; }
@@ -20,4 +21,5 @@ private:
     Run run(const char* what, const std::string& how, const std::vector<std::string>& names) const;
 
     std::string method_;
+    std::chrono::seconds limit_;
 };

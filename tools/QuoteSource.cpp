@@ -7,15 +7,15 @@
 #include <algorithm>
 #include <stdexcept>
 
-std::unique_ptr<QuoteSource> quoteSource(const std::string& text)
+std::unique_ptr<QuoteSource> quoteSource(const std::string& text, std::chrono::seconds limit)
 {
     const std::size_t colon = text.find(':');
     const std::string kind = text.substr(0, colon);
     const std::string rest = colon == text.npos ? std::string() : text.substr(colon + 1);
     if (kind == "finance-quote" && colon == text.npos)
-        return std::make_unique<FinanceQuoteSource>(FinanceQuoteSource::kUsualMethod);
+        return std::make_unique<FinanceQuoteSource>(FinanceQuoteSource::kUsualMethod, limit);
     if (kind == "finance-quote")
-        return std::make_unique<FinanceQuoteSource>(rest);
+        return std::make_unique<FinanceQuoteSource>(rest, limit);
     if (kind == "command")
         return std::make_unique<CommandSource>(rest);
     throw std::runtime_error("is no source of quotes: " + printable(text) +

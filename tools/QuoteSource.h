@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <cstddef>
 #include <memory>
 #include <string>
@@ -29,7 +30,8 @@ public:
 
 /// The source that `text` names, "finance-quote:METHOD" or "command:PROGRAM {ticker}". Throws std::runtime_error with
 /// the reason when there is none of that name.
-std::unique_ptr<QuoteSource> quoteSource(const std::string& text);
+/// @param limit of a name, for a source that is asked for several in one run.
+std::unique_ptr<QuoteSource> quoteSource(const std::string& text, std::chrono::seconds limit);
 
 /// Whether a program may be asked for `text`: letters, digits, and ".-^=_", of which neither '-' nor '.' comes first.
 /// Anything else might mean something to a program, as an option or a path does.

@@ -99,17 +99,18 @@ void listenOn(Socket& server, const Arguments& arguments)
 }
 
 /// Throws CLI::ValidationError for a source that there is not.
-std::unique_ptr<QuoteSource> sourceOf(const Arguments& arguments)
+std::unique_ptr<QuoteSource> sourceOf(const std::string& text, std::chrono::seconds limit)
 {
     try {
-        return arguments.source.empty() ? nullptr : quoteSource(arguments.source);
+        return quoteSource(text, limit);
     } catch (const std::runtime_error& error) {
         throw CLI::ValidationError("--source", error.what());
     }
 }
 
-void serve(const Arguments& arguments, const QuoteSource* source, std::chrono::milliseconds limit)
+void serve(const Arguments& arguments, std::chrono::seconds limit)
 {
+    const auto source = arguments.source.empty() ? nullptr : sourceOf(arguments.source, limit);
     const QuoteFolder folder(arguments.folder, std::cerr);
     // Before the address is told: whoever reads it may send a signal at once.
     const Descriptor stop = stopSignals();
@@ -121,18 +122,21 @@ void serve(const Arguments& arguments, const QuoteSource* source, std::chrono::m
     QuoteServer(server, {folder, fetches ? &*fetches : nullptr}).serve(stop);
 }
 
+void update(const Arguments& arguments, std::chrono::seconds limit)
+{
+    if (arguments.source.empty())
+        throw CLI::RequiredError("The --source of an --update");
+    const auto source = sourceOf(arguments.source, limit);
+    const Descriptor stop = stopSignals();
+    updateMarket(arguments.market, *source, limit, stop);
+}
+
 void run(const Arguments& arguments)
 {
     if (arguments.folder.empty() == arguments.market.empty())
         throw CLI::RequiredError("Either FOLDER or --update");
-    const auto source = sourceOf(arguments);
-    if (!arguments.market.empty() && source == nullptr)
-        throw CLI::RequiredError("The --source of an --update");
     const std::chrono::seconds limit(arguments.limit);
-    if (arguments.market.empty())
-        return serve(arguments, source.get(), limit);
-    const Descriptor stop = stopSignals();
-    updateMarket(arguments.market, *source, limit, stop);
+    arguments.market.empty() ? serve(arguments, limit) : update(arguments, limit);
 }
 
 } // namespace

@@ -165,7 +165,7 @@ TEST_F(SourcesTest, ACommandIsWordsAndNoShellText)
     EXPECT_EQ(source.ratesOf({"USD"}, "EUR").arguments[2], "USDEUR=X;$(x)");
     for (const char* bad : {"", "command", "command:", "command:a", "command:{ticker} b", "command:a '{ticker}",
                             "finance-quote:", "finance-quote:a b", "finance-quote:-e", "file:x"})
-        EXPECT_THROW(quoteSource(bad), std::runtime_error) << bad;
+        EXPECT_THROW(quoteSource(bad, std::chrono::seconds(1)), std::runtime_error) << bad;
     for (const char* good : {"IBM", "BRK.B", "^GSPC", "USDEUR=X", "A-B_2", "7203.T"})
         EXPECT_TRUE(isTicker(good)) << good;
     for (const char* bad : {"", "-e", ".x", "a b", "a;b", "a/b", "$x", "`x`", "a\nb", "'", "\xc3\xa4", "a&b", "@x"})
@@ -331,14 +331,16 @@ TEST_F(SourcesTest, AnUpdateBringsTheLatestIntoTheMarketFile)
     folder_.write("quotes",
                   "Date,Ticker,Close,Market,Currency\n2026-01-01,IBM,9,NYSE,USD\n2026-01-02,FUND,12.5,NYSE,USD\n"
                   "2026-01-01,POUND,9,NYSE,USD\n2026-01-01,NONE,9,NYSE,USD\n2026-01-01,a;b,9,NYSE,USD\n"
+                  "2026-01-01,HANGS,9,NYSE,USD\n"
                   "2026-01-01,TWO,9,NYSE,USD\n2026-01-01,TWO,9,Paris,EUR\n2026-01-01,X,9,Paris,EUR\n");
     folder_.write("rates", "Date,Currency,Rate\n2026-01-01,USD,1\n2026-01-01,CHF,1\n");
     ASSERT_EQ(ToolRun(PELORIN_IMPORT, "f --quotes quotes --rates rates", folder_).status, 0);
     const std::string before = folder_.content("f");
-    const ToolRun run(PELORIN_QUOTES, "--update f --source finance-quote:worked", folder_);
+    const ToolRun run(PELORIN_QUOTES, "--update f --source finance-quote:worked --time-limit 2", folder_);
     EXPECT_EQ(run.status, 0);
-    EXPECT_EQ(run.out, "quotes: 2 new, 0 changed, 1 equal\nrates: 1 new, 0 changed, 0 equal\nrefused: 5\n");
-    EXPECT_EQ(run.err, "a;b: has other signs than those of a ticker\nNONE: unknown, there: which takes more than a few "
+    EXPECT_EQ(run.out, "quotes: 2 new, 0 changed, 1 equal\nrates: 1 new, 0 changed, 0 equal\nrefused: 6\n");
+    EXPECT_EQ(run.err, "a;b: has other signs than those of a ticker\nHANGS: has not answered within 2 seconds\nNONE: "
+                       "unknown, there: which takes more than a few "
                        "words to tell to the end\n"
                        "POUND: comes in \"GBP\", and its market trades in \"USD\"\n"
                        "X: comes in \"USD\", and its market trades in \"EUR\"\nCHF: has no rate\n");
@@ -354,15 +356,15 @@ TEST_F(SourcesTest, AnUpdateBringsTheLatestIntoTheMarketFile)
     }
     EXPECT_THAT(latest,
                 testing::UnorderedElementsAre("EUR1", "CHF1", "USD0.8", "USDIBM12.5", "USDFUND12.5", "USDTWO12.5",
-                                              "EURTWO9", "USDPOUND9", "USDNONE9", "USDa;b9", "EURX9"));
+                                              "EURTWO9", "USDPOUND9", "USDNONE9", "USDHANGS9", "USDa;b9", "EURX9"));
     std::vector<std::string> kept;
     for (const auto& entry : std::filesystem::recursive_directory_iterator(folder_.path / "Documents"))
         if (entry.is_regular_file())
             kept.push_back(contentOf(entry.path()));
     EXPECT_THAT(kept, testing::Contains(before)) << "the former version is kept";
     const std::string updated = folder_.content("f");
-    EXPECT_EQ(ToolRun(PELORIN_QUOTES, "--update f --source finance-quote:worked", folder_).out,
-              "quotes: 0 new, 0 changed, 3 equal\nrates: 0 new, 0 changed, 1 equal\nrefused: 5\n");
+    EXPECT_EQ(ToolRun(PELORIN_QUOTES, "--update f --source finance-quote:worked --time-limit 2", folder_).out,
+              "quotes: 0 new, 0 changed, 3 equal\nrates: 0 new, 0 changed, 1 equal\nrefused: 6\n");
     folder_.write("hang", "#!/bin/sh\nsleep 60\n", 0755);
     const auto start = std::chrono::steady_clock::now();
     const ToolRun hanging(PELORIN_QUOTES, "--update f --time-limit 1 --source 'command:./hang {ticker}'", folder_);
