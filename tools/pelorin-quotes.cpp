@@ -54,6 +54,7 @@ constexpr unsigned kHighestPort = 65535;
 // A window gives up after 30 seconds; before that it is to have the last close of the folder.
 constexpr unsigned kUsualLimit = 20;
 constexpr unsigned kLongestLimit = 600;
+constexpr const char* kUsualSource = "finance-quote"; // of an update
 
 struct Arguments {
     std::string folder;
@@ -69,7 +70,7 @@ void describe(CLI::App& app, Arguments& arguments)
     app.footer(kTables);
     auto* folder = addText(app, "FOLDER", arguments.folder, "TEXT", "Folder of the tables");
     addText(app, "--source", arguments.source, "SOURCE",
-            "Where quotes come from that the tables do not have; see below");
+            "Where quotes come from that the tables do not have; see below. Without it --update asks finance-quote");
     addText(app, "--update", arguments.market, "FILE", "Market file to bring up to date, instead of serving a folder")
         ->excludes(folder);
     app.add_option("--time-limit", arguments.limit, "How long the source may take for a quote")
@@ -124,9 +125,7 @@ void serve(const Arguments& arguments, std::chrono::seconds limit)
 
 void update(const Arguments& arguments, std::chrono::seconds limit)
 {
-    if (arguments.source.empty())
-        throw CLI::RequiredError("The --source of an --update");
-    const auto source = sourceOf(arguments.source, limit);
+    const auto source = sourceOf(arguments.source.empty() ? kUsualSource : arguments.source, limit);
     const Descriptor stop = stopSignals();
     updateMarket(arguments.market, *source, limit, stop);
 }

@@ -43,7 +43,6 @@ TEST(ProgramsTest, FailureIsOneLineThatNamesTheReasonAndMakesNoFile)
         {PELORIN_QUOTES, ". --bind localhost", 2, "--bind"},
         {PELORIN_QUOTES, "", 2, "Either FOLDER or --update"},
         {PELORIN_QUOTES, ". --update market --source finance-quote", 2, "FOLDER excludes --update"},
-        {PELORIN_QUOTES, "--update market", 2, "--source"},
         {PELORIN_QUOTES, ". --source 'finance-quote:-e x'", 2, "--source: is no method of Finance::Quote: -e x"},
         {PELORIN_QUOTES, "--update none --source finance-quote", 1, "none: cannot be opened: No such file"},
         {PELORIN_QUOTES, "--update wallet --source finance-quote", 1, "wallet: this is a portfolio file\n"},

@@ -37,7 +37,7 @@ protected:
         unsetenv("ALPHAVANTAGE_API_KEY");
         // What the library loads by itself, in front of its own; neither asks a network.
         folder_.write("lib/Finance/Quote/Worked.pm", R"(package Finance::Quote::Worked;
-sub methods { return (worked => \&worked) }
+sub methods { return (worked => \&worked, yahoo_json => \&worked) }
 sub labels { return (worked => ['last', 'isodate', 'currency']) }
 sub worked {
     my ($quoter, @tickers) = @_;
@@ -363,7 +363,7 @@ TEST_F(SourcesTest, AnUpdateBringsTheLatestIntoTheMarketFile)
             kept.push_back(contentOf(entry.path()));
     EXPECT_THAT(kept, testing::Contains(before)) << "the former version is kept";
     const std::string updated = folder_.content("f");
-    EXPECT_EQ(ToolRun(PELORIN_QUOTES, "--update f --source finance-quote:worked --time-limit 2", folder_).out,
+    EXPECT_EQ(ToolRun(PELORIN_QUOTES, "--update f --time-limit 2", folder_).out,
               "quotes: 0 new, 0 changed, 3 equal\nrates: 0 new, 0 changed, 1 equal\nrefused: 6\n");
     folder_.write("hang", "#!/bin/sh\nsleep 60\n", 0755);
     const auto start = std::chrono::steady_clock::now();
