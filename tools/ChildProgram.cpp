@@ -88,6 +88,8 @@ ChildProgram::~ChildProgram()
 
 void ChildProgram::start(const std::vector<std::string>& arguments)
 {
+    // Whoever has started us may ignore it, as scripts do, and then there would be no end to wait for.
+    std::signal(SIGCHLD, SIG_DFL);
     const Pipe output;
     printed_.emplace(output.ends[0]);
     const Descriptor outputEnd(output.ends[1]);

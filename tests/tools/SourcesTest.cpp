@@ -371,6 +371,10 @@ TEST_F(SourcesTest, AnUpdateBringsTheLatestIntoTheMarketFile)
     EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(6));
     EXPECT_EQ(hanging.status, 1);
     EXPECT_THAT(hanging.err, HasSubstr("f: no quote and no rate has come, and it is left as it is\n"));
+    // Scripts ignore that signal, and so do the programs that they start.
+    const std::string ignoring = std::string("--ignore-signal=CHLD '") + PELORIN_QUOTES + "' ";
+    EXPECT_THAT(ToolRun("env", ignoring + "--update f --time-limit 1 --source 'command:false {ticker}'", folder_).err,
+                HasSubstr("has ended with status 1"));
     EXPECT_EQ(folder_.content("f"), updated);
 }
 
