@@ -3,6 +3,7 @@
 #include "exchange/MarketImport.h"
 #include "exchange/Table.h"
 #include "storage/AtomicFile.h"
+#include "storage/FileStamp.h"
 #include "storage/InputFile.h"
 #include "storage/Writing.h"
 
@@ -95,6 +96,7 @@ private:
 
 void addToQuoteTable(const std::filesystem::path& file, const std::string& ticker, const Closes& closes)
 {
+    const auto stamp = FileStamp::of(file.string());
     std::error_code error; // of what cannot be looked at; opening it tells
     const bool isThere = std::filesystem::exists(file, error) || error;
     std::string bytes = isThere ? bytesOf(file) : std::string();
@@ -114,5 +116,9 @@ void addToQuoteTable(const std::filesystem::path& file, const std::string& ticke
     AtomicFile table(file, AtomicFile::Existing::kReplace);
     if (std::fwrite(bytes.data(), 1, bytes.size(), table.stream()) != bytes.size())
         failWriting(file);
+    // To the disk, which takes its time, and only then the look whether somebody else has written meanwhile.
+    table.flush();
+    if (FileStamp::of(file.string()) != stamp)
+        throw std::runtime_error(file.string() + ": another program has changed it meanwhile, so it is left as it is");
     table.commit();
 }
