@@ -53,7 +53,7 @@ std::string QuoteFolder::answer(std::string_view request) const
 {
     const Asked asked(request);
     // An empty ticker, as that of a request of neither kind, has no file.
-    const Closes closes = closesOf(asked.ticker());
+    const Closes closes = closesOf(asked.ticker(), log_);
     if (closes.empty())
         return noQuotesPage();
     return asked.latest ? latestQuotePage(closes.rbegin()->second) : historyPage(closes);
@@ -66,7 +66,8 @@ std::string_view QuoteFolder::tickerOf(std::string_view request)
 
 bool QuoteFolder::reaches(std::string_view ticker, const Date& day) const
 {
-    const Closes closes = closesOf(ticker);
+    std::ostream nobody(nullptr); // the answer that follows tells what is wrong with the table
+    const Closes closes = closesOf(ticker, nobody);
     return !closes.empty() && closes.rbegin()->first >= day;
 }
 
@@ -81,7 +82,7 @@ std::filesystem::path QuoteFolder::fileOf(std::string_view ticker) const
 }
 
 /// Of two prices of a day the later line counts.
-Closes QuoteFolder::closesOf(std::string_view ticker) const
+Closes QuoteFolder::closesOf(std::string_view ticker, std::ostream& log) const
 {
     constexpr std::size_t kRefusedTold = 20;
     Closes closes;
@@ -96,14 +97,14 @@ Closes QuoteFolder::closesOf(std::string_view ticker) const
         watch.refused = [&](const std::string& path, unsigned long line, const std::string& reason) {
             // At each request anew: the first say enough.
             if (++refused <= kRefusedTold)
-                log_ << path << ", line " << line << ": " << reason << '\n';
+                log << path << ", line " << line << ": " << reason << '\n';
         };
         table.forEach([&] { closes.insert_or_assign(table.date(), table.value(false)); }, watch);
         if (refused > kRefusedTold)
-            log_ << file.string() << ": ... and " << refused - kRefusedTold << " more\n";
+            log << file.string() << ": ... and " << refused - kRefusedTold << " more\n";
     } catch (const std::runtime_error& reason) {
         // What stands before the damage is served all the same.
-        log_ << reason.what() << '\n';
+        log << reason.what() << '\n';
     }
     return closes;
 }

@@ -27,7 +27,7 @@ public:
 
 private:
     std::filesystem::path fileOf(std::string_view ticker) const;
-    Closes closesOf(std::string_view ticker) const;
+    Closes closesOf(std::string_view ticker, std::ostream& log) const;
 
     std::filesystem::path folder_;
     std::ostream& log_;
