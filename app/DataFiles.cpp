@@ -87,15 +87,20 @@ void DataFiles::askForLoad()
             if (!kind)
                 return;
             const bool isMarkets = kind == FileKind::kMarkets;
-            const char* question = isMarkets ? "This will delete all unsaved changes to the wallet and the markets..."
-                                             : "This will delete all unsaved changes to the wallet...";
             // A portfolio is always asked for, even an empty one.
-            if ((!isMarkets || window_.catalogue().getNbrCurrencies() > 0) && !PLWindow::confirm(question))
+            if (isMarkets ? !mayReplaceAll()
+                          : !PLWindow::confirm("This will delete all unsaved changes to the wallet..."))
                 return;
             showFolder(openPanel_, *kind);
         }
     }
     openPanel_.Show();
+}
+
+bool DataFiles::mayReplaceAll() const
+{
+    return window_.catalogue().getNbrCurrencies() == 0 ||
+           PLWindow::confirm("This will delete all unsaved changes to the wallet and the markets...");
 }
 
 void DataFiles::load(BMessage* message)
@@ -108,23 +113,51 @@ void DataFiles::load(BMessage* message)
     if (message->FindRef("refs", &ref) != B_OK || BEntry(&ref).GetPath(&path) != B_OK)
         return window_.SetMessage("ERROR GETTING REF");
     // Nothing is thrown away before there is a file to read.
-    const auto file = openFile(path.Path());
+    const auto file = openOrTell(path.Path());
     if (file == nullptr)
-        return window_.SetMessage((std::string("OPEN FAILED: ") + path.Path()).c_str());
+        return;
     const WindowLock lock(window_);
     if (!lock.isHeld())
         return;
     // The portfolio refers to markets and companies by name, so new markets take it along.
     const bool wasEmpty = isWalletEmpty();
     window_.replaceWallet();
-    if (kind == FileKind::kWallet)
-        return loadWallet(*file);
-    names_.wallet.isEmptied = names_.wallet.isEmptied || !wasEmpty;
-    tell(FileKind::kWallet, "");
-    loadMarkets(*file);
+    if (kind == FileKind::kMarkets) {
+        names_.wallet.isEmptied = names_.wallet.isEmptied || !wasEmpty;
+        tell(FileKind::kWallet, "");
+    }
+    if (kind == FileKind::kWallet ? readWallet(*file) : readMarkets(*file))
+        window_.noteFile(*kind);
 }
 
-void DataFiles::loadMarkets(const InputFile& file)
+void DataFiles::loadBoth(const std::string& markets, const std::string& wallet)
+{
+    // Nothing is thrown away before there is all that is to be read.
+    const auto marketFile = openOrTell(markets);
+    const auto walletFile = marketFile == nullptr || wallet.empty() ? nullptr : openOrTell(wallet);
+    if (marketFile == nullptr || (walletFile == nullptr && !wallet.empty()))
+        return;
+    window_.replaceWallet();
+    window_.RemoveAllCurrencies();
+    forgetWallet();
+    // Both are one step: only then is it said which of them is as its file has it.
+    const bool areMarketsWhole = readMarkets(*marketFile);
+    const bool isWalletWhole = walletFile != nullptr && readWallet(*walletFile);
+    if (areMarketsWhole)
+        window_.noteFile(FileKind::kMarkets);
+    if (isWalletWhole)
+        window_.noteFile(FileKind::kWallet);
+}
+
+std::unique_ptr<InputFile> DataFiles::openOrTell(const std::string& path)
+{
+    auto file = openFile(path.c_str());
+    if (file == nullptr)
+        window_.SetMessage(("OPEN FAILED: " + path).c_str());
+    return file;
+}
+
+bool DataFiles::readMarkets(const InputFile& file)
 {
     names_.markets = {file.path().c_str(), FileStamp::of(fileno(file.stream()))};
     window_.RemoveAllMarkets();
@@ -134,18 +167,17 @@ void DataFiles::loadMarkets(const InputFile& file)
     const bool isWhole = window_.catalogue().rd(file.stream()) == 0;
     window_.showCatalogue(before);
     window_.SetMessage(isWhole ? "Markets successfully loaded..." : "Failed to load the markets");
-    if (isWhole) {
-        window_.noteFile(FileKind::kMarkets);
-    } else {
+    if (!isWhole) {
         const bool isPartHere = window_.catalogue().getNbrCurrencies() > before;
         names_.markets.failure = shownName(fileName(names_.markets.path)) +
                                  (isPartHere ? " was loaded only in part: " : " was not loaded: ") +
                                  faultOfMarketFile(file.stream(), shownName);
     }
     tell(FileKind::kMarkets, names_.markets.failure);
+    return isWhole;
 }
 
-void DataFiles::loadWallet(const InputFile& file)
+bool DataFiles::readWallet(const InputFile& file)
 {
     names_.wallet = {file.path().c_str(), FileStamp::of(fileno(file.stream()))};
     const bool isRead = window_.getWallet()->rd(file.stream(), nullptr) == 0;
@@ -159,8 +191,7 @@ void DataFiles::loadWallet(const InputFile& file)
     // happened, and the next save asks for a name.
     window_.SetMessage("Wallet successfully loaded...");
     tell(FileKind::kWallet, report);
-    if (isRead)
-        window_.noteFile(FileKind::kWallet);
+    return isRead;
 }
 
 std::string DataFiles::reportOn(const InputFile& file, bool isRead)

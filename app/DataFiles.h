@@ -68,6 +68,11 @@ public:
     void askForLoad();
     /// The answer of the open panel: loads the file. When it can be opened the portfolio goes, whichever kind it is.
     void load(BMessage* message);
+    /// The same with a market file and a portfolio that fits it, in place of all that is here. Nothing happens, after a
+    /// message, when either cannot be opened. An empty path stands for no portfolio.
+    void loadBoth(const std::string& markets, const std::string& wallet);
+    /// Asks whether what is here may go, where there is something.
+    bool mayReplaceAll() const;
     /// Reads both in place of all that is here. When a copy, or the market data, cannot be opened, nothing changes.
     Restoring restore(const Restored& markets, const Restored& wallet);
     /// Saves to the file that is remembered, or shows the save panel, with the file's name in it when there is one.
@@ -90,8 +95,12 @@ private:
     std::optional<FileKind> kindInFront() const;
     /// Has the panel open in the folder of that kind.
     void showFolder(BFilePanel& panel, FileKind kind);
-    void loadMarkets(const InputFile& file);
-    void loadWallet(const InputFile& file);
+    /// Null, after a message, when it cannot be opened.
+    std::unique_ptr<InputFile> openOrTell(const std::string& path);
+    // Both put what the file holds in the place of what the window has, and tell what came of it. @return whether
+    // that is what the file has.
+    bool readMarkets(const InputFile& file);
+    bool readWallet(const InputFile& file);
     /// Why a portfolio could not be loaded, which is remembered, or what was lost of it; empty when nothing was.
     std::string reportOn(const InputFile& file, bool isRead);
     /// The notice about the file of that kind, in place of the one before; an empty text only takes that away.

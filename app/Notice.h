@@ -14,8 +14,9 @@ struct Notice {
 
     std::string key;             ///< a new notice takes the place of one with the same key, shown or waiting
     std::string text;            ///< one line; longer text is in the tool tip
-    std::vector<Button> buttons; ///< at most two; pressing one also takes the notice away
+    std::vector<Button> buttons; ///< at most three; pressing one also takes the notice away
     bool isPassing = false;      ///< goes by itself after some seconds, and does not queue
     bool isRemark = false;       ///< a passing one that is told behind another one which comes within a second
     bool isAnswer = false;       ///< to what was just done: goes before those that wait
+    bool isOffer = false;        ///< waits behind all others, also behind those that come later
 };

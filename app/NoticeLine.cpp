@@ -65,9 +65,10 @@ NoticeLine::NoticeLine(BRect frame) : BView(frame, "NoticeLine", B_FOLLOW_LEFT |
     SetViewColor(kGround);
     const float height = frame.Height();
     AddChild(text_ = new NoticeText({kInset, 0, frame.Width() - kInset, height}));
-    for (const char* name : {"btnNotice1", "btnNotice2"}) {
+    for (const auto& [name, key] :
+         {std::pair("btnNotice1", "Alt+6"), {"btnNotice2", "Alt+7"}, {"btnNotice3", "Alt+8"}}) {
         buttons_.push_back(new BButton({0, kEdgeWidth, 0, height - kEdgeWidth}, name, "", nullptr, B_WILL_DRAW));
-        buttons_.back()->SetToolTip(buttons_.size() == 1 ? "Alt+6" : "Alt+7");
+        buttons_.back()->SetToolTip(key);
         AddChild(buttons_.back());
     }
     Hide();
@@ -77,7 +78,7 @@ NoticeLine::~NoticeLine() = default;
 
 void NoticeLine::AttachedToWindow()
 {
-    for (int32 button = 0; button < 2; ++button) {
+    for (int32 button = 0; button < static_cast<int32>(buttons_.size()); ++button) {
         auto* message = new BMessage(kKeyPressed);
         message->AddInt32("button", button);
         Window()->AddShortcut('6' + static_cast<uint32>(button), B_COMMAND_KEY, message, this);
@@ -127,7 +128,8 @@ void NoticeLine::show(Notice notice)
         } else if (same != waiting_.end())
             *same = std::move(notice);
         else
-            waiting_.push_back(std::move(notice));
+            waiting_.insert(notice.isOffer ? waiting_.end() : std::ranges::find_if(waiting_, &Notice::isOffer),
+                            std::move(notice));
     }
     update();
 }

@@ -34,7 +34,7 @@ public:
     /// longer shown.
     void press(BMessage* message);
 
-    /// Gives the notice keys: Alt+6 and Alt+7 press its buttons, Alt+0 dismisses it.
+    /// Gives the notice keys: Alt+6, Alt+7 and Alt+8 press its buttons, Alt+0 dismisses it.
     void AttachedToWindow() override;
     void MessageReceived(BMessage* message) override;
     void Draw(BRect updateRect) override;

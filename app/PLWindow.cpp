@@ -1,6 +1,7 @@
 #include "app/PLWindow.h"
 
 #include "app/Completions.h"
+#include "app/FirstSteps.h"
 #include "app/Holds.h"
 #include "app/MessageView.h"
 #include "app/NoticeLine.h"
@@ -143,6 +144,8 @@ constexpr Command kOwnCommands[] = {
     {'WBGd', [](PLWindow& w, BMessage*) { w.valueAtLastQuotes(); }},           // the portfolio page
     {'OPIn', [](PLWindow& w, BMessage*) { w.ChangeOperationType("INCOME"); }}, // the operation page
     {'OPCh', [](PLWindow& w, BMessage*) { w.ChangeOperationType("CHARGE"); }},
+    {FirstSteps::kOpenLast, [](PLWindow& w, BMessage*) { w.OpenLastFiles(); }, "Load"},
+    {FirstSteps::kOpenSample, [](PLWindow& w, BMessage*) { w.OpenSample(); }, "Load"},
     {'NtSm', [](PLWindow& w, BMessage*) { w.takeBackSimulation(); }},
 };
 
@@ -205,6 +208,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     history_ = std::make_unique<History>(moment(), files_->names());
     showHistory();
     rescue_ = std::make_unique<Rescue>(*this, *files_, folder);
+    firstSteps_ = std::make_unique<FirstSteps>(*this, *tabView_, *files_, folder);
 }
 
 PLWindow::~PLWindow() = default;
@@ -251,6 +255,16 @@ void PLWindow::makeTableButtons()
                         "Writes what this page shows as a table for other programs", 'TExp');
 }
 
+void PLWindow::OpenLastFiles()
+{
+    firstSteps_->openLast();
+}
+
+void PLWindow::OpenSample()
+{
+    firstSteps_->openSample();
+}
+
 void PLWindow::OpenExport()
 {
     export_->open(*exportButton_);
@@ -286,6 +300,7 @@ void PLWindow::MessageReceived(BMessage* message)
     noteStep(std::exchange(command_, {}));
     if (history_->serial() != former)
         tellDone(command->step);
+    firstSteps_->update();
 }
 
 void PLWindow::tellDone(const std::string& command)

@@ -19,6 +19,7 @@
 
 class BButton;
 class Completions;
+class FirstSteps;
 class MessageView;
 class NoticeLine;
 class ParameterView;
@@ -123,6 +124,9 @@ public:
     /// The answer of the save panel. @return `B_OK`; what is missing in the message.
     status_t Save(BMessage* message) { return files_->save(message); }
     void Save(const String& path) { files_->save(path); }
+
+    void OpenLastFiles();
+    void OpenSample();
 
     // Tables and journals of other programs, and for them.
     void AskForImport() { import_->ask(); }
@@ -263,6 +267,7 @@ private:
     std::unique_ptr<ImportAssistant> import_;
     std::unique_ptr<Completions> completions_;
     std::unique_ptr<Shortcuts> shortcuts_;
+    std::unique_ptr<FirstSteps> firstSteps_;
     std::unique_ptr<Rescue> rescue_; // the last one to come and the first to go: its last copy needs all of the above
     int holds_ = 0;                  // of the valuation; 0 between two commands
     bool isUpdateDue_ = false;       // it was asked for meanwhile

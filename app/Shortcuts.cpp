@@ -1,5 +1,6 @@
 #include "app/Shortcuts.h"
 
+#include "app/FirstSteps.h"
 #include "platform/Button.h"
 #include "platform/ListView.h"
 #include "platform/Message.h"
@@ -73,6 +74,7 @@ Shortcuts::Shortcuts(BWindow& window, BTabView& tabs) : window_(window), tabs_(t
         window.AddShortcut('1' + static_cast<uint32>(i), B_COMMAND_KEY, message, this);
     }
     window.AddShortcut('O', B_CONTROL_KEY, new BMessage(kLoad), this);
+    window.AddShortcut('O', B_CONTROL_KEY | B_SHIFT_KEY, new BMessage(FirstSteps::kOpenLast), &window);
     window.AddShortcut('S', B_CONTROL_KEY, new BMessage(kSave), this);
     window.AddShortcut('N', B_CONTROL_KEY, new BMessage(kAdd), this);
     window.AddShortcut('F', B_CONTROL_KEY, new BMessage(kFind), this);

@@ -20,6 +20,7 @@
 namespace {
 
 const BPoint kNoDataPlace(10, 20);
+const BPoint kHintPlace(10, 40);
 constexpr float kFlagReach = 6;       // of the pointer, in pixels
 constexpr double kLeastDays = 4;      // a shorter range is not shown
 constexpr double kLeastShare = 0.001; // and no smaller part of an axis of numbers
@@ -69,6 +70,7 @@ void GraphView::Draw(BRect)
     if (contents.series.empty()) {
         drawn_.reset(); // there is nothing to read out, and no range to change
         painter.drawNotice("No data", kNoDataPlace, contents.legendFont.size);
+        painter.drawNotice(hint_.c_str(), kHintPlace, contents.legendFont.size);
         return;
     }
     ChartLayout layout = layOutChart(contents);

@@ -35,6 +35,8 @@ public:
     /// Whether x are dates; the flags of elements and points are to be set alike.
     void setXDateBased(bool dateBased) { xDateBased_ = dateBased; }
     bool isXDateBased() const { return xDateBased_; }
+    /// Stands below "No data" in a chart without any: what will be drawn here.
+    void setHint(const std::string& hint) { hint_ = hint; }
     /// Covers whatever its alpha.
     void setBackgroundColor(rgb_color color) { backgroundColor_ = color; }
     rgb_color getBackgroundColor() const { return backgroundColor_; }
@@ -98,6 +100,7 @@ private:
     void savePicture(const BMessage& answer);
 
     GraphViewToGraphElements elements_;
+    std::string hint_;
     String xLegend_;
     String yLegend_;
     rgb_color backgroundColor_{255, 255, 255, 0};

@@ -19,6 +19,9 @@ constexpr rgb_color B_TRANSPARENT_COLOR = {119, 116, 119, 0};
 /// The ground of windows and of what stands in them.
 constexpr rgb_color kPanelGrey = {216, 216, 216, 255};
 
+/// Text on white that is of less weight than other text.
+constexpr rgb_color kFaintGrey = {110, 110, 110, 255};
+
 /// What a shape is drawn with.
 enum pattern { B_SOLID_HIGH, B_SOLID_LOW };
 

@@ -85,6 +85,8 @@ public:
     virtual void SelectionChanged() {}
     /// The list was scrolled sideways.
     virtual void ScrolledSideways() {}
+    /// What stands, in grey, in the place of rows while there is none.
+    virtual std::string EmptyText() const { return {}; }
     /// What the tool tip says at `where`, over the row of that index; empty for none.
     virtual std::string ToolTipAt(BPoint /*where*/, int32 /*index*/) const { return {}; }
 

@@ -2,10 +2,10 @@
 
 #include "market/Catalogue.h"
 #include "market/Company.h"
+#include "sample/Noise.h"
+#include "sample/SampleMarket.h"
 #include "storage/AtomicFile.h"
-#include "tools/Noise.h"
 #include "tools/QuotePages.h"
-#include "tools/SampleMarket.h"
 
 #include <cmath>
 #include <cstdio>

@@ -1,12 +1,9 @@
 #include "foundation/Today.h"
 #include "market/Catalogue.h"
-#include "portfolio/Wallet.h"
-#include "storage/AtomicFile.h"
+#include "sample/SampleFiles.h"
 #include "storage/DataFolder.h"
 #include "storage/InputFile.h"
 #include "tools/Program.h"
-#include "tools/SampleMarket.h"
-#include "tools/SamplePortfolio.h"
 #include "tools/SampleQuotes.h"
 
 #include <filesystem>
@@ -49,12 +46,6 @@ void describe(CLI::App& app, Arguments& arguments)
     app.add_flag("--only-news", arguments.onlyNews, "Do not tell of the two files when both are there already");
 }
 
-bool isThere(const std::string& path)
-{
-    std::error_code error; // of a folder that cannot be searched; making the file tells it
-    return std::filesystem::exists(std::filesystem::symlink_status(path, error));
-}
-
 std::filesystem::path dataFolder(const Arguments& arguments)
 {
     if (!arguments.folder.empty())
@@ -63,23 +54,6 @@ std::filesystem::path dataFolder(const Arguments& arguments)
     if (users.path().empty())
         throw std::runtime_error("There is no home folder to keep files in; name a FOLDER.");
     return users.path();
-}
-
-/// Lets `object` write itself to `path` unless that is there. @return whether it has.
-template <class Object>
-bool writeSample(const std::filesystem::path& path, const Object& object, const Date& stamp)
-{
-    if (isThere(path))
-        return false;
-    std::error_code error;
-    std::filesystem::create_directories(path.parent_path(), error);
-    if (error)
-        throw std::runtime_error(path.parent_path().string() + ": cannot be made: " + error.message());
-    AtomicFile file(path, AtomicFile::Existing::kKeep);
-    if (object.wrt(file.stream(), stamp) != 0)
-        file.fail("cannot be written");
-    file.commit();
-    return true;
 }
 
 void tell(const std::filesystem::path& path, bool isWritten)
@@ -100,25 +74,14 @@ void writeQuotes(const std::string& folder, const std::string& marketFile, const
 void run(const Arguments& arguments)
 {
     const Date& last = arguments.date;
-    const std::vector<Date> days = sampleDays(last);
-    Catalogue catalogue;
-    Wallet wallet;
-    fillSampleMarket(catalogue, days);
-    fillSamplePortfolio(wallet, catalogue, days);
-
-    const std::filesystem::path folder = dataFolder(arguments);
-    const std::filesystem::path market = folder / "Companies" / "Sample";
-    const std::filesystem::path portfolio = folder / "PortoFolios" / "Sample";
-    // Each file by itself: an owner who has removed one of them gets it back, and keeps the other as it is.
-    const bool isMarketNew = writeSample(market, catalogue, last);
-    const bool isPortfolioNew = writeSample(portfolio, wallet, last);
-    if (!arguments.quiet && (!arguments.onlyNews || isMarketNew || isPortfolioNew)) {
-        tell(market, isMarketNew);
-        tell(portfolio, isPortfolioNew);
+    const SampleFiles files = SampleFiles::make(dataFolder(arguments), last);
+    if (!arguments.quiet && (!arguments.onlyNews || files.areMarketsNew || files.isPortfolioNew)) {
+        tell(files.markets, files.areMarketsNew);
+        tell(files.portfolio, files.isPortfolioNew);
     }
     if (arguments.quotes.empty())
         return;
-    writeQuotes(arguments.quotes, market, last);
+    writeQuotes(arguments.quotes, files.markets, last);
     if (!arguments.quiet)
         std::cout << arguments.quotes << ": quotes up to " << last.toString().bytes() << " written\n";
 }

@@ -118,6 +118,10 @@ public:
     /// A text that is cut in its column.
     std::string ToolTipAt(BPoint where, int32 index) const override;
 
+    /// Shown in the place of rows until there is one: what will stand here, and what to press first.
+    void setHint(const std::string& hint) { hint_ = hint; }
+    std::string EmptyText() const override { return all_.empty() ? hint_ : std::string(); }
+
 protected:
     /// Puts the row behind all others; the list shows it where it belongs.
     void appendRow(ColumnItem* row);
@@ -173,5 +177,6 @@ private:
     std::vector<std::string> words_;   // that rows must have, folded
     std::vector<ColumnItem*> ordered_; // what was chosen of all, sorted
     bool isOrderKnown_ = false;
+    std::string hint_;
     ColumnItem* hidden_ = nullptr; // the leading row while it does not show; then no row is selected
 };

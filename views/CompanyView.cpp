@@ -46,6 +46,8 @@ void CompanyView::makeMarkets(BRect frame)
     markets_ = new MarketListView("lstMarkets");
     markets_->addTo(box, {kBoxSide, kBoxTop, right, fieldTop - kGap}, "Markets");
     markets_->SetSelectionMessage(new BMessage('MSel'));
+    markets_->setHint("No market yet. A market has a currency: add that first on the page Currency (Alt+2). Then type "
+                      "a name and the currency's symbol, and press Add.");
     constexpr float kCurrencyWidth = 112;
     marketName_ = addField(box, {kBoxSide, fieldTop, right - kCurrencyWidth - kGap, fieldTop + kFieldHeight},
                            "txtMarketName", "Name", 'CTMn', 40);
@@ -67,6 +69,8 @@ void CompanyView::makeCompanies(BRect frame)
     companies_ = new CompanyListView("lstCompanies");
     companies_->addTo(box, {kBoxSide, kBoxTop, kListEnd, bottom}, "Companies");
     companies_->SetSelectionMessage(new BMessage('CSel'));
+    companies_->setHint("The companies of the market that is selected will stand here. Type ticker and name, and press "
+                        "Add. \"Import...\" brings many at once, with their prices.");
 
     constexpr float kLeft = kListEnd + kMargin;
     constexpr float kNarrow = 44;

@@ -40,6 +40,8 @@ void CurrencyView::makeCurrencies(BRect frame)
     currencies_ = new CurrencyListView("lstCurrencies");
     currencies_->addTo(box, {kBoxSide, kBoxTop, kListEnd, bottom}, "Currencies");
     currencies_->SetSelectionMessage(new BMessage('Crsl'));
+    currencies_->setHint("No currency yet: this is where to begin. Type a name and a symbol, such as Euro and EUR, and "
+                         "press Add. The first one becomes the reference, in which totals are given.");
 
     constexpr float kLeft = kListEnd + 2 * kMargin;
     constexpr float kDivider = 118;
@@ -76,6 +78,9 @@ void CurrencyView::makeMarkets(BRect frame)
     const float width = frame.Width() - 2 * kBoxSide;
     markets_ = new MarketListView("lstMarkets");
     markets_->addTo(box, {kBoxSide, kBoxTop, kBoxSide + width, frame.Height() - kBoxSide}, "Markets");
+    markets_->setHint(
+        "The markets of the currency that is selected will stand here. They are added on the page Company "
+        "(Alt+1).");
 }
 
 void CurrencyView::setCurrencyRefName(const String& name)

@@ -34,6 +34,8 @@ EventBox::EventBox(BRect frame) : BBox(frame, "")
     list_ = new CompanyEventListView("lstCompanyEvents");
     list_->addTo(this, {kBoxSide, kBoxTop, right, kListEnd}, "Events");
     list_->SetSelectionMessage(new BMessage('CEse'));
+    list_->setHint(
+        "Splits and notes of the company that is selected will stand here. Fill in the fields, and press Add.");
 
     // Four rows of the list; what is below it is left to the fields.
     const float top = kListEnd + kMargin;

@@ -110,6 +110,9 @@ void OperationView::makeList()
                        {kBoxSide, kBoxTop + kFilterRow, kRight - kMargin - kBoxSide, kListEnd - kListTop - kBoxSide},
                        kListTitle);
     operations_->SetSelectionMessage(new BMessage('OSel'));
+    operations_->setHint(
+        "No operation yet. Choose a type below, beginning with a deposit, fill in the fields and press "
+        "Add; accounts are added on the page PortoFolio (Alt+3). \"Import...\" brings a bank's statement.");
 }
 
 void OperationView::makeFields()

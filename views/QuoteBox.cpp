@@ -15,6 +15,8 @@ QuoteBox::QuoteBox(BRect frame, const char* title, const Codes& codes) : BBox(fr
     list_ = new QuoteListView("lstQuotes");
     list_->addTo(this, {kBoxSide, kBoxTop, kBoxSide + kListWidth, bottom}, title);
     list_->SetSelectionMessage(new BMessage(codes.selection));
+    list_->setHint("A value for each day will stand here. Select a row above; then type date and value, and press Add. "
+                   "\"Import...\" brings a table.");
 
     constexpr float kLeft = kBoxSide + kListWidth + kMargin;
     constexpr float kDivider = 44;

@@ -111,6 +111,7 @@ protected:
     QuoteChart* addChart(BRect frame)
     {
         AddChild(chart_ = new QuoteChart(frame));
+        chart_->setHint("The values of the row that is selected above will be drawn here, with their trend.");
         return chart_;
     }
 

@@ -119,6 +119,9 @@ void WalletView::makeAccounts()
     accounts_ = new AccountStateListView("lstAccounts");
     accounts_->addTo(box, {kBoxSide, kBoxTop, kListEnd, bottom}, "Accounts");
     accounts_->SetSelectionMessage(new BMessage('Acsl'));
+    accounts_->setHint(
+        "No account yet. Type a name and a currency's symbol, and press Add. Currencies are added on the "
+        "page Currency (Alt+2).");
 
     constexpr float kLeft = kListEnd + 2 * kMargin;
     const float right = kRight - kMargin - kBoxSide;
@@ -145,6 +148,8 @@ void WalletView::makeHoldings()
     shares_->addTo(holdingsBox_,
                    {kBoxSide, kBoxTop, kRight - kMargin - kBoxSide, kHoldingsEnd - kHoldingsTop - kBoxSide},
                    "Holdings");
+    shares_->setHint("What is held on the day will stand here. Money is paid in, and shares are bought, on the page "
+                     "Operations (Alt+4).");
     // On the upper edge of the box: the list has the room below it.
     constexpr float kWidth = 220;
     constexpr float kFilterTop = kHoldingsTop - 4;
@@ -290,6 +295,9 @@ void WalletView::UpdateEvolution(const std::vector<EvolutionPoint>& points, cons
                                  EvolutionOutcome outcome)
 {
     ClearEvolution();
+    evolution_->setHint(outcome == EvolutionOutcome::kBuilt
+                            ? "The value of each day since the first operation will be drawn here."
+                            : "");
     evolution_->showPoints(points, reference != nullptr ? textOf(reference->getRepresentation()) : "???");
     // What is too long to be drawn, or has no beginning, is said in the chart; there it is looked for.
     if (outcome != EvolutionOutcome::kBuilt)

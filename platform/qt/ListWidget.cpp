@@ -2,6 +2,7 @@
 
 #include "platform/ListItem.h"
 #include "platform/ListView.h"
+#include "platform/qt/Canvas.h"
 
 #include <QContextMenuEvent>
 #include <QHelpEvent>
@@ -171,9 +172,21 @@ bool ListWidget::viewportEvent(QEvent* event)
     return true;
 }
 
+void ListWidget::paintEmptyText()
+{
+    constexpr int kInset = 6;
+    QPainter painter(viewport());
+    painter.setFont(be_plain_font->toQt());
+    painter.setPen(toQt(kFaintGrey));
+    painter.drawText(viewport()->rect().adjusted(kInset, kInset, -kInset, -kInset), Qt::TextWordWrap,
+                     QString::fromStdString(list_.EmptyText()));
+}
+
 void ListWidget::paintEvent(QPaintEvent* event)
 {
     QListView::paintEvent(event);
+    if (list_.CountItems() == 0)
+        paintEmptyText();
     // Which list has the keyboard shows also when no row is selected.
     if (!hasFocus())
         return;

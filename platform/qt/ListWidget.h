@@ -60,6 +60,8 @@ protected:
     void paintEvent(QPaintEvent* event) override;
 
 private:
+    void paintEmptyText();
+
     BListView& list_;
     ListModel rows_;
     ListRows painter_;

@@ -107,6 +107,7 @@ TEST_F(FieldTest, NumbersAreWrittenAsTheyWereUnderstood)
         {"txtQuantity", "5.00", "5", ""},
         {"txtQuantity", "99999999999", "2147483647", "99999999999 was read as 2147483647"},
     };
+    dismissOffer();
     show(kOperationPage);
     choose("operationType", "Buy");
     for (const auto& c : cases) {

@@ -4,6 +4,8 @@
 #include "platform/Entry.h"
 #include "platform/FilePanel.h"
 #include "platform/Message.h"
+#include "platform/StringView.h"
+#include "platform/TabView.h"
 #include "platform/qt/WindowWidget.h"
 #include "portfolio/Account.h"
 #include "portfolio/Share.h"
@@ -13,6 +15,7 @@
 
 #include <QApplication>
 #include <QLineEdit>
+#include <QTest>
 #include <filesystem>
 #include <fstream>
 #include <functional>
@@ -92,6 +95,45 @@ TEST_F(FileTest, SampleComesInThroughTheButtonsAndIsSavedUnchanged)
     loadMarkets(marketFile());
     loadWallet(walletFile());
     EXPECT_EQ(text("txtTotalValue"), total);
+}
+
+TEST_F(FileTest, AnEmptyWindowOffersTheSampleAndTheFilesThatWereSavedLast)
+{
+    const auto press = [this](const char* button) {
+        QTest::mouseClick(window().widget().findChild<QWidget*>(button), Qt::LeftButton);
+        settle();
+    };
+    EXPECT_EQ(notice(), "Nothing is open yet.");
+    press("btnNotice1");
+    EXPECT_EQ(message(), "Wallet successfully loaded...");
+    EXPECT_EQ(text("txtTotalDeposit"), "93,000.00 EUR") << "on the portfolio's page";
+    EXPECT_EQ(notice(), "");
+    press("btnUndo");
+    EXPECT_EQ(window().catalogue().getNbrCurrencies() + wallet().getNbrAccounts(), 0U) << "both were one step";
+    EXPECT_EQ(notice(), "Saved last: Sample and Sample");
+
+    // By their times, and not what lies beside them.
+    namespace fs = std::filesystem;
+    const auto now = fs::file_time_type::clock::now();
+    fs::copy_file(walletFile(), folder() + "/PortoFolios/Other");
+    fs::last_write_time(folder() + "/PortoFolios/Other", now - std::chrono::hours(1));
+    fs::copy_file(walletFile(), folder() + "/PortoFolios/Mine");
+    fs::last_write_time(folder() + "/PortoFolios/Mine", now + std::chrono::hours(1));
+    write(folder() + "/PortoFolios/.Hidden", "");
+    fs::last_write_time(folder() + "/PortoFolios/.Hidden", now + std::chrono::hours(2));
+    fs::create_directory(folder() + "/Companies/Folder");
+    restart();
+    EXPECT_EQ(notice(), "Saved last: Sample and Mine");
+    QTest::keyClick(&window().widget(), Qt::Key_O, Qt::ControlModifier | Qt::ShiftModifier);
+    settle();
+    EXPECT_EQ(text("txtTotalDeposit"), "93,000.00 EUR");
+    auto& tabs = dynamic_cast<BTabView&>(*window().FindView("TabView"));
+    const auto* openFile = tabs.TabAt(kPortoFolioPage)->View()->FindView("txtOpenFile");
+    EXPECT_STREQ(dynamic_cast<const BStringView&>(*openFile).Text(), "Mine");
+    answerNextAlert("Cancel");
+    QTest::keyClick(&window().widget(), Qt::Key_O, Qt::ControlModifier | Qt::ShiftModifier);
+    settle();
+    EXPECT_THAT(alerts(), SizeIs(1)) << "what is here would go";
 }
 
 TEST_F(FileTest, LoadingAsksWhereSomethingCouldBeLost)

@@ -37,6 +37,7 @@ TEST_F(NoticeTest, SeveralQueueAndAClickBringsTheNext)
     const auto button = [&](const char* label) {
         return Notice::Button{label, [&pressed, label] { pressed += label; }};
     };
+    dismissOffer();
     show(kPortoFolioPage);
     find<QWidget>("txtDate").setFocus();
     EXPECT_EQ(notice(), "");

@@ -59,6 +59,7 @@ protected:
     QWidget& widget() { return window().widget(); }
     std::string notice()
     {
+        dismissOffer();
         const auto* text = widget().findChild<QWidget*>("txtNotice");
         return text->isVisible() ? text->accessibleName().toStdString() : "";
     }

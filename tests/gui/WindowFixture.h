@@ -73,6 +73,8 @@ protected:
 
     /// What the status line shows.
     std::string message() const;
+    /// Takes away what an empty window offers.
+    void dismissOffer() { window().dropNotice("first steps"); }
     void clearMessage() { window().SetMessage(""); }
     /// Sends a code as a control does.
     void post(uint32 code);

@@ -1,4 +1,4 @@
-#include "tools/SamplePortfolio.h"
+#include "sample/SamplePortfolio.h"
 
 #include "market/Catalogue.h"
 #include "market/Company.h"
@@ -9,7 +9,7 @@
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
 #include "portfolio/Wallet.h"
-#include "tools/SampleMarket.h"
+#include "sample/SampleMarket.h"
 
 #include <string_view>
 #include <unordered_map>

@@ -1,4 +1,4 @@
-#include "tools/SampleMarket.h"
+#include "sample/SampleMarket.h"
 
 #include "market/Catalogue.h"
 #include "market/Company.h"
@@ -6,7 +6,7 @@
 #include "market/Market.h"
 #include "market/NoteCompanyEvent.h"
 #include "market/SplitCompanyEvent.h"
-#include "tools/Noise.h"
+#include "sample/Noise.h"
 
 #include <algorithm>
 #include <cmath>

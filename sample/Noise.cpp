@@ -1,4 +1,4 @@
-#include "tools/Noise.h"
+#include "sample/Noise.h"
 
 std::uint64_t Noise::nextBits()
 {
