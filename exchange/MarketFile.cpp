@@ -6,6 +6,7 @@
 #include "market/NoteCompanyEvent.h"
 #include "market/RecordList.h"
 #include "market/SplitCompanyEvent.h"
+#include "storage/DurableSave.h"
 
 #include <algorithm>
 #include <functional>
@@ -228,6 +229,17 @@ void MarketFile::read()
         throw std::runtime_error(file_.path() + ": " + faultOfMarketFile(file, printable));
     if (!reference_.isUndefined())
         catalogue_.setReferenceCurrency(catalogue_.getCurrencyByRepresentation(reference_));
+}
+
+void MarketFile::save(MarketPlan& plan, const Date& latestDay)
+{
+    const MarketPlan::Owners changed = plan.carryOut(catalogue_);
+    // Values of former days leave the date that later ones have given.
+    const Date stamp = std::max(latestDay, latestStamp_);
+    const auto writeTo = [&](FILE* to) { return write(to, changed, stamp); };
+    const auto result = DurableSave(DataFolder()).save(path(), writeTo, stamp_);
+    if (result.outcome != DurableSave::Outcome::kSaved)
+        throw std::runtime_error(result.reason);
 }
 
 int MarketFile::write(FILE* to, const MarketPlan::Owners& changed, const Date& stamp) const

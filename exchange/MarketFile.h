@@ -23,10 +23,11 @@ public:
     /// The symbol of the reference as the file names it, even when it has no currency of that symbol; empty when it
     /// names none.
     std::string reference() const { return std::string(reference_.comparedBytes()); }
-    /// The latest of the dates that the currencies bear; undefined when none has a real one.
-    const Date& latestStamp() const { return latestStamp_; }
-    /// Tells the file as it was read from what another program may have put in its place since.
-    const std::optional<FileStamp>& stamp() const { return stamp_; }
+    /// Carries out `plan`, which was made for the catalogue, and saves the file as a save of the window does. Throws
+    /// std::runtime_error with the reason when it could not be saved, or is not as it was read any more; then nothing
+    /// has happened to it.
+    /// @param latestDay of the values. A file that bears a later one keeps that.
+    void save(MarketPlan& plan, const Date& latestDay);
 
     /// Writes the file with what a plan has added to the catalogue. `changed` are those of whose quotes or rates some
     /// are other than in the file; all else that the file has is copied from it.
@@ -37,8 +38,8 @@ private:
     void read();
 
     InputFile file_;
-    std::optional<FileStamp> stamp_;
+    std::optional<FileStamp> stamp_; // tells the file as it was read from what another program has put in its place
     Catalogue catalogue_;
     String reference_;
-    Date latestStamp_;
+    Date latestStamp_; // the latest of the dates that the currencies bear; undefined when none has a real one
 };

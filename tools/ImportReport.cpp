@@ -1,7 +1,6 @@
 #include "tools/ImportReport.h"
 
 #include "foundation/PrintableText.h"
-#include "storage/DurableSave.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -50,15 +49,4 @@ void ImportReport::print() const
     std::cerr << names;
     if (!(std::cout << figures << std::flush))
         throw std::runtime_error(std::string("standard output: ") + std::strerror(errno));
-}
-
-void bringInto(MarketFile& file, MarketPlan& plan, const Date& latestDay)
-{
-    const MarketPlan::Owners changed = plan.carryOut(file.catalogue());
-    // Values of former days leave the date that later ones have given.
-    const Date stamp = std::max(latestDay, file.latestStamp());
-    const auto write = [&](FILE* to) { return file.write(to, changed, stamp); };
-    const auto result = DurableSave(DataFolder()).save(file.path(), write, file.stamp());
-    if (result.outcome != DurableSave::Outcome::kSaved)
-        throw std::runtime_error(result.reason);
 }

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "exchange/MarketFile.h"
+#include "exchange/MarketPlan.h"
 
 #include <string>
 
@@ -14,8 +14,3 @@ struct ImportReport {
     std::string names;
     std::string figures;
 };
-
-/// Carries out a plan that was made for the file, and saves it as a save of the window does. Throws std::runtime_error
-/// with the reason when it could not be saved; then it is as it was.
-/// @param latestDay of the values. A file that bears a later one keeps that.
-void bringInto(MarketFile& file, MarketPlan& plan, const Date& latestDay);

@@ -1,3 +1,4 @@
+#include "exchange/MarketFile.h"
 #include "exchange/MarketImport.h"
 #include "storage/AtomicFile.h"
 #include "tools/ImportMode.h"
@@ -109,7 +110,7 @@ void ImportTables::runInto(const ImportArguments& arguments)
         std::cerr << path << ": has all of it, and is left as it is\n";
         return report.print();
     }
-    bringInto(file, added, stamp);
+    file.save(added, stamp);
     report.print();
 }
 

@@ -202,6 +202,6 @@ void updateMarket(const std::string& path, const QuoteSource& source, std::chron
     plan.settle();
     const ImportReport report(plan);
     if (!plan.isEmpty())
-        bringInto(file, plan, latestDay);
+        file.save(plan, latestDay);
     report.print();
 }
