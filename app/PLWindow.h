@@ -21,11 +21,13 @@ class BButton;
 class Completions;
 class MessageView;
 class NoticeLine;
+class PageReturns;
 class ParameterView;
 class Rescue;
 class Shortcuts;
 class State;
 class WalletView;
+struct EvolutionPoint;
 
 /// The main window, and the controller: it owns the model and the five pages, and turns the code of every message into
 /// one command.
@@ -226,6 +228,8 @@ private:
     void removeMarkets(const Currency& currency);
     void showParameters();
     void showAccounts();
+    /// Shows the returns beside the valuation, of which `days` are the daily values, if there are any.
+    void showReturns(std::vector<EvolutionPoint> days);
     /// Tells in a notice that there are simulated sales, or no longer.
     void tellSimulation();
     /// Null, after a message, when there is none.
@@ -260,6 +264,7 @@ private:
     std::unique_ptr<SplitAssistant> split_;
     std::unique_ptr<ExportAssistant> export_;
     std::unique_ptr<OperationEditor> operations_;
+    std::unique_ptr<PageReturns> returns_;
     std::unique_ptr<ImportAssistant> import_;
     std::unique_ptr<Completions> completions_;
     std::unique_ptr<Shortcuts> shortcuts_;

@@ -1,6 +1,8 @@
 // The portfolio: its accounts, its parameters, its value.
 
 #include "app/Holds.h"
+#include "app/PageReturns.h"
+#include "app/PlainPortfolio.h"
 #include "foundation/DateText.h"
 #include "market/Currency.h"
 #include "portfolio/Wallet.h"
@@ -157,6 +159,7 @@ void PLWindow::replaceWallet()
     // No row and no selection refers to the former portfolio any more when it goes.
     SetState(nullptr);
     walletView_->ClearEvolution();
+    returns_->forget();
     walletView_->ForgetSelection();
     operationView_->ForgetSelection();
     wallet_ = std::make_unique<Wallet>();
@@ -185,6 +188,7 @@ void PLWindow::UpdateState()
 
     // The valuation destroys all states: no row shows one, and the window has none, until there is a new one.
     walletView_->ClearState();
+    returns_->forget();
     state_ = nullptr;
     refreshWalletCatalogue();
     const Date date = walletView_->getDate();
@@ -204,12 +208,26 @@ void PLWindow::UpdateState()
         tellSimulation();
         return;
     }
-    if (isEvolutionAsked)
-        walletView_->UpdateEvolution(evolutionPoints(*wallet_, catalogue_), catalogue_.getReferenceCurrency(), outcome);
-    else
+    std::vector<EvolutionPoint> days;
+    if (isEvolutionAsked) {
+        days = evolutionByDate(*wallet_, catalogue_);
+        walletView_->UpdateEvolution(days, catalogue_.getReferenceCurrency(), outcome);
+    } else {
         walletView_->ClearEvolution();
+    }
     SetState(state);
+    showReturns(std::move(days));
     tellSimulation();
+}
+
+void PLWindow::showReturns(std::vector<EvolutionPoint> days)
+{
+    if (automaticSales(*wallet_).empty())
+        return returns_->show(*state_, std::move(days));
+    PlainPortfolio plain(*wallet_, catalogue_, state_->getDate());
+    if (!days.empty())
+        days = plain.evolve(); // which makes another state
+    returns_->show(plain.state(), std::move(days));
 }
 
 void PLWindow::tellSimulation()
