@@ -12,6 +12,7 @@
 #include "app/SplitAssistant.h"
 #include "market/Catalogue.h"
 #include "platform/Window.h"
+#include "valuation/Evolution.h"
 #include "views/CompanyView.h"
 #include "views/CurrencyView.h"
 
@@ -27,7 +28,6 @@ class Rescue;
 class Shortcuts;
 class State;
 class WalletView;
-struct EvolutionPoint;
 
 /// The main window, and the controller: it owns the model and the five pages, and turns the code of every message into
 /// one command.
@@ -87,8 +87,9 @@ public:
     // The portfolio as a whole (WalletCommands.cpp).
     /// Values the portfolio anew at its page's date and shows it. Within a `StateHold` that waits for its end.
     void UpdateState();
-    /// Makes `state` the one that is shown; null shows none. The former one is not destroyed here.
-    void SetState(State* state);
+    /// Makes `state` the one that is shown, of which `days` are the daily values if there are any; null shows none. The
+    /// former one is not destroyed here.
+    void SetState(State* state, std::vector<EvolutionPoint> days = {});
     /// Starts a new, empty portfolio, which has no file yet.
     void ReinitWallet();
     void ChangeParameter(uint32 code);
@@ -228,8 +229,8 @@ private:
     void removeMarkets(const Currency& currency);
     void showParameters();
     void showAccounts();
-    /// Shows the returns beside the valuation, of which `days` are the daily values, if there are any.
-    void showReturns(std::vector<EvolutionPoint> days);
+    /// Shows what `state_` is worth, and has come to, on the page of the portfolio.
+    void showValuation(std::vector<EvolutionPoint> days);
     /// Tells in a notice that there are simulated sales, or no longer.
     void tellSimulation();
     /// Null, after a message, when there is none.

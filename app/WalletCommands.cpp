@@ -9,6 +9,7 @@
 #include "valuation/AccountState.h"
 #include "valuation/AutomaticSale.h"
 #include "valuation/Evolution.h"
+#include "valuation/HoldingFigures.h"
 #include "valuation/QuoteCoverage.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
@@ -215,19 +216,8 @@ void PLWindow::UpdateState()
     } else {
         walletView_->ClearEvolution();
     }
-    SetState(state);
-    showReturns(std::move(days));
+    SetState(state, std::move(days));
     tellSimulation();
-}
-
-void PLWindow::showReturns(std::vector<EvolutionPoint> days)
-{
-    if (automaticSales(*wallet_).empty())
-        return returns_->show(*state_, std::move(days));
-    PlainPortfolio plain(*wallet_, catalogue_, state_->getDate());
-    if (!days.empty())
-        days = plain.evolve(); // which makes another state
-    returns_->show(plain.state(), std::move(days));
 }
 
 void PLWindow::tellSimulation()
@@ -262,16 +252,32 @@ void PLWindow::valueAtLastQuotes()
     UpdateState();
 }
 
-void PLWindow::SetState(State* state)
+void PLWindow::showValuation(std::vector<EvolutionPoint> days)
+{
+    const Totals totals(*state_, catalogue_);
+    // What simulations have made up is no part of the returns and of what the holdings came to. The copy ends here:
+    // companies list its holdings, too.
+    std::optional<PlainPortfolio> plain;
+    if (!automaticSales(*wallet_).empty())
+        plain.emplace(*wallet_, catalogue_, state_->getDate());
+    walletView_->SetState(state_, totals, holdingFigures(plain ? plain->state() : *state_, catalogue_, {}));
+    if (plain && !days.empty())
+        days = plain->evolve(); // with another state in place of that of the figures
+    returns_->show(plain ? plain->state() : *state_, std::move(days));
+    if (totals.isKnown && totals.reference->getNbrQuotes() > 0) // otherwise no total rests on a quote
+        walletView_->showCoverage(state_->getDate(), quoteCoverage(*state_), rateCoverage(*state_, catalogue_));
+}
+
+void PLWindow::SetState(State* state, std::vector<EvolutionPoint> days)
 {
     const WindowLock lock(*this);
     if (!lock.isHeld())
         return;
     state_ = state;
-    const Totals totals = state != nullptr ? Totals(*state, catalogue_) : Totals();
-    walletView_->SetState(state, totals);
-    if (totals.isKnown && totals.reference->getNbrQuotes() > 0) // otherwise no total rests on a quote
-        walletView_->showCoverage(state->getDate(), quoteCoverage(*state), rateCoverage(*state, catalogue_));
+    if (state != nullptr)
+        showValuation(std::move(days));
+    else
+        walletView_->SetState(nullptr, {}, {});
     // The list is emptied and filled: automatic operations have come and gone with the valuation. A portfolio that is
     // not shown has no operations to show either.
     operationView_->ClearAllOperations();

@@ -28,7 +28,7 @@ constexpr float kTopEnd = kMargin + kButtonHeight;
 constexpr float kFileEnd = kTopEnd + 22;
 constexpr float kTotalsTop = kFileEnd;
 constexpr float kReturnsTop = kTotalsTop + kBoxTop + 2 + kFieldHeight; // below the totals
-constexpr float kTotalsEnd = kReturnsTop + 17;
+constexpr float kTotalsEnd = kReturnsTop + 18;
 constexpr float kAccountsTop = kTotalsTop + 62;
 constexpr float kAccountsEnd = kAccountsTop + 148;
 constexpr float kHoldingsTop = kAccountsEnd + kMargin;
@@ -238,7 +238,7 @@ void WalletView::makeChart()
     showChart(false);
 }
 
-void WalletView::SetState(const State* state, const Totals& totals)
+void WalletView::SetState(const State* state, const Totals& totals, const std::vector<HoldingFigures>& figures)
 {
     // Before: the lists are empty or show states that are still alive. After: they show those of `state`, and what
     // `ClearState` has kept in mind is selected.
@@ -248,7 +248,7 @@ void WalletView::SetState(const State* state, const Totals& totals)
     hideReturns();
     if (state != nullptr) {
         shares_->showColumn(ShareStateItem::kEndDate, state->isAutomatic());
-        shares_->addAllOf(*state, totals);
+        shares_->addAllOf(*state, totals, figures);
         // When the rows are there. They are found again by account and share, since all states are new.
         accounts_->recall();
         shares_->recall();
@@ -292,9 +292,11 @@ void WalletView::showReturns(const Returns& returns, const Date& first, const Da
     float left = place(*timeWeighted_, "Time-weighted return" + why, !time.isKnown(), kRight - kBoxSide - 4);
     left = place(*moneyWeighted_, "Money-weighted return" + returnText(returns.moneyWeighted),
                  !returns.moneyWeighted.isKnown(), left - kApart);
-    const bool hasRange = returns.moneyWeighted.kind != AnnualReturn::Kind::kNoDay;
-    place(*returnRange_, hasRange ? "From " + dateText(first) + " to " + dateText(last) + ", per year:" : "", false,
-          left - kApart);
+    const std::string range = "From " + dateText(first) + " to " + dateText(last) + ", per year:";
+    // A gain of a few days can have a dozen digits within a year.
+    const bool isRoom = left - kApart - returnRange_->StringWidth(range.c_str()) > kMargin;
+    const bool isRange = returns.moneyWeighted.kind != AnnualReturn::Kind::kNoDay;
+    place(*returnRange_, isRoom && isRange ? range : "", false, left - kApart);
 }
 
 void WalletView::hideReturns()

@@ -20,6 +20,7 @@ class EvolutionChart;
 class State;
 enum class EvolutionOutcome;
 struct EvolutionPoint;
+struct HoldingFigures;
 struct QuoteCoverage;
 struct Returns;
 struct Totals;
@@ -35,9 +36,9 @@ public:
     Date getDate() const { return date_->getDate(); }
     bool isComputeEvolution() const { return computeEvolution_->Value() == B_CONTROL_ON; }
 
-    /// Shows `state` and its totals; null empties the page. What was selected before `ClearState` is selected again,
-    /// where it still is.
-    void SetState(const State* state, const Totals& totals);
+    /// Shows `state`, its totals and the figures of its holdings; null empties the page. What was selected before
+    /// `ClearState` is selected again, where it still is.
+    void SetState(const State* state, const Totals& totals, const std::vector<HoldingFigures>& figures);
     /// Says beside the totals how many of the quotes that they rest on are not of `day`, or else of the rates.
     void showCoverage(const Date& day, const QuoteCoverage& quotes, const QuoteCoverage& rates);
     /// The last day with all quotes, where the page speaks of one; otherwise undefined.
