@@ -92,7 +92,8 @@ void WalletView::makeTop()
                 {"btnUpdateAllQuotes", "Update Quotes", 'WBUp'}});
     addOpenFile(this, {kMargin, kTopEnd, kRight, kTopEnd + 18});
     explain(*this, {{"txtDate", "The day to value at.  Up and Down: a day on and back; Page Up and Page Down: a month"},
-                    {"cbxComputeEvolution", "Draws the value of every day since the first operation"},
+                    {"cbxComputeEvolution",
+                     "Draws the value of every day since the first operation, and gives the time-weighted return"},
                     {"btnLoadPortoFolio", "Loads the portfolio from a file.  Ctrl+O"},
                     {"btnSavePortoFolio", "Saves the portfolio to a file.  Ctrl+S"},
                     {"btnReinitPortoFolio", "Begins an empty portfolio. Asks nothing; Undo brings the former one back"},
