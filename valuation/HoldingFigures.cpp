@@ -23,15 +23,7 @@ class DailyRates {
 public:
     explicit DailyRates(const State& state) : first_(state.getFirstOperationDate()), last_(state.getDate()) {}
 
-    float on(const Currency& currency, const Date& day)
-    {
-        const std::vector<float>& rates = of(currency);
-        const bool isInside = !rates.empty() && day.isValid() && day >= first_ && day <= last_;
-        return isInside ? rates[static_cast<std::size_t>(day - first_)] : currency.getRealQuote(day);
-    }
-
-private:
-    /// From the first day on; empty where that is mistyped.
+    /// The rate on each day from the first operation on; empty where that is mistyped. It stays where it is.
     const std::vector<float>& of(const Currency& currency)
     {
         constexpr int kMostDays = 100000;
@@ -43,23 +35,47 @@ private:
         }
         return found->second;
     }
+    /// Where a day stands in these; beyond them all when it does not.
+    std::size_t placeOf(const Date& day) const
+    {
+        return day.isValid() && day >= first_ ? static_cast<std::size_t>(day - first_) : kNowhere;
+    }
+
+private:
+    static constexpr std::size_t kNowhere = ~std::size_t{0};
 
     Date first_;
     Date last_;
     std::unordered_map<const Currency*, std::vector<float>> rates_;
 };
 
-/// The value of one unit on a day: of `unit` in `measure`, or 1 for the holding's own currency. No number without a
-/// rate.
-struct Measure {
-    DailyRates* rates;
-    const Currency* unit;
-    const Currency* measure; // null for the unit's own
+/// The value of one unit of a currency on a day.
+class Measure {
+public:
+    /// In itself: 1.
+    Measure() = default;
+    /// In another currency; no number without a rate.
+    Measure(DailyRates& rates, const Currency& unit, const Currency& measure)
+        : rates_(&rates), unit_(&unit), measure_(&measure), unitRates_(&rates.of(unit)),
+          measureRates_(&rates.of(measure))
+    {}
 
     double on(const Date& day) const
     {
-        return measure != nullptr ? static_cast<double>(rates->on(*unit, day)) / rates->on(*measure, day) : 1;
+        if (rates_ == nullptr)
+            return 1;
+        const std::size_t place = rates_->placeOf(day);
+        if (place < unitRates_->size()) // and so in the others, which are of the same days
+            return static_cast<double>((*unitRates_)[place]) / (*measureRates_)[place];
+        return static_cast<double>(unit_->getRealQuote(day)) / measure_->getRealQuote(day);
     }
+
+private:
+    const DailyRates* rates_ = nullptr;
+    const Currency* unit_ = nullptr;
+    const Currency* measure_ = nullptr;
+    const std::vector<float>* unitRates_ = nullptr;
+    const std::vector<float>* measureRates_ = nullptr;
 };
 
 /// A holding replayed in one currency.
@@ -131,7 +147,7 @@ double incomeOf(const std::vector<Dividends::Payment>& payments, const Date& fro
     for (const Dividends::Payment& payment : payments)
         if (payment.date > from && payment.date <= to) {
             const bool isSame = payment.currency == &measure;
-            sum += payment.amount * (isSame ? 1 : Measure{&rates, payment.currency, &measure}.on(payment.date));
+            sum += payment.amount * (isSame ? 1 : Measure(rates, *payment.currency, measure).on(payment.date));
         }
     return sum;
 }
@@ -172,7 +188,7 @@ HoldingFigures figuresOf(const ShareState& state, const Catalogue& catalogue, co
     const Currency* reference = catalogue.getReferenceCurrency();
     if (reference == nullptr || currency->getNbrQuotes() == 0)
         return figures;
-    HoldingSums sums = sumsOf(state, from, {&rates, currency, reference});
+    HoldingSums sums = sumsOf(state, from, Measure(rates, *currency, *reference));
     sums.income = incomeOf(payments, from, state.getDate(), *reference, rates);
     if (isKnown(sums))
         figures.inReference = sums;
