@@ -1,10 +1,11 @@
 #include "app/DividendNotes.h"
 
-#include "app/OperationText.h"
 #include "app/PLWindow.h"
 #include "market/NoteCompanyEvent.h"
 #include "portfolio/OperationKind.h"
+#include "portfolio/OperationText.h"
 #include "portfolio/Wallet.h"
+#include "valuation/Dividends.h"
 #include "views/CompanyView.h"
 #include "views/ModelText.h"
 
@@ -12,8 +13,6 @@
 #include <vector>
 
 namespace {
-
-constexpr const char* kTitle = "Dividend";
 
 /// The incomes of the wallet that would have that note, in the order of the accounts.
 std::vector<const Operation*> incomesOf(const Wallet& wallet, const Date& date, const std::string& text)
@@ -34,7 +33,7 @@ std::vector<NoteCompanyEvent*> notesOf(const Catalogue& catalogue, const Date& d
         for (const Company* company : market->companies())
             for (CompanyEvent* event : company->events()) {
                 auto* note = dynamic_cast<NoteCompanyEvent*>(event);
-                if (note != nullptr && note->getDate() == date && note->getTitle() == kTitle &&
+                if (note != nullptr && note->getDate() == date && note->getTitle() == Dividends::kTitle &&
                     note->getText() == text.c_str())
                     found.push_back(note);
             }
@@ -46,7 +45,7 @@ std::vector<NoteCompanyEvent*> notesOf(const Catalogue& catalogue, const Date& d
 void DividendNotes::add(Company& payer, const Operation& income)
 {
     const std::string text = moveText(income);
-    page_.AddCompanyEvent(new NoteCompanyEvent(&payer, income.getDate(), kTitle, text.c_str()), false);
+    page_.AddCompanyEvent(new NoteCompanyEvent(&payer, income.getDate(), Dividends::kTitle, text.c_str()), false);
 }
 
 std::string DividendNotes::nameOf(const Company& payer)

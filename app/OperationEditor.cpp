@@ -1,9 +1,9 @@
 #include "app/OperationEditor.h"
 
 #include "app/Holds.h"
-#include "app/OperationText.h"
 #include "market/NoteCompanyEvent.h"
 #include "portfolio/OperationKind.h"
+#include "portfolio/OperationText.h"
 #include "portfolio/Wallet.h"
 #include "views/CompanyView.h"
 #include "views/OperationView.h"
@@ -88,7 +88,7 @@ void OperationEditor::book(Operation* former)
 
 void OperationEditor::tell(const std::string& deed)
 {
-    window_.showNotice({kNotice, deed, {}, true});
+    window_.showNotice({kNotice, shortened(deed, kLongestShown), {}, true});
 }
 
 void OperationEditor::showMade(Operation* made, Operation* former)

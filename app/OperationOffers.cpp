@@ -1,8 +1,8 @@
 #include "app/OperationOffers.h"
 
 #include "app/OperationMaker.h"
-#include "app/OperationText.h"
 #include "app/PLWindow.h"
+#include "portfolio/OperationText.h"
 #include "portfolio/Wallet.h"
 #include "views/ModelText.h"
 #include "views/OperationView.h"
@@ -188,7 +188,7 @@ void OperationOffers::offerTransferQuotes()
 
 void OperationOffers::showSums()
 {
-    page_.setCharged(chargedText());
+    page_.setCharged(shortened(chargedText(), kLongestShown));
     if (!isTrade(page_.getType()))
         return;
     // For the eye only: no command reads the total.

@@ -5,6 +5,7 @@
 #include "app/Holds.h"
 #include "app/MessageView.h"
 #include "app/NoticeLine.h"
+#include "app/PageReturns.h"
 #include "app/Rescue.h"
 #include "app/Shortcuts.h"
 #include "foundation/Today.h"
@@ -195,6 +196,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
         std::make_unique<QuoteEditor<Currency>>(*this, *currencyView_, "You must first select a currency");
     events_ = std::make_unique<EventEditor>(*this, *companyView_);
     operations_ = std::make_unique<OperationEditor>(*this, *operationView_, *companyView_);
+    returns_ = std::make_unique<PageReturns>(*this, *walletView_);
     split_ = std::make_unique<SplitAssistant>(*this, *companyView_, *operationView_);
     import_ = std::make_unique<ImportAssistant>(*this, *tabView_, *companyView_, *currencyView_, folder);
     tabView_->SetSelectionHook([this] { importButton_->SetEnabled(import_->isPossible()); });

@@ -12,6 +12,7 @@
 #include "app/SplitAssistant.h"
 #include "market/Catalogue.h"
 #include "platform/Window.h"
+#include "valuation/Evolution.h"
 #include "views/CompanyView.h"
 #include "views/CurrencyView.h"
 
@@ -22,6 +23,7 @@ class Completions;
 class FirstSteps;
 class MessageView;
 class NoticeLine;
+class PageReturns;
 class ParameterView;
 class Rescue;
 class Shortcuts;
@@ -86,8 +88,9 @@ public:
     // The portfolio as a whole (WalletCommands.cpp).
     /// Values the portfolio anew at its page's date and shows it. Within a `StateHold` that waits for its end.
     void UpdateState();
-    /// Makes `state` the one that is shown; null shows none. The former one is not destroyed here.
-    void SetState(State* state);
+    /// Makes `state` the one that is shown, of which `days` are the daily values if there are any; null shows none. The
+    /// former one is not destroyed here.
+    void SetState(State* state, std::vector<EvolutionPoint> days = {});
     /// Starts a new, empty portfolio, which has no file yet.
     void ReinitWallet();
     void ChangeParameter(uint32 code);
@@ -230,6 +233,8 @@ private:
     void removeMarkets(const Currency& currency);
     void showParameters();
     void showAccounts();
+    /// Shows what `state_` is worth, and has come to, on the page of the portfolio.
+    void showValuation(std::vector<EvolutionPoint> days);
     /// Tells in a notice that there are simulated sales, or no longer.
     void tellSimulation();
     /// Null, after a message, when there is none.
@@ -264,6 +269,7 @@ private:
     std::unique_ptr<SplitAssistant> split_;
     std::unique_ptr<ExportAssistant> export_;
     std::unique_ptr<OperationEditor> operations_;
+    std::unique_ptr<PageReturns> returns_;
     std::unique_ptr<ImportAssistant> import_;
     std::unique_ptr<Completions> completions_;
     std::unique_ptr<Shortcuts> shortcuts_;

@@ -1,12 +1,15 @@
 // The portfolio: its accounts, its parameters, its value.
 
 #include "app/Holds.h"
+#include "app/PageReturns.h"
+#include "app/PlainPortfolio.h"
 #include "foundation/DateText.h"
 #include "market/Currency.h"
 #include "portfolio/Wallet.h"
 #include "valuation/AccountState.h"
 #include "valuation/AutomaticSale.h"
 #include "valuation/Evolution.h"
+#include "valuation/HoldingFigures.h"
 #include "valuation/QuoteCoverage.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
@@ -157,6 +160,7 @@ void PLWindow::replaceWallet()
     // No row and no selection refers to the former portfolio any more when it goes.
     SetState(nullptr);
     walletView_->ClearEvolution();
+    returns_->forget();
     walletView_->ForgetSelection();
     operationView_->ForgetSelection();
     wallet_ = std::make_unique<Wallet>();
@@ -185,6 +189,7 @@ void PLWindow::UpdateState()
 
     // The valuation destroys all states: no row shows one, and the window has none, until there is a new one.
     walletView_->ClearState();
+    returns_->forget();
     state_ = nullptr;
     refreshWalletCatalogue();
     const Date date = walletView_->getDate();
@@ -204,11 +209,14 @@ void PLWindow::UpdateState()
         tellSimulation();
         return;
     }
-    if (isEvolutionAsked)
-        walletView_->UpdateEvolution(evolutionPoints(*wallet_, catalogue_), catalogue_.getReferenceCurrency(), outcome);
-    else
+    std::vector<EvolutionPoint> days;
+    if (isEvolutionAsked) {
+        days = evolutionByDate(*wallet_, catalogue_);
+        walletView_->UpdateEvolution(days, catalogue_.getReferenceCurrency(), outcome);
+    } else {
         walletView_->ClearEvolution();
-    SetState(state);
+    }
+    SetState(state, std::move(days));
     tellSimulation();
 }
 
@@ -244,16 +252,32 @@ void PLWindow::valueAtLastQuotes()
     UpdateState();
 }
 
-void PLWindow::SetState(State* state)
+void PLWindow::showValuation(std::vector<EvolutionPoint> days)
+{
+    const Totals totals(*state_, catalogue_);
+    // What simulations have made up is no part of the returns and of what the holdings came to. The copy ends here:
+    // companies list its holdings, too.
+    std::optional<PlainPortfolio> plain;
+    if (!automaticSales(*wallet_).empty())
+        plain.emplace(*wallet_, catalogue_, state_->getDate());
+    walletView_->SetState(state_, totals, holdingFigures(plain ? plain->state() : *state_, catalogue_, {}));
+    if (plain && !days.empty())
+        days = plain->evolve(); // with another state in place of that of the figures
+    returns_->show(plain ? plain->state() : *state_, std::move(days));
+    if (totals.isKnown && totals.reference->getNbrQuotes() > 0) // otherwise no total rests on a quote
+        walletView_->showCoverage(state_->getDate(), quoteCoverage(*state_), rateCoverage(*state_, catalogue_));
+}
+
+void PLWindow::SetState(State* state, std::vector<EvolutionPoint> days)
 {
     const WindowLock lock(*this);
     if (!lock.isHeld())
         return;
     state_ = state;
-    const Totals totals = state != nullptr ? Totals(*state, catalogue_) : Totals();
-    walletView_->SetState(state, totals);
-    if (totals.isKnown && totals.reference->getNbrQuotes() > 0) // otherwise no total rests on a quote
-        walletView_->showCoverage(state->getDate(), quoteCoverage(*state), rateCoverage(*state, catalogue_));
+    if (state != nullptr)
+        showValuation(std::move(days));
+    else
+        walletView_->SetState(nullptr, {}, {});
     // The list is emptied and filled: automatic operations have come and gone with the valuation. A portfolio that is
     // not shown has no operations to show either.
     operationView_->ClearAllOperations();

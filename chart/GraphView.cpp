@@ -230,6 +230,12 @@ void GraphView::rangeChanged()
 {
     showRange();
     Invalidate();
+    RangeChanged();
+}
+
+void GraphView::setBounds(const ChartRange& bounds)
+{
+    zoom_.setBounds(bounds, xDateBased_ ? kLeastDays : kLeastShare * bounds.length());
 }
 
 void GraphView::showRange()
@@ -334,7 +340,7 @@ void GraphView::takeRange(ChartContents& contents)
     ChartRange all = rangeOf(contents.series);
     for (const PlacedFlag& flag : contents.flags)
         all.include(flag.where.x);
-    zoom_.setBounds(all, xDateBased_ ? kLeastDays : kLeastShare * all.length());
+    setBounds(all);
     contents.x = zoom_.shown();
     if (zoom_.isAll())
         return;

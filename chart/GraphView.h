@@ -75,7 +75,7 @@ public:
 
     /// Maps pixels to data as last drawn; null when there was no data.
     const ChartScale* scale() const { return drawn_ ? &drawn_->layout.scale : nullptr; }
-    /// The range that is shown, as last drawn.
+    /// The range that is shown, as last drawn or, where the chart says its bounds, as it will be.
     ChartRange shownRange() const { return zoom_.shown(); }
     /// What is read out now; nothing while neither pointer nor keys ask for it.
     std::optional<ChartReadOut> readOut() const;
@@ -83,6 +83,10 @@ public:
 protected:
     /// Adds what follows from the rows of the lines, which stand in the order of the elements.
     virtual void addReadOutRows(std::vector<ReadOutRow>& /*rows*/) const {}
+    /// A person has asked for another part of the x axis.
+    virtual void RangeChanged() {}
+    /// Says what x the data has, so that `shownRange` is known before it is drawn.
+    void setBounds(const ChartRange& bounds);
 
 private:
     friend class GraphElementsToGraphView;

@@ -1,6 +1,5 @@
 #include "valuation/Dividends.h"
 
-#include "foundation/NumberText.h"
 #include "market/Catalogue.h"
 #include "market/Company.h"
 #include "market/Currency.h"
@@ -9,14 +8,13 @@
 #include "portfolio/Account.h"
 #include "portfolio/CashMove.h"
 #include "portfolio/OperationKind.h"
+#include "portfolio/OperationText.h"
 #include "portfolio/Wallet.h"
 
 #include <string>
 #include <string_view>
 
 namespace {
-
-constexpr const char* kTitle = "Dividend";
 
 /// Incomes of a day and a text, and the companies with such a note.
 struct Alike {
@@ -32,13 +30,6 @@ std::string keyOf(const Date& date, std::string_view text)
     return std::string(date.toString().bytes()) + '\n' + std::string(text);
 }
 
-/// What the note of an income says: the effect on the account.
-std::string noteOf(const Account& account, double amount)
-{
-    const std::string symbol(account.getCurrencyRepresentation().bytes());
-    return amountText(amount) + (symbol.empty() ? "" : ' ' + symbol) + " to " + std::string(account.getName().bytes());
-}
-
 void takeIncomes(const Account& account, ByText* alike)
 {
     if (account.currency() == nullptr)
@@ -46,9 +37,8 @@ void takeIncomes(const Account& account, ByText* alike)
     for (const Operation* operation : account.operations()) {
         if (kindOf(*operation) != OperationKind::kIncome)
             continue;
-        const double amount = cashMove(*operation, account);
-        const Dividends::Payment payment{operation->getDate(), amount, account.currency()};
-        ++alike->try_emplace(keyOf(payment.date, noteOf(account, amount)), Alike{payment}).first->second.incomes;
+        const Dividends::Payment payment{operation->getDate(), cashMove(*operation, account), account.currency()};
+        ++alike->try_emplace(keyOf(payment.date, moveText(*operation)), Alike{payment}).first->second.incomes;
     }
 }
 
@@ -56,7 +46,7 @@ void takeNotes(const Company& company, ByText* alike)
 {
     for (const CompanyEvent* event : company.events()) {
         const auto* note = dynamic_cast<const NoteCompanyEvent*>(event);
-        if (note == nullptr || note->getTitle() != kTitle)
+        if (note == nullptr || note->getTitle() != Dividends::kTitle)
             continue;
         const auto found = alike->find(keyOf(note->getDate(), note->getText().bytes()));
         if (found != alike->end())

@@ -17,6 +17,8 @@ class Wallet;
 /// told to be of an income, and none counts.
 class Dividends {
 public:
+    static constexpr const char* kTitle = "Dividend"; ///< of the notes
+
     struct Payment {
         Date date;
         double amount;            ///< what arrived

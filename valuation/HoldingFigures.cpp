@@ -13,19 +13,69 @@
 #include "valuation/State.h"
 
 #include <cmath>
+#include <unordered_map>
 
 namespace {
 
-/// The value of one unit on a day: of `unit` in `measure`, or 1 for the holding's own currency. No number without a
-/// rate.
-struct Measure {
-    const Currency* unit;
-    const Currency* measure; // null for the unit's own
+/// The rates of the currencies on the days up to that of a state. Thousands of trades ask for them, in no order, and so
+/// each currency is gone through once.
+class DailyRates {
+public:
+    explicit DailyRates(const State& state) : first_(state.getFirstOperationDate()), last_(state.getDate()) {}
+
+    /// The rate on each day from the first operation on; empty where that is mistyped. It stays where it is.
+    const std::vector<float>& of(const Currency& currency)
+    {
+        constexpr int kMostDays = 100000;
+        const auto [found, isNew] = rates_.try_emplace(&currency);
+        if (isNew && first_.isValid() && last_.isValid() && first_ <= last_ && last_ - first_ < kMostDays) {
+            Currency::Walk walk(currency);
+            for (Date day = first_; day <= last_; day + 1)
+                found->second.push_back(walk.realQuote(day));
+        }
+        return found->second;
+    }
+    /// Where a day stands in these; beyond them all when it does not.
+    std::size_t placeOf(const Date& day) const
+    {
+        return day.isValid() && day >= first_ ? static_cast<std::size_t>(day - first_) : kNowhere;
+    }
+
+private:
+    static constexpr std::size_t kNowhere = ~std::size_t{0};
+
+    Date first_;
+    Date last_;
+    std::unordered_map<const Currency*, std::vector<float>> rates_;
+};
+
+/// The value of one unit of a currency on a day.
+class Measure {
+public:
+    /// In itself: 1.
+    Measure() = default;
+    /// In another currency; no number without a rate.
+    Measure(DailyRates& rates, const Currency& unit, const Currency& measure)
+        : rates_(&rates), unit_(&unit), measure_(&measure), unitRates_(&rates.of(unit)),
+          measureRates_(&rates.of(measure))
+    {}
 
     double on(const Date& day) const
     {
-        return measure != nullptr ? static_cast<double>(unit->getRealQuote(day)) / measure->getRealQuote(day) : 1;
+        if (rates_ == nullptr)
+            return 1;
+        const std::size_t place = rates_->placeOf(day);
+        if (place < unitRates_->size()) // and so in the others, which are of the same days
+            return static_cast<double>((*unitRates_)[place]) / (*measureRates_)[place];
+        return static_cast<double>(unit_->getRealQuote(day)) / measure_->getRealQuote(day);
     }
+
+private:
+    const DailyRates* rates_ = nullptr;
+    const Currency* unit_ = nullptr;
+    const Currency* measure_ = nullptr;
+    const std::vector<float>* unitRates_ = nullptr;
+    const std::vector<float>* measureRates_ = nullptr;
 };
 
 /// A holding replayed in one currency.
@@ -91,13 +141,13 @@ HoldingSums difference(const HoldingSums& end, const HoldingSums& begin)
 
 /// The income within the range, each payment at the rates of its day.
 double incomeOf(const std::vector<Dividends::Payment>& payments, const Date& from, const Date& to,
-                const Currency& measure)
+                const Currency& measure, DailyRates& rates)
 {
     double sum = 0;
     for (const Dividends::Payment& payment : payments)
         if (payment.date > from && payment.date <= to) {
             const bool isSame = payment.currency == &measure;
-            sum += payment.amount * (isSame ? 1 : Measure{payment.currency, &measure}.on(payment.date));
+            sum += payment.amount * (isSame ? 1 : Measure(rates, *payment.currency, measure).on(payment.date));
         }
     return sum;
 }
@@ -123,7 +173,7 @@ bool isKnown(const HoldingSums& sums)
 }
 
 HoldingFigures figuresOf(const ShareState& state, const Catalogue& catalogue, const Dividends& dividends,
-                         const Date& from)
+                         const Date& from, DailyRates& rates)
 {
     if (state.share() == nullptr)
         return {};
@@ -134,12 +184,12 @@ HoldingFigures figuresOf(const ShareState& state, const Catalogue& catalogue, co
     if (currency == nullptr)
         return figures;
     const auto& payments = dividends.of(*company);
-    figures.own.income = incomeOf(payments, from, state.getDate(), *currency);
+    figures.own.income = incomeOf(payments, from, state.getDate(), *currency, rates);
     const Currency* reference = catalogue.getReferenceCurrency();
     if (reference == nullptr || currency->getNbrQuotes() == 0)
         return figures;
-    HoldingSums sums = sumsOf(state, from, {currency, reference});
-    sums.income = incomeOf(payments, from, state.getDate(), *reference);
+    HoldingSums sums = sumsOf(state, from, Measure(rates, *currency, *reference));
+    sums.income = incomeOf(payments, from, state.getDate(), *reference, rates);
     if (isKnown(sums))
         figures.inReference = sums;
     return figures;
@@ -153,7 +203,8 @@ std::vector<HoldingFigures> holdingFigures(const State& state, const Catalogue& 
     if (state.wallet() == nullptr)
         return figures;
     const Dividends dividends(*state.wallet(), catalogue);
+    DailyRates rates(state);
     for (const ShareState* share : state.shareStates())
-        figures.push_back(figuresOf(*share, catalogue, dividends, from));
+        figures.push_back(figuresOf(*share, catalogue, dividends, from, rates));
     return figures;
 }

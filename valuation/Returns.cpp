@@ -10,18 +10,18 @@
 
 namespace {
 
-using Points = std::vector<EvolutionPoint>;
+using Points = std::span<const EvolutionPoint>;
 using Flows = std::vector<CashFlow>;
 
 /// A range of returns: from `first` on, with what was there already, and the flows behind that.
 struct Range {
     Date first;
-    double value;                 // put in on the first day, at its end; 0 when the range begins with the operations
-    Points::const_iterator point; // the first of the days whose growth counts
-    Flows::const_iterator flow;   // the first that counts
+    double value;               // put in on the first day, at its end; 0 when the range begins with the operations
+    Points::iterator point;     // the first of the days whose growth counts
+    Flows::const_iterator flow; // the first that counts
 };
 
-AnnualReturn moneyWeightedReturn(const Range& range, const Points& points, const Flows& flows)
+AnnualReturn moneyWeightedReturn(const Range& range, Points points, const Flows& flows)
 {
     const EvolutionPoint& last = points.back();
     std::vector<MoneyWeightedReturn::Payment> payments{{0, range.value}};
@@ -31,7 +31,7 @@ AnnualReturn moneyWeightedReturn(const Range& range, const Points& points, const
     return MoneyWeightedReturn(std::move(payments)).result();
 }
 
-AnnualReturn timeWeightedReturn(const Range& range, const Points& points, const Flows& flows)
+AnnualReturn timeWeightedReturn(const Range& range, Points points, const Flows& flows)
 {
     TimeWeightedReturn growth(range.value);
     auto flow = range.flow;
@@ -46,8 +46,8 @@ AnnualReturn timeWeightedReturn(const Range& range, const Points& points, const 
 
 } // namespace
 
-Returns::Returns(const Wallet& wallet, const Catalogue& catalogue, const std::vector<EvolutionPoint>& evolution,
-                 const Date& firstOperation, const Date& from)
+Returns::Returns(const Wallet& wallet, const Catalogue& catalogue, Points evolution, const Date& firstOperation,
+                 const Date& from)
 {
     if (evolution.empty())
         return;

@@ -3,7 +3,7 @@
 #include "valuation/AnnualReturn.h"
 #include "valuation/Evolution.h"
 
-#include <vector>
+#include <span>
 
 /// The returns of a wallet over a range of days, by an evolution that leads up to its last day.
 ///
@@ -19,6 +19,6 @@ struct Returns {
     /// `evolution` is by date, from the first operation to the last day, as `evolutionByDate` gives it. Where there are
     /// no daily values, only the last one, the money-weighted return is known unless the range begins later. `from` may
     /// be undefined.
-    Returns(const Wallet& wallet, const Catalogue& catalogue, const std::vector<EvolutionPoint>& evolution,
+    Returns(const Wallet& wallet, const Catalogue& catalogue, std::span<const EvolutionPoint> evolution,
             const Date& firstOperation, const Date& from);
 };

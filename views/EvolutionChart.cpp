@@ -1,8 +1,11 @@
 #include "views/EvolutionChart.h"
 
+#include "chart/DateTicks.h"
 #include "chart/GraphPoint.h"
 #include "valuation/Evolution.h"
 #include "views/Look.h"
+
+#include <cmath>
 
 EvolutionChart::EvolutionChart(BRect frame) : GraphView(frame, "grvEvolution")
 {
@@ -33,6 +36,22 @@ void EvolutionChart::showPoints(const std::vector<EvolutionPoint>& points, const
         value_.addGraphPoint(new GraphPoint(point.date, point.totalValue));
         putIn_.addGraphPoint(new GraphPoint(point.date, point.totalDeposit));
     }
+    if (!points.empty())
+        setBounds({dayNumber(points.front().date), dayNumber(points.back().date)});
+}
+
+std::pair<Date, Date> EvolutionChart::daysInView() const
+{
+    if (value_.getNbrGraphPoints() == 0)
+        return {};
+    const ChartRange range = shownRange();
+    return {dateOfDay(std::ceil(range.min)), dateOfDay(std::floor(range.max))};
+}
+
+void EvolutionChart::RangeChanged()
+{
+    if (rangeHook_)
+        rangeHook_();
 }
 
 void EvolutionChart::showNothing()

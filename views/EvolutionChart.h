@@ -3,7 +3,9 @@
 #include "chart/GraphLine.h"
 #include "chart/GraphView.h"
 
+#include <functional>
 #include <string>
+#include <utility>
 #include <vector>
 
 struct EvolutionPoint;
@@ -14,14 +16,20 @@ class EvolutionChart final : public GraphView {
 public:
     explicit EvolutionChart(BRect frame);
 
-    /// Shows these days, in the currency of that symbol.
+    /// Shows these days, which come by date, in the currency of that symbol.
     void showPoints(const std::vector<EvolutionPoint>& points, const std::string& symbol);
     /// Shows no days.
     void showNothing();
+    /// The first and the last of the days that are in view; undefined while it shows no days.
+    std::pair<Date, Date> daysInView() const;
+    /// `hook` is called when a person has changed which.
+    void setRangeHook(const std::function<void()>& hook) { rangeHook_ = hook; }
 
 private:
     void addReadOutRows(std::vector<ReadOutRow>& rows) const override;
+    void RangeChanged() override;
 
     GraphLine value_; // these are in the chart; the first one is marked with its extremes
     GraphLine putIn_;
+    std::function<void()> rangeHook_;
 };

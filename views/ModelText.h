@@ -7,11 +7,13 @@
 #include <optional>
 #include <string>
 
+/// How much of a text is shown in a list, a chart or a line, in bytes.
+constexpr std::size_t kLongestShown = 512;
+
 /// A text of the model, to be shown in a list, a chart or a line; empty for a String without text. Of a longer one, as
 /// a damaged file can hold of megabytes, some hundred characters are shown.
 inline std::string textOf(const String& text)
 {
-    constexpr std::size_t kLongestShown = 512; // bytes
     return shortened(text.bytes(), kLongestShown);
 }
 

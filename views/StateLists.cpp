@@ -10,6 +10,8 @@
 #include "views/Look.h"
 #include "views/ModelText.h"
 
+#include <cmath>
+
 namespace {
 
 /// "12.3 %": in one decimal, as far as anybody asks.
@@ -20,6 +22,7 @@ std::string shareText(double fraction)
 }
 
 constexpr std::size_t kReferenceColumn = 7;
+constexpr std::size_t kSumsInReference = 17; // and behind it
 
 // Accounts. Name and currency are the account's as they are now, the balance is that of the valuation.
 
@@ -117,6 +120,34 @@ Cell endDate(const Item& item)
     return item.object()->isHeld() ? Cell{dateText(end), look::kText, dayOrder(end)} : Cell();
 }
 
+/// An amount out of the figures of a holding, in the currency of that symbol; a gain in colour.
+Cell sumCell(const std::optional<double>& sum, bool isGain, const std::string& symbol)
+{
+    constexpr double kShown = 0.005; // less than that is shown as 0
+    if (!sum)
+        return {};
+    const bool isPlain = !isGain || std::abs(*sum) < kShown;
+    return {amountText(*sum), isPlain ? look::kText : *sum < 0 ? look::kLoss : look::kGain, sum, symbol};
+}
+
+template <auto kSum, bool kIsGain = false>
+Cell ownSum(const Item& item)
+{
+    const HoldingFigures& figures = item.figures();
+    if (figures.isEmpty())
+        return {};
+    return sumCell(figures.own.*kSum, kIsGain, textOf(item.object()->getCurrencyRepresentation()));
+}
+
+template <auto kSum, bool kIsGain = false>
+Cell referenceSum(const Item& item)
+{
+    const HoldingFigures& figures = item.figures();
+    if (figures.isEmpty() || !figures.inReference)
+        return {};
+    return sumCell((*figures.inReference).*kSum, kIsGain, item.reference());
+}
+
 } // namespace
 
 const std::vector<ColumnOf<AccountState>> AccountStateItem::kColumns = {
@@ -126,7 +157,7 @@ const std::vector<ColumnOf<AccountState>> AccountStateItem::kColumns = {
     {{"Default", 56, B_ALIGN_CENTER}, defaultMark},
 };
 
-// All of them fit into the page.
+// As far as the gain they fit into the page; to those behind it the list scrolls sideways.
 const std::vector<ColumnOf<ShareStateItem>> ShareStateItem::kColumns = {
     {{"Ticker", 50}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyAbbreviation()); }},
     {{"Company", 106}, [](const Item& i) { return name(*i.object(), i.object()->getCompanyName()); }},
@@ -138,7 +169,20 @@ const std::vector<ColumnOf<ShareStateItem>> ShareStateItem::kColumns = {
     {{"In ???", 76, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceValue},
     {{"Part", 50, B_ALIGN_RIGHT}, partOfAll},
     {{"Gain", 68, B_ALIGN_RIGHT}, gain},
-    {{"End Date", 82, B_ALIGN_RIGHT, UnitPlace::kNone, true}, endDate}, // see `ShareStateItem::kEndDate`,
+    {{"End Date", 82, B_ALIGN_RIGHT, UnitPlace::kNone, true}, endDate}, // see `ShareStateItem::kEndDate`
+    {{"Bought", 110, B_ALIGN_RIGHT, UnitPlace::kShown}, ownSum<&HoldingSums::bought>},
+    {{"Sold", 110, B_ALIGN_RIGHT, UnitPlace::kShown}, ownSum<&HoldingSums::sold>},
+    {{"Costs", 92, B_ALIGN_RIGHT, UnitPlace::kShown}, ownSum<&HoldingSums::costs>},
+    {{"Income", 100, B_ALIGN_RIGHT, UnitPlace::kShown}, ownSum<&HoldingSums::income>},
+    {{"Realised", 110, B_ALIGN_RIGHT, UnitPlace::kShown}, ownSum<&HoldingSums::realisedGain, true>},
+    {{"Unrealised", 110, B_ALIGN_RIGHT, UnitPlace::kShown}, ownSum<&HoldingSums::unrealisedGain, true>},
+    // From here on as `kSumsInReference` says.
+    {{"Bought", 106, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceSum<&HoldingSums::bought>},
+    {{"Sold", 92, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceSum<&HoldingSums::sold>},
+    {{"Costs", 92, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceSum<&HoldingSums::costs>},
+    {{"Income", 106, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceSum<&HoldingSums::income>},
+    {{"Realised", 112, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceSum<&HoldingSums::realisedGain, true>},
+    {{"Unrealised", 128, B_ALIGN_RIGHT, UnitPlace::kCopied}, referenceSum<&HoldingSums::unrealisedGain, true>},
 };
 
 void ShareStateItem::showIn(const std::string& symbol, double rate, double total)
@@ -146,24 +190,28 @@ void ShareStateItem::showIn(const std::string& symbol, double rate, double total
     const Company* company = share_ != nullptr ? share_->company() : nullptr;
     const Market* market = company != nullptr ? company->market() : nullptr;
     const Currency* currency = market != nullptr ? market->currency() : nullptr;
+    reference_ = symbol;
     // Where the row says no value in its own currency, there is none in another.
     if (rate == 0 || !basis_.isKnown || !basis_.hasRate || !state_->isHeld() || currency == nullptr)
         return;
-    reference_ = symbol;
     value_ = state_->worth() * currency->getRealQuote(state_->getDate()) / rate;
     if (total > 0)
         part_ = *value_ / total;
 }
 
-void ShareStateListView::addAllOf(const State& state, const Totals& totals)
+void ShareStateListView::addAllOf(const State& state, const Totals& totals, const std::vector<HoldingFigures>& figures)
 {
     const auto shares = state.shareStates();
     const int32 first = CountRows();
     addAll({shares.begin(), shares.end()});
+    for (std::size_t i = 0; i < figures.size(); ++i)
+        static_cast<ShareStateItem*>(rowAt(first + static_cast<int32>(i)))->showFigures(figures[i]);
     if (totals.reference == nullptr)
         return;
     const std::string symbol = textOf(totals.reference->getRepresentation());
     setTitle(kReferenceColumn, "In " + symbol);
+    for (std::size_t i = kSumsInReference; i < ShareStateItem::kColumns.size(); ++i)
+        setTitle(i, ShareStateItem::kColumns[i].title + " in " + symbol);
     const double rate = totals.reference->getRealQuote(state.getDate());
     for (int32 i = first; i < CountRows(); ++i)
         static_cast<ShareStateItem*>(rowAt(i))->showIn(symbol, rate, totals.totalValue);

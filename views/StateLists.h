@@ -1,11 +1,13 @@
 #pragma once
 
 #include "valuation/AccountState.h"
+#include "valuation/HoldingFigures.h"
 #include "valuation/ShareState.h"
 #include "views/ObjectListView.h"
 
 #include <optional>
 #include <string>
+#include <vector>
 
 class State;
 struct Totals;
@@ -45,6 +47,9 @@ public:
     std::optional<double> value() const { return value_; }
     std::optional<double> part() const { return part_; }
     const std::string& reference() const { return reference_; }
+    /// What the holding has come to; `showFigures` has the row show it.
+    void showFigures(const HoldingFigures& figures) { figures_ = figures; }
+    const HoldingFigures& figures() const { return figures_; }
     /// The quote that the holding was valued by, from when the row was made.
     const QuoteBasis& basis() const { return basis_; }
     Cell cell(std::size_t column) const override { return kColumns[column].cell(*this); }
@@ -55,6 +60,7 @@ private:
     QuoteBasis basis_;
     std::optional<double> value_;
     std::optional<double> part_;
+    HoldingFigures figures_;
     std::string reference_;
 };
 
@@ -66,6 +72,6 @@ class ShareStateListView final : public ObjectListView<ShareState, ShareStateIte
 public:
     using ObjectListView::ObjectListView;
 
-    /// Adds the holdings of `state`, of which these are the totals.
-    void addAllOf(const State& state, const Totals& totals);
+    /// Adds the holdings of `state`, of which these are the totals, and of each holding the figures.
+    void addAllOf(const State& state, const Totals& totals, const std::vector<HoldingFigures>& figures);
 };

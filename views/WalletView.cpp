@@ -9,11 +9,14 @@
 #include "platform/StringView.h"
 #include "valuation/Evolution.h"
 #include "valuation/QuoteCoverage.h"
+#include "valuation/Returns.h"
 #include "valuation/State.h"
 #include "valuation/Totals.h"
 #include "views/EvolutionChart.h"
 #include "views/Look.h"
 #include "views/ModelText.h"
+
+#include <cmath>
 
 namespace {
 
@@ -24,8 +27,9 @@ constexpr float kRight = kPageWidth - kMargin;
 constexpr float kTopEnd = kMargin + kButtonHeight;
 constexpr float kFileEnd = kTopEnd + 22;
 constexpr float kTotalsTop = kFileEnd;
-constexpr float kTotalsEnd = kTotalsTop + 54;
-constexpr float kAccountsTop = kTotalsEnd + kMargin;
+constexpr float kReturnsTop = kTotalsTop + kBoxTop + 2 + kFieldHeight; // below the totals
+constexpr float kTotalsEnd = kReturnsTop + 18;
+constexpr float kAccountsTop = kTotalsTop + 62;
 constexpr float kAccountsEnd = kAccountsTop + 148;
 constexpr float kHoldingsTop = kAccountsEnd + kMargin;
 constexpr float kHoldingsEnd = kHoldingsTop + 210;
@@ -41,6 +45,24 @@ std::string coverageText(const QuoteCoverage& coverage, const char* what, const 
            (missing == 1 ? " is " : " are ") + (coverage.unknown > 0 ? "not of " : "older than ") + dateText(day);
 }
 
+/// " 7.51 %", or in a few words why there is none.
+std::string returnText(const AnnualReturn& annual)
+{
+    constexpr const char* kReasons[] = {"", ": no day", ": no rate", ": several rates"}; // by kind
+    return annual.isKnown() ? ' ' + percentText(annual.rate) : kReasons[static_cast<int>(annual.kind)];
+}
+
+/// Sets a line that ends at `right`. @return where it begins.
+float place(BStringView& line, const std::string& text, bool isFaint, float right)
+{
+    line.SetText(text.c_str());
+    line.SetHighColor(isFaint ? kFaint : kText);
+    const float width = std::ceil(line.StringWidth(text.c_str()));
+    line.MoveTo(right - width, kReturnsTop);
+    line.ResizeTo(width, 16);
+    return right - width;
+}
+
 } // namespace
 
 WalletView::WalletView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
@@ -48,6 +70,7 @@ WalletView::WalletView(BRect frame, const char* name, BWindow*) : PageView(frame
     makeTop();
     makeTotals();
     makeCoverage();
+    makeReturns();
     makeAccounts();
     makeHoldings();
     makeChart();
@@ -69,7 +92,8 @@ void WalletView::makeTop()
                 {"btnUpdateAllQuotes", "Update Quotes", 'WBUp'}});
     addOpenFile(this, {kMargin, kTopEnd, kRight, kTopEnd + 18});
     explain(*this, {{"txtDate", "The day to value at.  Up and Down: a day on and back; Page Up and Page Down: a month"},
-                    {"cbxComputeEvolution", "Draws the value of every day since the first operation"},
+                    {"cbxComputeEvolution",
+                     "Draws the value of every day since the first operation, and gives the time-weighted return"},
                     {"btnLoadPortoFolio", "Loads the portfolio from a file.  Ctrl+O"},
                     {"btnSavePortoFolio", "Saves the portfolio to a file.  Ctrl+S"},
                     {"btnReinitPortoFolio", "Begins an empty portfolio. Asks nothing; Undo brings the former one back"},
@@ -109,6 +133,26 @@ void WalletView::makeCoverage()
         addButton(this, {kButtonRight - kWidth, kTop, kButtonRight, kTop + 18}, "btnLastQuotes", "Go There", 'WBGd');
     goToLastQuotes_->SetToolTip("Values the portfolio on the last day with all quotes");
     hideCoverage();
+}
+
+/// In the box of the totals, below "Annual Revenu".
+void WalletView::makeReturns()
+{
+    const auto add = [this](const char* name, const char* tip) {
+        auto* line = new BStringView({0, kReturnsTop, 0, kReturnsTop + 16}, name, "");
+        line->SetToolTip(tip);
+        AddChild(line);
+        return line;
+    };
+    returnRange_ =
+        add("txtReturnRange", "The days that the two returns are of: those that the chart shows, or else all\n"
+                              "since the first operation. Both are per year, with interest on interest.");
+    moneyWeighted_ = add("txtMoneyWeighted",
+                         "The interest rate at which an account, with your deposits and withdrawals on their days,\n"
+                         "would have come to the same value: what your money earned. Spreadsheets call it XIRR.");
+    timeWeighted_ = add("txtTimeWeighted",
+                        "The growth from day to day, multiplied, whenever you paid in how much: what your choice of\n"
+                        "shares earned, to be compared with funds. It needs the value of every day.");
 }
 
 void WalletView::makeAccounts()
@@ -200,16 +244,17 @@ void WalletView::makeChart()
     showChart(false);
 }
 
-void WalletView::SetState(const State* state, const Totals& totals)
+void WalletView::SetState(const State* state, const Totals& totals, const std::vector<HoldingFigures>& figures)
 {
     // Before: the lists are empty or show states that are still alive. After: they show those of `state`, and what
     // `ClearState` has kept in mind is selected.
     SetAccountStateList(state);
     shares_->clear();
     hideCoverage();
+    hideReturns();
     if (state != nullptr) {
         shares_->showColumn(ShareStateItem::kEndDate, state->isAutomatic());
-        shares_->addAllOf(*state, totals);
+        shares_->addAllOf(*state, totals, figures);
         // When the rows are there. They are found again by account and share, since all states are new.
         accounts_->recall();
         shares_->recall();
@@ -244,6 +289,38 @@ void WalletView::showCoverage(const Date& day, const QuoteCoverage& quotes, cons
         goToLastQuotes_->Hide();
 }
 
+void WalletView::showReturns(const Returns& returns, const Date& first, const Date& last, bool hasDays)
+{
+    constexpr float kApart = 18;
+    const AnnualReturn& time = returns.timeWeighted;
+    const bool isToTick = !hasDays && time.kind != AnnualReturn::Kind::kNoDay;
+    const std::string why = isToTick ? ": tick Compute Evolution" : returnText(time);
+    float left = place(*timeWeighted_, "Time-weighted return" + why, !time.isKnown(), kRight - kBoxSide - 4);
+    left = place(*moneyWeighted_, "Money-weighted return" + returnText(returns.moneyWeighted),
+                 !returns.moneyWeighted.isKnown(), left - kApart);
+    const std::string range = "From " + dateText(first) + " to " + dateText(last) + ", per year:";
+    // A gain of a few days can have a dozen digits within a year.
+    const bool isRoom = left - kApart - returnRange_->StringWidth(range.c_str()) > kMargin;
+    const bool isRange = returns.moneyWeighted.kind != AnnualReturn::Kind::kNoDay;
+    place(*returnRange_, isRoom && isRange ? range : "", false, left - kApart);
+}
+
+void WalletView::hideReturns()
+{
+    for (BStringView* line : {returnRange_, moneyWeighted_, timeWeighted_})
+        line->SetText("");
+}
+
+std::pair<Date, Date> WalletView::daysInView() const
+{
+    return evolution_->daysInView();
+}
+
+void WalletView::setRangeHook(const std::function<void()>& hook)
+{
+    evolution_->setRangeHook(hook);
+}
+
 void WalletView::hideCoverage()
 {
     lastQuotedDay_ = Date();
@@ -262,6 +339,7 @@ void WalletView::ClearState()
     shares_->clear();
     showTotals({});
     hideCoverage();
+    hideReturns();
 }
 
 void WalletView::ForgetSelection()

@@ -8,6 +8,7 @@
 #include "views/PageView.h"
 #include "views/StateLists.h"
 
+#include <functional>
 #include <utility>
 #include <vector>
 
@@ -19,7 +20,9 @@ class EvolutionChart;
 class State;
 enum class EvolutionOutcome;
 struct EvolutionPoint;
+struct HoldingFigures;
 struct QuoteCoverage;
+struct Returns;
 struct Totals;
 
 /// The page of the portfolio as it stands on a day: totals, accounts, holdings, and how its value came about.
@@ -33,18 +36,25 @@ public:
     Date getDate() const { return date_->getDate(); }
     bool isComputeEvolution() const { return computeEvolution_->Value() == B_CONTROL_ON; }
 
-    /// Shows `state` and its totals; null empties the page. What was selected before `ClearState` is selected again,
-    /// where it still is.
-    void SetState(const State* state, const Totals& totals);
+    /// Shows `state`, its totals and the figures of its holdings; null empties the page. What was selected before
+    /// `ClearState` is selected again, where it still is.
+    void SetState(const State* state, const Totals& totals, const std::vector<HoldingFigures>& figures);
     /// Says beside the totals how many of the quotes that they rest on are not of `day`, or else of the rates.
     void showCoverage(const Date& day, const QuoteCoverage& quotes, const QuoteCoverage& rates);
     /// The last day with all quotes, where the page speaks of one; otherwise undefined.
     Date lastQuotedDay() const { return lastQuotedDay_; }
+    /// Shows the returns from `first` to `last`. The time-weighted one needs daily values, without which the page says
+    /// how to get them.
+    void showReturns(const Returns& returns, const Date& first, const Date& last, bool hasDays);
+    /// The first and the last day that the chart shows; undefined without one.
+    std::pair<Date, Date> daysInView() const;
+    /// `hook` is called when a person has changed which.
+    void setRangeHook(const std::function<void()>& hook);
     /// Empties the page before its state is destroyed, keeping in mind what was selected.
     void ClearState();
     /// What was selected belongs to a portfolio that is gone.
     void ForgetSelection();
-    /// Fills the chart with values in the reference currency, null without one, or says why there are none.
+    /// Fills the chart with values, by date, in the reference currency, null without one, or says why there are none.
     void UpdateEvolution(const std::vector<EvolutionPoint>& points, const Currency* reference,
                          EvolutionOutcome outcome);
     /// Without the tick there is no chart, and the list of holdings has its room.
@@ -76,6 +86,8 @@ private:
     void makeHoldings();
     void makeChart();
     void makeCoverage();
+    void makeReturns();
+    void hideReturns();
     void hideCoverage();
     void showChart(bool isShown);
     void tellFiltered();
@@ -91,6 +103,9 @@ private:
     BStringView* coverage_ = nullptr;
     BButton* goToLastQuotes_ = nullptr;
     Date lastQuotedDay_;
+    BStringView* returnRange_ = nullptr;
+    BStringView* moneyWeighted_ = nullptr;
+    BStringView* timeWeighted_ = nullptr;
     AccountStateListView* accounts_ = nullptr;
     BTextControl* accountName_ = nullptr;
     BTextControl* accountCurrency_ = nullptr;

@@ -2,14 +2,19 @@
 
 #include "chart/DateTicks.h"
 #include "chart/GraphView.h"
+#include "foundation/DateText.h"
 #include "tests/gui/CatalogueFixture.h"
+#include "tests/support/ToolRun.h"
 #include "valuation/State.h"
 
 #include <QAbstractButton>
 #include <QApplication>
 #include <QImage>
 #include <QWheelEvent>
+#include <cmath>
+#include <cstring>
 #include <gmock/gmock.h>
+#include <sstream>
 
 namespace {
 
@@ -147,6 +152,55 @@ TEST_F(ChartTest, ReadsTheNearestDayEverywhereAndAgreesWithTheTotals)
     EXPECT_EQ(texts(chart), last) << "by keys as well";
     QTest::keyClick(&widget, Qt::Key_Down);
     EXPECT_EQ(texts(chart)[0], "20/11/2024");
+}
+
+TEST_F(ChartTest, ReturnsAreOfTheDaysInViewAndThoseOfPelorinValue)
+{
+    loadSample();
+    const auto line = [this](const char* name) { return find<QWidget>(name).accessibleName().toStdString(); };
+    const auto returns = [&] { return line("txtMoneyWeighted") + ", " + line("txtTimeWeighted"); };
+    const auto expectRange = [&](const Date& from, const Date& to, const std::string& options) {
+        const std::string range = "From " + dateText(from) + " to " + dateText(to);
+        EXPECT_EQ(line("txtReturnRange"), range + ", per year:");
+        const ToolRun tool(PELORIN_VALUE,
+                           "'" + marketFile() + "' '" + walletFile() + "' --date " + dateText(to) + options,
+                           TemporaryFolder("pelorin-gui-returns"));
+        const auto valued = [&](const char* what) {
+            std::istringstream rest(tool.out.substr(tool.out.find(what) + std::strlen(what)));
+            std::string number;
+            rest >> number;
+            return std::string(what) + ' ' + number + " %";
+        };
+        EXPECT_EQ(returns(), valued("Money-weighted return") + ", " + valued("Time-weighted return")) << range;
+    };
+    const Date first = window().getState()->getFirstOperationDate();
+    EXPECT_THAT(returns(), testing::MatchesRegex("Money.* %, Time-weighted return: tick Compute Evolution"));
+    click("cbxComputeEvolution");
+    expectRange(first, {21, 11, 2024}, "");
+    click("btn1Y");
+    expectRange({21, 11, 2023}, {21, 11, 2024}, " --from 21/11/2023");
+    drag(evolution(), placeOf(evolution(), {1, 2, 2023}), placeOf(evolution(), {1, 2, 2024}));
+    const ChartRange range = evolution().shownRange();
+    const Date from = dateOfDay(std::ceil(range.min)), to = dateOfDay(std::floor(range.max));
+    EXPECT_EQ(from.getYear() + to.getYear(), 2023 + 2024);
+    expectRange(from, to, " --from " + dateText(from));
+    enter("txtDate", "21/11/2025");
+    expectRange(from, to, " --from " + dateText(from));
+    click("btnAll");
+    const std::string value = text("txtTotalValue");
+    show(kOperationPage);
+    click("cbxPrevision");
+    show(kPortoFolioPage);
+    enter("txtDate", "22/11/2025"); // values the sales that the day before was simulated with
+    enter("txtDate", "21/11/2025");
+    EXPECT_NE(text("txtTotalValue"), value);
+    expectRange(first, {21, 11, 2025}, "");
+    click("cbxComputeEvolution");
+    EXPECT_THAT(returns(), testing::EndsWith(", Time-weighted return: tick Compute Evolution"));
+    enter("txtDate", dateText(first).c_str());
+    EXPECT_EQ(line("txtReturnRange") + returns(), "Money-weighted return: no day, Time-weighted return: no day");
+    enter("txtDate", "");
+    EXPECT_EQ(returns(), ", ");
 }
 
 TEST_F(ChartTest, MarksTradesAndEventsAndKeepsItsRangeForAnotherCompany)

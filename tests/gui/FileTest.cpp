@@ -20,6 +20,7 @@
 #include <fstream>
 #include <functional>
 #include <gmock/gmock.h>
+#include <sstream>
 #include <sys/stat.h>
 
 namespace {
@@ -76,6 +77,35 @@ protected:
     }
 };
 
+/// With one blank where there are several.
+std::string squeezed(const std::string& text)
+{
+    std::string squeezed;
+    for (const char c : text)
+        if (c != ' ' || !squeezed.ends_with(' '))
+            squeezed += c;
+    return squeezed;
+}
+
+/// The lines that the gains of pelorin-value have for a row of the holdings; none for one without.
+std::string gainsOf(const std::string& row)
+{
+    std::istringstream rest(row + '\t'); // the last cell may be empty
+    std::vector<std::string> cells;
+    for (std::string cell; std::getline(rest, cell, '\t');)
+        cells.push_back(cell);
+    constexpr std::size_t kOwn = 10, kSums = 6;
+    if (cells[kOwn].empty())
+        return {}; // nothing has happened yet
+    std::string own = cells[1], reference;
+    for (std::size_t i = kOwn; i < kOwn + kSums; ++i) {
+        own += ' ' + cells[i].substr(0, cells[i].find(' '));
+        reference += ' ' + cells[i + kSums];
+    }
+    const std::string symbol = cells[kOwn].substr(cells[kOwn].find(' '));
+    return squeezed(own + symbol + '\n' + (symbol == " EUR" ? "" : reference + " EUR\n"));
+}
+
 TEST_F(FileTest, SampleComesInThroughTheButtonsAndIsSavedUnchanged)
 {
     loadSample();
@@ -83,6 +113,9 @@ TEST_F(FileTest, SampleComesInThroughTheButtonsAndIsSavedUnchanged)
                          TemporaryFolder("pelorin-gui-value"));
     const std::string total = text("txtTotalValue");
     EXPECT_THAT(valued.out, testing::HasSubstr(total.substr(0, total.find(' '))));
+    EXPECT_NE(gainsOf(rows("lstShares")[0]), "");
+    for (const std::string& row : rows("lstShares"))
+        EXPECT_THAT(squeezed(valued.out), testing::HasSubstr(gainsOf(row)));
     const auto market = std::filesystem::file_size(marketFile());
     const auto portfolio = std::filesystem::file_size(walletFile());
     follow({{{}, "btnSavePortoFolio", "Wallet successfully saved..."}});

@@ -8,7 +8,9 @@
 #include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/Peer.h"
+#include "tests/support/ServerRun.h"
 #include "tests/support/SmallPortfolio.h"
+#include "tests/support/WorkedSource.h"
 
 #include <QInputDevice>
 #include <QKeyEvent>
@@ -216,6 +218,34 @@ TEST_F(FetchCommandTest, PortfolioQuotesComeInWithoutAValuation)
     EXPECT_EQ(message(), "All portofolio quotes are up-to-date.") << "also after a failure";
     show(kCompanyPage);
     EXPECT_EQ(rows("lstQuotes").back(), "21/11/2024\t45.00") << "the page of the selected company was told";
+}
+
+TEST_F(FetchCommandTest, QuotesComeFromTheWorldAndABadSourceLeavesTheLastClose)
+{
+    const TemporaryFolder world("pelorin-gui-world");
+    installWorkedSource(world);
+    addTwoMarkets();
+    const std::string before = "Date,Close\n2026-01-01,7\n";
+    const std::pair<const char*, float> cases[] = {{"IBM", 12.5F}, {"LIES", 7.F}, {"DIES", 7.F}, {"HANGS", 7.F}};
+    std::vector<Company*> companies;
+    for (const auto& [ticker, latest] : cases) {
+        world.write("q/" + std::string(ticker) + ".csv", before);
+        companies.push_back(new Company(window().catalogue().getMarkets()[1], ticker, ticker));
+        buy(companies.back());
+    }
+    const ServerRun server(PELORIN_QUOTES, world / "q", 0, "finance-quote:worked", world / "log", "4");
+    quoteServers() = {"localhost", "localhost", server.port(), std::chrono::seconds(20)};
+    show(kPortoFolioPage);
+    click("btnUpdateAllQuotes");
+    EXPECT_EQ(notice(), "4 of 4 quotes came");
+    for (std::size_t i = 0; i < companies.size(); ++i) {
+        const auto& [ticker, latest] = cases[i];
+        EXPECT_EQ(companies[i]->getRealQuote(Date(21, 11, 2024)), latest) << ticker;
+        EXPECT_EQ(world.content("q/" + std::string(ticker) + ".csv"),
+                  before + (latest == 7 ? "" : "2026-01-02,12.5\n"));
+    }
+    EXPECT_EQ(world.content("log"), "LIES: line 1 is no date,close: \"LIES,2026-01-02,free,USD\"\n"
+                                    "DIES: a module that breaks\nHANGS: has not ended within 4 seconds\n");
 }
 
 TEST_F(FetchCommandTest, ASilentServerIsAskedOnceAndEscapeEndsTheWait)

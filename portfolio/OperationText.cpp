@@ -1,4 +1,4 @@
-#include "app/OperationText.h"
+#include "portfolio/OperationText.h"
 
 #include "foundation/NumberText.h"
 #include "portfolio/Account.h"
@@ -7,11 +7,15 @@
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/TransferAccountOperation.h"
-#include "views/ModelText.h"
 
 #include <cmath>
 
 namespace {
+
+std::string textOf(const String& text)
+{
+    return std::string(text.bytes());
+}
 
 /// The move on the account that lists the operation, or will.
 double ownMove(const Operation& operation, const Wallet& wallet)
