@@ -5,11 +5,8 @@
 #include "tests/gui/CatalogueFixture.h"
 #include "valuation/State.h"
 
-#include <QAbstractButton>
-#include <QApplication>
 #include <QImage>
 #include <QWheelEvent>
-#include <gmock/gmock.h>
 
 namespace {
 
