@@ -18,9 +18,9 @@ namespace {
 /// What an export has written, back into files.
 class ImportFolder : public ImportMode {
 public:
-    void describe(CLI::App& app) override;
-    bool isMeant(const CLI::App& app) const override { return app.count("--from") > 0; }
-    void run(const CLI::App& app, const ImportArguments& arguments) override;
+    void describe(Program& program) override;
+    bool isMeant(const Program& program) const override { return program.isGiven("--from"); }
+    void run(const Program& program, const ImportArguments& arguments) override;
 
 private:
     std::string folder_;
@@ -69,19 +69,19 @@ void tell(const char* what, const ValueCounts& counts)
               << " equal\n";
 }
 
-void ImportFolder::describe(CLI::App& app)
+void ImportFolder::describe(Program& program)
 {
-    addText(app, "--from", folder_, "FOLDER", "Read back what pelorin-export --as csv has written there");
+    program.addText("--from", folder_, "FOLDER", "Read back what pelorin-export --as csv has written there");
 }
 
-void ImportFolder::run(const CLI::App& app, const ImportArguments& arguments)
+void ImportFolder::run(const Program& program, const ImportArguments& arguments)
 {
     if (arguments.into.empty())
-        throw CLI::RequiredError("--into");
+        throw BadArguments::missing("--into");
     for (const char* other : {"OUTPUT", "--quotes", "--rates", "--listing", "--reference", "--rates-are", "--currency",
                               "--market", "--ticker-from-name", "--force"})
-        if (app.count(other) > 0)
-            throw CLI::ExcludesError("--from", other);
+        if (program.isGiven(other))
+            throw BadArguments::apart("--from", other);
     const auto marketStamp = FileStamp::of(arguments.into);
     const auto portfolioStamp = FileStamp::of(arguments.portfolio);
     Catalogue catalogue;

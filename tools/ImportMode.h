@@ -21,10 +21,10 @@ class ImportMode {
 public:
     virtual ~ImportMode() = default;
 
-    virtual void describe(CLI::App& app) = 0;
-    virtual bool isMeant(const CLI::App& app) const = 0;
-    /// Throws CLI::ParseError for options that do not go together, std::runtime_error for what cannot be done.
-    virtual void run(const CLI::App& app, const ImportArguments& arguments) = 0;
+    virtual void describe(Program& program) = 0;
+    virtual bool isMeant(const Program& program) const = 0;
+    /// Throws BadArguments for options that do not go together, std::runtime_error for what cannot be done.
+    virtual void run(const Program& program, const ImportArguments& arguments) = 0;
 };
 
 /// Market data from tables of quotes and rates: what is meant when no other way is.

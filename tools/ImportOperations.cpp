@@ -55,9 +55,9 @@ std::vector<float> cashOf(Valuation& valuation)
 
 /// What a validator of the options says of a text that `take` throws for.
 template <class Take>
-CLI::Validator checkedBy(const Take& take)
+Program::Option::Check checkedBy(const Take& take)
 {
-    const auto check = [take](const std::string& text) {
+    return [take](const std::string& text) {
         try {
             take(text);
             return std::string();
@@ -65,7 +65,6 @@ CLI::Validator checkedBy(const Take& take)
             return std::string(error.what());
         }
     };
-    return {check, ""};
 }
 
 /// The option that tells what a line leaves open, to go on from the reason.
@@ -94,12 +93,12 @@ OperationPlan::NewAccount newAccountOf(const std::string& text)
 
 class ImportOperations : public ImportMode {
 public:
-    void describe(CLI::App& app) override;
-    bool isMeant(const CLI::App& app) const override { return app.count("--operations") > 0; }
-    void run(const CLI::App& app, const ImportArguments& arguments) override;
+    void describe(Program& program) override;
+    bool isMeant(const Program& program) const override { return program.isGiven("--operations"); }
+    void run(const Program& program, const ImportArguments& arguments) override;
 
 private:
-    static void check(const CLI::App& app, const ImportArguments& arguments);
+    static void check(const Program& program, const ImportArguments& arguments);
     StatementProfile profile();
     void tellLines(const StatementTable& table, const OperationPlan& plan, bool withNew) const;
     void refuse(const OperationPlan& plan) const;
@@ -120,49 +119,48 @@ private:
     std::optional<FileStamp> stamp_; // of the portfolio file when it was read
 };
 
-void ImportOperations::describe(CLI::App& app)
+void ImportOperations::describe(Program& program)
 {
-    CLI::Option* operations =
-        app.add_option("--operations", table_, "Statement of which the portfolio gets the operations")
-            ->type_name("TABLE")
-            ->group(kGroup);
+    const Program::Option operations =
+        program.add("--operations", table_, "Statement of which the portfolio gets the operations")
+            .type("TABLE")
+            .group(kGroup);
     const auto list = [&](const char* name, std::vector<std::string>& values, const char* type, const char* purpose) {
-        return app.add_option(name, values, purpose)->type_name(type)->allow_extra_args(false);
+        return program.add(name, values, purpose).type(type).oneEach();
     };
     const auto text = [&](const char* name, std::string& value, const char* type, const char* purpose) {
-        return addText(app, name, value, type, purpose);
+        return program.addText(name, value, type, purpose);
     };
-    CLI::Option* const options[] = {
+    Program::Option options[] = {
         list("--column", columns_, "COLUMN=HEADING", "Heading of a column that is not known")
-            ->check(checkedBy([](const std::string& value) { StatementProfile().addColumn(value); })),
+            .check(checkedBy([](const std::string& value) { StatementProfile().addColumn(value); })),
         list("--type", types_, "WORD=TYPE", "What a word means: deposit, withdrawal, transfer, buy, sell, ...")
-            ->check(checkedBy([](const std::string& value) { StatementProfile().addType(value); })),
+            .check(checkedBy([](const std::string& value) { StatementProfile().addType(value); })),
         text("--account", account_, "NAME", "Account of the lines that name none"),
         list("--new-account", newAccounts_, "NAME=SYMBOL", "Makes an account in the currency of that symbol")
-            ->check(checkedBy(newAccountOf)),
-        text("--dates", dates_, "dmy|mdy", "Whether the day or the month comes first")
-            ->check(CLI::IsMember({"dmy", "mdy"})),
+            .check(checkedBy(newAccountOf)),
+        text("--dates", dates_, "dmy|mdy", "Whether the day or the month comes first").oneOf({"dmy", "mdy"}),
         text("--profile", profilePath_, "FILE",
              "Reads --column, --type, --account and --dates from FILE, or writes them there when there is none"),
-        app.add_flag("--skip-bad", skipBad_, "Books the other lines when some are refused"),
+        program.addFlag("--skip-bad", skipBad_, "Books the other lines when some are refused"),
     };
-    for (CLI::Option* option : options)
-        option->needs(operations)->group(kGroup);
+    for (Program::Option& option : options)
+        option.needs(operations).group(kGroup);
 }
 
-void ImportOperations::check(const CLI::App& app, const ImportArguments& arguments)
+void ImportOperations::check(const Program& program, const ImportArguments& arguments)
 {
     if (arguments.portfolio.empty() || arguments.market.empty())
-        throw CLI::RequiredError("--portfolio and --market");
+        throw BadArguments::missing("--portfolio and --market");
     for (const char* other : {"OUTPUT", "--quotes", "--rates", "--listing", "--reference", "--rates-are", "--currency",
                               "--ticker-from-name", "--force", "--into", "--from"})
-        if (const CLI::Option* option = app.get_option_no_throw(other); option != nullptr && option->count() > 0)
-            throw CLI::ExcludesError("--operations", other);
+        if (program.isGiven(other))
+            throw BadArguments::apart("--operations", other);
 }
 
-void ImportOperations::run(const CLI::App& app, const ImportArguments& arguments)
+void ImportOperations::run(const Program& program, const ImportArguments& arguments)
 {
-    check(app, arguments);
+    check(program, arguments);
     const StatementProfile profile = this->profile();
     stamp_ = FileStamp::of(arguments.portfolio);
     Valuation valuation(arguments.market, arguments.portfolio);

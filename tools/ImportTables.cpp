@@ -16,9 +16,9 @@ const char* const kValues = "value-in-reference";
 
 class ImportTables : public ImportMode {
 public:
-    void describe(CLI::App& app) override;
-    bool isMeant(const CLI::App&) const override { return true; }
-    void run(const CLI::App& app, const ImportArguments& arguments) override;
+    void describe(Program& program) override;
+    bool isMeant(const Program&) const override { return true; }
+    void run(const Program& program, const ImportArguments& arguments) override;
 
 private:
     void runNew(const ImportArguments& arguments);
@@ -34,29 +34,29 @@ private:
     ImportOptions import_;
 };
 
-void ImportTables::describe(CLI::App& app)
+void ImportTables::describe(Program& program)
 {
-    app.add_option("--quotes", quotes_, "Tables of closing prices")->type_name("FILE");
-    app.add_option("--rates", rates_, "Tables of exchange rates")->type_name("FILE");
-    app.add_option("--listing", listings_, "Tables that tell market, currency and name of tickers")->type_name("FILE");
-    addText(app, "--reference", import_.reference, "SYMBOL",
-            "Currency that the rates refer to; without it that of the file of --into, or EUR, or when there are no "
-            "rates the --currency");
-    app.add_option("--rates-are", ratesAre_, "How the rates are meant; see below")
-        ->check(CLI::IsMember({kUnits, kValues}));
-    addText(app, "--currency", import_.currency, "SYMBOL", "Currency of the markets that no table tells it of")
-        ->capture_default_str();
-    app.add_flag("--ticker-from-name", import_.tickerFromName,
-                 "The quotes are of one ticker a file, which the file's name tells (AAPL.csv: date,close)");
+    program.add("--quotes", quotes_, "Tables of closing prices").type("FILE");
+    program.add("--rates", rates_, "Tables of exchange rates").type("FILE");
+    program.add("--listing", listings_, "Tables that tell market, currency and name of tickers").type("FILE");
+    program.addText(
+        "--reference", import_.reference, "SYMBOL",
+        "Currency that the rates refer to; without it that of the file of --into, or EUR, or when there are no "
+        "rates the --currency");
+    program.add("--rates-are", ratesAre_, "How the rates are meant; see below").oneOf({kUnits, kValues});
+    program.addText("--currency", import_.currency, "SYMBOL", "Currency of the markets that no table tells it of")
+        .showDefault();
+    program.addFlag("--ticker-from-name", import_.tickerFromName,
+                    "The quotes are of one ticker a file, which the file's name tells (AAPL.csv: date,close)");
 }
 
-void ImportTables::run(const CLI::App& app, const ImportArguments& arguments)
+void ImportTables::run(const Program& program, const ImportArguments& arguments)
 {
     if (arguments.output.empty() == arguments.into.empty())
-        throw CLI::RequiredError("Either OUTPUT or --into");
+        throw BadArguments::missing("Either OUTPUT or --into");
     if (quotes_.empty() && rates_.empty())
-        throw CLI::RequiredError("--quotes or --rates");
-    hasReference_ = app.count("--reference") > 0;
+        throw BadArguments::missing("--quotes or --rates");
+    hasReference_ = program.isGiven("--reference");
     if (!ratesAre_.empty())
         import_.ratesAreUnits = ratesAre_ == kUnits;
     if (!arguments.market.empty())

@@ -43,16 +43,14 @@ struct Arguments {
     std::string form = kCsv;
 };
 
-void describe(CLI::App& app, Arguments& arguments)
+void describe(Program& program, Arguments& arguments)
 {
-    app.footer(kForms);
-    app.add_option("MARKET_FILE", arguments.market, "Currencies, markets and companies with their quotes")->required();
-    app.add_option("PORTFOLIO_FILE", arguments.portfolio, "Accounts and holdings with their operations");
-    addText(app, "--to", arguments.folder, "FOLDER", "Folder to write into; made when it is missing")->required();
-    addDate(app, "--date", arguments.date, "Day of holdings, cash and journal; without it today");
-    app.add_option("--as", arguments.form, "What is written; see below")
-        ->check(CLI::IsMember({kCsv, kLedger, kBeancount}))
-        ->capture_default_str();
+    program.setFooter(kForms);
+    program.add("MARKET_FILE", arguments.market, "Currencies, markets and companies with their quotes").required();
+    program.add("PORTFOLIO_FILE", arguments.portfolio, "Accounts and holdings with their operations");
+    program.addText("--to", arguments.folder, "FOLDER", "Folder to write into; made when it is missing").required();
+    program.addDate("--date", arguments.date, "Day of holdings, cash and journal; without it today");
+    program.add("--as", arguments.form, "What is written; see below").oneOf({kCsv, kLedger, kBeancount}).showDefault();
 }
 
 void remark(const std::vector<std::string>& remarks)
@@ -124,7 +122,7 @@ void run(const Arguments& arguments)
 int main(int argc, char** argv)
 {
     Arguments arguments;
-    CLI::App app(kPurpose, "pelorin-export");
-    describe(app, arguments);
-    return runProgram(app, argc, argv, [&] { run(arguments); });
+    Program program(kPurpose, "pelorin-export");
+    describe(program, arguments);
+    return program.run(argc, argv, [&] { run(arguments); });
 }

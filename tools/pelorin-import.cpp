@@ -47,35 +47,37 @@ they bring what is new and the values of days; what is booked already is passed 
 Exit status: 0, 1 when a file cannot be read, written or added to or a line of a statement is refused, 2 for bad
 arguments.)";
 
-void describe(CLI::App& app, ImportArguments& arguments)
+void describe(Program& program, ImportArguments& arguments)
 {
-    app.footer(kTables);
-    auto* output = app.add_option("OUTPUT", arguments.output, "Market file to make; comes first");
-    addText(app, "--into", arguments.into, "FILE", "Market file to add to; with --from it may be missing")
-        ->excludes(output);
-    addText(app, "--market", arguments.market, "NAME",
-            "Market of the tickers that no table tells it of; without it NYSE. With --operations the market file");
-    addText(app, "--portfolio", arguments.portfolio, "FILE", "Portfolio file to add to");
-    app.add_flag("--dry-run", arguments.dryRun, "Write nothing, only tell what would be new, changed, equal, refused");
-    app.add_flag("--force", arguments.force, "Replace OUTPUT when it exists")->needs(output);
+    program.setFooter(kTables);
+    const auto output = program.add("OUTPUT", arguments.output, "Market file to make; comes first");
+    program.addText("--into", arguments.into, "FILE", "Market file to add to; with --from it may be missing")
+        .excludes(output);
+    program.addText(
+        "--market", arguments.market, "NAME",
+        "Market of the tickers that no table tells it of; without it NYSE. With --operations the market file");
+    program.addText("--portfolio", arguments.portfolio, "FILE", "Portfolio file to add to");
+    program.addFlag("--dry-run", arguments.dryRun,
+                    "Write nothing, only tell what would be new, changed, equal, refused");
+    program.addFlag("--force", arguments.force, "Replace OUTPUT when it exists").needs(output);
 }
 
 } // namespace
 
 int main(int argc, char** argv)
 {
-    CLI::App app(kPurpose, "pelorin-import");
+    Program program(kPurpose, "pelorin-import");
     ImportArguments arguments;
-    describe(app, arguments);
+    describe(program, arguments);
     // The first that is meant is taken; tables are always meant, and so come last.
     std::vector<std::unique_ptr<ImportMode>> modes;
     modes.push_back(importOperations());
     modes.push_back(importFolder());
     modes.push_back(importTables());
     for (const auto& mode : modes)
-        mode->describe(app);
-    return runProgram(app, argc, argv, [&] {
-        const auto isMeant = [&](const auto& mode) { return mode->isMeant(app); };
-        (*std::ranges::find_if(modes, isMeant))->run(app, arguments);
+        mode->describe(program);
+    return program.run(argc, argv, [&] {
+        const auto isMeant = [&](const auto& mode) { return mode->isMeant(program); };
+        (*std::ranges::find_if(modes, isMeant))->run(program, arguments);
     });
 }

@@ -65,26 +65,28 @@ struct Arguments {
     unsigned limit = kUsualLimit; // of the source, in seconds
 };
 
-void describe(CLI::App& app, Arguments& arguments)
+void describe(Program& program, Arguments& arguments)
 {
-    app.footer(kTables);
-    auto* folder = addText(app, "FOLDER", arguments.folder, "TEXT", "Folder of the tables");
-    addText(app, "--source", arguments.source, "SOURCE",
-            "Where quotes come from that the tables do not have; see below. Without it --update asks finance-quote");
-    addText(app, "--update", arguments.market, "FILE", "Market file to bring up to date, instead of serving a folder")
-        ->excludes(folder);
-    app.add_option("--time-limit", arguments.limit, "How long the source may take for a quote")
-        ->type_name("SECONDS")
-        ->check(CLI::Range(1U, kLongestLimit))
-        ->capture_default_str();
-    app.add_option("--port", arguments.port, "TCP port to listen on; 0 lets the system choose one")
-        ->type_name("N")
-        ->check(CLI::Range(0U, kHighestPort))
-        ->capture_default_str();
-    app.add_option("--bind", arguments.address, "IPv4 address to listen on; 0.0.0.0 is open to the whole network")
-        ->type_name("ADDRESS")
-        ->check(CLI::ValidIPV4)
-        ->capture_default_str();
+    program.setFooter(kTables);
+    const auto folder = program.addText("FOLDER", arguments.folder, "TEXT", "Folder of the tables");
+    program.addText("--source", arguments.source, "SOURCE",
+                    "Where quotes come from that the tables do not have; see below. Without it --update asks "
+                    "finance-quote");
+    program
+        .addText("--update", arguments.market, "FILE", "Market file to bring up to date, instead of serving a folder")
+        .excludes(folder);
+    program.add("--time-limit", arguments.limit, "How long the source may take for a quote")
+        .type("SECONDS")
+        .between(1, kLongestLimit)
+        .showDefault();
+    program.add("--port", arguments.port, "TCP port to listen on; 0 lets the system choose one")
+        .type("N")
+        .between(0, kHighestPort)
+        .showDefault();
+    program.add("--bind", arguments.address, "IPv4 address to listen on; 0.0.0.0 is open to the whole network")
+        .type("ADDRESS")
+        .ipv4()
+        .showDefault();
 }
 
 /// Listens, and tells where on standard output.
@@ -99,13 +101,13 @@ void listenOn(Socket& server, const Arguments& arguments)
     std::cout << where << port << std::endl;
 }
 
-/// Throws CLI::ValidationError for a source that there is not.
+/// Throws BadArguments for a source that there is not.
 std::unique_ptr<QuoteSource> sourceOf(const std::string& text, std::chrono::seconds limit)
 {
     try {
         return quoteSource(text, limit);
     } catch (const std::runtime_error& error) {
-        throw CLI::ValidationError("--source", error.what());
+        throw BadArguments(std::string("--source: ") + error.what());
     }
 }
 
@@ -133,7 +135,7 @@ void update(const Arguments& arguments, std::chrono::seconds limit)
 void run(const Arguments& arguments)
 {
     if (arguments.folder.empty() == arguments.market.empty())
-        throw CLI::RequiredError("Either FOLDER or --update");
+        throw BadArguments::missing("Either FOLDER or --update");
     const std::chrono::seconds limit(arguments.limit);
     arguments.market.empty() ? serve(arguments, limit) : update(arguments, limit);
 }
@@ -143,7 +145,7 @@ void run(const Arguments& arguments)
 int main(int argc, char** argv)
 {
     Arguments arguments;
-    CLI::App app(kPurpose, "pelorin-quotes");
-    describe(app, arguments);
-    return runProgram(app, argc, argv, [&] { run(arguments); });
+    Program program(kPurpose, "pelorin-quotes");
+    describe(program, arguments);
+    return program.run(argc, argv, [&] { run(arguments); });
 }

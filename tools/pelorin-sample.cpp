@@ -34,16 +34,16 @@ struct Arguments {
     bool onlyNews = false;
 };
 
-void describe(CLI::App& app, Arguments& arguments)
+void describe(Program& program, Arguments& arguments)
 {
-    app.footer(kOutput);
-    addText(app, "FOLDER", arguments.folder, "TEXT",
-            "Data folder, made when it is missing; without it the one that Pelorin keeps your files in");
-    addDate(app, "--date", arguments.date, "Day up to which there are quotes and rates; without it today");
-    addText(app, "--quotes", arguments.quotes, "FOLDER",
-            "Folder of tables TICKER.csv to write; made when it is missing");
-    app.add_flag("--quiet", arguments.quiet, "Do not tell what was written");
-    app.add_flag("--only-news", arguments.onlyNews, "Do not tell of the two files when both are there already");
+    program.setFooter(kOutput);
+    program.addText("FOLDER", arguments.folder, "TEXT",
+                    "Data folder, made when it is missing; without it the one that Pelorin keeps your files in");
+    program.addDate("--date", arguments.date, "Day up to which there are quotes and rates; without it today");
+    program.addText("--quotes", arguments.quotes, "FOLDER",
+                    "Folder of tables TICKER.csv to write; made when it is missing");
+    program.addFlag("--quiet", arguments.quiet, "Do not tell what was written");
+    program.addFlag("--only-news", arguments.onlyNews, "Do not tell of the two files when both are there already");
 }
 
 std::filesystem::path dataFolder(const Arguments& arguments)
@@ -91,7 +91,7 @@ void run(const Arguments& arguments)
 int main(int argc, char** argv)
 {
     Arguments arguments;
-    CLI::App app(kPurpose, "pelorin-sample");
-    describe(app, arguments);
-    return runProgram(app, argc, argv, [&] { run(arguments); });
+    Program program(kPurpose, "pelorin-sample");
+    describe(program, arguments);
+    return program.run(argc, argv, [&] { run(arguments); });
 }

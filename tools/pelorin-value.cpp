@@ -46,18 +46,18 @@ struct Arguments {
     bool json = false;
 };
 
-void describe(CLI::App& app, Arguments& arguments)
+void describe(Program& program, Arguments& arguments)
 {
-    app.footer(kOutput);
-    app.add_option("MARKET_FILE", arguments.market, "Currencies, markets and companies with their quotes")->required();
-    app.add_option("PORTFOLIO_FILE", arguments.portfolio, "Accounts and holdings with their operations")->required();
-    addDate(app, "--date", arguments.date, "Day to value the portfolio on; without it today");
-    addDate(app, "--from", arguments.from,
-            "Begin the returns and the gains behind this day; without it with the first operation");
-    app.add_flag("--previsions", arguments.previsions, "Search the automatic sales that the trend lines suggest");
-    app.add_flag("--evolution", arguments.evolution,
-                 "Also give the total value of every day since the first operation");
-    app.add_flag("--json", arguments.json, "Write JSON instead of tables");
+    program.setFooter(kOutput);
+    program.add("MARKET_FILE", arguments.market, "Currencies, markets and companies with their quotes").required();
+    program.add("PORTFOLIO_FILE", arguments.portfolio, "Accounts and holdings with their operations").required();
+    program.addDate("--date", arguments.date, "Day to value the portfolio on; without it today");
+    program.addDate("--from", arguments.from,
+                    "Begin the returns and the gains behind this day; without it with the first operation");
+    program.addFlag("--previsions", arguments.previsions, "Search the automatic sales that the trend lines suggest");
+    program.addFlag("--evolution", arguments.evolution,
+                    "Also give the total value of every day since the first operation");
+    program.addFlag("--json", arguments.json, "Write JSON instead of tables");
 }
 
 void checkOutput()
@@ -85,7 +85,7 @@ void run(const Arguments& arguments)
 int main(int argc, char** argv)
 {
     Arguments arguments;
-    CLI::App app(kPurpose, "pelorin-value");
-    describe(app, arguments);
-    return runProgram(app, argc, argv, [&] { run(arguments); });
+    Program program(kPurpose, "pelorin-value");
+    describe(program, arguments);
+    return program.run(argc, argv, [&] { run(arguments); });
 }

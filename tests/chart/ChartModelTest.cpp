@@ -11,21 +11,12 @@
 
 namespace {
 
-constexpr float kNaN = std::numeric_limits<float>::quiet_NaN();
-
 GraphPoint* datedPoint(const Date& date, float y)
 {
     auto* point = new GraphPoint(0, y);
     point->setDateBased(true);
     point->setDateX(date);
     return point;
-}
-
-template <class Poly>
-void addAll(Poly& poly, const std::vector<float>& xs)
-{
-    for (const float x : xs)
-        poly.addGraphPoint(new GraphPoint(x, 10 * x));
 }
 
 template <class Poly>
@@ -36,51 +27,48 @@ std::vector<GraphPoint*> pointsOf(const Poly& poly)
     return {points, points + count};
 }
 
-template <class Poly>
-std::vector<float> xsOf(const Poly& poly)
+TEST(GraphPolyElementTest, LineKeepsItsPointsByXAndPolygonAsTheyWereAddedAndBothKnowTheirExtremes)
 {
-    std::vector<float> xs;
-    for (const GraphPoint* point : pointsOf(poly))
-        xs.push_back(point->getX());
-    return xs;
-}
-
-TEST(GraphPolyElementTest, LineKeepsItsPointsByXAndPolygonAsTheyWereAdded)
-{
-    GraphLine line;
-    GraphPolygon polygon;
-    addAll(line, {3, 1, 2});
-    addAll(polygon, {3, 1, 2});
-    EXPECT_EQ(xsOf(line), (std::vector<float>{1, 2, 3}));
-    pointsOf(line)[0]->setX(2.5F);
-    pointsOf(polygon)[1]->setX(9);
-    EXPECT_EQ(xsOf(line), (std::vector<float>{2, 2.5F, 3}));
-    EXPECT_EQ(xsOf(polygon), (std::vector<float>{3, 9, 2}));
-}
-
-TEST(GraphLineTest, SortsByDatesThatCountOnlyAfterTheAddition)
-{
-    GraphLine line;
-    std::vector<GraphPoint*> added;
-    for (const short day : {short{30}, short{10}, short{20}}) {
-        added.push_back(new GraphPoint(0, day));
-        added.back()->setDateX(Date(day, 6, 2001));
-        line.addGraphPoint(added.back());
-    }
-    for (GraphPoint* point : added)
-        point->setDateBased(true);
-    EXPECT_EQ(pointsOf(line)[0]->getY(), 10);
-    EXPECT_EQ(pointsOf(line)[1]->getY(), 20);
+    const auto check = [](auto&& poly, const std::vector<float>& first, const std::vector<float>& then) {
+        const auto xs = [&poly] {
+            std::vector<float> found;
+            for (const GraphPoint* point : pointsOf(poly))
+                found.push_back(point->getX());
+            return found;
+        };
+        EXPECT_EQ(poly.getMaxY(), 0) << "without points";
+        EXPECT_EQ(poly.getMinDateX(), Date()) << "without points";
+        std::vector<GraphPoint*> added;
+        for (const float x : {3.0F, 1.0F, 2.0F}) {
+            added.push_back(new GraphPoint(x, -10 * x));
+            poly.addGraphPoint(added.back());
+        }
+        EXPECT_EQ(xs(), first);
+        added[1]->setX(2.5F);
+        EXPECT_EQ(xs(), then);
+        EXPECT_TRUE(poly.getMinX() == 2 && poly.getMaxX() == 3 && poly.getMinY() == -30 && poly.getMaxY() == -10);
+        poly.clearAll();
+        for (const int day : {14, 3, 25, 9})
+            poly.addGraphPoint(datedPoint(Date(static_cast<short>(day), 1, 2002), 0));
+        EXPECT_EQ(poly.getMinDateX(), Date(3, 1, 2002));
+        EXPECT_EQ(poly.getMaxDateX(), Date(25, 1, 2002));
+    };
+    check(GraphLine(), {1, 2, 3}, {2, 2.5F, 3});
+    check(GraphPolygon(), {3, 1, 2}, {3, 2.5F, 2});
 }
 
 TEST(GraphLineTest, PutsPointsThatHaveNoOrderInOne)
 {
     GraphLine line; // long enough for a sort that trusts its comparison to leave the array
     for (int i = 0; i < 500; ++i) {
-        if (i % 3 == 0)
-            line.addGraphPoint(datedPoint(Date(static_cast<short>(28 - i % 28), 2, 1999), 0));
-        else
-            line.addGraphPoint(new GraphPoint(i % 7 == 0 ? kNaN : static_cast<float>(-i), 0));
+        if (i % 3 == 0) { // dates count only after the addition
+            auto* point = new GraphPoint(0, 0);
+            line.addGraphPoint(point);
+            point->setDateX(Date(static_cast<short>(28 - i % 28), 2, 1999));
+            point->setDateBased(true);
+        } else
+            line.addGraphPoint(
+                new GraphPoint(i % 7 == 0 ? std::numeric_limits<float>::quiet_NaN() : static_cast<float>(-i), 0));
     }
     const std::vector<GraphPoint*> points = pointsOf(line);
     const auto dated = std::ranges::find_if(points, &GraphPoint::isDateBased);
@@ -91,27 +79,6 @@ TEST(GraphLineTest, PutsPointsThatHaveNoOrderInOne)
     EXPECT_TRUE(std::is_sorted(points.begin(), unordered, isBefore));
     const auto isEarlier = [](GraphPoint* a, GraphPoint* b) { return a->getDateX() < b->getDateX(); };
     EXPECT_TRUE(std::is_sorted(dated, points.end(), isEarlier));
-}
-
-TEST(GraphPolyElementTest, FindsTheExtremesOfAllPoints)
-{
-    const auto check = [](auto&& poly, const char* what) {
-        SCOPED_TRACE(what);
-        EXPECT_EQ(poly.getMaxY(), 0) << "without points";
-        EXPECT_EQ(poly.getMinDateX(), Date()) << "without points";
-        for (const int day : {14, 3, 25, 9})
-            poly.addGraphPoint(datedPoint(Date(static_cast<short>(day), 1, 2002), static_cast<float>(-day)));
-        EXPECT_EQ(poly.getMinDateX(), Date(3, 1, 2002));
-        EXPECT_EQ(poly.getMaxDateX(), Date(25, 1, 2002));
-        EXPECT_EQ(poly.getMinY(), -25);
-        EXPECT_EQ(poly.getMaxY(), -3);
-        poly.clearAll();
-        addAll(poly, {4, -2, 8, 1});
-        EXPECT_EQ(poly.getMinX(), -2);
-        EXPECT_EQ(poly.getMaxX(), 8);
-    };
-    check(GraphLine(), "line");
-    check(GraphPolygon(), "polygon");
 }
 
 TEST(GraphPointTest, BelongsToOneElementWhichOwnsIt)

@@ -4,8 +4,6 @@
 
 #include <gtest/gtest.h>
 
-#include <functional>
-
 namespace {
 
 constexpr ChartRange kData{100, 200};
@@ -15,51 +13,33 @@ TEST(ChartZoomTest, StaysWithinTheDataAndAboveTheLeastLength)
 {
     const struct {
         const char* what;
-        std::function<void(ChartZoom&)> act;
+        ChartRange asked;
+        double around, factor; // of a zoom; 0 for none
+        double pan;
         ChartRange shown;
     } cases[] = {
-        {"nothing", [](ChartZoom&) {}, kData},
-        {"in, around a point", [](ChartZoom& z) { z.zoom(120, 0.5); }, {110, 160}},
-        {"and out again", [](ChartZoom& z) { z.zoom(120, 0.5), z.zoom(120, 2); }, kData},
-        {"out at an end",
-         [](ChartZoom& z) {
-             z.show({100, 120}), z.zoom(110, 2);
-         },
-         {100, 130}},
-        {"in, too far", [](ChartZoom& z) { z.zoom(150, 1e-9); }, {148, 152}},
-        {"in, outside", [](ChartZoom& z) { z.zoom(999, 0.5); }, {150, 200}},
-        {"a part that is too short",
-         [](ChartZoom& z) {
-             z.show({120, 121});
-         },
-         {118.5, 122.5}},
-        {"one at the end",
-         [](ChartZoom& z) {
-             z.show({200, 200});
-         },
-         {196, 200}},
-        {"pan",
-         [](ChartZoom& z) {
-             z.show({110, 120}), z.pan(30);
-         },
-         {140, 150}},
-        {"pan too far",
-         [](ChartZoom& z) {
-             z.show({110, 120}), z.pan(-30);
-         },
-         {100, 110}},
-        {"all again",
-         [](ChartZoom& z) {
-             z.show({110, 120}), z.showAll();
-         },
-         kData},
+        {"nothing", kData, 0, 0, 0, kData},
+        {"in, around a point", kData, 120, 0.5, 0, {110, 160}},
+        {"and out again", {110, 160}, 120, 2, 0, kData},
+        {"out at an end", {100, 120}, 110, 2, 0, {100, 130}},
+        {"in, too far", kData, 150, 1e-9, 0, {148, 152}},
+        {"in, outside", kData, 999, 0.5, 0, {150, 200}},
+        {"a part that is too short", {120, 121}, 0, 0, 0, {118.5, 122.5}},
+        {"one at the end", {200, 200}, 0, 0, 0, {196, 200}},
+        {"pan", {110, 120}, 0, 0, 30, {140, 150}},
+        {"pan too far", {110, 120}, 0, 0, -30, {100, 110}},
     };
     for (const auto& c : cases) {
         ChartZoom zoom;
         zoom.setBounds(kData, kLeast);
-        c.act(zoom);
+        zoom.show(c.asked);
+        if (c.factor > 0)
+            zoom.zoom(c.around, c.factor);
+        zoom.pan(c.pan);
         EXPECT_DOUBLE_EQ(zoom.shown().min, c.shown.min) << c.what;
         EXPECT_DOUBLE_EQ(zoom.shown().max, c.shown.max) << c.what;
+        zoom.showAll();
+        EXPECT_EQ(zoom.shown(), kData) << c.what << ", and all again";
     }
 }
 

@@ -97,16 +97,6 @@ TEST_F(ImportTest, CsvRecordsFollowRfc4180WithLineNumbers)
     EXPECT_THAT(records("a,b\n" + longest + "\nc"), ElementsAre("1:a|b", "2:" + longest, "3:c"));
 }
 
-TEST_F(ImportTest, GzippedDataThatEndTooEarlyAreAnError)
-{
-    zipped("t.gz", "2005-01-03,A,1\n2005-01-04,A,2\n");
-    fs::resize_file(folder_ / "t.gz", fs::file_size(folder_ / "t.gz") - 9);
-    MarketImport importer = import(catalogue_);
-    EXPECT_THROW(importer.addQuotes(folder_ / "t.gz"), std::runtime_error);
-    EXPECT_THROW(importer.addQuotes(folder_ / "none"), std::runtime_error);
-    EXPECT_THROW(importer.addQuotes(folder_.path), std::runtime_error);
-}
-
 TEST_F(ImportTest, DatesAreIsoOrDayMonthYear)
 {
     for (const char* good : {"2004-02-29", "29/02/2004", "29/2/2004", "2004-2-29"})

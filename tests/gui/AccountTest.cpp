@@ -6,8 +6,6 @@
 #include "tests/support/ToolRun.h"
 
 #include <QCheckBox>
-#include <QComboBox>
-#include <gmock/gmock.h>
 
 namespace {
 

@@ -3,16 +3,11 @@
 #include "market/Company.h"
 #include "market/Currency.h"
 #include "market/Market.h"
-#include "platform/ListView.h"
-#include "platform/qt/WindowWidget.h"
 #include "portfolio/Account.h"
 #include "portfolio/Share.h"
 #include "portfolio/ShareOperation.h"
 #include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"
-
-#include <QLineEdit>
-#include <QTest>
 
 /// Tests of the commands, with their market data.
 class CatalogueTest : public WindowTest {
@@ -76,7 +71,6 @@ protected:
         (new ShareOperation(Date(2, 3, 2024), share, true, 10, 11, false, 0))->setAccount(account);
         window().UpdateState();
     }
-    std::string notice() { return window().widget().findChild<QWidget*>("txtNotice")->accessibleName().toStdString(); }
     Company* company()
     {
         Company* found = nullptr;
@@ -88,5 +82,28 @@ protected:
         select(name, 0);
         QTest::keyClick(list(name).widget(), Qt::Key_A, Qt::ControlModifier);
         settle();
+    }
+
+    /// The dialog that waits, its controls, what they say, and a click on them.
+    static QWidget* dialog() { return QApplication::activeModalWidget(); }
+    template <class Widget>
+    static Widget* part(const char* name)
+    {
+        return dialog()->findChild<Widget*>(name);
+    }
+    static std::string line(const char* name) { return part<QWidget>(name)->accessibleName().toStdString(); }
+    static std::vector<std::string> table(const char* name)
+    {
+        std::vector<std::string> texts;
+        const QAbstractItemModel& rows = *part<QAbstractItemView>(name)->model();
+        for (int i = 0; i < rows.rowCount(); ++i)
+            texts.push_back(rows.data(rows.index(i, 0), Qt::AccessibleTextRole).toString().toStdString());
+        return texts;
+    }
+    static void pressPart(const char* name)
+    {
+        QTest::mouseClick(part<QAbstractButton>(name), Qt::LeftButton, {}, {8, 8});
+        settle();
+        settle(); // the window goes behind its answer
     }
 };

@@ -7,13 +7,10 @@
 #include "tests/support/ToolRun.h"
 #include "valuation/State.h"
 
-#include <QAbstractButton>
-#include <QApplication>
 #include <QImage>
 #include <QWheelEvent>
 #include <cmath>
 #include <cstring>
-#include <gmock/gmock.h>
 #include <sstream>
 
 namespace {

@@ -1,7 +1,6 @@
 // The built program on a real X server, by real mouse and key events alone: a portfolio from an empty window, by hand.
 
 #include "net/QuoteServers.h"
-#include "platform/qt/WindowWidget.h"
 #include "tests/gui/RealProgram.h"
 #include "tests/gui/WindowFixture.h"
 #include "tests/support/ServerRun.h"

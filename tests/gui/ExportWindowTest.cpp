@@ -1,21 +1,15 @@
 #include "foundation/NumberText.h"
 #include "platform/DialogAnswers.h"
-#include "platform/qt/WindowWidget.h"
 #include "tests/gui/WindowFixture.h"
 #include "tests/support/ToolRun.h"
 #include "views/ColumnListView.h"
 
-#include <QAbstractItemView>
-#include <QApplication>
 #include <QDialogButtonBox>
 #include <QFileDialog>
-#include <QLineEdit>
 #include <QMenu>
 #include <QMessageBox>
 #include <QPushButton>
-#include <QTest>
 #include <QTimer>
-#include <gmock/gmock.h>
 
 using testing::ElementsAre;
 using testing::HasSubstr;
@@ -77,17 +71,11 @@ protected:
         DialogAnswers::current().panel = nullptr;
         return notice();
     }
-    std::string notice()
-    {
-        auto* text = window().widget().findChild<QWidget*>("txtNotice");
-        return text->isVisible() ? text->accessibleName().toStdString() : "";
-    }
 
 private:
     QMenu* openMenu()
     {
-        QTest::mouseClick(window().widget().findChild<QWidget*>("btnExport"), Qt::LeftButton);
-        settle();
+        press("btnExport");
         auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
         if (menu == nullptr)
             throw std::runtime_error("no menu");
@@ -281,7 +269,6 @@ TEST_F(ExportWindowTest, NothingIsReplacedUnaskedAndAFailureLeavesAllAsItWas)
     // A success takes the notice of the failure away.
     show(kPortoFolioPage);
     EXPECT_THAT(exportOver(place / "accounts.csv", "Accounts at 21/11/2024..."), HasSubstr("4 accounts"));
-    QTest::mouseClick(window().widget().findChild<QWidget*>("txtNotice"), Qt::LeftButton);
-    settle();
+    press("txtNotice");
     EXPECT_EQ(notice(), "");
 }

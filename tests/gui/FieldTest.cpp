@@ -1,13 +1,9 @@
 // What fields make of what is typed into them: completions, numbers and dates as they are understood, and what is not.
 
-#include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "valuation/State.h"
 
-#include <QAbstractItemView>
-#include <QApplication>
 #include <QCalendarWidget>
-#include <gmock/gmock.h>
 
 namespace {
 
@@ -17,13 +13,6 @@ using testing::IsEmpty;
 
 class FieldTest : public CatalogueTest {
 protected:
-    void key(Qt::Key key, Qt::KeyboardModifiers modifiers = {})
-    {
-        QTest::keyClick(QApplication::focusWidget(), key, modifiers);
-        settle();
-    }
-    std::string focus() { return QApplication::focusWidget()->objectName().toStdString(); }
-    std::string notice() { return window().FindView("txtNotice")->widget()->accessibleName().toStdString(); }
     void dismiss() { key(Qt::Key_0, Qt::AltModifier); }
     bool isMarked(const char* name) { return !find<QLineEdit>(name).toolTip().isEmpty(); }
     /// The list below a field; null while it has not been needed.
@@ -161,7 +150,10 @@ TEST_F(FieldTest, WhatCannotBeReadIsNotBooked)
     fill({{"txtQuoteDate", "1/1/2024"}, {"txtQuoteValue", "1.5x"}});
     click("btnAddQuote");
     EXPECT_EQ(notice(), "Value: 1.5x is no number");
+    EXPECT_TRUE(isMarked("txtQuoteValue"));
     EXPECT_THAT(rows("lstQuotes"), IsEmpty());
+    addQuote("2-3-2024", "-0.123456789");
+    EXPECT_THAT(rows("lstQuotes"), ElementsAre("02/03/2024\t-0.12345679"));
 }
 
 TEST_F(FieldTest, DatesAreCompletedWhateverComesNext)
@@ -171,11 +163,13 @@ TEST_F(FieldTest, DatesAreCompletedWhateverComesNext)
         const char *typed, *shown;
     } cases[] = {{"1/2/26", "01/02/2026"},     {"1.2.99", "01/02/1999"},  {"1/2/73", "01/02/2073"},
                  {"1/2/74", "01/02/1974"},     {"29/2/00", "29/02/2000"}, {"2026-06-30", "30/06/2026"},
-                 {"2026-02-30", "2026-02-30"}, {"1/2/0026", "01/02/26"},  {"1/2", "1/2"}};
+                 {"2026-02-30", "2026-02-30"}, {"1/2/0026", "01/02/26"},  {"1/2", "1/2"},
+                 {"30.2.2024", "30.2.2024"}};
     for (const auto& c : cases) {
         type("txtQuoteDate", c.typed);
         key(Qt::Key_Tab);
         EXPECT_EQ(text("txtQuoteDate"), c.shown) << c.typed;
+        EXPECT_EQ(isMarked("txtQuoteDate"), c.shown == std::string(c.typed)) << c.typed;
     }
     // By a click, which leaves the field, by the key, and by the code, which does not.
     const auto add = [&](const char* date, const auto& send) {

@@ -6,20 +6,15 @@
 #include "platform/Message.h"
 #include "platform/StringView.h"
 #include "platform/TabView.h"
-#include "platform/qt/WindowWidget.h"
 #include "portfolio/Account.h"
 #include "portfolio/Share.h"
 #include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"
 #include "tests/support/ToolRun.h"
 
-#include <QApplication>
-#include <QLineEdit>
-#include <QTest>
 #include <filesystem>
 #include <fstream>
 #include <functional>
-#include <gmock/gmock.h>
 #include <sstream>
 #include <sys/stat.h>
 
@@ -33,16 +28,6 @@ using testing::SizeIs;
 
 class FileTest : public WindowTest {
 protected:
-    void loadMarkets(const std::string& path) { load(kCompanyPage, "btnLoadMarket", path); }
-    void loadWallet(const std::string& path) { load(kPortoFolioPage, "btnLoadPortoFolio", path); }
-    void load(Page page, const char* button, const std::string& path)
-    {
-        show(page);
-        if (page == kPortoFolioPage || window().catalogue().getNbrCurrencies() > 0)
-            answerNextAlert("Continue");
-        click(button);
-        answerPanel("OpenPanel", path);
-    }
     void receive(const BMessage& refs, const std::string& expected)
     {
         clearMessage();
@@ -63,12 +48,6 @@ protected:
         click(button);
         DialogAnswers::current().panel = nullptr;
         return offered;
-    }
-    /// The notice that is shown, empty when there is none.
-    std::string notice()
-    {
-        auto* text = window().widget().findChild<QWidget*>("txtNotice");
-        return text->isVisible() ? text->accessibleName().toStdString() : "";
     }
 
     static void write(const std::string& path, const std::string& content)
@@ -132,10 +111,6 @@ TEST_F(FileTest, SampleComesInThroughTheButtonsAndIsSavedUnchanged)
 
 TEST_F(FileTest, AnEmptyWindowOffersTheSampleAndTheFilesThatWereSavedLast)
 {
-    const auto press = [this](const char* button) {
-        QTest::mouseClick(window().widget().findChild<QWidget*>(button), Qt::LeftButton);
-        settle();
-    };
     EXPECT_EQ(notice(), "Nothing is open yet.");
     press("btnNotice1");
     EXPECT_EQ(message(), "Wallet successfully loaded...");
@@ -232,7 +207,7 @@ TEST_F(FileTest, FileThatCannotBeOpenedLeavesEverything)
             refs.AddRef("refs", &odd);
             receive(refs, "OPEN FAILED: " + odd.directory + '/' + odd.name);
         }
-        load(page, page == kCompanyPage ? "btnLoadMarket" : "btnLoadPortoFolio", pipe);
+        page == kCompanyPage ? loadMarkets(pipe) : loadWallet(pipe);
         EXPECT_EQ(message(), "OPEN FAILED: " + pipe);
     }
     for (const Page page : {kOperationPage, kParameterPage}) { // which have no files
@@ -414,25 +389,15 @@ TEST_F(FileTest, SavePanelComesWithTheOldNameAndWithoutOneForANewPortfolio)
     EXPECT_EQ(panelName(), "Sample");
     answerPanel("SavePanel", "Other.2026");
     EXPECT_TRUE(std::filesystem::exists(folder() + "/PortoFolios/Other.2026"));
-    click("btnReinitPortoFolio");
-    click("btnSavePortoFolio");
-    EXPECT_EQ(panelName(), "");
-    answerPanel("SavePanel", "New");
-    EXPECT_TRUE(std::filesystem::exists(folder() + "/PortoFolios/New")) << "no ending is added";
-}
-
-TEST_F(FileTest, ReinitForgetsThePathAndAsksForAName)
-{
-    loadSample();
     follow({{{}, "btnReinitPortoFolio", ""}});
-    EXPECT_EQ(wallet().getNbrAccounts(), 0U);
     EXPECT_EQ(text("txtTotalDeposit"), "0.00 EUR");
     click("btnSavePortoFolio");
+    EXPECT_EQ(panelName(), "");
     EXPECT_EQ(panelFolder("SavePanel"), folder() + "/PortoFolios");
     answerPanel("SavePanel", "New");
     EXPECT_EQ(message(), "Wallet successfully saved...");
     const std::string file = folder() + "/PortoFolios/New";
-    EXPECT_TRUE(std::filesystem::remove(file));
+    EXPECT_TRUE(std::filesystem::remove(file)) << "no ending is added";
     std::filesystem::create_directory(file);
     follow({{{}, "btnSavePortoFolio", "Failed to open the file."}}); // its path is known now
 }

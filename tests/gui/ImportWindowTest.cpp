@@ -1,16 +1,9 @@
 #include "platform/Entry.h"
 #include "platform/Message.h"
-#include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
-#include "tests/support/Bytes.h"
 
-#include <QAbstractButton>
-#include <QAbstractItemView>
-#include <QApplication>
-#include <QComboBox>
 #include <filesystem>
 #include <fstream>
-#include <gmock/gmock.h>
 
 using testing::Contains;
 using testing::ElementsAre;
@@ -24,27 +17,6 @@ class ImportWindowTest : public CatalogueTest {
 protected:
     using Answers = std::vector<std::pair<const char*, const char*>>; // menus or fields, with what is chosen there
 
-    static QWidget* dialog() { return QApplication::activeModalWidget(); }
-    template <class Widget>
-    static Widget* part(const char* name)
-    {
-        return dialog()->findChild<Widget*>(name);
-    }
-    static std::string line(const char* name) { return part<QWidget>(name)->accessibleName().toStdString(); }
-    static std::vector<std::string> table(const char* name)
-    {
-        std::vector<std::string> texts;
-        const QAbstractItemModel& rows = *part<QAbstractItemView>(name)->model();
-        for (int i = 0; i < rows.rowCount(); ++i)
-            texts.push_back(rows.data(rows.index(i, 0), Qt::AccessibleTextRole).toString().toStdString());
-        return texts;
-    }
-    static void press(const char* name)
-    {
-        QTest::mouseClick(part<QAbstractButton>(name), Qt::LeftButton, {}, {8, 8});
-        settle();
-        settle(); // the window goes behind its answer
-    }
     static bool canImport() { return part<QWidget>("btnImport")->isEnabled(); }
     /// Chooses by keys, each of which counts.
     static void answer(const char* name, const std::string& item)
@@ -78,23 +50,10 @@ protected:
     void open(Page page, const std::string& path)
     {
         show(page);
-        QTest::mouseClick(window().widget().findChild<QWidget*>("btnImportTable"), Qt::LeftButton);
-        settle();
+        press("btnImportTable");
         answerPanel("OpenPanel", path);
         if (dialog() != nullptr)
             QApplication::setActiveWindow(dialog());
-    }
-    void pressUndo(const char* button)
-    {
-        QTest::mouseClick(window().widget().findChild<QWidget*>(button), Qt::LeftButton);
-        settle();
-    }
-    /// Both files, as they would be saved now.
-    std::string bytes()
-    {
-        const Date stamp(1, 1, 2024);
-        return written([&](FILE* f) { window().catalogue().wrt(f, stamp); }) + "\n--\n" +
-               written([&](FILE* f) { wallet().wrt(f, stamp); });
     }
     /// The import of what the window shows is one step, which leads back and on to the same bytes.
     void importAndReturn(
@@ -103,16 +62,16 @@ protected:
         EXPECT_EQ(bytes(), before) << "changed by looking at it";
         const auto steps = window().changeSerial();
         ASSERT_TRUE(canImport()) << line("txtImportNote");
-        press("btnImport");
+        pressPart("btnImport");
         ASSERT_EQ(dialog(), nullptr);
         EXPECT_EQ(window().changeSerial(), steps + 1);
         EXPECT_EQ(window().history().undoLabel(), label);
         const std::string after = bytes();
         EXPECT_NE(after, before);
         look(); // at what the pages show
-        pressUndo("btnUndo");
+        press("btnUndo");
         EXPECT_EQ(bytes(), before);
-        pressUndo("btnRedo");
+        press("btnRedo");
         EXPECT_EQ(bytes(), after);
     }
     void addAccount(const char* name)
@@ -168,7 +127,7 @@ TEST_F(ImportWindowTest, AStatementIsAssignedShownAndBookedInOneStepAndRemembere
     open(kPortoFolioPage, file("june.csv", head + "4.5.2024;Spende;;;;;7,50\n5.6.2024;Spende;;;;;1,00\n"));
     EXPECT_THAT(line("txtImportNote"), HasSubstr("as for may"));
     EXPECT_THAT(line("txtImport"), HasSubstr("1 new operation, 1 already there, 0 refused"));
-    press("btnImport");
+    pressPart("btnImport");
     EXPECT_THAT(notice(), HasSubstr("Imported 1 operation from june.csv; 1 line already there"));
 }
 
@@ -188,7 +147,7 @@ TEST_F(ImportWindowTest, NothingIsBookedUnlessAPersonSaysSoForWhatIsThere)
     settle();
     ASSERT_EQ(dialog(), nullptr);
     open(kOperationPage, path);
-    press("cbxImportOthers");
+    pressPart("cbxImportOthers");
     EXPECT_TRUE(canImport());
     QTest::keyClick(dialog()->focusWidget(), Qt::Key_Escape);
     settle();
@@ -197,17 +156,17 @@ TEST_F(ImportWindowTest, NothingIsBookedUnlessAPersonSaysSoForWhatIsThere)
 
     // What is not as it was when it was shown is left alone.
     open(kOperationPage, path);
-    press("cbxImportOthers");
+    pressPart("cbxImportOthers");
     window().PostMessage('HUnd'); // takes back the account
     settle();
     const std::string undone = bytes();
     ASSERT_NE(undone, before);
-    press("btnImport");
+    pressPart("btnImport");
     EXPECT_EQ(bytes(), undone);
     EXPECT_THAT(notice(), HasSubstr("have changed meanwhile"));
-    pressUndo("btnRedo");
+    press("btnRedo");
     open(kOperationPage, path);
-    press("cbxImportOthers");
+    pressPart("cbxImportOthers");
     importAndReturn(before, "Import operations from s.csv");
 }
 
@@ -225,7 +184,7 @@ TEST_F(ImportWindowTest, PricesAndRatesComeInWithAllThatIsNew)
     EXPECT_THAT(line("txtImportNote"),
                 HasSubstr("No rate of \"CHF\", in which \"NEU\" is quoted: import its rates first"));
     EXPECT_FALSE(canImport());
-    press("btnCancel");
+    pressPart("btnCancel");
     EXPECT_EQ(bytes(), before);
 
     // The page says what a table without headings is of; the second line is none.
@@ -252,7 +211,7 @@ TEST_F(ImportWindowTest, PricesAndRatesComeInWithAllThatIsNew)
     // A click from a field that was typed in shows first what that changes.
     part<QLineEdit>("txtImportMarket")->setFocus();
     QTest::keyClicks(part<QLineEdit>("txtImportMarket"), "X");
-    press("btnImport");
+    pressPart("btnImport");
     ASSERT_NE(dialog(), nullptr);
     importAndReturn(withRates, "Import quotes from prices.csv", [this] {
         EXPECT_THAT(rows("lstMarkets"), Contains(StartsWith("Zürich")));
@@ -274,9 +233,9 @@ TEST_F(ImportWindowTest, AnEmptyCatalogueGetsItsReferenceFromAnImport)
     EXPECT_FALSE(canImport()) << line("txtImport");
     answer("importHeading", "Tag");
     EXPECT_THAT(line("txtImport"), HasSubstr("2 new, 0 changed, 0 equal quotes"));
-    press("btnCancel");
+    pressPart("btnCancel");
     show(kParameterPage);
-    EXPECT_FALSE(window().widget().findChild<QWidget*>("btnImportTable")->isEnabled());
+    EXPECT_FALSE(anywhere("btnImportTable").isEnabled());
 }
 
 TEST_F(ImportWindowTest, AFileThatCannotBeReadIsToldAndChangesNothing)
@@ -296,7 +255,7 @@ TEST_F(ImportWindowTest, AFileThatCannotBeReadIsToldAndChangesNothing)
             if (dialog() != nullptr) {
                 EXPECT_THAT(line("txtImportNote"), HasSubstr(c.told));
                 EXPECT_FALSE(canImport());
-                press("btnCancel");
+                pressPart("btnCancel");
             } else {
                 EXPECT_THAT(notice(), HasSubstr("bad.csv")) << c.told;
                 EXPECT_THAT(notice(), HasSubstr(c.told));
@@ -310,7 +269,7 @@ TEST_F(ImportWindowTest, AFileThatCannotBeReadIsToldAndChangesNothing)
         answer(page == kCompanyPage ? "importKind" : "importDates", page == kCompanyPage ? "exchange" : "with the day");
         EXPECT_THAT(line("txtImportNote"), HasSubstr("No such file"));
         EXPECT_FALSE(canImport());
-        press("btnCancel");
+        pressPart("btnCancel");
     }
     const std::filesystem::path place(folder());
     const entry_ref ref{place.parent_path(), place.filename()};

@@ -8,15 +8,12 @@
 #include "tests/support/Bytes.h"
 #include "tests/support/ToolRun.h"
 
-#include <QAbstractButton>
 #include <QCoreApplication>
 #include <QProcess>
 #include <algorithm>
 #include <fcntl.h>
 #include <filesystem>
 #include <fstream>
-#include <gmock/gmock.h>
-#include <sstream>
 
 namespace {
 
@@ -155,7 +152,7 @@ protected:
         };
         const auto found = std::find_if(states_.rbegin(), states_.rend(), fits);
         if (found == states_.rend()) {
-            EXPECT_TRUE(sums[0].empty() && sums[1].empty()) << "what is offered never was there: " << told(sums);
+            EXPECT_TRUE(sums[0].empty() && sums[1].empty()) << "what is offered never was there";
         }
         const Clock::rep until = found == states_.rbegin() ? killed
                                  : found == states_.rend() ? states_.empty() ? killed : states_.front().time
@@ -165,15 +162,6 @@ protected:
         EXPECT_LT(behind, kInterval + kWriting);
         if (!sums[0].empty() || !sums[1].empty())
             expectRestored(sums[0].empty() ? std::optional<std::uint64_t>() : sums[0].front());
-    }
-    std::string told(const std::vector<std::uint64_t> (&sums)[2]) const
-    {
-        std::ostringstream text;
-        for (const auto& each : sums)
-            text << (each.empty() ? 0 : each.front()) << ' ';
-        for (const State& s : states_)
-            text << '\n' << s.sums[0] << ' ' << s.sums[1] << ' ' << s.isUnsaved[0] << s.isUnsaved[1] << ' ' << s.time;
-        return text.str();
     }
     void expectRestored(std::optional<std::uint64_t> marketSum)
     {

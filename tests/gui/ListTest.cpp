@@ -1,12 +1,10 @@
 // What a person does with lists: sorting, filtering, widening, copying, and their keys and menus.
 
-#include "platform/qt/WindowWidget.h"
 #include "portfolio/TransferAccountOperation.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/SmallPortfolio.h"
 #include "views/ColumnListView.h"
 
-#include <QApplication>
 #include <QClipboard>
 #include <QContextMenuEvent>
 #include <QHelpEvent>
@@ -14,7 +12,6 @@
 #include <QMenu>
 #include <QTimer>
 #include <QToolTip>
-#include <gmock/gmock.h>
 
 namespace {
 
@@ -109,7 +106,6 @@ protected:
         QApplication::sendEvent(view->viewport(), &asked);
         settle();
     }
-    std::string focus() { return window().widget().focusWidget()->objectName().toStdString(); }
 };
 
 TEST_F(ListTest, AClickOnAHeadingSortsByValueThenTheOtherWayThenNoMore)
@@ -142,6 +138,9 @@ TEST_F(ListTest, AClickOnAHeadingSortsByValueThenTheOtherWayThenNoMore)
     post(kUndo);
     EXPECT_THAT(column("lstCurrencies", 1), ElementsAre("USD", "EUR", "CHF", "JPY"));
     EXPECT_EQ(list("lstCurrencies").CurrentSelection(), 3) << "in a sorted list, too";
+    QTest::keyClicks(list("lstCurrencies").widget(), "chf");
+    settle();
+    EXPECT_EQ(list("lstCurrencies").CurrentSelection(), 2) << "typing finds a row, by a later cell, too";
     alerts();
 }
 
@@ -174,7 +173,7 @@ TEST_F(ListTest, FiltersCountWhatTheyShowAndHideNothingThatIsMade)
 TEST_F(ListTest, OfSeveralRowsTheOneInTheFieldsStaysTheOneThatCommandsTake)
 {
     select("lstOperations", 1);
-    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Down, Qt::ShiftModifier);
+    key(Qt::Key_Down, Qt::ShiftModifier);
     EXPECT_EQ(text("txtAmount"), "1000.00");
     clickHeading("lstOperations", 0); // the second one now stands above it
     EXPECT_EQ(list("lstOperations").CountSelected(), 1);
@@ -280,23 +279,20 @@ TEST_F(ListTest, SeparatorsWidenAndCutTextsShowInAToolTip)
 TEST_F(ListTest, KeysAndMenusOfRowsDoWhatTheButtonsDo)
 {
     select("lstOperations", 3);
-    QTest::keyClick(QApplication::focusWidget(), Qt::Key_F2);
+    key(Qt::Key_F2);
     EXPECT_EQ(focus(), "txtDate");
-    QTest::keyClick(QApplication::focusWidget(), Qt::Key_F, Qt::ControlModifier);
-    settle();
+    ctrl(Qt::Key_F);
     EXPECT_EQ(focus(), "txtFilter");
     QTest::keyClicks(QApplication::focusWidget(), "deposit");
     EXPECT_EQ(list("lstOperations").CountItems(), 3);
-    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Escape);
+    key(Qt::Key_Escape);
     EXPECT_EQ(focus(), "lstOperations");
     EXPECT_EQ(list("lstOperations").CountItems(), 4);
-    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Delete);
-    settle();
-    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Delete); // nothing is selected any more
-    settle();
+    key(Qt::Key_Delete);
+    key(Qt::Key_Delete); // nothing is selected any more
     EXPECT_EQ(list("lstOperations").CountItems(), 3);
     select("lstOperations", 0);
-    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Down, Qt::ShiftModifier);
+    key(Qt::Key_Down, Qt::ShiftModifier);
     EXPECT_EQ(list("lstOperations").CountSelected(), 2);
     click("btnRemoveOperation");
     EXPECT_EQ(list("lstOperations").CountItems(), 2);
@@ -309,8 +305,7 @@ TEST_F(ListTest, KeysAndMenusOfRowsDoWhatTheButtonsDo)
     addMarket("Lyon", "EUR");
     answerNextAlert("Cancel");
     select("lstMarkets", 0);
-    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Delete);
-    settle();
+    key(Qt::Key_Delete);
     EXPECT_EQ(alerts().size(), 1U);
     chooseInMenu("lstMarkets", 0, "Edit");
     EXPECT_EQ(focus(), "txtMarketName");

@@ -1,13 +1,10 @@
 // The line of notices, and what is told there and beside the figures.
 
 #include "app/NoticeLine.h"
-#include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
 
-#include <QApplication>
 #include <QCheckBox>
 #include <QPushButton>
-#include <gmock/gmock.h>
 
 namespace {
 
@@ -15,19 +12,12 @@ using testing::HasSubstr;
 
 class NoticeTest : public CatalogueTest {
 protected:
-    QWidget& part(const char* name) { return *window().widget().findChild<QWidget*>(name); }
     /// What is shown of it; empty while it is hidden.
     std::string shown(const char* name)
     {
-        const auto* button = qobject_cast<QPushButton*>(&part(name));
-        const QString text = button != nullptr ? button->text() : part(name).accessibleName();
-        return part(name).isVisible() ? text.toStdString() : "";
-    }
-    std::string notice() { return shown("txtNotice"); }
-    void clickOn(const char* name)
-    {
-        QTest::mouseClick(&part(name), Qt::LeftButton);
-        settle();
+        const auto* button = qobject_cast<QPushButton*>(&anywhere(name));
+        const QString text = button != nullptr ? button->text() : anywhere(name).accessibleName();
+        return anywhere(name).isVisible() ? text.toStdString() : "";
     }
 };
 
@@ -48,23 +38,23 @@ TEST_F(NoticeTest, SeveralQueueAndAClickBringsTheNext)
     EXPECT_EQ(notice() + ' ' + shown("btnNotice1") + ' ' + shown("btnNotice2"), "first Yes No");
     window().showNotice({"a", std::string(500, 'w') + "\nmore", {button("On")}});
     EXPECT_EQ(notice(), std::string(500, 'w') + "\nmore") << "in the place of the former one";
-    EXPECT_THAT(part("txtNotice").toolTip().toStdString(), HasSubstr("wwww\nmore"));
+    EXPECT_THAT(anywhere("txtNotice").toolTip().toStdString(), HasSubstr("wwww\nmore"));
     EXPECT_EQ(shown("btnNotice1") + shown("btnNotice2"), "On");
-    EXPECT_LT(part("txtNotice").geometry().right(), part("btnNotice1").geometry().left());
+    EXPECT_LT(anywhere("txtNotice").geometry().right(), anywhere("btnNotice1").geometry().left());
     window().showNotice({"d", "passing", {}, true});
     EXPECT_EQ(notice(), "passing") << "it does not queue";
     BMessage expired('NtEx');
     window().FindView("NoticeLine")->MessageReceived(&expired);
     EXPECT_THAT(notice(), HasSubstr("more"));
 
-    auto& on = static_cast<QPushButton&>(part("btnNotice1"));
+    auto& on = static_cast<QPushButton&>(anywhere("btnNotice1"));
     on.click();
     on.click(); // before the first one has its turn
     settle();
     EXPECT_EQ(pressed, "On") << "and not what came in its place";
     EXPECT_EQ(notice(), "second, again");
     EXPECT_EQ(shown("btnNotice1"), "");
-    clickOn("txtNotice");
+    press("txtNotice");
     EXPECT_EQ(notice() + ' ' + shown("btnNotice1"), "third Go");
     QTest::keyClick(QApplication::focusWidget(), Qt::Key_7, Qt::AltModifier); // it has one button only
     settle();
@@ -75,7 +65,7 @@ TEST_F(NoticeTest, SeveralQueueAndAClickBringsTheNext)
     window().showNotice({"a", "last", {}});
     window().dropNotice("c");
     EXPECT_EQ(notice(), "last");
-    clickOn("NoticeLine");
+    press("NoticeLine");
     EXPECT_EQ(notice(), "");
     EXPECT_EQ(QApplication::focusWidget()->objectName(), "txtDate") << "the keyboard has stayed where it was";
 }
@@ -95,13 +85,13 @@ TEST_F(NoticeTest, SimulatedSalesAreToldOfAndTakenBack)
     show(kPortoFolioPage);
     enter("txtDate", "21/11/2024");
     EXPECT_EQ(notice(), "simulated sales are in these figures");
-    clickOn("txtNotice");
+    press("txtNotice");
     enter("txtDate", "20/11/2024");
     EXPECT_EQ(notice(), "") << "who has dismissed it knows";
     enter("txtDate", "1/4/2024");
     ASSERT_EQ(shown("btnNotice1"), "Take Back");
     EXPECT_EQ(beta->shares()[0]->getNbrShareOperations(), 2U);
-    clickOn("btnNotice1");
+    press("btnNotice1");
     EXPECT_EQ(notice(), "");
     EXPECT_EQ(beta->shares()[0]->getNbrShareOperations(), 1U);
     EXPECT_EQ(rows("lstShares"), before);
@@ -123,7 +113,7 @@ TEST_F(NoticeTest, TotalsSayWhatTheyRestOn)
     enter("txtDate", "15/11/2024");
     EXPECT_EQ(shown("txtEstimated"),
               "estimated: 1 of 2 quotes is older than 15/11/2024, the last day with all quotes is 01/11/2024");
-    EXPECT_THAT(part("txtEstimated").toolTip().toStdString(), HasSubstr("1 of 1 rates is older"));
+    EXPECT_THAT(anywhere("txtEstimated").toolTip().toStdString(), HasSubstr("1 of 1 rates is older"));
     click("btnLastQuotes");
     EXPECT_EQ(text("txtDate"), "01/11/2024");
     EXPECT_EQ(shown("txtEstimated"),

@@ -1,18 +1,12 @@
 // The operation commands, by their controls on the operation page.
 
 #include "market/NoteCompanyEvent.h"
-#include "platform/ListView.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/SmallPortfolio.h"
 #include "valuation/AccountState.h"
 #include "valuation/State.h"
 
-#include <QApplication>
 #include <QCheckBox>
-#include <QComboBox>
-#include <QLineEdit>
-#include <QTest>
-#include <gmock/gmock.h>
 
 namespace {
 
@@ -469,23 +463,6 @@ TEST_F(OperationTest, IncomeAndChargesMoveTheirSumsAndNoDeposits)
     follow({{{{"txtAmount", "40"}}, kUpdate, ""}});
     expectCash(euros, 40, "replaced");
     EXPECT_THAT(notes(), ElementsAre("21/11/2024 Dividend 40.00 USD to Dollars"));
-
-    show(kCompanyPage);
-    click("btnSaveMarket");
-    answerPanel("SavePanel", "Mine");
-    show(kPortoFolioPage);
-    click("btnSavePortoFolio");
-    answerPanel("SavePanel", "Mine");
-    restart();
-    show(kCompanyPage);
-    click("btnLoadMarket");
-    answerPanel("OpenPanel", folder() + "/Companies/Mine");
-    show(kPortoFolioPage);
-    answerNextAlert("Continue");
-    click("btnLoadPortoFolio");
-    answerPanel("OpenPanel", folder() + "/PortoFolios/Mine");
-    show(kOperationPage);
-    expectCash(euros, 40, "saved and loaded");
 
     select("lstOperations", 3);
     click(kRemove);

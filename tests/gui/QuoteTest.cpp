@@ -5,7 +5,6 @@
 #include "chart/GraphView.h"
 #include "net/QuoteServers.h"
 #include "platform/ListItem.h"
-#include "platform/qt/WindowWidget.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/Peer.h"
 #include "tests/support/ServerRun.h"
@@ -15,7 +14,6 @@
 #include <QInputDevice>
 #include <QKeyEvent>
 #include <QWindow>
-#include <gmock/gmock.h>
 #include <sstream>
 
 namespace {
@@ -28,31 +26,6 @@ using testing::UnorderedElementsAre;
 using QuoteTest = CatalogueTest;
 
 const std::string kBand = "Trend \u00B1 one standard deviation";
-
-TEST_F(QuoteTest, FieldsReadDatesAndNumbersAsTypedAndMarkWhatTheyCannot)
-{
-    addSmallCatalogue();
-    const struct {
-        const char *date, *value;
-        const char* row; // null: not added
-        std::string marked;
-    } cases[] = {
-        {"2.3.2024", "1,5", "02/03/2024\t1.50", ""},   {"2-3-2024", "0.123456789", "02/03/2024\t0.12345679", ""},
-        {"2/3/2024", "abc", nullptr, "txtQuoteValue"}, {"4/3/2024", "12 EUR", nullptr, "txtQuoteValue"},
-        {"2/3/0099", "-7", "02/03/99\t-7.00", ""},     {"30/2/2024", "1", nullptr, "txtQuoteDate"},
-        {"2/3", "1", nullptr, "txtQuoteDate"},
-    };
-    for (const auto& c : cases) {
-        fill({{"txtQuoteDate", c.date}, {"txtQuoteValue", c.value}});
-        for (const char* field : {"txtQuoteDate", "txtQuoteValue"})
-            EXPECT_EQ(find<QLineEdit>(field).toolTip().isEmpty(), field != c.marked) << c.date << ' ' << c.value;
-        click("btnAddQuote");
-        if (c.row != nullptr) {
-            EXPECT_THAT(rows("lstQuotes"), testing::Contains(c.row));
-        }
-    }
-    EXPECT_THAT(rows("lstQuotes"), SizeIs(5)) << "the days of 2024, and one of the first century";
-}
 
 TEST_F(QuoteTest, AnotherSeriesEmptiesTheFieldsOfItsQuotes)
 {
@@ -254,7 +227,7 @@ TEST_F(FetchCommandTest, ASilentServerIsAskedOnceAndEscapeEndsTheWait)
     for (const Market* market : window().catalogue().getMarkets())
         buy(market->companies().front());
     show(kPortoFolioPage);
-    QWidget& notice = *window().widget().findChild<QWidget*>("txtNotice");
+    QWidget& notice = anywhere("txtNotice");
     QWindow* handle = window().widget().windowHandle();
     // Keys belong to a keyboard, which Qt makes with the first of them: here, and not in the server's thread.
     QInputDevice::primaryKeyboard();

@@ -6,15 +6,10 @@
 #include "market/Market.h"
 #include "platform/Button.h"
 #include "platform/DialogAnswers.h"
-#include "platform/ListView.h"
 #include "platform/TextControl.h"
-#include "platform/qt/WindowWidget.h"
 #include "tests/gui/WindowFixture.h"
 #include "tests/support/Links.h"
 #include "views/OperationView.h"
-
-#include <QAbstractItemView>
-#include <QTest>
 
 #include <algorithm>
 #include <cstdlib>

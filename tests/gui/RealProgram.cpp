@@ -46,8 +46,7 @@ void RealProgram::Child::startIt(const std::string& program, const QStringList& 
         throw std::runtime_error(program + " does not start");
 }
 
-RealProgram::RealProgram(const std::string& program, const std::string& home, const Variables& more)
-    : display_(startServer())
+RealProgram::RealProgram(const std::string& program, const std::string& home) : display_(startServer())
 {
     QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
     // The X keyboard library copies parts of texts that have no end, which a strict check takes for a mistake.
@@ -56,8 +55,6 @@ RealProgram::RealProgram(const std::string& program, const std::string& home, co
     environment.insert("QT_QPA_PLATFORM", "xcb");
     environment.insert("HOME", QString::fromStdString(home));
     environment.remove("XDG_CONFIG_HOME");
-    for (const auto& [name, value] : more)
-        environment.insert(QString::fromStdString(name), QString::fromStdString(value));
     program_.setProcessEnvironment(environment);
     program_.startIt(program, {});
     awaitWindow("Pelorin");

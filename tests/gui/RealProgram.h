@@ -2,7 +2,6 @@
 
 #include <QPoint>
 #include <QProcess>
-#include <map>
 #include <string>
 
 /// The built program in a real window: on an X server of its own without a screen, driven by real mouse and key events.
@@ -10,10 +9,8 @@
 /// What goes wrong throws std::runtime_error.
 class RealProgram {
 public:
-    using Variables = std::map<std::string, std::string>;
-
-    /// Starts an X server, and `program` on it with `home` as home folder and `more` in its environment.
-    RealProgram(const std::string& program, const std::string& home, const Variables& more = {});
+    /// Starts an X server, and `program` on it with `home` as home folder.
+    RealProgram(const std::string& program, const std::string& home);
 
     /// Clicks at a place of the main window.
     void click(QPoint place);

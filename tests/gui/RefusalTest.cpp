@@ -2,10 +2,6 @@
 // checks, and that they change nothing.
 
 #include "tests/gui/CatalogueFixture.h"
-#include "valuation/AccountState.h"
-#include "valuation/State.h"
-
-#include <gmock/gmock.h>
 
 namespace {
 
@@ -120,18 +116,6 @@ TEST_F(RefusalTest, Operations)
     }
     EXPECT_EQ(wallet().getAccount(0)->getNbrOperations(), 0U);
     EXPECT_EQ(wallet().getNbrShares(), 1U) << "a holding is made before the quantity is looked at";
-}
-
-TEST_F(RefusalTest, RowWithoutAccount)
-{
-    addTwoMarkets();
-    show(kPortoFolioPage);
-    follow({{{{"txtAccountName", "Cash"}, {"txtAccountCurrency", "EUR"}}, "btnAddAccount", ""}});
-    window().getState()->getAccountState(0)->setAccount(nullptr);
-    select("lstAccounts", 0);
-    EXPECT_EQ(message(), "Error getting the selected account.");
-    follow({{{}, "btnUpdateQuote", "Error accessing the account."},
-            {{}, "btnRemoveQuote", "Error accessing the account."}});
 }
 
 } // namespace

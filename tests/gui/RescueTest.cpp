@@ -1,20 +1,14 @@
 // Copies of what is not saved: when they are made, what a later start offers, and what restoring gives.
 
 #include "app/Rescue.h"
-#include "foundation/Today.h"
 #include "market/Company.h"
 #include "platform/DialogAnswers.h"
-#include "platform/qt/WindowWidget.h"
 #include "portfolio/Account.h"
 #include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"
-#include "tests/support/Bytes.h"
 #include "tests/support/ToolRun.h"
 
-#include <QAbstractButton>
-#include <QTest>
 #include <filesystem>
-#include <gmock/gmock.h>
 
 namespace {
 
@@ -32,12 +26,6 @@ struct ShortInterval {
 
 class RescueTest : protected ShortInterval, public WindowTest {
 protected:
-    /// The bytes of both files, were they saved now.
-    std::string model()
-    {
-        return written([this](FILE* file) { window().catalogue().wrt(file, today()); }) +
-               written([this](FILE* file) { wallet().wrt(file, today()); });
-    }
     /// The kinds that have copies, with their generations.
     std::string copies() const
     {
@@ -56,19 +44,10 @@ protected:
         constexpr int kPatience = 20000;
         return QTest::qWaitFor([&] { return copies() == expected; }, kPatience);
     }
-    QWidget& widget() { return window().widget(); }
     std::string notice()
     {
         dismissOffer();
-        const auto* text = widget().findChild<QWidget*>("txtNotice");
-        return text->isVisible() ? text->accessibleName().toStdString() : "";
-    }
-    void press(const char* name)
-    {
-        auto* button = widget().findChild<QAbstractButton*>(name);
-        ASSERT_TRUE(button->isVisible()) << name;
-        QTest::mouseClick(button, Qt::LeftButton);
-        settle();
+        return WindowTest::notice();
     }
     void restoreUnsaved() { press("btnNotice1"); }
     void throwAway() { press("btnNotice2"); }
@@ -100,7 +79,7 @@ TEST_F(RescueTest, WhatAClosedWindowHadNotSavedIsOfferedAndComesBackToItsFiles)
     const std::string files = contentOf(marketFile()) + contentOf(walletFile());
     addQuote();
     addAccount();
-    const std::string before = model();
+    const std::string before = bytes();
     restart();
     EXPECT_EQ(contentOf(marketFile()) + contentOf(walletFile()), files) << "the user's files are left alone";
     EXPECT_EQ(window().catalogue().getNbrCurrencies(), 0U) << "nothing is loaded by itself";
@@ -111,10 +90,10 @@ TEST_F(RescueTest, WhatAClosedWindowHadNotSavedIsOfferedAndComesBackToItsFiles)
     fill({{"txtCurrencyName", "Other"}, {"txtCurrencyRepresentation", "O"}});
     click("btnAddCurrency");
     EXPECT_EQ(notice(), "Added currency Other");
-    QTest::mouseClick(widget().findChild<QWidget*>("txtNotice"), Qt::LeftButton); // what was done goes by itself later
+    press("txtNotice"); // what was done goes by itself later
     restoreUnsaved();
     EXPECT_EQ(message(), "Unsaved changes successfully restored...");
-    EXPECT_EQ(model() == before, true);
+    EXPECT_EQ(bytes() == before, true);
     EXPECT_EQ(notice(), "");
     EXPECT_GT(window().unsavedChanges(FileKind::kMarkets), 0U);
     EXPECT_GT(window().unsavedChanges(FileKind::kWallet), 0U);
@@ -125,7 +104,7 @@ TEST_F(RescueTest, WhatAClosedWindowHadNotSavedIsOfferedAndComesBackToItsFiles)
         << "of the other currency, which was left in turn, and of the portfolio";
     show(kPortoFolioPage);
     follow({{{}, "btnSavePortoFolio", "Wallet successfully saved..."}});
-    EXPECT_EQ(contentOf(marketFile()) + contentOf(walletFile()) == before, true);
+    EXPECT_EQ(contentOf(marketFile()) + "\n--\n" + contentOf(walletFile()) == before, true);
     restart();
     EXPECT_THAT(notice(), MatchesRegex("Not saved on .*: a new market data")) << "that of the other currency";
     throwAway();
@@ -138,12 +117,12 @@ TEST_F(RescueTest, OnlyWhatChangedIsCopiedAndTheRestComesFromItsFile)
 {
     loadSample();
     addAccount();
-    const std::string before = model();
+    const std::string before = bytes();
     restart();
     EXPECT_THAT(copies(), MatchesRegex("PortoFolios \\(.\\)"));
     EXPECT_THAT(notice(), MatchesRegex(".*: portfolio Sample"));
     restoreUnsaved();
-    EXPECT_EQ(model() == before, true);
+    EXPECT_EQ(bytes() == before, true);
     EXPECT_EQ(window().unsavedChanges(FileKind::kMarkets), 0U);
     EXPECT_GT(window().unsavedChanges(FileKind::kWallet), 0U);
     undo(); // to what it was before: the offer, too
@@ -157,7 +136,7 @@ TEST_F(RescueTest, OnlyWhatChangedIsCopiedAndTheRestComesFromItsFile)
     fs::rename(folder() + "/Companies/Moved", marketFile());
     restart(); // nobody has said anything: it is offered again
     restoreUnsaved();
-    EXPECT_EQ(model() == before, true);
+    EXPECT_EQ(bytes() == before, true);
 
     // A name that the portfolio's file has changes, and the portfolio does not.
     show(kPortoFolioPage);
@@ -166,25 +145,24 @@ TEST_F(RescueTest, OnlyWhatChangedIsCopiedAndTheRestComesFromItsFile)
     select("lstMarkets", 0);
     type("txtMarketName", "Renamed");
     click("btnUpdateMarket");
-    const std::string renamed = model();
+    const std::string renamed = bytes();
     ASSERT_GT(window().unsavedChanges(FileKind::kMarkets), 0U);
     ASSERT_GT(window().unsavedChanges(FileKind::kWallet), 0U);
     restart();
     EXPECT_THAT(notice(), HasSubstr("market data Sample, portfolio Sample")) << "else it would not fit any more";
     restoreUnsaved();
-    EXPECT_EQ(model() == renamed, true);
+    EXPECT_EQ(bytes() == renamed, true);
     // Saved market data leave the portfolio's file behind, with the old name.
     show(kCompanyPage);
     click("btnSaveMarket");
     restart();
     EXPECT_THAT(notice(), HasSubstr(": portfolio Sample"));
     restoreUnsaved();
-    EXPECT_EQ(model() == renamed, true);
+    EXPECT_EQ(bytes() == renamed, true);
 }
 
 TEST_F(RescueTest, ARestoredPortfolioIsNotSavedOverANewerFileUnasked)
 {
-    makeSample();
     loadSample();
     addAccount();
     restart();
@@ -200,7 +178,6 @@ TEST_F(RescueTest, ARestoredPortfolioIsNotSavedOverANewerFileUnasked)
 
 TEST_F(RescueTest, AnAccountWithoutCurrencyCostsOnlyThePortfolioItsCopy)
 {
-    makeSample();
     loadSample();
     show(kCurrencyPage);
     select("lstCurrencies", 1);
@@ -246,15 +223,14 @@ TEST_F(RescueTest, WhatHasNoNameYetIsAskedForOneByTheNextSave)
     fill({{"txtCurrencyName", "Euro"}, {"txtCurrencyRepresentation", "EUR"}});
     click("btnAddCurrency");
     addAccount();
-    const std::string before = model();
+    const std::string before = bytes();
     restart();
     EXPECT_THAT(notice(), HasSubstr("a new market data, a new portfolio"));
-    QTest::mouseClick(widget().findChild<QWidget*>("txtNotice"), Qt::LeftButton); // dismissed is not refused
-    settle();
+    press("txtNotice"); // dismissed is not refused
     EXPECT_EQ(notice(), "");
     restart();
     restoreUnsaved();
-    EXPECT_EQ(model() == before, true);
+    EXPECT_EQ(bytes() == before, true);
     click("btnSaveMarket");
     EXPECT_EQ(panelFolder("SavePanel"), folder() + "/Companies");
     answerPanel("SavePanel", folder() + "/Companies/Mine");
@@ -262,7 +238,7 @@ TEST_F(RescueTest, WhatHasNoNameYetIsAskedForOneByTheNextSave)
     EXPECT_THAT(copies(), MatchesRegex("PortoFolios \\(.\\)"));
     restart(); // the portfolio goes with the file that the market data has by now
     restoreUnsaved();
-    EXPECT_EQ(model() == before, true);
+    EXPECT_EQ(bytes() == before, true);
 }
 
 } // namespace

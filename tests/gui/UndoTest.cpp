@@ -8,9 +8,6 @@
 #include "platform/StringView.h"
 #include "platform/TabView.h"
 #include "tests/gui/RandomCommands.h"
-#include "tests/support/Bytes.h"
-
-#include <QApplication>
 
 #include <cstdlib>
 #include <filesystem>
@@ -48,9 +45,7 @@ protected:
     /// All that shall come back: both files, all lists with what is selected, the totals, the lists of holdings.
     std::string fingerprint()
     {
-        const Date stamp(1, 1, 2024);
-        std::string print = written([&](FILE* file) { window().catalogue().wrt(file, stamp); });
-        print += "\n--\n" + written([&](FILE* file) { wallet().wrt(file, stamp); });
+        std::string print = bytes();
         for (const auto& [page, name] : kLists) {
             const BListView& rows = listOf(page, name);
             print += std::string("\n-- ") + page + ' ' + name;
@@ -169,11 +164,6 @@ protected:
         return tabs.TabAt(tabs.Selection())->View()->FindView(name);
     }
     std::string tip(const char* button) { return window().FindView(button)->widget()->toolTip().toStdString(); }
-    void press(Qt::Key key, Qt::KeyboardModifiers modifiers = Qt::ControlModifier)
-    {
-        QTest::keyClick(QApplication::focusWidget(), key, modifiers);
-        settle();
-    }
     void addMarket(const std::string& name)
     {
         enter("txtMarketName", name);
@@ -184,7 +174,6 @@ protected:
 
 TEST_F(UndoStepTest, CountsWhatTheFilesDoNotHave)
 {
-    makeSample();
     loadSample();
     show(kCompanyPage);
     EXPECT_EQ(openFile(), "Sample");
@@ -192,16 +181,16 @@ TEST_F(UndoStepTest, CountsWhatTheFilesDoNotHave)
     EXPECT_EQ(openFile(), "Sample - 1 change not saved");
     EXPECT_EQ(tip("btnUndo"), "Undo: Add market Xetra  Ctrl+Z");
     addMarket("Milan");
-    press(Qt::Key_S);
+    ctrl(Qt::Key_S);
     EXPECT_EQ(openFile(), "Sample");
     // Past a save the file has more than there is here.
-    press(Qt::Key_Z);
+    ctrl(Qt::Key_Z);
     EXPECT_EQ(openFile(), "Sample - 1 change not saved");
     EXPECT_EQ(tip("btnRedo"), "Redo: Add market Milan  Ctrl+Shift+Z");
-    press(Qt::Key_Z, Qt::ControlModifier | Qt::ShiftModifier);
+    ctrl(Qt::Key_Z, Qt::ShiftModifier);
     EXPECT_EQ(openFile(), "Sample");
     // Another way on from there: one step back and one on.
-    press(Qt::Key_Z);
+    ctrl(Qt::Key_Z);
     addMarket("Zurich");
     EXPECT_EQ(openFile(), "Sample - 2 changes not saved");
     show(kParameterPage);
@@ -210,28 +199,25 @@ TEST_F(UndoStepTest, CountsWhatTheFilesDoNotHave)
 
 TEST_F(UndoStepTest, TakesBackALoadAndAReinitWithTheirFiles)
 {
-    makeSample();
     loadSample();
     show(kPortoFolioPage);
     click("btnReinitPortoFolio");
     EXPECT_EQ(openFile(), "No file");
     EXPECT_EQ(tip("btnUndo"), "Undo: Reinit  Ctrl+Z");
-    press(Qt::Key_Z);
+    ctrl(Qt::Key_Z);
     EXPECT_EQ(openFile(), "Sample");
     EXPECT_GT(wallet().getNbrAccounts(), 0U);
     // A save after the undo of a load writes to the file of before.
     std::filesystem::copy(walletFile(), folder() + "/PortoFolios/Other");
-    answerNextAlert("Continue");
-    click("btnLoadPortoFolio");
-    answerPanel("OpenPanel", folder() + "/PortoFolios/Other");
+    loadWallet(folder() + "/PortoFolios/Other");
     EXPECT_EQ(openFile(), "Other");
-    press(Qt::Key_Z);
+    ctrl(Qt::Key_Z);
     EXPECT_EQ(openFile(), "Sample");
     show(kParameterPage);
     enter("txtBuyCost", "77");
     EXPECT_EQ(openFile(), "Sample - 1 change not saved");
     const auto other = std::filesystem::last_write_time(folder() + "/PortoFolios/Other");
-    press(Qt::Key_S);
+    ctrl(Qt::Key_S);
     EXPECT_EQ(message(), "Wallet successfully saved...");
     EXPECT_EQ(std::filesystem::last_write_time(folder() + "/PortoFolios/Other"), other);
 }
@@ -239,9 +225,7 @@ TEST_F(UndoStepTest, TakesBackALoadAndAReinitWithTheirFiles)
 TEST_F(UndoStepTest, ASaveGivesANameThatStaysOnTheWayBackAndOn)
 {
     makeSample();
-    show(kCompanyPage);
-    click("btnLoadMarket");
-    answerPanel("OpenPanel", marketFile());
+    loadMarkets(marketFile());
     show(kPortoFolioPage);
     fill({{"txtAccountName", "Main"}, {"txtAccountCurrency", "EUR"}});
     click("btnAddAccount");
@@ -249,12 +233,12 @@ TEST_F(UndoStepTest, ASaveGivesANameThatStaysOnTheWayBackAndOn)
     answerPanel("SavePanel", "Named");
     EXPECT_EQ(openFile(), "Named");
     for (const auto modifiers : {Qt::ControlModifier | Qt::NoModifier, Qt::ControlModifier | Qt::ShiftModifier}) {
-        press(Qt::Key_Z, modifiers);
-        press(Qt::Key_Z, modifiers);
+        key(Qt::Key_Z, modifiers);
+        key(Qt::Key_Z, modifiers);
     }
     EXPECT_EQ(openFile(), "Named");
     clearMessage();
-    press(Qt::Key_S);
+    ctrl(Qt::Key_S);
     EXPECT_EQ(message(), "Wallet successfully saved...") << "and nothing is asked: the file is as this window wrote it";
 
     // The portfolio's file has names of the market data, and no places in it.
@@ -280,15 +264,15 @@ TEST_F(UndoStepTest, LeavesCtrlZToAFieldThatIsBeingTypedIn)
     show(kCurrencyPage);
     enter("txtCurrencyRepresentation", "EUR");
     type("txtCurrencyName", "Euro");
-    press(Qt::Key_N); // adds; the keyboard stays in the field
+    ctrl(Qt::Key_N); // adds; the keyboard stays in the field
     ASSERT_EQ(rows("lstCurrencies").size(), 1U);
     QTest::keyClicks(QApplication::focusWidget(), "s");
-    press(Qt::Key_Z);
+    ctrl(Qt::Key_Z);
     EXPECT_EQ(text("txtCurrencyName"), "Euro");
     EXPECT_EQ(rows("lstCurrencies").size(), 1U);
-    press(Qt::Key_Z);
+    ctrl(Qt::Key_Z);
     EXPECT_EQ(rows("lstCurrencies").size(), 0U);
-    press(Qt::Key_Z, Qt::ControlModifier | Qt::ShiftModifier);
+    ctrl(Qt::Key_Z, Qt::ShiftModifier);
     EXPECT_EQ(rows("lstCurrencies").size(), 1U);
 }
 

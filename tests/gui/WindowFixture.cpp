@@ -3,22 +3,15 @@
 #include "app/MessageView.h"
 #include "foundation/Today.h"
 #include "platform/ListItem.h"
-#include "platform/ListView.h"
 #include "platform/TabView.h"
-#include "platform/qt/WindowWidget.h"
+#include "tests/support/Bytes.h"
 #include "tests/support/ToolRun.h"
 
-#include <QAbstractButton>
-#include <QAbstractItemView>
-#include <QApplication>
-#include <QComboBox>
 #include <QDialog>
 #include <QFileDialog>
 #include <QLabel>
-#include <QLineEdit>
 #include <QTabBar>
 #include <QTemporaryDir>
-#include <QTest>
 #include <QThread>
 #include <QTimer>
 
@@ -81,6 +74,12 @@ void WindowTest::makeSample() const
     ASSERT_EQ(run.status, 0) << run.err;
 }
 
+std::string WindowTest::bytes()
+{
+    return written([this](FILE* file) { window().catalogue().wrt(file, today()); }) + "\n--\n" +
+           written([this](FILE* file) { wallet().wrt(file, today()); });
+}
+
 void WindowTest::settle()
 {
     constexpr int kRounds = 4; // a message may post further ones
@@ -124,6 +123,28 @@ void WindowTest::click(const char* name)
     constexpr int kInside = 8;
     QTest::mouseClick(&button, Qt::LeftButton, {}, {kInside, button.height() / 2});
     settle();
+}
+
+void WindowTest::press(const char* name)
+{
+    ASSERT_TRUE(anywhere(name).isVisible()) << name;
+    QTest::mouseClick(&anywhere(name), Qt::LeftButton);
+    settle();
+}
+
+void WindowTest::key(Qt::Key key, Qt::KeyboardModifiers modifiers)
+{
+    QTest::keyClick(&keyboard(), key, modifiers);
+    settle();
+}
+
+QWidget& WindowTest::keyboard()
+{
+    QWidget& desktop = window().widget();
+    for (QWidget* widget : {QApplication::focusWidget(), desktop.focusWidget()})
+        if (widget != nullptr)
+            return *widget;
+    return desktop;
 }
 
 void WindowTest::type(const char* name, const std::string& text)
@@ -208,6 +229,12 @@ std::string WindowTest::message() const
     return text != nullptr ? text : "";
 }
 
+std::string WindowTest::notice()
+{
+    const QWidget& line = anywhere("txtNotice");
+    return line.isVisible() ? line.accessibleName().toStdString() : "";
+}
+
 void WindowTest::post(uint32 code)
 {
     window_->PostMessage(code);
@@ -263,17 +290,21 @@ void WindowTest::answerPanel(const char* panel, const std::string& path)
     activate();
 }
 
+void WindowTest::load(Page page, const char* button, const std::string& path)
+{
+    show(page);
+    if (page == kPortoFolioPage || window().catalogue().getNbrCurrencies() > 0)
+        answerNextAlert("Continue");
+    click(button);
+    answerPanel("OpenPanel", path);
+}
+
 void WindowTest::loadSample()
 {
     makeSample();
-    show(kCompanyPage);
-    click("btnLoadMarket");
-    answerPanel("OpenPanel", marketFile());
+    loadMarkets(marketFile());
     ASSERT_EQ(message(), "Markets successfully loaded...");
-    show(kPortoFolioPage);
-    answerNextAlert("Continue");
-    click("btnLoadPortoFolio");
-    answerPanel("OpenPanel", walletFile());
+    loadWallet(walletFile());
     ASSERT_EQ(message(), "Wallet successfully loaded...");
     alerts();
 }

@@ -1,16 +1,21 @@
 #pragma once
 
 #include "app/PLWindow.h"
+#include "platform/ListView.h"
+#include "platform/qt/WindowWidget.h"
 
-#include <QString>
-#include <QWidget>
+#include <QAbstractButton>
+#include <QAbstractItemView>
+#include <QApplication>
+#include <QComboBox>
+#include <QLineEdit>
+#include <QTest>
 #include <functional>
-#include <gtest/gtest.h>
+#include <gmock/gmock.h>
 #include <memory>
 #include <string>
 #include <vector>
 
-class BListView;
 class QTemporaryDir;
 
 /// The tabs of the window.
@@ -33,6 +38,9 @@ protected:
     /// Writes the sample of `pelorin-sample` into the data folder.
     void makeSample() const;
 
+    /// The bytes of both files, were they saved on 21/11/2024.
+    std::string bytes();
+
     /// Clicks on a tab.
     void show(Page page);
     /// The control of that name on the page that is shown; the test fails when there is none.
@@ -45,10 +53,18 @@ protected:
         return *widget;
     }
     bool isVisible(const char* name) { return find<QWidget>(name).isVisible(); }
+    /// The same on any page or beside the pages.
+    QWidget& anywhere(const char* name) { return *window().widget().findChild<QWidget*>(name); }
     BListView& list(const char* name);
 
     /// Clicks on a button or a check box.
     void click(const char* name);
+    /// The same anywhere.
+    void press(const char* name);
+    /// Presses a key where the keyboard is; `focus` tells where.
+    void key(Qt::Key key, Qt::KeyboardModifiers modifiers = {});
+    void ctrl(Qt::Key key, Qt::KeyboardModifiers more = {}) { this->key(key, Qt::ControlModifier | more); }
+    std::string focus() { return keyboard().objectName().toStdString(); }
     /// Types into a field in place of what is there, without Enter.
     void type(const char* name, const std::string& text);
     /// The same, with Enter.
@@ -76,6 +92,8 @@ protected:
     /// Takes away what an empty window offers.
     void dismissOffer() { window().dropNotice("first steps"); }
     void clearMessage() { window().SetMessage(""); }
+    /// The notice that is shown; empty when there is none.
+    std::string notice();
     /// Sends a code as a control does.
     void post(uint32 code);
     /// Handles all that waits.
@@ -91,7 +109,10 @@ protected:
     /// The folder that a panel shows; empty while it is not open.
     std::string panelFolder(const char* panel) const;
 
-    /// Both files through the buttons and panels.
+    /// A file by button and panel; what would be lost is let go.
+    void loadMarkets(const std::string& path) { load(kCompanyPage, "btnLoadMarket", path); }
+    void loadWallet(const std::string& path) { load(kPortoFolioPage, "btnLoadPortoFolio", path); }
+    /// Makes both files of the sample, and loads them.
     void loadSample();
 
     /// What `restart` makes: another kind of window.
@@ -99,7 +120,10 @@ protected:
 
 private:
     void open();
+    void load(Page page, const char* button, const std::string& path);
     void activate();
+    /// What has the keyboard, or gets it back when the window does.
+    QWidget& keyboard();
     BView& pageView();
     QWidget& page();
     void watchForAlert();

@@ -202,26 +202,23 @@ TEST(WalletFileTest, ATransferToNobodyStaysAndWhatFollowsIsReadOutOfPlace)
     EXPECT_TRUE(failed->getDate().isUndefined());
     EXPECT_EQ(failed->getAmount() + failed->getRateCost() + failed->getCost(), 0);
     EXPECT_EQ(failed->getFromCurrencyQuote() + failed->getToCurrencyQuote(), 2);
-    // The rest of the transfer's body stands where the parameters are looked for.
-    EXPECT_EQ(p.wallet.getBuyCost(), 200);
+    EXPECT_EQ(p.wallet.getBuyCost(), 200) << "the rest of its body stands where the parameters are looked for";
     EXPECT_EQ(p.wallet.getSellRateCost(), 1.5F);
     EXPECT_EQ(p.wallet.getInvestementPeriod(), 0);
     EXPECT_TRUE(p.wallet.hasLostRecipient());
-}
 
-TEST(WalletFileTest, ATransferToNobodyIsNoFailureEvenWhenWhatIsReadOutOfPlaceMeetsTheEnd)
-{
-    SmallPortfolio p;
+    SmallPortfolio again;
     const BytesFile file(replaced(bytesOfPieces(), "01000000 04000000 'Side' 0000", "01000000 04000000 'Sude' 0000"));
-    EXPECT_EQ(p.wallet.rd(file, nullptr), 0);
-    ASSERT_EQ(p.wallet.getNbrAccounts(), 2U);
-    EXPECT_EQ(p.wallet.getAccount(0)->getNbrOperations(), 4U);
-    EXPECT_EQ(p.wallet.getBuyCost(), Wallet().getBuyCost()) << "a parameter that the end has cost it";
-    EXPECT_EQ(diagnosisOf(file, p.catalogue), "the transfer of 200.00 from Main to Sude on 02/01/1999 lost its "
-                                              "recipient, which is no account of the file; what stands behind is read "
-                                              "out of place");
-    EXPECT_EQ(p.wallet.rd(BytesFile(bytesOfPieces()), nullptr), 0);
-    EXPECT_FALSE(p.wallet.hasLostRecipient());
+    EXPECT_EQ(again.wallet.rd(file, nullptr), 0) << "no failure, though what is read out of place meets the end";
+    ASSERT_EQ(again.wallet.getNbrAccounts(), 2U);
+    EXPECT_EQ(again.wallet.getAccount(0)->getNbrOperations(), 4U);
+    EXPECT_EQ(again.wallet.getBuyCost(), Wallet().getBuyCost()) << "a parameter that the end has cost it";
+    EXPECT_EQ(diagnosisOf(file, again.catalogue),
+              "the transfer of 200.00 from Main to Sude on 02/01/1999 lost its "
+              "recipient, which is no account of the file; what stands behind is read "
+              "out of place");
+    EXPECT_EQ(again.wallet.rd(BytesFile(bytesOfPieces()), nullptr), 0);
+    EXPECT_FALSE(again.wallet.hasLostRecipient());
 }
 
 TEST(WalletFileTest, AFailedReadIsToldAllThatIsMissingOrWhereTheFileEnds)

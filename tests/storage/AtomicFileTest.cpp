@@ -30,26 +30,6 @@ TEST_F(AtomicFileTest, IsWholeOrNotThere)
     EXPECT_EQ(folder_.content("late"), "somebody else's");
 }
 
-TEST_F(AtomicFileTest, ReplacesWhatALinkLeadsToAndKeepsItsPermissions)
-{
-    folder_.write("folder/old", "old", 0640);
-    fs::create_symlink("old", folder_ / "folder/link");
-    fs::create_symlink("folder/link", folder_ / "link");
-    fs::create_symlink("folder/made", folder_ / "dangling");
-
-    AtomicFile replacing(folder_ / "link", kReplace);
-    std::fputs("new", replacing.stream());
-    EXPECT_EQ(folder_.content("link"), "old") << "before the commit";
-    replacing.commit();
-    EXPECT_EQ(folder_.content("folder/old"), "new");
-    EXPECT_TRUE(fs::is_symlink(folder_ / "link") && fs::is_symlink(folder_ / "folder/link"));
-    EXPECT_EQ(fs::status(folder_ / "folder/old").permissions(), fs::perms(0640));
-
-    AtomicFile(folder_ / "dangling", kReplace).commit();
-    EXPECT_TRUE(fs::is_symlink(folder_ / "dangling"));
-    EXPECT_TRUE(fs::is_empty(folder_ / "folder/made"));
-}
-
 TEST_F(AtomicFileTest, RemovesWhatAKilledProgramLeftButNotWhatALivingOneWrites)
 {
     folder_.write(".pelorin-4194999-0.tmp", "half", 0200);

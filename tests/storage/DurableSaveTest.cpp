@@ -132,16 +132,23 @@ TEST_F(DurableSaveTest, DealsWithWhateverThePathLeadsTo)
     fs::permissions(folder_ / "locked", fs::perms(0555));
     fs::create_symlink("ring", folder_ / "ring");
     fs::create_symlink("made", folder_ / "dangling");
+    fs::create_symlink("dangling", folder_ / "chain");
     fs::create_symlink("missing/made", folder_ / "lost");
     const struct {
         std::string path;
         DurableSave::Outcome outcome;
     } cases[] = {
-        {folder_ / "folder", kOpenFailed},   {folder_ / "missing/f", kOpenFailed},
-        {folder_ / "ring", kOpenFailed},     {folder_ / std::string(300, 'x'), kOpenFailed},
-        {folder_ / "locked/f", kOpenFailed}, {folder_ / "locked/new", kOpenFailed},
-        {folder_ / "lost", kOpenFailed},     {folder_ / "dangling", kSaved},
-        {"/dev/full", kWriteFailed},         {"/dev/null", kSaved},
+        {folder_ / "folder", kOpenFailed},
+        {folder_ / "missing/f", kOpenFailed},
+        {folder_ / "ring", kOpenFailed},
+        {folder_ / std::string(300, 'x'), kOpenFailed},
+        {folder_ / "locked/f", kOpenFailed},
+        {folder_ / "locked/new", kOpenFailed},
+        {folder_ / "lost", kOpenFailed},
+        {folder_ / "dangling", kSaved},
+        {folder_ / "chain", kSaved},
+        {"/dev/full", kWriteFailed},
+        {"/dev/null", kSaved},
     };
     for (const auto& c : cases) {
         bool isCalled = false;
@@ -153,7 +160,7 @@ TEST_F(DurableSaveTest, DealsWithWhateverThePathLeadsTo)
         EXPECT_EQ(isCalled, c.outcome != kOpenFailed) << c.path;
         EXPECT_EQ(result.reason.starts_with(c.path + ": "), c.outcome != kSaved) << result.reason;
     }
-    EXPECT_TRUE(fs::is_symlink(folder_ / "dangling"));
+    EXPECT_TRUE(fs::is_symlink(folder_ / "dangling") && fs::is_symlink(folder_ / "chain"));
     EXPECT_EQ(folder_.content("made"), "new");
     EXPECT_EQ(folder_.content("locked/f"), "old");
     EXPECT_EQ(save_.save(folder_ / "locked/a\nb", writeNew).reason.find('\n'), std::string::npos) << "one line";
