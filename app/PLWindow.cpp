@@ -40,10 +40,10 @@ void valueAtDate(PLWindow& window)
         window.UpdateState();
 }
 
-const char* textIn(const BMessage& message)
+const char* textIn(const BMessage& message, const char* name = "text")
 {
     const char* text = "";
-    message.FindString("text", &text);
+    message.FindString(name, &text);
     return text;
 }
 
@@ -143,6 +143,8 @@ constexpr Command kOwnCommands[] = {
     {'WBGd', [](PLWindow& w, BMessage*) { w.valueAtLastQuotes(); }},           // the portfolio page
     {'OPIn', [](PLWindow& w, BMessage*) { w.ChangeOperationType("INCOME"); }}, // the operation page
     {'OPCh', [](PLWindow& w, BMessage*) { w.ChangeOperationType("CHARGE"); }},
+    {Guide::kOpen, [](PLWindow& w, BMessage* m) { w.OpenGuide(textIn(*m, "page")); }},
+    {Guide::kFailed, [](PLWindow& w, BMessage* m) { w.TellGuideFailure(m); }},
     {'NtSm', [](PLWindow& w, BMessage*) { w.takeBackSimulation(); }},
 };
 
@@ -200,6 +202,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
         ExportOffers(*this, *files_, *companyView_, *currencyView_, *walletView_, *operationView_));
     makeCompletions();
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
+    guide_.addKey(*this);
     walletView_->setDate(today());
     ReinitWallet(); // from here on there is a wallet, always
     history_ = std::make_unique<History>(moment(), files_->names());
@@ -254,6 +257,13 @@ void PLWindow::makeTableButtons()
 void PLWindow::OpenExport()
 {
     export_->open(*exportButton_);
+}
+
+void PLWindow::OpenGuide(const std::string& page)
+{
+    // In the order of `Tab`; packaging/guide/make has the same names.
+    static constexpr const char* kPages[] = {"company", "currency", "portofolio", "operations", "parameters"};
+    guide_.open(page.empty() ? kPages[tabView_->Selection()] : page);
 }
 
 void PLWindow::makeCompletions()
