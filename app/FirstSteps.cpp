@@ -75,6 +75,7 @@ void FirstSteps::update()
         notice.buttons.push_back(offer("Open last files", kOpenLast));
     }
     notice.buttons.push_back(offer("Open the sample", kOpenSample));
+    notice.buttons.push_back({"Guide", [this] { window_.OpenGuide(Guide::kStart); }});
     notice.isOffer = true;
     window_.showNotice(std::move(notice));
 }

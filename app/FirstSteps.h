@@ -9,8 +9,8 @@ class BTabView;
 class DataFiles;
 class PLWindow;
 
-/// What a window without any data offers, in a notice behind all others: the files that were saved last, and the
-/// sample. Nothing is loaded by itself.
+/// What a window without any data offers, in a notice behind all others: the files that were saved last, the
+/// sample, and the guide. Nothing is loaded by itself.
 class FirstSteps {
 public:
     static constexpr uint32 kOpenLast = 'FsLa';

@@ -77,6 +77,7 @@ void ImportAssistant::open(const BMessage* message)
     const BPoint middle = page->ConvertToScreen({page->Bounds().Width() / 2, kBelow});
     auto* dialog = new ImportWindow(middle, pending_, pending_->sheet(), BMessenger(&window_)); // owns itself
     dialog_ = BMessenger(dialog);
+    window_.guide().addKey(*dialog, "import");
     dialog->Show();
 }
 

@@ -42,10 +42,10 @@ void valueAtDate(PLWindow& window)
         window.UpdateState();
 }
 
-const char* textIn(const BMessage& message)
+const char* textIn(const BMessage& message, const char* name = "text")
 {
     const char* text = "";
-    message.FindString("text", &text);
+    message.FindString(name, &text);
     return text;
 }
 
@@ -147,6 +147,8 @@ constexpr Command kOwnCommands[] = {
     {'OPCh', [](PLWindow& w, BMessage*) { w.ChangeOperationType("CHARGE"); }},
     {FirstSteps::kOpenLast, [](PLWindow& w, BMessage*) { w.OpenLastFiles(); }, "Load"},
     {FirstSteps::kOpenSample, [](PLWindow& w, BMessage*) { w.OpenSample(); }, "Load"},
+    {Guide::kOpen, [](PLWindow& w, BMessage* m) { w.OpenGuide(textIn(*m, "page")); }},
+    {Guide::kFailed, [](PLWindow& w, BMessage* m) { w.TellGuideFailure(m); }},
     {'NtSm', [](PLWindow& w, BMessage*) { w.takeBackSimulation(); }},
 };
 
@@ -205,6 +207,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
         ExportOffers(*this, *files_, *companyView_, *currencyView_, *walletView_, *operationView_));
     makeCompletions();
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
+    guide_.addKey(*this);
     walletView_->setDate(today());
     ReinitWallet(); // from here on there is a wallet, always
     history_ = std::make_unique<History>(moment(), files_->names());
@@ -270,6 +273,13 @@ void PLWindow::OpenSample()
 void PLWindow::OpenExport()
 {
     export_->open(*exportButton_);
+}
+
+void PLWindow::OpenGuide(const std::string& page)
+{
+    // In the order of `Tab`; packaging/guide/make has the same names.
+    static constexpr const char* kPages[] = {"company", "currency", "portofolio", "operations", "parameters"};
+    guide_.open(page.empty() ? kPages[tabView_->Selection()] : page);
 }
 
 void PLWindow::makeCompletions()

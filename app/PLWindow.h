@@ -3,6 +3,7 @@
 #include "app/DataFiles.h"
 #include "app/EventEditor.h"
 #include "app/ExportAssistant.h"
+#include "app/Guide.h"
 #include "app/History.h"
 #include "app/ImportAssistant.h"
 #include "app/Notice.h"
@@ -140,6 +141,12 @@ public:
     void AskExport(const BMessage* message) { export_->ask(message); }
     void WriteExport(const BMessage* message) { export_->write(message); }
 
+    // The guide.
+    /// Opens it at `page`, which is one of its files; at that of the page in front when it is empty.
+    void OpenGuide(const std::string& page = {});
+    void TellGuideFailure(const BMessage* message) { guide_.tellFailure(message); }
+    Guide& guide() { return guide_; }
+
     // Markets (MarketCommands.cpp).
     void AddMarket();
     void AddMarket(Market* market, bool selected);
@@ -272,6 +279,7 @@ private:
     std::unique_ptr<PageReturns> returns_;
     std::unique_ptr<ImportAssistant> import_;
     std::unique_ptr<Completions> completions_;
+    Guide guide_{*this};
     std::unique_ptr<Shortcuts> shortcuts_;
     std::unique_ptr<FirstSteps> firstSteps_;
     std::unique_ptr<Rescue> rescue_; // the last one to come and the first to go: its last copy needs all of the above

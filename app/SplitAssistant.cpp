@@ -62,6 +62,7 @@ void SplitAssistant::open()
     const BPoint middle = page_.ConvertToScreen({page_.Bounds().Width() / 2, kBelow});
     auto* dialog = new SplitWindow(middle, *split, *kept, BMessenger(&window_)); // owns itself
     dialog_ = BMessenger(dialog);
+    window_.guide().addKey(*dialog, "split");
     dialog->Show();
 }
 

@@ -14,6 +14,8 @@ struct DialogAnswers {
     std::function<int32(const char* title, const char* text)> alert;
     /// @return the path that is chosen in a file panel; empty cancels it.
     std::function<std::string(const BFilePanel& panel)> panel;
+    /// Opens a file in the place of another program. @return whether that has started.
+    std::function<bool(const std::string& path)> launch;
 
     static DialogAnswers& current()
     {

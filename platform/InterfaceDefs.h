@@ -47,4 +47,5 @@ constexpr char B_PAGE_DOWN = 0x0c;
 constexpr char B_ESCAPE = 0x1b;
 constexpr char B_ENTER = 0x0a;
 constexpr char B_DELETE = 0x7f;
+constexpr uint32 B_F1_KEY = 0x02;     ///< for shortcuts; unlike in the kits they have it beside the letters
 constexpr char B_FUNCTION_KEY = 0x10; ///< lists get it for F2 only

@@ -37,8 +37,8 @@ public:
     BView* CurrentFocus() const;
 
     /// Has `message`, which it takes ownership of, sent to `target`, or to itself when that is null, when `key` (a
-    /// letter in capitals or a digit) is pressed with `modifiers`. Unlike in the kits, and as by a click elsewhere, a
-    /// field that is being typed in sends its text before. Ctrl+Q, which closes the window, is there from the start.
+    /// capital letter, a digit or `B_F1_KEY`) is pressed with `modifiers`. Unlike in the kits, as by a click elsewhere,
+    /// a field that is being typed in sends its text before. Ctrl+Q, which closes the window, is there from the start.
     void AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHandler* target = nullptr);
 
     /// The text in the field that has the keyboard counts as typed before: Ctrl+Z is the window's from here on. Until

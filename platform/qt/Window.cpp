@@ -77,7 +77,8 @@ void BWindow::AddShortcut(uint32 key, uint32 modifiers, BMessage* message, BHand
     // Kept by the shortcut, which lives as long as the window; `target` may go before.
     const std::shared_ptr<const BMessage> sent(message);
     const BMessenger messenger(target != nullptr ? target : this);
-    widget_->addShortcut(static_cast<int>(key), modifiers, [messenger, sent] { messenger.SendMessage(sent.get()); });
+    const int pressed = key == B_F1_KEY ? static_cast<int>(Qt::Key_F1) : static_cast<int>(key);
+    widget_->addShortcut(pressed, modifiers, [messenger, sent] { messenger.SendMessage(sent.get()); });
 }
 
 void BWindow::ForgetTyping()

@@ -1,10 +1,15 @@
 // The line of notices, and what is told there and beside the figures.
 
 #include "app/NoticeLine.h"
+#include "platform/DialogAnswers.h"
 #include "tests/gui/CatalogueFixture.h"
+#include "tests/support/ToolRun.h"
 
 #include <QCheckBox>
 #include <QPushButton>
+
+#include <filesystem>
+#include <fstream>
 
 namespace {
 
@@ -129,6 +134,79 @@ TEST_F(NoticeTest, EnterAndEscapeCancelWhatDestroys)
         EXPECT_EQ(alerts().size(), 1U);
         EXPECT_THAT(rows("lstCompanies"), testing::SizeIs(1)) << key;
     }
+}
+
+/// F1, and what the desktop does with the file that it is asked to open.
+class GuideTest : public NoticeTest {
+protected:
+    ~GuideTest() override
+    {
+        DialogAnswers::current().launch = nullptr;
+        qputenv("PATH", path_);
+    }
+    const QByteArray path_ = qgetenv("PATH");
+};
+
+TEST_F(GuideTest, F1OpensItAtThePageInFront)
+{
+    std::string opened;
+    DialogAnswers::current().launch = [&opened](const std::string& path) {
+        opened = path;
+        return true;
+    };
+    addSmallCatalogue();
+    choose("companyEventType", "Split");
+    follow({{{{"txtCompanyEventDate", "10/3/2024"}}, "btnAddCompanyEvent", ""}});
+    const struct {
+        Page page;
+        const char* button; // of the page, which opens a window; empty without one
+        const char* file;
+        const char* section;
+    } cases[] = {
+        {kCurrencyPage, "", "currency.html", "#currency"},
+        {kPortoFolioPage, "", "portofolio.html", "#portofolio"},
+        {kOperationPage, "", "operations.html", "#operations"},
+        {kParameterPage, "", "parameters.html", "#parameters"},
+        {kCompanyPage, "", "company.html", "#company"},
+        {kCompanyPage, "btnApplySplit", "split.html", "#6-when-a-share-is-split"},
+    };
+    for (const auto& c : cases) {
+        show(c.page);
+        if (*c.button != '\0')
+            click(c.button);
+        key(Qt::Key_F1);
+        EXPECT_EQ(std::filesystem::path(opened).filename(), c.file);
+        EXPECT_THAT(contentOf(opened), HasSubstr(std::string("url=index.html") + c.section + '"'));
+        EXPECT_EQ(notice().find("guide"), std::string::npos);
+    }
+    QTest::keyClick(QApplication::activeModalWidget(), Qt::Key_Escape); // it outlives the other window
+    settle();
+}
+
+TEST_F(GuideTest, WhereNoBrowserOpensItTheFileIsNamed)
+{
+    dismissOffer();
+    show(kCompanyPage);
+    const std::string opened = folder() + "/opened";
+    const std::pair<std::string, bool> openers[] = {
+        {"", false}, {"exit 4", false}, {"kill -9 $$", false}, {"echo \"$1\" > '" + opened + "'", true}};
+    for (const auto& [opener, succeeds] : openers) {
+        SCOPED_TRACE(opener);
+        const std::string script = folder() + "/xdg-open";
+        if (!opener.empty())
+            std::ofstream(script) << "#!/bin/sh\n" << opener << '\n';
+        if (!opener.empty())
+            std::filesystem::permissions(script, std::filesystem::perms::owner_all);
+        qputenv("PATH", QByteArray::fromStdString(folder()));
+        key(Qt::Key_F1);
+        EXPECT_TRUE(QTest::qWaitFor([&, succeeds = succeeds] {
+            return succeeds ? std::filesystem::exists(opened) : notice().ends_with("/pelorin/company.html");
+        })) << notice();
+        if (!succeeds)
+            press("txtNotice");
+    }
+    EXPECT_TRUE(QTest::qWaitFor([&] { return contentOf(opened).ends_with("/pelorin/company.html\n"); }));
+    EXPECT_EQ(notice(), "");
 }
 
 } // namespace
