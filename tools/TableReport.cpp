@@ -142,11 +142,10 @@ private:
 
     static void addReturn(const char* what, const AnnualReturn& annual, TextTable* table)
     {
-        constexpr const char* kReasons[] = {"", "no day", "no rate", "several rates"}; // by kind
         if (annual.isKnown())
             table->addRow({what, amountText(annual.rate * 100), "%"});
         else
-            table->addRow({what, kReasons[static_cast<int>(annual.kind)], ""});
+            table->addRow({what, annual.reason(), ""});
     }
 
     /// An amount in the currency of that symbol, in the reference currency; empty when that has no answer.

@@ -10,6 +10,7 @@ struct AnnualReturn {
         kNoDay,        ///< the range has no day
         kNoRate,       ///< none above -100 % says how the values came about, or none that a number can hold
         kSeveralRates, ///< several do
+        kTooManyDays,  ///< it goes by the values of all days, and there are too many
     };
 
     Kind kind = Kind::kNoDay;
@@ -28,4 +29,10 @@ struct AnnualReturn {
     }
 
     bool isKnown() const { return kind == Kind::kRate; }
+    /// Why there is none, in a few words; empty for a rate.
+    const char* reason() const
+    {
+        constexpr const char* kReasons[] = {"", "no day", "no rate", "several rates", "too many days"}; // by kind
+        return kReasons[static_cast<int>(kind)];
+    }
 };

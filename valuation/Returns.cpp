@@ -65,7 +65,7 @@ Returns::Returns(const Wallet& wallet, const Catalogue& catalogue, Points evolut
         range.value = std::prev(range.point)->totalValue;
         range.flow = std::ranges::upper_bound(flows, from, {}, &CashFlow::date);
     }
-    const AnnualReturn none(AnnualReturn::Kind::kNoRate);
+    const AnnualReturn none(AnnualReturn::Kind::kTooManyDays);
     moneyWeighted = isLater && !hasDays ? none : moneyWeightedReturn(range, evolution, flows);
     timeWeighted = hasDays ? timeWeightedReturn(range, evolution, flows) : none;
 }

@@ -48,8 +48,7 @@ std::string coverageText(const QuoteCoverage& coverage, const char* what, const 
 /// " 7.51 %", or in a few words why there is none.
 std::string returnText(const AnnualReturn& annual)
 {
-    constexpr const char* kReasons[] = {"", ": no day", ": no rate", ": several rates"}; // by kind
-    return annual.isKnown() ? ' ' + percentText(annual.rate) : kReasons[static_cast<int>(annual.kind)];
+    return annual.isKnown() ? ' ' + percentText(annual.rate) : std::string(": ") + annual.reason();
 }
 
 /// Sets a line that ends at `right`. @return where it begins.
