@@ -385,3 +385,12 @@ void DataFiles::save(const String& path)
     written_[static_cast<std::size_t>(*kind)] = result.stamp;
     window_.noteFile(*kind, true);
 }
+
+bool DataFiles::isOpen(const std::string& path) const
+{
+    const auto isSame = [&](const String& other) {
+        std::error_code isMissing;
+        return other.hasText() && std::filesystem::equivalent(path, other.getCharacterArray(), isMissing);
+    };
+    return isSame(names_.markets.path) || isSame(names_.wallet.path);
+}

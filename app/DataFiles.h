@@ -86,6 +86,8 @@ public:
     void forgetWallet();
 
     bool isWalletEmpty() const;
+    /// Whether `path` is one of the files that are remembered.
+    bool isOpen(const std::string& path) const;
     const Names& names() const { return names_; }
     /// For an undo of a load: from here on these are the files that are saved to.
     void setNames(const Names& names);

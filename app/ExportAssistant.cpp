@@ -2,6 +2,7 @@
 
 #include "app/DataFiles.h"
 #include "app/PLWindow.h"
+#include "app/ReportAssistant.h"
 #include "platform/MenuItem.h"
 #include "platform/Path.h"
 #include "platform/PopUpMenu.h"
@@ -26,17 +27,6 @@ BFilePanel makePanel(PLWindow& window)
     return BFilePanel(B_SAVE_PANEL, &target, nullptr, B_FILE_NODE, new BMessage(ExportAssistant::kPlaced), true);
 }
 
-bool isSameFile(const std::string& path, const String& other)
-{
-    std::error_code isMissing;
-    return other.hasText() && std::filesystem::equivalent(path, other.getCharacterArray(), isMissing);
-}
-
-std::string nameOf(const std::string& path)
-{
-    return std::filesystem::path(path).filename();
-}
-
 /// A name that nothing in the folder has: tables of a former export are replaced only where a person has named them.
 std::string freeName(const std::string& folder, const std::string& wanted)
 {
@@ -53,10 +43,25 @@ ExportAssistant::ExportAssistant(PLWindow& window, const BTabView& tabs, const D
                                  const DataFolder& folder, const ExportOffers& offers)
     : window_(window), tabs_(tabs), files_(files), offers_(offers), panel_(makePanel(window))
 {
+    if (const std::string first = firstFolder(folder); !first.empty())
+        panel_.SetPanelDirectory(first.c_str());
+}
+
+std::string ExportAssistant::firstFolder(const DataFolder& folder)
+{
     std::error_code error;
     const std::string documents = folder.path().empty() ? "" : folderOf(folder.path());
-    if (std::filesystem::is_directory(documents, error)) // else in the home folder
-        panel_.SetPanelDirectory(documents.c_str());
+    return std::filesystem::is_directory(documents, error) ? documents : "";
+}
+
+std::string ExportAssistant::nameOf(const std::string& path)
+{
+    return std::filesystem::path(path).filename();
+}
+
+std::string ExportAssistant::failureText(const std::string& path, const std::string& reason)
+{
+    return "Not written: " + (reason.starts_with(path) ? nameOf(path) + reason.substr(path.size()) : reason);
 }
 
 void ExportAssistant::open(const BView& button) const
@@ -72,6 +77,13 @@ void ExportAssistant::open(const BView& button) const
         item->SetEnabled(offer.isPossible);
         item->SetTarget(&window_);
         menu.AddItem(item);
+    }
+    if (tabs_.Selection() == PLWindow::kPortoFolioTab || tabs_.Selection() == PLWindow::kOperationTab) {
+        menu.AddItem(new BSeparatorItem);
+        auto* report = new BMenuItem("Report on paper...", new BMessage(ReportAssistant::kAsked));
+        report->SetEnabled(window_.getState() != nullptr);
+        report->SetTarget(&window_);
+        menu.AddItem(report);
     }
     menu.Open(button.ConvertToScreen({0, button.Bounds().Height() + 1}));
 }
@@ -111,19 +123,16 @@ void ExportAssistant::write(const BMessage* message)
     panel_.SetPanelDirectory(folderOf(path).c_str()); // for the next time
     const std::optional<ExportOffer> offer = find(std::exchange(asked_, {}));
     if (!offer)
-        return tellFailure("what was chosen is no longer shown");
-    const DataFiles::Names& open = files_.names();
-    if (isSameFile(path, open.markets.path) || isSameFile(path, open.wallet.path))
-        return tellFailure(nameOf(path) + " is a file that is open here");
+        return tellFailure(failureText(path, "what was chosen is no longer shown"));
+    if (files_.isOpen(path))
+        return tellFailure(failureText(path, path + " is a file that is open here"));
     try {
         const SizeSignalIgnored ignored; // a limit on the size of files is a reason like any other
         const std::string text = written(*offer, path);
         window_.dropNotice(kNotice); // of a failure before
         window_.showNotice({kNotice, text, {}, true});
     } catch (const std::runtime_error& error) {
-        // The place was just chosen: the name is enough, and leaves room for the reason.
-        const std::string reason = error.what();
-        tellFailure(reason.starts_with(path) ? nameOf(path) + reason.substr(path.size()) : reason);
+        tellFailure(failureText(path, error.what()));
     }
 }
 
@@ -138,8 +147,8 @@ std::string ExportAssistant::written(const ExportOffer& offer, const std::string
     return text;
 }
 
-void ExportAssistant::tellFailure(const std::string& reason)
+void ExportAssistant::tellFailure(const std::string& text)
 {
     // It stays until it is seen.
-    window_.showNotice({kNotice, "Not written: " + reason, {}, false, false, true});
+    window_.showNotice({kNotice, text, {}, false, false, true});
 }

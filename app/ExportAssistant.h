@@ -30,12 +30,18 @@ public:
     void ask(const BMessage* message);
     void write(const BMessage* message);
 
+    /// Where a file is first proposed: the folder that the data folder stands in; empty for the home folder.
+    static std::string firstFolder(const DataFolder& folder);
+    static std::string nameOf(const std::string& path);
+    /// "Not written: ..." The place was just chosen: its name is enough, and leaves room for the reason.
+    static std::string failureText(const std::string& path, const std::string& reason);
+
 private:
     /// That of the page in front with this label; nothing when it is not there, or has become impossible.
     std::optional<ExportOffer> find(const std::string& label) const;
     /// The text for a notice.
     std::string written(const ExportOffer& offer, const std::string& path) const;
-    void tellFailure(const std::string& reason);
+    void tellFailure(const std::string& text);
 
     PLWindow& window_;
     const BTabView& tabs_;

@@ -207,7 +207,7 @@ ExportOffers::Offers ExportOffers::ofOperations() const
                      [=](ExportRows& rows, CsvWriter& file) { rows.addOperations(file, written); });
     };
     return {offer("Operations shown", operations_.shownOperations()),
-            offer("All operations", ExportRows::allOperations(*window_.getWallet()))};
+            offer("All operations", operationsByDate(*window_.getWallet()))};
 }
 
 ExportOffers::Offers ExportOffers::ofParameters() const

@@ -14,6 +14,7 @@
 #include "platform/Button.h"
 #include "platform/TabView.h"
 #include "portfolio/Wallet.h"
+#include "report/ReportWindow.h"
 #include "views/FieldNotice.h"
 #include "views/ImportWindow.h"
 #include "views/OperationView.h"
@@ -135,6 +136,8 @@ constexpr Command kOwnCommands[] = {
     {'TExp', [](PLWindow& w, BMessage*) { w.OpenExport(); }},
     {ExportAssistant::kChosen, [](PLWindow& w, BMessage* m) { w.AskExport(m); }},
     {ExportAssistant::kPlaced, [](PLWindow& w, BMessage* m) { w.WriteExport(m); }},
+    {ReportAssistant::kAsked, [](PLWindow& w, BMessage*) { w.OpenReport(); }},
+    {ReportWindow::kPlaced, [](PLWindow& w, BMessage* m) { w.SaveReport(m); }},
     {'HUnd', [](PLWindow& w, BMessage*) { w.Undo(); }},
     {'HRed', [](PLWindow& w, BMessage*) { w.Redo(); }},
     {NoticeLine::kPressed, [](PLWindow& w, BMessage* m) { w.pressNotice(m); }},
@@ -205,6 +208,7 @@ PLWindow::PLWindow(BRect frame, const DataFolder& folder)
     export_ = std::make_unique<ExportAssistant>(
         *this, *tabView_, *files_, folder,
         ExportOffers(*this, *files_, *companyView_, *currencyView_, *walletView_, *operationView_));
+    report_ = std::make_unique<ReportAssistant>(*this, *tabView_, *files_, folder);
     makeCompletions();
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     guide_.addKey(*this);
@@ -256,8 +260,9 @@ void PLWindow::makeTableButtons()
     importButton_ =
         add(kRight - 2 * kWidth - 3, "btnImportTable", "Import...",
             "Brings in a table: prices on the page Company, rates on Currency, operations on the next two", 'TImp');
-    exportButton_ = add(kRight - kWidth + 1, "btnExport", "Export...",
-                        "Writes what this page shows as a table for other programs", 'TExp');
+    exportButton_ =
+        add(kRight - kWidth + 1, "btnExport", "Export...",
+            "Writes what this page shows as a table for other programs; Ctrl+P makes a report on paper", 'TExp');
 }
 
 void PLWindow::OpenLastFiles()

@@ -10,6 +10,7 @@
 #include "app/OperationEditor.h"
 #include "app/QuoteEditor.h"
 #include "app/RepeatGuard.h"
+#include "app/ReportAssistant.h"
 #include "app/SplitAssistant.h"
 #include "market/Catalogue.h"
 #include "platform/Window.h"
@@ -140,6 +141,8 @@ public:
     void OpenExport();
     void AskExport(const BMessage* message) { export_->ask(message); }
     void WriteExport(const BMessage* message) { export_->write(message); }
+    void OpenReport() { report_->open(); }
+    void SaveReport(const BMessage* message) { report_->save(message); }
 
     // The guide.
     /// Opens it at `page`, which is one of its files; at that of the page in front when it is empty.
@@ -275,6 +278,7 @@ private:
     std::unique_ptr<EventEditor> events_;
     std::unique_ptr<SplitAssistant> split_;
     std::unique_ptr<ExportAssistant> export_;
+    std::unique_ptr<ReportAssistant> report_;
     std::unique_ptr<OperationEditor> operations_;
     std::unique_ptr<PageReturns> returns_;
     std::unique_ptr<ImportAssistant> import_;

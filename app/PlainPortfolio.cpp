@@ -18,3 +18,10 @@ std::vector<EvolutionPoint> PlainPortfolio::evolve()
     state_ = refreshStates(*wallet_, state_->getDate(), false, &outcome);
     return outcome == EvolutionOutcome::kBuilt ? evolutionByDate(*wallet_, catalogue_) : std::vector<EvolutionPoint>();
 }
+
+WalletFigures PlainPortfolio::figures()
+{
+    const Date day = state_->getDate(); // of a state that goes
+    state_ = nullptr;
+    return {*wallet_, catalogue_, day, {}};
+}

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "valuation/Evolution.h"
+#include "valuation/WalletFigures.h"
 
 #include <memory>
 #include <optional>
@@ -21,6 +22,8 @@ public:
     const Wallet& wallet() const { return *wallet_; }
     /// Values it once more, with every day up to the same one, by ascending date; empty where that cannot be.
     std::vector<EvolutionPoint> evolve();
+    /// Values it once more, with all that a report tells of. To be called last, and to go before this.
+    WalletFigures figures();
     const State& state() const { return *state_; }
 
 private:

@@ -1,6 +1,7 @@
 #include "app/Shortcuts.h"
 
 #include "app/FirstSteps.h"
+#include "app/ReportAssistant.h"
 #include "platform/Button.h"
 #include "platform/ListView.h"
 #include "platform/Message.h"
@@ -77,6 +78,7 @@ Shortcuts::Shortcuts(BWindow& window, BTabView& tabs) : window_(window), tabs_(t
     window.AddShortcut('O', B_CONTROL_KEY | B_SHIFT_KEY, new BMessage(FirstSteps::kOpenLast), &window);
     window.AddShortcut('S', B_CONTROL_KEY, new BMessage(kSave), this);
     window.AddShortcut('N', B_CONTROL_KEY, new BMessage(kAdd), this);
+    window.AddShortcut('P', B_CONTROL_KEY, new BMessage(ReportAssistant::kAsked));
     window.AddShortcut('F', B_CONTROL_KEY, new BMessage(kFind), this);
     window.AddShortcut('Z', B_CONTROL_KEY, new BMessage(kUndo), this);
     window.AddShortcut('Z', B_CONTROL_KEY | B_SHIFT_KEY, new BMessage(kRedo), this);

@@ -12,7 +12,8 @@ class BWindow;
 /// that has none is about the portfolio, and the portfolio's page comes to the front for it. Ctrl+N presses the button
 /// that adds in the box where the keyboard is; outside of all boxes the page's only one, if there is only one. Ctrl+F
 /// goes to the filter of the page in front, or to its first list, which finds what is typed. Ctrl+Z and Ctrl+Shift+Z
-/// press the buttons that undo and redo, unless they are about what is being typed in a field.
+/// press the buttons that undo and redo, unless they are about what is being typed in a field. Ctrl+P opens the report
+/// on paper, as the menu of "Export..." does.
 class Shortcuts final : public BHandler {
 public:
     /// Both outlive this.

@@ -231,6 +231,13 @@ void ChartPainter::drawMark(const ChartMark& mark)
 /// Other lines may pass below a mark's label.
 void ChartPainter::drawOutlinedText(const ChartText& text)
 {
+    if (view_.IsPrinting()) { // as text it would stand there five times
+        view_.SetFontSize(text.size);
+        view_.SetHighColor(background_);
+        const float width = view_.StringWidth(text.text.c_str());
+        view_.FillRect({text.where.x - 1, text.where.y - text.size, text.where.x + width + 1, text.where.y + 1});
+        return drawText(text, text_);
+    }
     for (const BPoint& shift : {BPoint(-1, -1), BPoint(1, -1), BPoint(-1, 1), BPoint(1, 1)}) {
         ChartText outline = text;
         outline.where = text.where + shift;

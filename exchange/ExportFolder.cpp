@@ -62,7 +62,7 @@ void ExportFolder::addPortfolio(const State& state, const std::vector<EvolutionP
     rows_.addAccounts(begin(kAccounts), state);
     // Those that are sold, too: the order of all of them is part of a value.
     rows_.addHoldings(begin(kHoldings), state.shareStates());
-    rows_.addOperations(begin(kOperations), ExportRows::allOperations(*wallet_));
+    rows_.addOperations(begin(kOperations), operationsByDate(*wallet_));
     rows_.addParameters(begin(kParameters));
     rows_.addEvolution(begin(kEvolution), evolution);
 }

@@ -111,16 +111,6 @@ void ExportRows::addHolding(CsvWriter& table, const ShareState& holding)
          end.isUndefined() ? "" : tableDate(end)});
 }
 
-std::vector<const Operation*> ExportRows::allOperations(const Wallet& wallet)
-{
-    std::vector<const Operation*> operations;
-    for (const Account* account : wallet.accounts())
-        operations.insert(operations.end(), account->operations().begin(), account->operations().end());
-    // Those of one day stay in the order of the accounts and, on each, in that of the file, on which its cash depends.
-    std::ranges::stable_sort(operations, {}, &Operation::getDate);
-    return operations;
-}
-
 void ExportRows::addOperations(CsvWriter& table, const std::vector<const Operation*>& operations)
 {
     for (const Operation* operation : operations)

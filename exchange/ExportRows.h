@@ -41,9 +41,6 @@ public:
     void addParameters(CsvWriter& table);
     void addEvolution(CsvWriter& table, const std::vector<EvolutionPoint>& points);
 
-    /// All of the wallet's, automatic ones too, by date.
-    static std::vector<const Operation*> allOperations(const Wallet& wallet);
-
     const TableNames& names() const { return names_; }
     /// A line for each thing that the tables cannot hold.
     const std::vector<std::string>& leftOut() const { return leftOut_; }

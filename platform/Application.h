@@ -8,6 +8,10 @@
 /// left.
 class BApplication : public BLooper {
 public:
+    /// Has windows and views be laid out and drawn where nobody sees them, on a machine without a display, too. To be
+    /// called before the application is made.
+    static void UseNoDisplay();
+
     /// `signature` is the program's name among all programs, such as "application/x-vnd.Someone".
     explicit BApplication(const char* signature);
     ~BApplication() override;

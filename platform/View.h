@@ -126,6 +126,9 @@ public:
     /// `where` is the left end of the base line; `text` is UTF-8.
     void DrawString(const char* text, BPoint where);
 
+    /// Whether what is drawn now goes to paper, where text is text and no picture.
+    bool IsPrinting() const;
+
     /// Has `Draw` called again, later.
     void Invalidate();
     /// Has `DrawOver` called again, later; the picture stays as it is.

@@ -6,6 +6,7 @@
 #include <memory>
 
 class BView;
+class QSize;
 class QWidget;
 class WindowWidget;
 
@@ -21,7 +22,7 @@ constexpr uint32 B_CURRENT_WORKSPACE = 0;
 ///
 /// Owns its views. The window belongs to itself: `Quit` destroys it, closing it by hand does so when `QuitRequested`
 /// agrees, and the application destroys those that are left. On a screen smaller than its frame it shrinks to what fits
-/// and scrolls its content.
+/// and scrolls its content; one that is resizable has its views follow.
 class BWindow : public BLooper {
 public:
     /// `frame` is in screen coordinates, without title bar and borders.
@@ -54,6 +55,8 @@ public:
 
     /// What Qt shows the window with. For the platform's own use.
     WindowWidget& widget() const { return *widget_; }
+    /// Gives the content the size of the window, once there is some.
+    void fitContent(const QSize& size);
     /// The window is asked to close, by the person or by a message. @return false to stay.
     bool askToClose();
     static void closeAll();

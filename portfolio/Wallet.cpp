@@ -93,3 +93,12 @@ void Wallet::removeAutomaticOperations()
             delete operation;
     }
 }
+
+std::vector<const Operation*> operationsByDate(const Wallet& wallet)
+{
+    std::vector<const Operation*> operations;
+    for (const Account* account : wallet.accounts())
+        operations.insert(operations.end(), account->operations().begin(), account->operations().end());
+    std::ranges::stable_sort(operations, {}, &Operation::getDate);
+    return operations;
+}

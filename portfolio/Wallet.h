@@ -145,3 +145,7 @@ private:
     // that by default the loss limit stands still.
     std::array<float, kParameterCount> parameters_{29.95F, 29.95F, 0.0017F, 0.0017F, 90, 2.0F, 1.1F, 0.8F, 0.8F, 0.9F};
 };
+
+/// The operations of all accounts, automatic ones too, by date. Those of one day stand in the order of the accounts
+/// and, of each, in that of its list.
+std::vector<const Operation*> operationsByDate(const Wallet& wallet);

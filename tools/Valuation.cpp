@@ -4,6 +4,7 @@
 #include "portfolio/WalletDiagnosis.h"
 #include "storage/InputFile.h"
 #include "valuation/State.h"
+#include "valuation/WalletFigures.h"
 
 #include <stdexcept>
 
@@ -63,20 +64,18 @@ void Valuation::compute(const Date& date, bool previsions, bool evolution)
 
 void Valuation::computeReturns(const Date& date, const Date& from, bool previsions, bool evolution)
 {
+    // Before anything is simulated. An evolution that is refused leaves the day alone, which is told only to those who
+    // have asked for the days.
+    const WalletFigures figures(wallet_, catalogue_, date, from);
     hasEvolution_ = evolution;
-    EvolutionOutcome outcome;
-    state_ = refreshStates(wallet_, date, false, &outcome);
-    evolution_ = evolutionByDate(wallet_, catalogue_);
-    // Both before anything is simulated. An evolution that is refused leaves the day alone, which is told only to those
-    // who have asked for the days.
-    const Date first = state_->getFirstOperationDate();
-    returns_ = Returns(wallet_, catalogue_, evolution_, first, from);
-    // One range for both: it begins behind a day only when that is later than the first one.
-    figures_ = holdingFigures(*state_, catalogue_, from > first ? from : Date());
+    state_ = &figures.state();
+    evolution_ = figures.evolution();
+    returns_ = figures.returns();
+    figures_ = figures.holdings();
     if (previsions)
         compute(date, previsions, evolution);
     else if (evolution)
-        checkOutcome(outcome);
+        checkOutcome(figures.outcome());
 }
 
 void Valuation::checkOutcome(EvolutionOutcome outcome) const

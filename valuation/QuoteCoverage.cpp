@@ -1,5 +1,6 @@
 #include "valuation/QuoteCoverage.h"
 
+#include "foundation/DateText.h"
 #include "market/Catalogue.h"
 #include "market/Company.h"
 #include "market/Currency.h"
@@ -87,4 +88,25 @@ QuoteCoverage rateCoverage(const State& state, const Catalogue& catalogue)
             add(account->account()->currency());
     makeUnique(currencies);
     return coverageOf(currencies, state.getDate());
+}
+
+std::string coverageText(const QuoteCoverage& coverage, const char* what, const Date& day)
+{
+    const unsigned missing = coverage.older + coverage.unknown;
+    if (missing == 0)
+        return {};
+    return std::to_string(missing) + " of " + std::to_string(coverage.needed) + ' ' + what +
+           (missing == 1 ? " is " : " are ") + (coverage.unknown > 0 ? "not of " : "older than ") + dateText(day);
+}
+
+std::string estimateText(const QuoteCoverage& quotes, const QuoteCoverage& rates, const Date& day)
+{
+    const std::string ofQuotes = coverageText(quotes, "quotes", day);
+    const std::string missing = ofQuotes.empty() ? coverageText(rates, "rates", day) : ofQuotes;
+    if (missing.empty())
+        return {};
+    const std::string what = ofQuotes.empty() ? "rates" : "quotes";
+    const Date& last = ofQuotes.empty() ? rates.lastFullDay : quotes.lastFullDay;
+    return "estimated: " + missing + ", " +
+           (last.isUndefined() ? "no day has all " + what : "the last day with all " + what + " is " + dateText(last));
 }

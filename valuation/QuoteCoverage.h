@@ -2,6 +2,8 @@
 
 #include "foundation/Date.h"
 
+#include <string>
+
 class Catalogue;
 class State;
 
@@ -17,3 +19,8 @@ struct QuoteCoverage {
 QuoteCoverage quoteCoverage(const State& state);
 /// The rates of the currencies that its holdings and accounts are in, other than the reference currency.
 QuoteCoverage rateCoverage(const State& state, const Catalogue& catalogue);
+/// "11 of 12 quotes are older than 21/11/2026", for the `what` "quotes" and that day; empty when none is.
+std::string coverageText(const QuoteCoverage& coverage, const char* what, const Date& day);
+/// "estimated: 11 of 12 quotes are older than 21/11/2026, the last day with all quotes is 20/11/2026"; the same of the
+/// rates where no quote is missing, and empty where none of these is, either.
+std::string estimateText(const QuoteCoverage& quotes, const QuoteCoverage& rates, const Date& day);

@@ -5,6 +5,8 @@
 #include "valuation/Appraisal.h"
 #include "valuation/State.h"
 
+#include <cmath>
+
 namespace {
 
 constexpr double kDaysInYear = 365.25;
@@ -34,4 +36,13 @@ Totals::Totals(const State& state, const Catalogue& catalogue)
     totalValue = appraisal.totalValue(state);
     profit = totalValue - totalDeposit;
     annualRevenue = annualRevenueOf(state, profit);
+}
+
+std::optional<double> inReference(double amount, const Currency& currency, const Catalogue& catalogue, const Date& day)
+{
+    const Currency* reference = catalogue.getReferenceCurrency();
+    if (reference == nullptr || currency.getNbrQuotes() == 0)
+        return std::nullopt;
+    const double value = amount * currency.getRealQuote(day) / reference->getRealQuote(day);
+    return std::isfinite(value) ? std::optional(value) : std::nullopt;
 }

@@ -1,7 +1,10 @@
 #pragma once
 
+#include <optional>
+
 class Catalogue;
 class Currency;
+class Date;
 class State;
 
 /// The four totals shown for a state, in the reference currency; all 0 without one.
@@ -19,3 +22,7 @@ struct Totals {
     Totals() = default;
     Totals(const State& state, const Catalogue& catalogue);
 };
+
+/// `amount` of `currency` in the reference currency, at the rates of `day`; nothing where there is no such rate, or no
+/// reference currency.
+std::optional<double> inReference(double amount, const Currency& currency, const Catalogue& catalogue, const Date& day);

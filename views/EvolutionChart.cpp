@@ -7,7 +7,7 @@
 
 #include <cmath>
 
-EvolutionChart::EvolutionChart(BRect frame) : GraphView(frame, "grvEvolution")
+EvolutionChart::EvolutionChart(BRect frame, Medium medium) : GraphView(frame, "grvEvolution")
 {
     SetAccessibleName("Evolution of the total value");
     setXDateBased(true);
@@ -24,7 +24,8 @@ EvolutionChart::EvolutionChart(BRect frame) : GraphView(frame, "grvEvolution")
         addGraphElement(&l.line);
     }
     putIn_.setStepped(true); // what is put in on a day was not there the day before
-    addRangeButtons();
+    if (medium == Medium::kScreen)
+        addRangeButtons();
 }
 
 void EvolutionChart::showPoints(const std::vector<EvolutionPoint>& points, const std::string& symbol)

@@ -14,7 +14,10 @@ struct EvolutionPoint;
 /// what lies between the two is gained or lost. The read-out says how much.
 class EvolutionChart final : public GraphView {
 public:
-    explicit EvolutionChart(BRect frame);
+    enum class Medium { kScreen, kPaper };
+
+    /// On paper there is nothing to press.
+    explicit EvolutionChart(BRect frame, Medium medium = Medium::kScreen);
 
     /// Shows these days, which come by date, in the currency of that symbol.
     void showPoints(const std::vector<EvolutionPoint>& points, const std::string& symbol);

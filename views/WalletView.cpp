@@ -35,16 +35,6 @@ constexpr float kHoldingsTop = kAccountsEnd + kMargin;
 constexpr float kHoldingsEnd = kHoldingsTop + 210;
 constexpr float kChartTop = kHoldingsEnd + kMargin;
 
-/// "11 of 12 quotes are older than 21/11/2026"; empty when there is none to tell of.
-std::string coverageText(const QuoteCoverage& coverage, const char* what, const Date& day)
-{
-    const unsigned missing = coverage.older + coverage.unknown;
-    if (missing == 0)
-        return {};
-    return std::to_string(missing) + " of " + std::to_string(coverage.needed) + ' ' + what +
-           (missing == 1 ? " is " : " are ") + (coverage.unknown > 0 ? "not of " : "older than ") + dateText(day);
-}
-
 /// " 7.51 %", or in a few words why there is none.
 std::string returnText(const AnnualReturn& annual)
 {
@@ -267,14 +257,11 @@ void WalletView::showCoverage(const Date& day, const QuoteCoverage& quotes, cons
     // Where no quote is missing a rate may be: these are fetched from nowhere.
     const std::string ofQuotes = coverageText(quotes, "quotes", day);
     const std::string ofRates = coverageText(rates, "rates", day);
-    const char* what = ofQuotes.empty() ? "rates" : "quotes";
-    if (ofQuotes.empty() && ofRates.empty())
+    const std::string text = estimateText(quotes, rates, day);
+    if (text.empty())
         return hideCoverage();
     lastQuotedDay_ = ofQuotes.empty() ? rates.lastFullDay : quotes.lastFullDay;
     const bool isDay = !lastQuotedDay_.isUndefined();
-    const std::string text = "estimated: " + (ofQuotes.empty() ? ofRates : ofQuotes) + ", " +
-                             (isDay ? std::string("the last day with all ") + what + " is " + dateText(lastQuotedDay_)
-                                    : std::string("no day has all ") + what);
     coverage_->SetText(text.c_str());
     coverage_->SetToolTip((ofRates.empty() || ofQuotes.empty() ? "" : "Also, " + ofRates + ".").c_str());
     const float right = kRight - kBoxSide - (isDay ? 72 + kGap : 0);

@@ -10,10 +10,12 @@
 #include <QDir>
 #include <QFont>
 #include <QIcon>
+#include <QLoggingCategory>
 #include <QPalette>
 #include <QStyleFactory>
 
 #include <clocale>
+#include <langinfo.h>
 
 BApplication* be_app = nullptr;
 
@@ -50,6 +52,15 @@ QIcon iconOf(const QString& name)
 }
 
 } // namespace
+
+void BApplication::UseNoDisplay()
+{
+    qputenv("QT_QPA_PLATFORM", "offscreen");
+    QLoggingCategory::setFilterRules("default.warning=false"); // that there is no session, which is none's concern
+    // In a locale without UTF-8 a line on standard error would tell that another one is taken.
+    if (QByteArray(std::setlocale(LC_ALL, "") == nullptr ? "" : nl_langinfo(CODESET)) != "UTF-8")
+        qputenv("LC_ALL", "C.UTF-8");
+}
 
 BApplication::BApplication(const char* signature) : BLooper(signature), signature_(signature)
 {

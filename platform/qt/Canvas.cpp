@@ -80,3 +80,10 @@ void Canvas::drawWith(QPainter& painter, const std::function<void()>& draw)
     draw();
     painter_ = outer;
 }
+
+void Canvas::print(QPainter& painter, const std::function<void()>& draw)
+{
+    isPrinting_ = true;
+    drawWith(painter, draw);
+    isPrinting_ = false;
+}

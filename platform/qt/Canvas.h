@@ -35,6 +35,9 @@ public:
     void drawAll(const std::function<void()>& draw);
     /// Runs `draw` with every operation inside it going to `painter`.
     void drawWith(QPainter& painter, const std::function<void()>& draw);
+    /// The same for a painter on paper.
+    void print(QPainter& painter, const std::function<void()>& draw);
+    bool isPrinting() const { return isPrinting_; }
 
     /// The picture, of the view's present size. `*fresh` tells that it was just made and holds nothing yet.
     const QPixmap& picture(bool* fresh);
@@ -51,4 +54,5 @@ private:
     QPixmap picture_;
     QPainter* painter_ = nullptr; // while something is drawn as a whole
     bool stale_ = true;
+    bool isPrinting_ = false;
 };

@@ -197,10 +197,18 @@ void BView::FillArc(BPoint center, float xRadius, float yRadius, float startAngl
     });
 }
 
+bool BView::IsPrinting() const
+{
+    return canvas_->isPrinting();
+}
+
 void BView::DrawString(const char* text, BPoint where)
 {
     canvas_->paint([&](QPainter& painter) {
-        painter.setFont(state_.font.toQt());
+        QFont font = state_.font.toQt();
+        if (IsPrinting())
+            font.setHintingPreference(QFont::PreferNoHinting);
+        painter.setFont(font);
         painter.setPen(canvas_->color(B_SOLID_HIGH));
         painter.drawText(QPointF(where.x, where.y), QString::fromUtf8(text));
     });

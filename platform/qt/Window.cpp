@@ -61,6 +61,14 @@ void BWindow::AddChild(BView* view)
     root_->AddChild(view);
 }
 
+void BWindow::fitContent(const QSize& size)
+{
+    const auto width = static_cast<float>(size.width()), height = static_cast<float>(size.height());
+    frame_.right = frame_.left + width;
+    frame_.bottom = frame_.top + height;
+    root_->ResizeTo(width, height);
+}
+
 BView* BWindow::FindView(const char* name) const
 {
     return root_->FindView(name);

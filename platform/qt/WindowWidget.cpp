@@ -55,12 +55,13 @@ void WindowWidget::fitTo(QPoint place, QSize content, bool resizable)
     const int bar = style()->pixelMetric(QStyle::PM_ScrollBarExtent);
     // A scroll bar takes room itself: where the content is too high it needs more width, and the other way round.
     QSize size = content;
-    if (room.height() < size.height())
+    if (!resizable && room.height() < size.height())
         size.rwidth() += bar;
-    if (room.width() < size.width() && room.height() >= content.height() + bar)
+    if (!resizable && room.width() < size.width() && room.height() >= content.height() + bar)
         size.rheight() += bar;
     size = size.boundedTo(room.size());
     // From here on the window fits the screen. It is moved as far as needed for all of it to show.
+    isResizable_ = resizable;
     if (resizable)
         resize(size);
     else
@@ -87,4 +88,11 @@ void WindowWidget::closeEvent(QCloseEvent* event)
         event->accept();
     else
         event->ignore();
+}
+
+void WindowWidget::resizeEvent(QResizeEvent* event)
+{
+    QScrollArea::resizeEvent(event);
+    if (isResizable_)
+        window_.fitContent(event->size());
 }

@@ -14,7 +14,7 @@ public:
     explicit WindowWidget(BWindow& window);
 
     /// Gives the window the size `content` at `place`, or what of it fits on the screen, moved up and left until it
-    /// does.
+    /// does. One that is resizable takes its content along, which needs no scroll bars.
     void fitTo(QPoint place, QSize content, bool resizable);
     /// To be called before the window shows. It stays in front of `below`, which may be null.
     void makeModal(const QWidget* below);
@@ -24,7 +24,9 @@ public:
 
 protected:
     void closeEvent(QCloseEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
 
 private:
     BWindow& window_;
+    bool isResizable_ = false;
 };

@@ -170,20 +170,21 @@ TEST_F(ExportWindowTest, TheMenuOffersWhatThereIsAndEscapeLeavesIt)
                                                        "(Companies of a market...)", "(All quotes...)"));
         EXPECT_THAT(offered(kCurrencyPage),
                     ElementsAre("(Rates of a currency...)", "(All rates...)", "(Currencies...)"));
-        EXPECT_THAT(offered(kOperationPage), ElementsAre("(Operations shown...)", "(All operations...)"));
+        EXPECT_THAT(offered(kOperationPage),
+                    ElementsAre("(Operations shown...)", "(All operations...)", "-", "Report on paper..."));
         EXPECT_THAT(offered(kParameterPage), ElementsAre("Parameters..."));
     };
     expectNothing();
     EXPECT_THAT(offered(kPortoFolioPage),
                 ElementsAre("(Holdings at 21/11/2024...)", "(Accounts at 21/11/2024...)", "(Evolution...)", "-",
                             "(All tables into a folder...)", "(Journal for ledger and hledger...)",
-                            "(Journal for Beancount...)"));
+                            "(Journal for Beancount...)", "-", "Report on paper..."));
     loadSample();
     type("txtFilter", "USD");
     EXPECT_THAT(offered(kPortoFolioPage),
                 ElementsAre("Holdings shown at 21/11/2024...", "Holdings at 21/11/2024...", "Accounts at 21/11/2024...",
                             "(Evolution...)", "-", "All tables into a folder...", "Journal for ledger and hledger...",
-                            "Journal for Beancount..."));
+                            "Journal for Beancount...", "-", "Report on paper..."));
     enter("txtDate", "31/2/2024");
     EXPECT_THAT(offered(kPortoFolioPage), testing::Contains("(All tables into a folder...)"));
     EXPECT_THAT(offered(kOperationPage), testing::Contains("All operations..."));
@@ -271,4 +272,45 @@ TEST_F(ExportWindowTest, NothingIsReplacedUnaskedAndAFailureLeavesAllAsItWas)
     EXPECT_THAT(exportOver(place / "accounts.csv", "Accounts at 21/11/2024..."), HasSubstr("4 accounts"));
     press("txtNotice");
     EXPECT_EQ(notice(), "");
+}
+
+TEST_F(ExportWindowTest, TheReportOfAYearIsWhatTheCommandLineMakes)
+{
+    loadSample();
+    show(kOperationPage);
+    click("cbxPrevision"); // which is no part of it
+    const auto press = [](const char* name) {
+        QTest::mouseClick(QApplication::activeModalWidget()->findChild<QWidget*>(name), Qt::LeftButton);
+        settle();
+    };
+    const TemporaryFolder place("pelorin-gui-report");
+    const auto save = [&](const std::string& path) {
+        DialogAnswers::current().panel = [&](const BFilePanel& panel) {
+            EXPECT_EQ(panel.SaveText(), "Sample 2024-11-21.pdf");
+            return path;
+        };
+        press("btnSavePdf");
+        return QApplication::activeModalWidget()->findChild<QWidget*>("txtReport")->accessibleName().toStdString();
+    };
+    QTest::keyClick(&window().widget(), Qt::Key_P, Qt::ControlModifier);
+    settle();
+    auto* dialog = QApplication::activeModalWidget();
+    ASSERT_NE(dialog, nullptr);
+    QTest::keyClicks(dialog->findChild<QWidget*>("reportYear"), "2023");
+    QTest::keyClicks(dialog->findChild<QWidget*>("reportPaper"), "L");
+    settle();
+    const std::string market = contentOf(marketFile());
+    EXPECT_EQ(save(marketFile()), "Not written: Sample is a file that is open here");
+    EXPECT_TRUE(contentOf(marketFile()) == market);
+    EXPECT_EQ(save(place / "window.pdf"), "Report written to window.pdf");
+    press("btnCloseReport");
+    EXPECT_EQ(QApplication::activeModalWidget(), nullptr);
+    EXPECT_EQ(notice(), "Report written to window.pdf");
+
+    const std::string files = "'" + marketFile() + "' '" + walletFile() + "'";
+    ASSERT_EQ(
+        ToolRun(PELORIN_REPORT, files + " --date 21/11/2024 --year 2023 --paper letter --out tool.pdf", place).err, "");
+    const std::string text = ToolRun("pdftotext", "-layout tool.pdf -", place).out;
+    EXPECT_THAT(text, HasSubstr("Operations of 2023"));
+    EXPECT_EQ(ToolRun("pdftotext", "-layout window.pdf -", place).out, text);
 }

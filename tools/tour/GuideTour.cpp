@@ -1,5 +1,6 @@
 #include "tools/tour/GuideTour.h"
 
+#include "app/ReportAssistant.h"
 #include "tools/tour/TourHand.h"
 
 namespace {
@@ -123,6 +124,13 @@ void showExport(TourHand& hand)
     hand.closeMenu();
 }
 
+void showReport(TourHand& hand)
+{
+    hand.command(ReportAssistant::kAsked);
+    hand.pictureInFront("guide-report");
+    hand.pressInFront("btnCloseReport");
+}
+
 /// Simulates the sale of a holding with profit. The portfolio is of no use afterwards.
 void showPrevisions(TourHand& hand)
 {
@@ -204,6 +212,7 @@ void tourGuide(TourHand& hand)
     addDollars(hand);
     showImport(hand);
     showExport(hand);
+    showReport(hand);
     showPrevisions(hand);
     split(hand);
     showMistakes(hand);

@@ -6,6 +6,8 @@
 #include "platform/Menu.h"
 #include "platform/MenuField.h"
 #include "platform/MenuItem.h"
+#include "platform/Message.h"
+#include "platform/Messenger.h"
 #include "platform/Screenshot.h"
 #include "platform/TabView.h"
 #include "platform/TextControl.h"
@@ -92,6 +94,13 @@ void TourHand::select(const char* list, int32 first, int32 last)
     if (rows.CountItems() <= last)
         throw std::runtime_error(std::string(list) + ": has no row " + std::to_string(last));
     rows.Select(first, last, false);
+    handle_pending_messages();
+}
+
+void TourHand::command(uint32 code)
+{
+    const BMessage message(code);
+    BMessenger(&window_).SendMessage(&message);
     handle_pending_messages();
 }
 

@@ -31,6 +31,8 @@ public:
     /// Selects the rows of a list from `first` to `last`.
     void select(const char* list, int32 first, int32 last);
     void select(const char* list, int32 row) { select(list, row, row); }
+    /// Gives a command that has a key and no button.
+    void command(uint32 code);
     /// Leaves the menu that a button has opened.
     void closeMenu();
     /// Sends the notice away that is shown.
