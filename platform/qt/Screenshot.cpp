@@ -5,14 +5,22 @@
 #include "platform/qt/WindowWidget.h"
 
 #include <QApplication>
+#include <QElapsedTimer>
 #include <QPainter>
 #include <QPixmap>
 #include <QSaveFile>
 #include <QScreen>
+#include <QWindow>
 
 status_t save_screenshot(const BWindow& window, BRect part, const char* path)
 {
     WindowWidget& shown = window.widget();
+    // One that was just shown comes to the screen a moment later.
+    constexpr qint64 kPatience = 5000; // milliseconds
+    QElapsedTimer waiting;
+    for (waiting.start(); !shown.windowHandle()->isExposed() && waiting.elapsed() < kPatience;)
+        QApplication::processEvents();
+    shown.repaint();
     const QRect place = QRectF(part.left, part.top, part.Width(), part.Height()).toRect();
     QPixmap picture = shown.screen()->grabWindow(shown.winId(), place.x(), place.y(), place.width(), place.height());
     // It is a window of its own, which not every screen has on its picture of another one.
