@@ -3,8 +3,10 @@
 #include "app/DataFiles.h"
 #include "app/PLWindow.h"
 #include "foundation/Today.h"
+#include "market/MarketDiagnosis.h"
 #include "platform/TabView.h"
 #include "sample/SampleFiles.h"
+#include "storage/InputFile.h"
 
 #include <filesystem>
 #include <stdexcept>
@@ -16,8 +18,22 @@ namespace fs = std::filesystem;
 
 constexpr const char* kNotice = "first steps";
 
-/// The file in `folder` that was written last, leaving out hidden ones; empty when there is none.
-std::string lastFileIn(const fs::path& folder)
+/// Whether the file begins like one of that kind.
+bool isOfKind(const fs::path& path, FileKind kind)
+{
+    try {
+        const InputFile file(path);
+        if (kind == FileKind::kMarkets)
+            return looksLikeMarketFile(file.stream());
+        Date head; // that of the save
+        return head.rd(file.stream()) == 0 && head.isValid();
+    } catch (const std::runtime_error&) {
+        return false; // it cannot be opened
+    }
+}
+
+/// The file of that kind in `folder` that was written last, leaving out hidden ones; empty when there is none.
+std::string lastFileIn(const fs::path& folder, FileKind kind)
 {
     std::error_code error; // of a folder that is not there, or a file that is just going
     std::string last;
@@ -28,7 +44,7 @@ std::string lastFileIn(const fs::path& folder)
         const fs::file_time_type written = entry->last_write_time(isGone);
         if (isGone || !entry->is_regular_file(isGone) || entry->path().filename().string().starts_with('.'))
             continue;
-        if (last.empty() || written > time) {
+        if ((last.empty() || written > time) && isOfKind(entry->path(), kind)) {
             last = entry->path();
             time = written;
         }
@@ -49,7 +65,13 @@ FirstSteps::Files FirstSteps::lastFiles() const
     // The whole machine's "/Companies" would be meant otherwise.
     if (folder_.path().empty())
         return {};
-    return {lastFileIn(folder_.path() + DataFolder::kCompanies), lastFileIn(folder_.path() + DataFolder::kPortoFolios)};
+    Files last{lastFileIn(folder_.path() + DataFolder::kCompanies, FileKind::kMarkets),
+               lastFileIn(folder_.path() + DataFolder::kPortoFolios, FileKind::kWallet)};
+    // The sample's portfolio fits no market file of one's own.
+    if (fs::path(last.wallet).filename() == SampleFiles::kName &&
+        fs::path(last.markets).filename() != SampleFiles::kName)
+        last.wallet.clear();
+    return last;
 }
 
 bool FirstSteps::isWindowEmpty() const

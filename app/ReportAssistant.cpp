@@ -54,6 +54,7 @@ void ReportAssistant::open()
     auto* dialog = new ReportWindow(middle, {reported, &reported->report}, name + ' ' + tableDate(state->getDate()),
                                     folder_, BMessenger(&window_)); // owns itself
     dialog_ = BMessenger(dialog);
+    window_.guide().addKey(*dialog, "report");
     dialog->Show();
 }
 

@@ -8,6 +8,7 @@
 #include "storage/DataFolder.h"
 #include "storage/Folders.h"
 
+#include <chrono>
 #include <stdexcept>
 #include <string>
 
@@ -27,6 +28,9 @@ bool writeUnlessThere(const std::filesystem::path& path, const Object& object, c
     if (object.wrt(file.stream(), stamp) != 0)
         file.fail("cannot be written");
     file.commit();
+    // Who looks for what was saved last does not mean these.
+    constexpr std::chrono::years kLongAgo(20);
+    std::filesystem::last_write_time(path, std::filesystem::file_time_type::clock::now() - kLongAgo, error);
     return true;
 }
 
@@ -40,8 +44,7 @@ SampleFiles SampleFiles::make(const std::filesystem::path& folder, const Date& l
     fillSampleMarket(catalogue, days);
     fillSamplePortfolio(wallet, catalogue, days);
 
-    SampleFiles files{folder / (DataFolder::kCompanies + 1) / "Sample",
-                      folder / (DataFolder::kPortoFolios + 1) / "Sample"};
+    SampleFiles files{folder / (DataFolder::kCompanies + 1) / kName, folder / (DataFolder::kPortoFolios + 1) / kName};
     files.areMarketsNew = writeUnlessThere(files.markets, catalogue, last);
     files.isPortfolioNew = writeUnlessThere(files.portfolio, wallet, last);
     return files;

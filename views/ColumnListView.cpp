@@ -209,6 +209,11 @@ void ColumnListView::ScrolledSideways()
 
 std::string ColumnListView::ToolTipAt(BPoint where, int32 index) const
 {
+    // With its first columns out of sight nothing else tells whose row it is.
+    if (columns_.size() > 1 && LeftEdge() >= columns_[0].shownWidth() + columns_[1].shownWidth()) {
+        const auto& row = static_cast<const ColumnItem&>(*ItemAt(index));
+        return inOneLine(columns_[0].shownText(row.cell(0)) + "  " + columns_[1].shownText(row.cell(1)));
+    }
     float left = -LeftEdge();
     for (std::size_t i = 0; i < columns_.size(); ++i) {
         const float right = left + columns_[i].shownWidth();

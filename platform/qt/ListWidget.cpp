@@ -139,6 +139,11 @@ void ListWidget::keyPressEvent(QKeyEvent* event)
     // The rows that are selected, as a table that a spreadsheet takes.
     if (event->matches(QKeySequence::Copy))
         return list_.CopySelected();
+    // In a list of rows these two have nothing else to do.
+    const bool isLeft = event->key() == Qt::Key_Left;
+    if ((isLeft || event->key() == Qt::Key_Right) && horizontalScrollBar()->maximum() > 0)
+        return horizontalScrollBar()->triggerAction(isLeft ? QAbstractSlider::SliderSingleStepSub
+                                                           : QAbstractSlider::SliderSingleStepAdd);
     const char key = keyOf(*event);
     if (key != '\0')
         list_.KeyDown(&key, 1);
@@ -170,6 +175,14 @@ bool ListWidget::viewportEvent(QEvent* event)
     QToolTip::showText(help.globalPos(), text.empty() ? QString() : "<p style='white-space:pre'>" + shown + "</p>",
                        viewport());
     return true;
+}
+
+void ListWidget::scrollContentsBy(int dx, int dy)
+{
+    QListView::scrollContentsBy(dx, dy);
+    // What is painted is moved, and the frame of the keyboard with it.
+    if (hasFocus())
+        viewport()->update();
 }
 
 void ListWidget::paintEmptyText()
