@@ -69,6 +69,8 @@ public:
     void addPicture(const std::string& title, std::unique_ptr<BView> view);
 
     int CountPages() const;
+    /// The page on which the last part begins, counted from 0; the first one without parts.
+    int LastPart() const { return lastPart_; }
     /// The whole document as the bytes of a PDF file, with its fonts.
     std::string pdf() const;
 
@@ -78,4 +80,5 @@ public:
 private:
     std::string name_;
     std::unique_ptr<PaperPages> pages_;
+    int lastPart_ = 0;
 };

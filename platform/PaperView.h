@@ -15,6 +15,8 @@ public:
 
     /// Shows `document` instead of what it has shown, at the same place.
     void SetDocument(std::unique_ptr<PaperDocument> document);
+    /// Brings that page, counted from 0, to the upper edge.
+    void ShowPage(int page);
     /// Null before there is one.
     const PaperDocument* Document() const;
 

@@ -3,7 +3,10 @@
 #include "foundation/DateText.h"
 #include "foundation/NumberText.h"
 #include "market/Catalogue.h"
+#include "market/Company.h"
 #include "market/Currency.h"
+#include "market/Market.h"
+#include "portfolio/Share.h"
 #include "report/ReportCells.h"
 #include "valuation/State.h"
 #include "valuation/WalletFigures.h"
@@ -14,8 +17,11 @@
 namespace {
 
 constexpr auto kRight = B_ALIGN_RIGHT;
-constexpr std::size_t kRest = 6; // the column of the unrealised gains
+constexpr std::size_t kRest = 6;        // the column of the unrealised gains
+constexpr std::size_t kInReference = 3; // the value in the reference currency, from behind
 constexpr const char* kEstimate = "~ ";
+constexpr const char* kEstimateNote =
+    "~ marks an estimate: the straight line from the first quote, or rate, to the last, made longer.";
 
 std::string companyText(const ShareState& state)
 {
@@ -76,6 +82,20 @@ bool isEstimate(const ShareState& state, const HoldingFigures& sums)
     return sums.own.unrealisedGain && state.quoteBasis().isEstimate;
 }
 
+void mark(PaperCell& cell, bool isEstimated)
+{
+    if (isEstimated && !cell.text.empty())
+        cell.text.insert(0, kEstimate);
+}
+
+/// That of the holding's market; null without one.
+const Currency* currencyOf(const ShareState& state)
+{
+    const Company* company = state.share() != nullptr ? state.share()->company() : nullptr;
+    const Market* market = company != nullptr ? company->market() : nullptr;
+    return market != nullptr ? market->currency() : nullptr;
+}
+
 } // namespace
 
 HoldingTables::HoldingTables(const WalletFigures& figures) : figures_(figures)
@@ -84,13 +104,21 @@ HoldingTables::HoldingTables(const WalletFigures& figures) : figures_(figures)
         reference_ = textOf(reference->getRepresentation());
 }
 
+/// A single rate holds for ever, and is none.
+bool HoldingTables::isRateEstimate(const Currency* currency) const
+{
+    if (currency == nullptr || currency == figures_.catalogue().getReferenceCurrency() || currency->getNbrQuotes() < 2)
+        return false;
+    return currency->getLastQuoteUpTo(figures_.day()).isUndefined() || currency->getLastQuote() < figures_.day();
+}
+
 PaperTable HoldingTables::accounts() const
 {
     PaperTable table{"Accounts", {{"Account"}, {"Balance", kRight}, {"Currency"}}, {}};
     if (!reference_.empty())
         table.columns.push_back({"In " + reference_, kRight});
     double sum = 0;
-    bool isWhole = true;
+    bool isWhole = true, hasEstimate = false;
     for (AccountState* state : figures_.state().accountStates()) {
         const AccountStateItem item(state);
         table.rows.push_back({{cellOf(item, "Account"), cellOf(item, "Balance"), cellOf(item, "Currency")}});
@@ -102,9 +130,15 @@ PaperTable HoldingTables::accounts() const
         sum += value.value_or(0);
         if (!reference_.empty())
             table.rows.back().cells.push_back(value ? amountCell(*value) : PaperCell());
+        mark(table.rows.back().cells.back(), value && isRateEstimate(currency));
+        hasEstimate = hasEstimate || (value && isRateEstimate(currency));
     }
-    if (!reference_.empty() && isWhole && table.rows.size() > 1)
+    if (!reference_.empty() && isWhole && table.rows.size() > 1) {
         table.rows.push_back({{textCell("Together"), {}, {}, amountCell(sum)}, true});
+        mark(table.rows.back().cells.back(), hasEstimate);
+    }
+    if (hasEstimate)
+        table.note = kEstimateNote;
     return table;
 }
 
@@ -125,31 +159,37 @@ PaperTable HoldingTables::holdings() const
     table.columns.push_back({"Gain", kRight});
     const double rate = totals.isKnown ? totals.reference->getRealQuote(figures_.day()) : 0;
     double sum = 0;
-    bool isOlder = false, hasEstimate = false;
+    bool isOlder = false, hasEstimate = false, isWhole = true;
     for (ShareState* state : figures_.state().shareStates()) {
         if (!state->isHeld())
             continue;
         ShareStateItem item(state);
         item.showIn(reference_, rate, totals.totalValue);
         sum += item.value().value_or(0);
+        isWhole = isWhole && item.value();
+        const bool isAtEstimate = item.basis().isEstimate || isRateEstimate(currencyOf(*state));
         isOlder = isOlder || (item.basis().isKnown && item.basis().day != figures_.day());
-        hasEstimate = hasEstimate || item.basis().isEstimate;
+        hasEstimate = hasEstimate || isAtEstimate;
         PaperRow row;
         for (const PaperColumn& column : table.columns)
             row.cells.push_back(column.title.starts_with("In ") ? cellOf(item, "In ???") : cellOf(item, column.title));
+        if (!reference_.empty())
+            mark(row.cells[row.cells.size() - kInReference], item.value() && isAtEstimate);
         table.rows.push_back(row);
     }
-    if (!reference_.empty() && table.rows.size() > 1) {
+    if (!reference_.empty() && isWhole && table.rows.size() > 1) {
         PaperRow together{std::vector<PaperCell>(table.columns.size()), true};
         together.cells.front() = textCell("Together");
-        together.cells[table.columns.size() - 3] = amountCell(sum);
+        PaperCell& whole = together.cells[together.cells.size() - kInReference];
+        whole = amountCell(sum);
+        mark(whole, hasEstimate);
         table.rows.push_back(together);
     }
     if (isOlder)
         table.note =
             "Quote of: the day of the quote that counts, where there is none of " + dateText(figures_.day()) + ".";
     if (hasEstimate)
-        table.note += " ~ marks an estimate: the straight line from the first quote to the last, made longer.";
+        table.note += (isOlder ? " " : "") + std::string(kEstimateNote);
     return table;
 }
 
@@ -157,7 +197,8 @@ PaperTable HoldingTables::gains(const std::string& title, const std::vector<Hold
 {
     PaperTable table{title, gainColumns(hasRest), {}};
     GainSum together;
-    std::size_t holdings = 0, estimates = 0;
+    std::size_t holdings = 0;
+    bool hasEstimate = false;
     auto own = sums.begin();
     for (const ShareState* state : figures_.state().shareStates()) {
         const HoldingFigures& figures = *own++;
@@ -168,13 +209,14 @@ PaperTable HoldingTables::gains(const std::string& title, const std::vector<Hold
         addGains(*state, figures, hasRest, &table);
         together.add(figures.inReference);
         ++holdings;
-        estimates += hasRest && isEstimate(*state, figures) ? 1 : 0;
+        hasEstimate = hasEstimate || isEstimate(*state, figures) ||
+                      (figures.own.unrealisedGain && isRateEstimate(currencyOf(*state)));
     }
     if (holdings > 1 && together.isWhole) {
         table.rows.push_back(gainRow("Together", together.sums, reference_, hasRest));
         table.rows.back().isSum = true;
-        if (estimates > 0)
-            table.rows.back().cells[kRest].text.insert(0, kEstimate);
+        if (hasRest)
+            mark(table.rows.back().cells[kRest], hasEstimate);
     }
     if (holdings > 0)
         table.note = gainNote(reference_);
@@ -193,8 +235,10 @@ void HoldingTables::addGains(const ShareState& state, const HoldingFigures& sums
                 cell.color = look::kFaint;
     }
     for (PaperRow& row : rows) {
-        if (hasRest && isEstimate(state, sums))
-            row.cells[kRest].text.insert(0, kEstimate);
+        // The second row, if there is one, is in the reference currency.
+        const bool isAtRate = &row != &rows.front() && isRateEstimate(currencyOf(state));
+        if (hasRest)
+            mark(row.cells[kRest], isEstimate(state, sums) || isAtRate);
         table->rows.push_back(std::move(row));
     }
 }

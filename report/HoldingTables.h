@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+class Currency;
 class ShareState;
 class WalletFigures;
 
@@ -23,6 +24,7 @@ public:
     PaperTable gains(const std::string& title, const std::vector<HoldingFigures>& sums, bool hasRest) const;
 
 private:
+    bool isRateEstimate(const Currency* currency) const;
     void addGains(const ShareState& state, const HoldingFigures& sums, bool hasRest, PaperTable* table) const;
 
     const WalletFigures& figures_;

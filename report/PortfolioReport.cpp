@@ -18,9 +18,9 @@
 
 namespace {
 
-std::string returnText(const AnnualReturn& annual)
+std::string returnText(const AnnualReturn& annual, const std::string& mark)
 {
-    return annual.isKnown() ? percentText(annual.rate) : annual.reason();
+    return annual.isKnown() ? mark + percentText(annual.rate) : annual.reason();
 }
 
 bool hasOperations(const State& state)
@@ -49,7 +49,10 @@ std::unique_ptr<PaperDocument> PortfolioReport::make(std::optional<int> year, Pa
     paper->addTable(tables.accounts());
     paper->addTable(tables.holdings());
     const std::string since = isLater() ? "after " + dateText(figures_.from()) : "since the first operation";
-    paper->addTable(tables.gains("Gains " + since, figures_.holdings(), true));
+    PaperTable gains = tables.gains("Gains " + since, figures_.holdings(), true);
+    if (isLater())
+        gains.note += " What is not realised is the whole gain since the purchase.";
+    paper->addTable(gains);
     addYear(*paper, year);
     return paper;
 }
@@ -62,7 +65,14 @@ bool PortfolioReport::isLater() const
 std::string PortfolioReport::estimates() const
 {
     const State& state = figures_.state();
-    return estimateText(quoteCoverage(state), rateCoverage(state, figures_.catalogue()), figures_.day());
+    const Date& day = figures_.day();
+    const QuoteCoverage quotes = quoteCoverage(state), rates = rateCoverage(state, figures_.catalogue());
+    std::string text = estimateText(quotes, rates, day);
+    // Where quotes are missing the text is of these alone.
+    if (const std::string ofRates = coverageText(rates, "rates", day);
+        !ofRates.empty() && !coverageText(quotes, "quotes", day).empty())
+        text += "; " + ofRates;
+    return text;
 }
 
 void PortfolioReport::addTotals(PaperDocument& paper) const
@@ -86,10 +96,10 @@ void PortfolioReport::addTotals(PaperDocument& paper) const
                                  {"Profit", amount(totals.profit, mark)},
                                  {"First operation", {first}}};
     const std::string since = isLater() ? " since " + dateText(figures_.from()) : "";
-    if (returns.moneyWeighted.kind != AnnualReturn::Kind::kNoDay)
-        facts.insert(facts.end(), {{"Money-weighted return" + since, {returnText(returns.moneyWeighted)}},
-                                   {"Time-weighted return" + since, {returnText(returns.timeWeighted)}},
-                                   {"Annual revenue (simple)", {percentText(totals.annualRevenue)}}});
+    if (hasOperations(state))
+        facts.insert(facts.end(), {{"Money-weighted return" + since, {returnText(returns.moneyWeighted, mark)}},
+                                   {"Time-weighted return" + since, {returnText(returns.timeWeighted, mark)}},
+                                   {"Annual revenue (simple)", {mark + percentText(totals.annualRevenue)}}});
     paper.addFacts(facts);
     if (std::string text = estimates(); !text.empty())
         paper.addText("~ " + text + '.');

@@ -129,6 +129,8 @@ void ReportWindow::MessageReceived(BMessage* message)
     switch (message->what) {
     case kChanged:
         show();
+        // The first pages are the same whatever year was chosen.
+        paper_->ShowPage(document().LastPart());
         break;
     case kSavePressed:
         savePanel_.SetSaveText((fileName_ + ".pdf").c_str(), "pdf");

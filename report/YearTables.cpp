@@ -2,6 +2,7 @@
 
 #include "foundation/NumberText.h"
 #include "market/Catalogue.h"
+#include "market/Company.h"
 #include "market/Currency.h"
 #include "portfolio/CashMove.h"
 #include "portfolio/OperationKind.h"
@@ -65,7 +66,8 @@ double costOf(const Operation& operation, double move)
 
 } // namespace
 
-YearTables::YearTables(const WalletFigures& figures, std::optional<int> year) : figures_(figures), year_(year)
+YearTables::YearTables(const WalletFigures& figures, std::optional<int> year)
+    : figures_(figures), year_(year), dividends_(figures.wallet(), figures.catalogue())
 {
     last_ = figures.day();
     if (year) {
@@ -149,10 +151,13 @@ void YearTables::addOperation(const Operation& operation, PaperTable* table) con
     const Account& account = *operation.account();
     const double move = cashMove(operation, account);
     const auto symbolOf = [](const Account& of) { return textCell(textOf(of.getCurrencyRepresentation())); };
-    table->rows.push_back(
-        {{cellOf(item, "Date"), typeOf(item, move), textCell(textOf(account.getName())), cellOf(item, "What"),
-          cellOf(item, "Quantity"), isTrade ? cellOf(item, "Quote/Amount") : PaperCell(),
-          amountOrNothing(costOf(operation, move)), amountCell(move), symbolOf(account)}});
+    const Company* payer = dividends_.payerOf(operation);
+    const PaperCell what = payer != nullptr
+                               ? textCell(textOf(payer->getAbbreviation()) + "  " + textOf(payer->getName()))
+                               : cellOf(item, "What");
+    table->rows.push_back({{cellOf(item, "Date"), typeOf(item, move), textCell(textOf(account.getName())), what,
+                            cellOf(item, "Quantity"), isTrade ? cellOf(item, "Quote/Amount") : PaperCell(),
+                            amountOrNothing(costOf(operation, move)), amountCell(move), symbolOf(account)}});
     const auto* transfer = dynamic_cast<const TransferAccountOperation*>(&operation);
     if (transfer == nullptr || transfer->recipient() == nullptr || transfer->recipient() == &account)
         return;

@@ -2,6 +2,7 @@
 
 #include "foundation/Date.h"
 #include "platform/PaperDocument.h"
+#include "valuation/Dividends.h"
 
 #include <optional>
 #include <string>
@@ -36,5 +37,6 @@ private:
     std::optional<int> year_;
     Date before_;
     Date last_;
+    Dividends dividends_;
     std::vector<const Operation*> operations_;
 };

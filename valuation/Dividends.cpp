@@ -19,7 +19,7 @@ namespace {
 /// Incomes of a day and a text, and the companies with such a note.
 struct Alike {
     Dividends::Payment payment;
-    std::size_t incomes = 0;
+    std::vector<const Operation*> incomes = {};
     std::vector<const Company*> payers = {}; // one for each note
 };
 
@@ -38,7 +38,8 @@ void takeIncomes(const Account& account, ByText* alike)
         if (kindOf(*operation) != OperationKind::kIncome)
             continue;
         const Dividends::Payment payment{operation->getDate(), cashMove(*operation, account), account.currency()};
-        ++alike->try_emplace(keyOf(payment.date, moveText(*operation)), Alike{payment}).first->second.incomes;
+        const auto entry = alike->try_emplace(keyOf(payment.date, moveText(*operation)), Alike{payment}).first;
+        entry->second.incomes.push_back(operation);
     }
 }
 
@@ -66,10 +67,20 @@ Dividends::Dividends(const Wallet& wallet, const Catalogue& catalogue)
     for (const Market* market : catalogue.getMarkets())
         for (const Company* company : market->companies())
             takeNotes(*company, &alike);
-    for (const auto& [key, found] : alike)
-        if (found.payers.size() <= found.incomes)
-            for (const Company* payer : found.payers)
-                payments_[payer].push_back(found.payment);
+    for (const auto& [key, found] : alike) {
+        if (found.payers.size() > found.incomes.size())
+            continue;
+        for (const Company* payer : found.payers)
+            payments_[payer].push_back(found.payment);
+        if (found.payers.size() == 1 && found.incomes.size() == 1)
+            payers_.emplace(found.incomes.front(), found.payers.front());
+    }
+}
+
+const Company* Dividends::payerOf(const Operation& income) const
+{
+    const auto found = payers_.find(&income);
+    return found != payers_.end() ? found->second : nullptr;
 }
 
 const std::vector<Dividends::Payment>& Dividends::of(const Company& company) const

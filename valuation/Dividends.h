@@ -8,6 +8,7 @@
 class Catalogue;
 class Company;
 class Currency;
+class Operation;
 class Wallet;
 
 /// The income of a wallet by the company that paid it.
@@ -27,9 +28,12 @@ public:
 
     Dividends(const Wallet& wallet, const Catalogue& catalogue);
 
+    /// Who has paid that income; null where no note tells, or more than one could be meant.
+    const Company* payerOf(const Operation& income) const;
     /// Not in the order of the days.
     const std::vector<Payment>& of(const Company& company) const;
 
 private:
     std::unordered_map<const Company*, std::vector<Payment>> payments_;
+    std::unordered_map<const Operation*, const Company*> payers_;
 };

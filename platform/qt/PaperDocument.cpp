@@ -75,6 +75,7 @@ void PaperDocument::addPart(const std::string& title, const std::string& subtitl
 {
     if (!pages_->isAtTop())
         pages_->beginPage();
+    lastPart_ = pages_->count() - 1;
     addWrapped(*pages_, title, kPartType);
     addWrapped(*pages_, subtitle, kSubtitleType);
 }

@@ -144,11 +144,28 @@ qreal PaperTableLayout::headHeight() const
 qreal PaperTableLayout::heightFrom(std::size_t row) const
 {
     qreal height = rows_[row].height;
-    for (++row; row < rows_.size() && (rows_[row].shown->isSum || rows_[row].shown->goesOn); ++row)
+    const std::size_t next = nextOf(row);
+    while (++row < next)
         height += rows_[row].height;
-    if (row == rows_.size() && !note_.isEmpty())
+    if (next == rows_.size() && !note_.isEmpty())
         height += kBelow + static_cast<qreal>(note_.size()) * noteType().lineHeight();
     return height;
+}
+
+/// The row behind this one and those that stay on its page.
+std::size_t PaperTableLayout::nextOf(std::size_t row) const
+{
+    for (++row; row < rows_.size() && isBound(row);)
+        ++row;
+    return row;
+}
+
+/// What must have room where a row is laid: it, and the last one when that comes next, so that no page has that alone.
+qreal PaperTableLayout::neededFor(std::size_t row) const
+{
+    const std::size_t next = nextOf(row);
+    const bool isLastButOne = next < rows_.size() && nextOf(next) == rows_.size();
+    return heightFrom(row) + (isLastButOne ? heightFrom(next) : 0);
 }
 
 void PaperTableLayout::lay()
@@ -162,8 +179,8 @@ void PaperTableLayout::lay()
         pages_.moveDown(kAbove);
     addHead(false);
     for (std::size_t i = 0; i < rows_.size(); ++i) {
-        const bool isBound = i > 0 && (rows_[i].shown->isSum || rows_[i].shown->goesOn); // and so has its room
-        if (!isBound && i > 0 && heightFrom(i) > pages_.room()) {
+        // One that is bound to the row above it has its room.
+        if (i > 0 && !isBound(i) && neededFor(i) > pages_.room()) {
             pages_.beginPage();
             addHead(true);
         }
@@ -224,6 +241,6 @@ void PaperTableLayout::addRow(std::size_t row)
     addCells(rows_[row], type(shown.isSum));
     pages_.moveDown(rows_[row].height);
     const bool isLast = row + 1 == rows_.size();
-    if (isLast || !(table_.rows[row + 1].isSum || table_.rows[row + 1].goesOn))
+    if (isLast || !isBound(row + 1))
         pages_.addRule(area.left(), area.right(), pages_.y(), isLast ? 0.6 : 0.3, isLast ? kHeadRule : kRowRule);
 }

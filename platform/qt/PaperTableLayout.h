@@ -38,7 +38,10 @@ private:
     Row rowOf(const std::vector<QString>& cells, const PaperPages::Type& type) const;
     void makeRows();
     qreal headHeight() const;
+    bool isBound(std::size_t row) const { return rows_[row].shown->isSum || rows_[row].shown->goesOn; }
+    std::size_t nextOf(std::size_t row) const;
     qreal heightFrom(std::size_t row) const;
+    qreal neededFor(std::size_t row) const;
     void addHead(bool isAgain);
     void addCells(const Row& row, const PaperPages::Type& type);
     void addRow(std::size_t row);

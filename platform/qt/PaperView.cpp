@@ -10,6 +10,7 @@
 #include <QPrinter>
 #include <QPrinterInfo>
 #include <QScrollArea>
+#include <QScrollBar>
 
 #include <algorithm>
 
@@ -29,16 +30,17 @@ public:
         const QSizeF size = document->pages().size().size(QPageSize::Point);
         scale_ = std::max(1, width - 2 * kGap) / size.width();
         page_ = (size * scale_).toSize();
-        resize(width, document->CountPages() * (page_.height() + kGap) + kGap);
+        resize(width, topOf(document->CountPages()));
         update();
     }
+    int topOf(int page) const { return kGap + page * (page_.height() + kGap); }
 
 protected:
     void paintEvent(QPaintEvent* event) override
     {
         QPainter painter(this);
         for (int page = 0; document != nullptr && page < document->CountPages(); ++page) {
-            const QRect place(QPoint(kGap, kGap + page * (page_.height() + kGap)), page_);
+            const QRect place(QPoint(kGap, topOf(page)), page_);
             if (!place.adjusted(-1, -1, 1, 1).intersects(event->rect()))
                 continue;
             painter.fillRect(place.adjusted(-1, -1, 1, 1), QColor(150, 150, 150));
@@ -119,6 +121,12 @@ void PaperView::SetDocument(std::unique_ptr<PaperDocument> document)
     desk.sheets().document = std::move(document);
     desk.setAccessibleDescription(QString("%1 pages").arg(Document()->CountPages()));
     desk.fit();
+}
+
+void PaperView::ShowPage(int page)
+{
+    const Desk& desk = deskOf(*this);
+    desk.verticalScrollBar()->setValue(desk.sheets().topOf(page) - kGap);
 }
 
 const PaperDocument* PaperView::Document() const

@@ -71,10 +71,20 @@ std::optional<int> yearOf(const Arguments& arguments, const PortfolioReport& rep
     return years.empty() ? std::nullopt : std::optional(years.front());
 }
 
+/// What is read is never what is replaced, by whichever name or link.
+void checkIsNotRead(const std::string& out, const std::string& input)
+{
+    std::error_code isMissing;
+    if (std::filesystem::equivalent(out, input, isMissing))
+        throw std::runtime_error(out + ": is read here, and is left as it is");
+}
+
 void run(const Arguments& arguments)
 {
     const auto existing = arguments.force ? AtomicFile::Existing::kReplace : AtomicFile::Existing::kKeep;
     AtomicFile::check(arguments.out, existing);
+    checkIsNotRead(arguments.out, arguments.market);
+    checkIsNotRead(arguments.out, arguments.portfolio);
     Valuation valuation(arguments.market, arguments.portfolio);
     const WalletFigures figures(valuation.wallet(), valuation.catalogue(), arguments.date, arguments.from);
     const std::string name =
