@@ -1,3 +1,4 @@
+#include "market/NoteCompanyEvent.h"
 #include "tests/support/Bytes.h"
 #include "tests/support/SmallPortfolio.h"
 #include "tests/support/ToolRun.h"
@@ -64,7 +65,8 @@ TEST_F(ReportTest, AYearIsOnPaperWithItsSumsAndGains)
     transfer(cash_, york_, 4, 20)->setToCurrencyQuote(2);
     for (int day = 5; day < 100; ++day)
         move(cash_, day, day % 2 == 0 ? 3.5F : -1);
-    deposit(cash_, 400, 1); // of the year behind
+    new NoteCompanyEvent(alpha, Date(9, 1, 1999), "Dividend", "3.50 EUR to Cash"); // tells who has paid
+    deposit(cash_, 400, 1);                                                        // of the year behind
     deposit(cash_, 800, 2);
 
     const std::string text = report("--date 31/12/1999 --name 'Jane Doe' --year 1999");
@@ -78,11 +80,13 @@ TEST_F(ReportTest, AYearIsOnPaperWithItsSumsAndGains)
              "100 10.00 1.70 -1,001.70 EUR\n",
              "04/01/1999 Buy York AC Beta 10 7.00 0.12 -70.12 USD\n",
              "05/01/1999 Transfer Cash to York -20.00 EUR\n York from Cash 10.00 USD\n",
-             "\n08/01/1999 Charge Cash -1.00 EUR\n09/01/1999 Income Cash 3.50 EUR\n",
+             "\n08/01/1999 Charge Cash -1.00 EUR\n09/01/1999 Income Cash AC Compagnie",
+             "\n11/01/1999 Income Cash 3.50 EUR\n",
          })
         EXPECT_THAT(text, HasSubstr(line));
-    for (const char* word : {"Compagnie", "Chemins", "Maritime", "Grand", " 60 10.00 15.00 900.00 EUR 900.00 ",
-                             " 7.00 ~ 06/03/1999 ", "~ marks an estimate", " 1,000.00 480.00 2.52 80.00 300.00 EUR\n"})
+    for (const char* word :
+         {"Compagnie", "Chemins", "Maritime", "Grand", " 60 10.00 15.00 900.00 EUR 900.00 ", " 7.00 ~ 06/03/1999 ",
+          "~ marks an estimate", " 1,000.00 480.00 2.52 3.50 80.00 300.00 EUR\n"})
         EXPECT_THAT(text, HasSubstr(word));
     EXPECT_EQ(count(text, "Jane Doe Portfolio on 31/12/1999\n"), count(text, "\f"));
     EXPECT_THAT(report("--date 31/12/2001 --from 31/12/1999 --year 2000"),
@@ -116,6 +120,17 @@ TEST_F(ReportTest, PagesAreNumberedHeadingsRepeatedAndNothingIsAPicture)
         EXPECT_EQ(count(fonts, " yes "), 2 * (count(fonts, "\n") - 2)) << fonts; // embedded, and with its letters
         EXPECT_EQ(count(text, "Profit"), 1U);                                    // and not with "fi" in one sign
     }
+}
+
+TEST_F(ReportTest, WhatItReadsIsNotReplaced)
+{
+    report("");
+    const std::string before = folder_.content("wallet");
+    std::filesystem::create_symlink("wallet", folder_ / "link");
+    for (const char* out : {"wallet", "link", "market"})
+        EXPECT_EQ(ToolRun(PELORIN_REPORT, std::string("market wallet --force --out ") + out, folder_).err,
+                  std::string("pelorin-report: ") + out + ": is read here, and is left as it is\n");
+    EXPECT_EQ(folder_.content("wallet"), before);
 }
 
 TEST_F(ReportTest, WhatIsNotThereIsLeftOutAndSaid)
