@@ -79,7 +79,7 @@ void ListRows::paint(QPainter* painter, const QStyleOptionViewItem& option, cons
     QColor ground =
         index.row() % 2 == 0 ? option.palette.color(QPalette::Base) : option.palette.color(QPalette::AlternateBase);
     if (selected)
-        ground = active ? option.palette.color(QPalette::Highlight) : QColor(176, 190, 208);
+        ground = active ? option.palette.color(QPalette::Highlight) : toQt(kPaleSelection);
     painter->fillRect(area, ground);
     const QColor text =
         selected && active ? option.palette.color(QPalette::HighlightedText) : option.palette.color(QPalette::Text);

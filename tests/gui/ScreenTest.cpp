@@ -1,13 +1,20 @@
+#include "chart/ChartPainter.h"
 #include "platform/qt/WindowWidget.h"
 #include "tests/gui/WindowFixture.h"
+#include "views/Look.h"
 
 #include <QAbstractButton>
 #include <QAbstractItemView>
+#include <QApplication>
 #include <QLabel>
 #include <QLineEdit>
+#include <QPalette>
 #include <QScrollArea>
 #include <QScrollBar>
 #include <QTabBar>
+
+#include <algorithm>
+#include <cmath>
 
 namespace {
 
@@ -111,6 +118,66 @@ TEST_F(ScreenTest, EveryControlIsInSightOnEveryPage)
                 scrolls = scrolls || (area->isVisible() && area->verticalScrollBar()->maximum() > 0);
         }
         EXPECT_EQ(scrolls, screen.scrolls);
+    }
+}
+
+/// How bright a colour is to the eye, as the guidelines for readable pages reckon it.
+double luminance(rgb_color color)
+{
+    const auto linear = [](std::uint8_t component) {
+        const double part = component / 255.0;
+        return part <= 0.04045 ? part / 12.92 : std::pow((part + 0.055) / 1.055, 2.4);
+    };
+    return 0.2126 * linear(color.red) + 0.7152 * linear(color.green) + 0.0722 * linear(color.blue);
+}
+
+rgb_color colorOf(QPalette::ColorRole role, QPalette::ColorGroup group = QPalette::Active)
+{
+    const QColor color = QApplication::palette().color(group, role);
+    // What shines through stands on white here.
+    const auto over = [&](int c) { return static_cast<std::uint8_t>(255 - (255 - c) * color.alpha() / 255); };
+    return {over(color.red()), over(color.green()), over(color.blue()), 255};
+}
+
+TEST(ColourTest, EveryTextIsReadableOnItsGround)
+{
+    const rgb_color white = {255, 255, 255, 255};
+    const rgb_color panel = colorOf(QPalette::Window);
+    const std::vector<rgb_color> rows = {colorOf(QPalette::Base), colorOf(QPalette::AlternateBase), kPaleSelection,
+                                         look::kGenerated, look::kNew};
+    const auto disabled = QPalette::Disabled;
+    const struct {
+        const char* what;
+        std::vector<rgb_color> texts, grounds;
+    } cases[] = {
+        {"lists", {look::kText, look::kFaint, look::kWarning, look::kGain, look::kLoss}, rows},
+        {"the selection", {colorOf(QPalette::HighlightedText)}, {colorOf(QPalette::Highlight)}},
+        {"headings", {look::kText}, {look::kHeading}},
+        {"pages", {look::kText, look::kFaint, look::kWarning, kBoxTitle, colorOf(QPalette::WindowText)}, {panel}},
+        {"what is disabled",
+         {colorOf(QPalette::WindowText, disabled), colorOf(QPalette::Text, disabled),
+          colorOf(QPalette::ButtonText, disabled)},
+         {panel, colorOf(QPalette::Button, disabled), colorOf(QPalette::Base)}},
+        {"buttons", {colorOf(QPalette::ButtonText)}, {colorOf(QPalette::Button)}},
+        {"fields",
+         {colorOf(QPalette::Text), colorOf(QPalette::PlaceholderText)},
+         {colorOf(QPalette::Base), kReadOnlyField, kWrongField}},
+        {"calendars", {kWarningRed}, {colorOf(QPalette::Base)}},
+        {"tool tips", {colorOf(QPalette::ToolTipText)}, {colorOf(QPalette::ToolTipBase)}},
+        {"notices", {look::kText}, {look::kNotice, look::kGenerated}},
+        {"charts",
+         {ChartPainter::ink(white, ChartPainter::kTextInk), ChartPainter::ink(white, ChartPainter::kLabelInk)},
+         {white}},
+    };
+    for (const auto& c : cases) {
+        for (const rgb_color& text : c.texts) {
+            for (const rgb_color& ground : c.grounds) {
+                const auto [dark, light] = std::minmax({luminance(text), luminance(ground)});
+                EXPECT_GE((light + 0.05) / (dark + 0.05), 4.5)
+                    << c.what << ": " << +text.red << ' ' << +text.green << ' ' << +text.blue << " on " << +ground.red
+                    << ' ' << +ground.green << ' ' << +ground.blue;
+            }
+        }
     }
 }
 
