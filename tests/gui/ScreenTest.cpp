@@ -121,6 +121,18 @@ TEST_F(ScreenTest, EveryControlIsInSightOnEveryPage)
     }
 }
 
+TEST_F(ScreenTest, WhatADesktopSetsForAllProgramsDoesNotStay)
+{
+    const QFont font = QApplication::font();
+    const QPalette colors = QApplication::palette();
+    QApplication::setFont(QFont(font.family(), 14));
+    QApplication::setPalette(QPalette(Qt::black));
+    settle();
+    EXPECT_EQ(QApplication::font().pixelSize(), font.pixelSize());
+    EXPECT_EQ(QApplication::palette().color(QPalette::Base), colors.color(QPalette::Base));
+    EXPECT_EQ(window().FindView("btnUndo")->widget()->font().pixelSize(), font.pixelSize());
+}
+
 /// How bright a colour is to the eye, as the guidelines for readable pages reckon it.
 double luminance(rgb_color color)
 {
