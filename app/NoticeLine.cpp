@@ -18,7 +18,6 @@ constexpr uint32 kKeyPressed = 'NtKy';
 constexpr uint32 kDismissed = 'NtDs';
 constexpr bigtime_t kPassingTime = 6000000;
 constexpr std::chrono::seconds kTogether(1);
-constexpr rgb_color kGround = {255, 244, 206, 255};
 constexpr rgb_color kEdge = {204, 178, 104, 255};
 constexpr float kInset = 8;     // of the text
 constexpr float kEdgeWidth = 2; // about a button
@@ -62,7 +61,7 @@ private:
 
 NoticeLine::NoticeLine(BRect frame) : BView(frame, "NoticeLine", B_FOLLOW_LEFT | B_FOLLOW_BOTTOM, B_WILL_DRAW)
 {
-    SetViewColor(kGround);
+    SetViewColor(look::kNotice);
     const float height = frame.Height();
     AddChild(text_ = new NoticeText({kInset, 0, frame.Width() - kInset, height}));
     for (const auto& [name, key] :

@@ -17,12 +17,14 @@
 #include "report/ReportWindow.h"
 #include "views/FieldNotice.h"
 #include "views/ImportWindow.h"
+#include "views/Look.h"
 #include "views/OperationView.h"
 #include "views/ParameterView.h"
 #include "views/SplitWindow.h"
 #include "views/WalletView.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstring>
 #include <iterator>
 #include <span>
@@ -184,8 +186,13 @@ std::string doneText(const std::string& command, const std::string& label)
     return done + (isOf ? " of" : "") + label.substr(command.size());
 }
 
+constexpr float kWidth = 800;
+constexpr float kHeight = 800;
+constexpr float kStatusHeight = 24;
+constexpr float kNoticeHeight = 22;
+constexpr float kNoticeAbove = 43; // the lower edge of the window: between pages and the letters of the status line
 const BRect kPageFrame(0, 0, 800, 775);
-const BRect kNoticeFrame(8, 757, 792, 779); // between what is on the pages and the letters of the status line
+const BRect kNoticeFrame(8, kHeight - kNoticeAbove, kWidth - 8, kHeight - kNoticeAbove + kNoticeHeight);
 
 } // namespace
 
@@ -224,7 +231,7 @@ PLWindow::~PLWindow() = default;
 
 void PLWindow::makePages()
 {
-    tabView_ = new BTabView({0, 0, 800, 800}, "TabView", B_WIDTH_AS_USUAL, B_FOLLOW_ALL_SIDES);
+    tabView_ = new BTabView({0, 0, kWidth, kHeight}, "TabView", B_WIDTH_AS_USUAL, B_FOLLOW_ALL_SIDES);
     const auto add = [this](BView* page, const char* label) {
         auto* tab = new BTab(page);
         tab->SetLabel(label);
@@ -237,12 +244,56 @@ void PLWindow::makePages()
     add(walletView_ = new WalletView(kPageFrame, "WalletView", this), "PortoFolio");
     add(operationView_ = new OperationView(kPageFrame, "OperationView", this), "Operations");
     add(parameterView_ = new ParameterView(kPageFrame, "ParameterView", this), "Parameters");
-    messageView_ = new MessageView({0, 776, 800, 800}, "MessageView", this);
+    messageView_ = new MessageView({0, kHeight - kStatusHeight, kWidth, kHeight}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
     makeTableButtons();
     makeUndoButtons();
     AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // last: in front of the edges of both
+}
+
+void PLWindow::GiveWay(float width, float height)
+{
+    const float top = tabView_->TabHeight();
+    const auto shrinkPages = [this](float room) {
+        float highest = 0;
+        for (int32 i = 0; i < tabView_->CountTabs(); ++i)
+            highest = std::max(highest, static_cast<PageView*>(tabView_->TabAt(i)->View())->shrinkTo(room));
+        return highest;
+    };
+    height = std::min(height, kHeight);
+    const float room = height - kNoticeAbove - top;
+    // A page that is still too high is scrolled, and its scroll bar needs a place beside it. One for the width takes
+    // its own from the height.
+    const float wanted = kWidth + (shrinkPages(room) > room ? look::kScrollBar : 0);
+    if (width < wanted)
+        shrinkPages(room - look::kScrollBar);
+    ResizeTo(std::min(width, wanted), height);
+}
+
+void PLWindow::FrameResized(float width, float height)
+{
+    // Where not all of the window has room, the pages end above the line of notices, and not below it.
+    tabView_->ScrollTabs();
+    tabView_->ResizeTo(width, height - kNoticeAbove);
+    messageView_->MoveTo(0, height - kStatusHeight);
+    messageView_->ResizeTo(width, kStatusHeight);
+    noticeLine_->MoveTo(kNoticeFrame.left, height - kNoticeAbove);
+    noticeLine_->ResizeTo(width - 2 * kNoticeFrame.left, kNoticeHeight);
+    float right = width - kNoticeFrame.left;
+    float formerRight = redoButton_->Frame().right;
+    for (BButton* button : {redoButton_, undoButton_, exportButton_, importButton_}) {
+        const BRect frame = button->Frame();
+        right -= formerRight - frame.right; // the gaps stay
+        formerRight = frame.left;
+        // Beside the tabs there is less room for them, too.
+        constexpr float kPadding = 5;
+        const float narrow = std::ceil(button->StringWidth(button->Label())) + 2 * kPadding;
+        const float taken = width < kWidth ? std::min(frame.Width(), narrow) : frame.Width();
+        button->MoveTo(right - taken, frame.top);
+        button->ResizeTo(taken, frame.Height());
+        right -= taken;
+    }
 }
 
 /// Left of those of undo, on every page.

@@ -54,6 +54,8 @@ public:
     void MessageReceived(BMessage* message) override;
     /// Ends the program. Intended: nothing is saved and nothing asked; saving is the user's own act.
     bool QuitRequested() override;
+    void GiveWay(float width, float height) override;
+    void FrameResized(float width, float height) override;
     /// Loads the file that the open panel was left with.
     virtual void RefsReceived(BMessage* message) { files_->load(message); }
 

@@ -15,7 +15,7 @@ constexpr float kDataInset = 6;     // between the plot's sides and the first an
 constexpr float kSampleWidth = 16;  // in the key
 constexpr float kSampleGap = 5;     // between a sample and its name
 constexpr float kEntryGap = 16;     // between entries of the key
-constexpr float kSmallestPlot = 40; // in either direction
+constexpr float kSmallestPlot = 30; // in either direction
 constexpr float kKeyShare = 0.3F;   // of the height, at most
 
 /// The steps of a layout, in their order. Each narrows the plot, beginning with the bounds.

@@ -15,8 +15,14 @@ rgb_color opaque(rgb_color color)
     return {color.red, color.green, color.blue, 255};
 }
 
-/// `background` moved by `share` towards black, or towards white when it is dark.
-rgb_color ink(rgb_color background, double share)
+float discRadius(float penSize)
+{
+    return penSize + 1;
+}
+
+} // namespace
+
+rgb_color ChartPainter::ink(rgb_color background, double share)
 {
     constexpr double kHalfBright = 128;
     // How bright an eye finds it: green counts most, blue least.
@@ -28,16 +34,9 @@ rgb_color ink(rgb_color background, double share)
     return {mix(background.red), mix(background.green), mix(background.blue), 255};
 }
 
-float discRadius(float penSize)
-{
-    return penSize + 1;
-}
-
-} // namespace
-
 ChartPainter::ChartPainter(BView& view, rgb_color background)
-    : view_(view), background_(opaque(background)), text_(ink(background, 0.85)), label_(ink(background, 0.65)),
-      axis_(ink(background, 0.45)), grid_(ink(background, 0.1))
+    : view_(view), background_(opaque(background)), text_(ink(background, kTextInk)),
+      label_(ink(background, kLabelInk)), axis_(ink(background, 0.45)), grid_(ink(background, 0.1))
 {
     view_.SetDrawingMode(B_OP_COPY);
 }

@@ -7,6 +7,12 @@
 /// Draws what a layout has found a place for.
 class ChartPainter {
 public:
+    // What names and values are written in, and what the axes are labelled in.
+    static constexpr double kTextInk = 0.85;
+    static constexpr double kLabelInk = 0.65;
+    /// `background` moved by `share` towards black, or towards white when it is dark.
+    static rgb_color ink(rgb_color background, double share);
+
     /// Draws on `view`, in colours that can be read on `background`. Leaves the view's drawing mode at B_OP_COPY.
     ChartPainter(BView& view, rgb_color background);
 

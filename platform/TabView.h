@@ -23,6 +23,9 @@ public:
     virtual void Select(int32 index);
     /// `hook` is called whenever another tab was chosen, in whatever way. The kits have `Select` do that.
     void SetSelectionHook(const std::function<void()>& hook);
+    float TabHeight() const;
+    /// From here on what does not fit is scrolled, of the views that have tabs by now. The kits leave it to the views.
+    void ScrollTabs();
     /// Index of the tab that is shown, negative without any.
     int32 Selection() const;
 
@@ -32,5 +35,6 @@ private:
     QTabWidget& tabWidget() const;
 
     std::vector<std::unique_ptr<BTab>> tabs_;
+    bool areScrolled_ = false;
     QWidget* host_ = nullptr; // the page that the next child goes into
 };

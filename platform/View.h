@@ -55,6 +55,8 @@ public:
 
     // Place and size.
     BRect Bounds() const { return frame_.OffsetToCopy(0, 0); }
+    /// Where it stands in its parent.
+    BRect Frame() const { return frame_; }
     BPoint ConvertToScreen(BPoint where) const;
     void MoveTo(float x, float y);
     /// The children follow by their resizing modes.

@@ -6,6 +6,7 @@
 #include <memory>
 
 class BView;
+class QPoint;
 class QSize;
 class QWidget;
 class WindowWidget;
@@ -21,8 +22,8 @@ constexpr uint32 B_CURRENT_WORKSPACE = 0;
 /// A window on the desktop, and the looper of all that stands in it.
 ///
 /// Owns its views. The window belongs to itself: `Quit` destroys it, closing it by hand does so when `QuitRequested`
-/// agrees, and the application destroys those that are left. On a screen smaller than its frame it shrinks to what fits
-/// and scrolls its content; one that is resizable has its views follow.
+/// agrees, and the application destroys those that are left. On a screen that has no room for its frame it is asked to
+/// give way; what does not fit even then is scrolled. One that is resizable has its views follow instead.
 class BWindow : public BLooper {
 public:
     /// `frame` is in screen coordinates, without title bar and borders.
@@ -48,6 +49,13 @@ public:
 
     void Show();
     void Hide();
+    /// The views follow by their resizing modes.
+    void ResizeTo(float width, float height);
+    /// Hook: the screen has room for no more than `width` and `height`, less than the window has; to be followed by
+    /// `ResizeTo` as far as its content can do with less. Before it shows, and again when its borders are known. The
+    /// kits leave it to the program to ask for the screen.
+    virtual void GiveWay(float /*width*/, float /*height*/) {}
+    virtual void FrameResized(float /*width*/, float /*height*/) {}
     /// Destroys the window, which has been made with `new`, and its views.
     virtual void Quit() { delete this; }
     /// `B_QUIT_REQUESTED` closes the window as by hand.
@@ -67,6 +75,8 @@ public:
     static QWidget* front();
 
 private:
+    void fit(QPoint place);
+
     BRect frame_;
     std::unique_ptr<WindowWidget> widget_;
     std::unique_ptr<BView> root_; // holds the views

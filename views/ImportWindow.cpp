@@ -90,9 +90,10 @@ void ImportWindow::show(ImportSheet sheet)
     const std::string focused = focus != nullptr ? focus->Name() : "";
     delete panel_;
     ++sheet_;
-    panel_ = new PageView(Bounds(), "ImportView");
+    const BRect whole(0, 0, kWidth, kHeight); // what of it has no room is given up below
+    panel_ = new PageView(whole, "ImportView");
     AddChild(panel_);
-    BRect area = Bounds().InsetByCopy(kMargin, kMargin); // what is left, from above
+    BRect area = whole.InsetByCopy(kMargin, kMargin); // what is left, from above
     area.top = makeLines(area, sheet);
     area.top = makeQuestions(area, sheet);
     BRect buttons = area;
@@ -100,6 +101,8 @@ void ImportWindow::show(ImportSheet sheet)
     area.bottom = buttons.top - kMargin;
     makeLists(area, sheet);
     makeButtons(buttons, sheet);
+    if (Bounds().Height() < kHeight)
+        GiveWay(kWidth, Bounds().Height());
     if (BView* view = focused.empty() ? nullptr : panel_->FindView(focused.c_str()))
         view->MakeFocus();
 }
@@ -237,6 +240,12 @@ void ImportWindow::MessageReceived(BMessage* message)
     default:
         BWindow::MessageReceived(message);
     }
+}
+
+void ImportWindow::GiveWay(float, float height)
+{
+    if (height < kHeight)
+        ResizeTo(kWidth, panel_->shrinkTo(height));
 }
 
 bool ImportWindow::QuitRequested()

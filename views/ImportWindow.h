@@ -30,6 +30,7 @@ public:
 
     void MessageReceived(BMessage* message) override;
     bool QuitRequested() override;
+    void GiveWay(float width, float height) override;
 
 private:
     /// What a control of the sheet that is shown sends.

@@ -207,10 +207,11 @@ void OperationView::Draw(BRect)
     constexpr const char* kLegend = "Automatic operations";
     constexpr float kPadding = 8;
     const float left = kRight - StringWidth(kLegend) - 2 * kPadding;
+    const float top = prevision_->Frame().top;
     SetHighColor(kGenerated);
-    FillRect({left, kMargin + 2, kRight, kMargin + kFieldHeight - 2});
+    FillRect({left, top + 2, kRight, top + kFieldHeight - 2});
     SetHighColor(kText);
-    DrawString(kLegend, {left + kPadding, kMargin + kFieldHeight - kPadding + 1});
+    DrawString(kLegend, {left + kPadding, top + kFieldHeight - kPadding + 1});
 }
 
 void OperationView::RecallSelection()
@@ -337,7 +338,7 @@ void OperationView::SetType(const String& type)
             field.view->Hide();
     }
     // Below the amount, where a trade has its quote and cost.
-    const int row = (kIncome >> index & 1U) != 0 ? 2 : 1;
-    marketName_->MoveTo(cell(0, row).left, cell(0, row).top);
-    companyAbbreviation_->MoveTo(cell(1, row).left, cell(1, row).top);
+    const float top = ((kIncome >> index & 1U) != 0 ? quote_ : quantity_)->Frame().top;
+    marketName_->MoveTo(marketName_->Frame().left, top);
+    companyAbbreviation_->MoveTo(companyAbbreviation_->Frame().left, top);
 }

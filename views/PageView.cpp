@@ -4,6 +4,7 @@
 #include "platform/Button.h"
 #include "platform/StringView.h"
 #include "views/FieldNotice.h"
+#include "views/HeightSharing.h"
 #include "views/Look.h"
 
 #include <algorithm>
@@ -45,9 +46,24 @@ private:
 
 } // namespace
 
-PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_ALL, B_WILL_DRAW | B_FRAME_EVENTS)
+PageView::PageView(BRect frame, const char* name)
+    : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW | B_FRAME_EVENTS)
 {
     SetViewColor(look::kPanel);
+}
+
+PageView::~PageView() = default;
+
+float PageView::shrinkTo(float height)
+{
+    AboutToShrink();
+    if (heights_ == nullptr)
+        heights_ = std::make_unique<HeightSharing>(*this, std::min(Bounds().Height(), look::kPageHeight));
+    const float shown = std::max(height, heights_->least());
+    ResizeTo(Bounds().Width(), shown);
+    heights_->share(shown); // after the charts have followed the page
+    Shrunk();
+    return shown;
 }
 
 BButton* PageView::addButton(BView* parent, BRect frame, const char* name, const char* label, uint32 code)

@@ -7,9 +7,11 @@
 #include "views/NumberControl.h"
 
 #include <initializer_list>
+#include <memory>
 #include <vector>
 
 class BButton;
+class HeightSharing;
 
 /// What the five pages have in common: the panel's grey, and how their controls are made.
 class PageView : public BView {
@@ -24,9 +26,18 @@ public:
     static constexpr const char* kRemoveLabel = "Remove";
 
     PageView(BRect frame, const char* name);
+    ~PageView() override;
+
+    /// Takes the page to `height`, less than it was laid out for: lists and charts give way. @return its height now,
+    /// which is more where that is not enough.
+    float shrinkTo(float height);
 
     /// Hook: a button of the page that updates is pressed; its message is sent behind this.
     virtual void AboutToUpdate() {}
+    /// Hook: the page is about to give up height; from here on its views stand as they were laid out.
+    virtual void AboutToShrink() {}
+    /// Hook: it has done so.
+    virtual void Shrunk() {}
 
     // All of these put what they make into `parent`, which owns it.
     static BBox* addBox(BView* parent, BRect frame, const char* label)
@@ -110,4 +121,6 @@ private:
         parent->AddChild(view);
         return view;
     }
+
+    std::unique_ptr<HeightSharing> heights_; // once the page has less than it was laid out for
 };

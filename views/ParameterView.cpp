@@ -189,7 +189,7 @@ void ParameterView::Draw(BRect)
     constexpr float kBaseLine = 15; // of the field's text, from its top
     SetHighColor(look::kFaint);
     for (std::size_t i = 0; i < fields_.size(); ++i)
-        DrawString(kPlan[i].help, {kRight + 16, kTop + kPitch * static_cast<float>(i) + kBaseLine});
+        DrawString(kPlan[i].help, {kRight + 16, fields_[i]->Frame().top + kBaseLine});
 }
 
 void ParameterView::FrameResized(float, float)

@@ -106,7 +106,7 @@ SplitWindow::SplitWindow(BPoint middle, const SplitPlan& split, const SplitPlan&
     : BWindow(frameFor(middle, split), "Apply Split", B_MODAL_WINDOW, B_NOT_RESIZABLE), split_(split), kept_(kept),
       target_(target)
 {
-    auto* panel = new PageView(Bounds(), "SplitView");
+    auto* panel = panel_ = new PageView(Bounds(), "SplitView");
     AddChild(panel);
     BRect area = Bounds().InsetByCopy(kMargin, kMargin); // what is left, from above
     addLine(panel, {area.left, area.top, area.right, area.top + kFieldHeight}, "txtSplit", headline(split_))
@@ -196,6 +196,12 @@ void SplitWindow::showPlan()
                          textOf(plan.company()->getCurrencyRepresentation()))
                             .c_str());
     put(*settlement_, settlementText(plan));
+}
+
+void SplitWindow::GiveWay(float, float height)
+{
+    if (height < Bounds().Height())
+        ResizeTo(kWidth, panel_->shrinkTo(height));
 }
 
 void SplitWindow::MessageReceived(BMessage* message)

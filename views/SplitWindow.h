@@ -9,6 +9,7 @@ class BBox;
 class BButton;
 class BCheckBox;
 class BStringView;
+class PageView;
 
 /// Shows what a split will do, and asks whether to do it; does nothing itself.
 ///
@@ -24,6 +25,7 @@ public:
     SplitWindow(BPoint middle, const SplitPlan& split, const SplitPlan& kept, const BMessenger& target);
 
     void MessageReceived(BMessage* message) override;
+    void GiveWay(float width, float height) override;
 
 private:
     void makeQuotes(BView* panel, BRect area);
@@ -36,6 +38,7 @@ private:
     SplitPlan split_;
     SplitPlan kept_;
     BMessenger target_;
+    PageView* panel_ = nullptr;
     BCheckBox* quotes_ = nullptr;
     BStringView* sample_ = nullptr;
     // Null without trades.

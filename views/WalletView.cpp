@@ -47,7 +47,7 @@ float place(BStringView& line, const std::string& text, bool isFaint, float righ
     line.SetText(text.c_str());
     line.SetHighColor(isFaint ? kFaint : kText);
     const float width = std::ceil(line.StringWidth(text.c_str()));
-    line.MoveTo(right - width, kReturnsTop);
+    line.MoveTo(right - width, line.Frame().top);
     line.ResizeTo(width, 16);
     return right - width;
 }
@@ -113,7 +113,7 @@ void WalletView::makeTotals()
 void WalletView::makeCoverage()
 {
     constexpr float kTop = kTotalsTop - 2;
-    AddChild(coverage_ = new BStringView({0, kTop, 0, kTop + 18}, "txtEstimated", ""));
+    AddChild(coverage_ = new BStringView({kMargin, kTop, kRight, kTop + 18}, "txtEstimated", ""));
     coverage_->SetViewColor(kGenerated);
     coverage_->SetAlignment(B_ALIGN_CENTER);
     constexpr float kWidth = 72;
@@ -128,7 +128,7 @@ void WalletView::makeCoverage()
 void WalletView::makeReturns()
 {
     const auto add = [this](const char* name, const char* tip) {
-        auto* line = new BStringView({0, kReturnsTop, 0, kReturnsTop + 16}, name, "");
+        auto* line = new BStringView({kMargin, kReturnsTop, kRight, kReturnsTop + 16}, name, "");
         line->SetToolTip(tip);
         AddChild(line);
         return line;
@@ -177,6 +177,7 @@ void WalletView::makeAccounts()
 void WalletView::makeHoldings()
 {
     holdingsBox_ = addBox(this, {kMargin, kHoldingsTop, kRight, kHoldingsEnd}, "Holdings");
+    holdingsHeight_ = kHoldingsEnd - kHoldingsTop;
     shares_ = new ShareStateListView("lstShares");
     shares_->addTo(holdingsBox_,
                    {kBoxSide, kBoxTop, kRight - kMargin - kBoxSide, kHoldingsEnd - kHoldingsTop - kBoxSide},
@@ -213,13 +214,20 @@ void WalletView::tellFiltered()
 void WalletView::showChart(bool isShown)
 {
     // The holdings have the room of a chart that is not asked for.
-    const float end = isShown ? kHoldingsEnd : kPageHeight - kMargin;
-    holdingsBox_->ResizeTo(kRight - kMargin, end - kHoldingsTop);
-    shares_->ResizeTo(shares_->Bounds().Width(), end - kHoldingsTop - kBoxTop - kHeadingHeight - kBoxSide);
+    const BRect box = holdingsBox_->Frame(), list = shares_->Frame();
+    const float height = isShown ? holdingsHeight_ : evolution_->Frame().bottom - box.top;
+    holdingsBox_->ResizeTo(box.Width(), height);
+    shares_->ResizeTo(list.Width(), list.Height() + height - box.Height());
     if (isShown)
         evolution_->Show();
     else
         evolution_->Hide();
+}
+
+void WalletView::Shrunk()
+{
+    holdingsHeight_ = holdingsBox_->Frame().Height();
+    showChart(isComputeEvolution());
 }
 
 void WalletView::makeChart()
@@ -266,7 +274,7 @@ void WalletView::showCoverage(const Date& day, const QuoteCoverage& quotes, cons
     coverage_->SetToolTip((ofRates.empty() || ofQuotes.empty() ? "" : "Also, " + ofRates + ".").c_str());
     const float right = kRight - kBoxSide - (isDay ? 72 + kGap : 0);
     const float width = coverage_->StringWidth(text.c_str()) + 2 * kGap;
-    coverage_->MoveTo(right - width, kTotalsTop - 2);
+    coverage_->MoveTo(right - width, coverage_->Frame().top);
     coverage_->ResizeTo(width, 18);
     coverage_->Show();
     if (isDay)

@@ -63,6 +63,9 @@ public:
     /// The holdings that the filter lets through, in the order in which they show.
     std::vector<const ShareState*> shownHoldings() const { return shares_->allShown(); }
 
+    void AboutToShrink() override { showChart(true); }
+    void Shrunk() override;
+
     String getAccountName() const { return accountName_->Text(); }
     void setAccountName(const String& name) { showText(*accountName_, name); }
     /// The symbol as it was typed.
@@ -111,6 +114,7 @@ private:
     BTextControl* accountCurrency_ = nullptr;
     BCheckBox* defaultTransferAccount_ = nullptr;
     BBox* holdingsBox_ = nullptr;
+    float holdingsHeight_ = 0; // of the box above a chart
     ShareStateListView* shares_ = nullptr;
     BSearchControl* filter_ = nullptr; // of the holdings
     EvolutionChart* evolution_ = nullptr;

@@ -9,6 +9,7 @@
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QPushButton>
+#include <QScreen>
 #include <QStyle>
 #include <QVBoxLayout>
 
@@ -50,6 +51,12 @@ int32 BAlert::ask() const
     auto* text = new QLabel(QString::fromStdString(text_));
     text->setObjectName("AlertText");
     text->setTextFormat(Qt::PlainText);
+    // A long line is broken, so that all of it is on the screen.
+    const int most = dialog.screen()->availableGeometry().width() * 3 / 4;
+    if (text->sizeHint().width() > most) {
+        text->setWordWrap(true);
+        text->setFixedWidth(most);
+    }
     message->addWidget(icon);
     message->addWidget(text, 1);
     rows->addLayout(message);

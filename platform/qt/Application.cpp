@@ -4,6 +4,7 @@
 #include "platform/GraphicsDefs.h"
 #include "platform/Message.h"
 #include "platform/Window.h"
+#include "platform/qt/Canvas.h"
 #include "platform/qt/EndSignals.h"
 
 #include <QApplication>
@@ -12,6 +13,7 @@
 #include <QIcon>
 #include <QLoggingCategory>
 #include <QPalette>
+#include <QStyle>
 #include <QStyleFactory>
 
 #include <clocale>
@@ -28,18 +30,51 @@ char* arguments[] = {programName, nullptr};
 
 QPalette panelColors()
 {
-    const QColor panel(kPanelGrey.red, kPanelGrey.green, kPanelGrey.blue);
-    QPalette palette(panel, panel);
+    // All that is light or dark on a desktop is set, so that none of it comes from there.
+    QPalette palette(toQt(kPanelGrey), toQt(kPanelGrey));
     palette.setColor(QPalette::Base, Qt::white);
-    palette.setColor(QPalette::AlternateBase, QColor(244, 246, 249));
-    palette.setColor(QPalette::Highlight, QColor(38, 94, 158));
+    palette.setColor(QPalette::AlternateBase, toQt(kSecondRow));
+    palette.setColor(QPalette::Highlight, toQt(kSelection));
     palette.setColor(QPalette::HighlightedText, Qt::white);
-    palette.setColor(QPalette::ToolTipBase, QColor(255, 253, 231));
+    palette.setColor(QPalette::ToolTipBase, toQt(kToolTipGround));
     palette.setColor(QPalette::ToolTipText, Qt::black);
+    palette.setColor(QPalette::PlaceholderText, toQt(kFaintGrey));
+    palette.setColor(QPalette::Link, toQt(kSelection));
+    palette.setColor(QPalette::LinkVisited, toQt(kSelection));
     for (const auto role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText})
-        palette.setColor(QPalette::Disabled, role, QColor(120, 120, 120));
+        palette.setColor(QPalette::Disabled, role, toQt(kFaintGrey));
     return palette;
 }
+
+/// The same look on every desktop: the measures of the pages hold for this style and font only, and the colours for
+/// light grounds.
+void setLook()
+{
+    if (QApplication::style()->objectName() != "fusion")
+        QApplication::setStyle(QStyleFactory::create("Fusion"));
+    const QPalette colors = panelColors(), shown = QApplication::palette();
+    const auto isOther = [&](QPalette::ColorRole role) { return shown.color(role) != colors.color(role); };
+    if (isOther(QPalette::Window) || isOther(QPalette::Base) || isOther(QPalette::Text) || isOther(QPalette::Highlight))
+        QApplication::setPalette(colors);
+    const QFont font = be_plain_font->toQt();
+    if (QApplication::font().pixelSize() != font.pixelSize() || QApplication::font().family() != font.family())
+        QApplication::setFont(font);
+}
+
+/// What a desktop sets for all programs, late in the start or when a person changes it there, does not stay.
+class OwnLook final : public QApplication {
+public:
+    using QApplication::QApplication;
+
+protected:
+    bool event(QEvent* event) override
+    {
+        const bool isDone = QApplication::event(event);
+        if (event->type() == QEvent::ApplicationFontChange || event->type() == QEvent::ApplicationPaletteChange)
+            QMetaObject::invokeMethod(this, setLook, Qt::QueuedConnection); // whoever changes it has done so
+        return isDone;
+    }
+};
 
 /// The icon of the program `name` in all sizes that were built in, without one if there are none.
 QIcon iconOf(const QString& name)
@@ -66,7 +101,8 @@ BApplication::BApplication(const char* signature) : BLooper(signature), signatur
 {
     // A test program makes the connection to the desktop itself, and several applications on it one after the other.
     if (QCoreApplication::instance() == nullptr) {
-        new QApplication(argumentCount, arguments); // lives as long as the process
+        QApplication::setDesktopSettingsAware(false); // neither its colours nor its fonts
+        new OwnLook(argumentCount, arguments);        // lives as long as the process
         // It has taken over the desktop's way to write numbers. The program's own has a point, whatever the desktop's.
         std::setlocale(LC_NUMERIC, "C");
         const QString name = QString::fromStdString(signature_.substr(signature_.find_last_of("./") + 1));
@@ -74,10 +110,8 @@ BApplication::BApplication(const char* signature) : BLooper(signature), signatur
         QApplication::setDesktopFileName(name.toLower());
         QApplication::setWindowIcon(iconOf(name.toLower()));
     }
-    // The same look on every desktop: the measures of the pages hold for this style and font only.
-    QApplication::setStyle(QStyleFactory::create("Fusion"));
     QApplication::setPalette(panelColors());
-    QApplication::setFont(be_plain_font->toQt());
+    setLook();
     // The program ends when it is asked to, as the window does when it closes, and not because no window is there:
     // while it starts there is none, either.
     QApplication::setQuitOnLastWindowClosed(false);

@@ -18,7 +18,6 @@ void BBox::SetLabel(const char* label)
 void BBox::Draw(BRect)
 {
     constexpr rgb_color kLine = {168, 168, 168, 255};
-    constexpr rgb_color kTitle = {40, 60, 90, 255};
     constexpr float kTitleLeft = 10;
     constexpr float kTitleGap = 4; // between the line and the title
     BFont font;
@@ -38,7 +37,7 @@ void BBox::Draw(BRect)
     FillRect({0, bounds.bottom - 1, bounds.right, bounds.bottom});
     FillRect({0, top, 1, bounds.bottom});
     FillRect({bounds.right - 1, top, bounds.right, bounds.bottom});
-    SetHighColor(kTitle);
+    SetHighColor(kBoxTitle);
     if (titled)
         DrawString(Label(), {kTitleLeft, std::ceil(height.ascent)});
 }

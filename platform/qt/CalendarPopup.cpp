@@ -1,9 +1,12 @@
 #include "platform/qt/CalendarPopup.h"
 
+#include "platform/qt/Canvas.h"
+
 #include <QCalendarWidget>
 #include <QIcon>
 #include <QPainter>
 #include <QScreen>
+#include <QTextCharFormat>
 #include <QVBoxLayout>
 
 #include <algorithm>
@@ -18,6 +21,10 @@ CalendarPopup::CalendarPopup(QWidget& field, const CalendarDay& shown, Choose ch
     days->setAccessibleName("Days");
     days->setVerticalHeaderFormat(QCalendarWidget::NoVerticalHeader);
     days->setDateEditEnabled(false); // digits are for the field
+    QTextCharFormat weekend;         // the usual red is too light
+    weekend.setForeground(toQt(kWarningRed));
+    for (const Qt::DayOfWeek free : {Qt::Saturday, Qt::Sunday})
+        days->setWeekdayTextFormat(free, weekend);
     const QDate day(shown.year, shown.month, shown.day);
     days->setSelectedDate(day.isValid() ? day : QDate::currentDate());
     auto* layout = new QVBoxLayout(this);
@@ -42,7 +49,7 @@ void CalendarPopup::open(QWidget& field, const CalendarDay& shown, Choose choose
     const QRect screen = field.screen()->availableGeometry();
     QPoint corner = field.mapToGlobal(QPoint(0, field.height()));
     if (corner.y() + popup->height() > screen.bottom())
-        corner.setY(field.mapToGlobal(QPoint(0, 0)).y() - popup->height());
+        corner.setY(std::max(field.mapToGlobal(QPoint(0, 0)).y() - popup->height(), screen.top()));
     corner.setX(std::max(screen.left(), std::min(corner.x(), screen.right() - popup->width())));
     popup->move(corner);
     popup->show();
@@ -56,12 +63,12 @@ QIcon calendarIcon()
     leaf.setDevicePixelRatio(kSharp);
     leaf.fill(Qt::transparent);
     QPainter painter(&leaf);
-    painter.setPen(QColor(110, 110, 110));
+    painter.setPen(toQt(kFaintGrey));
     painter.setBrush(Qt::white);
     painter.drawRect(2, 3, 11, 10);
-    painter.fillRect(2, 3, 12, 3, QColor(38, 94, 158));
+    painter.fillRect(2, 3, 12, 3, toQt(kSelection));
     for (int day = 0; day < 6; ++day)
-        painter.fillRect(4 + day % 3 * 3, 8 + day / 3 * 3, 2, 2, QColor(110, 110, 110));
+        painter.fillRect(4 + day % 3 * 3, 8 + day / 3 * 3, 2, 2, toQt(kFaintGrey));
     painter.end();
     return QIcon(leaf);
 }

@@ -63,7 +63,7 @@ void CompletionList::place()
     // Below the field or, where there is no room, above.
     QPoint corner = field_.mapToGlobal(QPoint(0, field_.height()));
     if (corner.y() + size.height() > screen.bottom())
-        corner.setY(field_.mapToGlobal(QPoint(0, 0)).y() - size.height());
+        corner.setY(std::max(field_.mapToGlobal(QPoint(0, 0)).y() - size.height(), screen.top()));
     corner.setX(std::max(screen.left(), std::min(corner.x(), screen.right() - size.width())));
     setGeometry(QRect(corner, size));
 }

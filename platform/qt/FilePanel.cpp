@@ -10,6 +10,7 @@
 #include <QFileDialog>
 #include <QFileInfo>
 #include <QLineEdit>
+#include <QScreen>
 #include <QTreeView>
 
 #include <filesystem>
@@ -111,6 +112,7 @@ void BFilePanel::Show()
             field->clear();
         shown.selectFile(QString::fromStdString(saveText_));
     }
+    shown.resize(shown.size().boundedTo(shown.screen()->availableGeometry().size()));
     shown.show();
     shown.raise();
     shown.activateWindow();

@@ -79,7 +79,7 @@ void ListRows::paint(QPainter* painter, const QStyleOptionViewItem& option, cons
     QColor ground =
         index.row() % 2 == 0 ? option.palette.color(QPalette::Base) : option.palette.color(QPalette::AlternateBase);
     if (selected)
-        ground = active ? option.palette.color(QPalette::Highlight) : QColor(176, 190, 208);
+        ground = active ? option.palette.color(QPalette::Highlight) : toQt(kPaleSelection);
     painter->fillRect(area, ground);
     const QColor text =
         selected && active ? option.palette.color(QPalette::HighlightedText) : option.palette.color(QPalette::Text);
@@ -169,11 +169,13 @@ bool ListWidget::viewportEvent(QEvent* event)
     const auto& help = static_cast<QHelpEvent&>(*event);
     const QModelIndex row = indexAt(help.pos());
     const BPoint where(static_cast<float>(help.x()), static_cast<float>(help.y()));
-    const std::string text = row.isValid() ? list_.ToolTipAt(where, row.row()) : "";
+    // The text of an empty list may need more room than a low list has.
+    const bool isEmpty = list_.CountItems() == 0;
+    const std::string text = isEmpty ? list_.EmptyText() : row.isValid() ? list_.ToolTipAt(where, row.row()) : "";
     // As it stands: a name may look like HTML.
     const QString shown = QString::fromStdString(text).toHtmlEscaped();
-    QToolTip::showText(help.globalPos(), text.empty() ? QString() : "<p style='white-space:pre'>" + shown + "</p>",
-                       viewport());
+    const QString paragraph = isEmpty ? "<p>" : "<p style='white-space:pre'>";
+    QToolTip::showText(help.globalPos(), text.empty() ? QString() : paragraph + shown + "</p>", viewport());
     return true;
 }
 

@@ -2,9 +2,13 @@
 
 #include "platform/qt/Labels.h"
 
+#include <QScrollArea>
 #include <QShortcut>
 #include <QTabBar>
 #include <QTabWidget>
+#include <QVBoxLayout>
+
+#include <utility>
 
 BTabView::BTabView(BRect frame, const char* name, button_width, uint32 resizingMode, uint32 flags)
     : BView(frame, name, resizingMode, flags, new QTabWidget)
@@ -61,6 +65,28 @@ void BTabView::Select(int32 index)
 void BTabView::SetSelectionHook(const std::function<void()>& hook)
 {
     QObject::connect(&tabWidget(), &QTabWidget::currentChanged, widget(), [hook] { hook(); });
+}
+
+void BTabView::ScrollTabs()
+{
+    if (std::exchange(areScrolled_, true))
+        return;
+    for (const auto& tab : tabs_) {
+        QWidget* view = tab->View()->widget();
+        auto* area = new QScrollArea;
+        area->setFrameShape(QFrame::NoFrame);
+        area->setFocusPolicy(Qt::NoFocus); // what is in it has the keyboard, and is scrolled into sight
+        auto* room = new QVBoxLayout(view->parentWidget()); // which owns both
+        room->setContentsMargins(0, 0, 0, 0);
+        room->addWidget(area);
+        area->setWidget(view);
+        view->show();
+    }
+}
+
+float BTabView::TabHeight() const
+{
+    return static_cast<float>(tabWidget().tabBar()->sizeHint().height());
 }
 
 int32 BTabView::Selection() const

@@ -1,6 +1,7 @@
 #include "platform/TextControl.h"
 
 #include "platform/qt/CalendarPopup.h"
+#include "platform/qt/Canvas.h"
 #include "platform/qt/FieldText.h"
 #include "platform/qt/Labels.h"
 #include "platform/qt/TextField.h"
@@ -154,7 +155,7 @@ void BTextControl::SetEditable(bool editable)
     field_->setReadOnly(!editable);
     QPalette colors = caption_->palette();
     if (!editable)
-        colors.setColor(QPalette::Base, QColor(236, 236, 236));
+        colors.setColor(QPalette::Base, toQt(kReadOnlyField));
     field_->setPalette(colors);
 }
 
@@ -169,7 +170,7 @@ void BTextControl::MarkAsInvalid(const char* reason)
     // tip, either.
     QPalette colors = caption_->palette();
     if (reason != nullptr)
-        colors.setColor(QPalette::Base, QColor(255, 214, 209));
+        colors.setColor(QPalette::Base, toQt(kWrongField));
     field_->setPalette(colors);
     field_->setToolTip(QString::fromUtf8(reason));
 }

@@ -37,9 +37,8 @@ BWindow::BWindow(BRect frame, const char* title, window_type type, uint32 flags,
     if (type == B_MODAL_WINDOW)
         widget_->makeModal(front());
     widget_->setWindowTitle(QString::fromUtf8(title));
-    const QSize size(static_cast<int>(frame.Width()), static_cast<int>(frame.Height()));
-    const QPoint place(static_cast<int>(frame.left), static_cast<int>(frame.top));
-    widget_->fitTo(place, size, (flags & B_NOT_RESIZABLE) == 0);
+    widget_->setResizable((flags & B_NOT_RESIZABLE) == 0);
+    fit({static_cast<int>(frame.left), static_cast<int>(frame.top)});
     // Before there are views, so that each hears of the window when it is added.
     root_->setWindow(this);
     widget_->setWidget(root_->widget());
@@ -102,8 +101,23 @@ void BWindow::ForgetTyping()
     }
 }
 
+void BWindow::fit(QPoint place)
+{
+    widget_->fitTo(place, {static_cast<int>(frame_.Width()), static_cast<int>(frame_.Height())});
+}
+
+void BWindow::ResizeTo(float width, float height)
+{
+    root_->ResizeTo(width, height);
+    frame_.right = frame_.left + width;
+    frame_.bottom = frame_.top + height;
+    fit(widget_->pos());
+    FrameResized(width, height);
+}
+
 void BWindow::Show()
 {
+    widget_->giveWay();
     widget_->show();
 }
 

@@ -44,30 +44,60 @@ void WindowWidget::addShortcut(int key, uint32 modifiers, const std::function<vo
     });
 }
 
-void WindowWidget::fitTo(QPoint place, QSize content, bool resizable)
+QMargins WindowWidget::border() const
+{
+    const QRect inner = geometry(), outer = frameGeometry();
+    if (isVisible())
+        return {inner.left() - outer.left(), inner.top() - outer.top(), outer.right() - inner.right(),
+                outer.bottom() - inner.bottom()};
+    // The desktop's borders are not known before the window is shown; they are about those of a window within one.
+    const int width = style()->pixelMetric(QStyle::PM_MdiSubWindowFrameWidth);
+    return {width, style()->pixelMetric(QStyle::PM_TitleBarHeight), width, width};
+}
+
+void WindowWidget::giveWay()
+{
+    const QSize most = screen()->availableGeometry().size().shrunkBy(border());
+    if (most.width() >= widget()->width() && most.height() >= widget()->height())
+        return;
+    window_.GiveWay(static_cast<float>(most.width()), static_cast<float>(most.height()));
+    fitTo(pos(), widget()->size());
+}
+
+void WindowWidget::fitTo(QPoint place, QSize content)
 {
     setFrameShape(QFrame::NoFrame);
     setFocusPolicy(Qt::NoFocus);
-    // The desktop's borders are not known before the window is shown; they are about those of a window within one.
-    const int border = style()->pixelMetric(QStyle::PM_MdiSubWindowFrameWidth);
-    const int title = style()->pixelMetric(QStyle::PM_TitleBarHeight);
-    const QRect room = screen()->availableGeometry().adjusted(border, title, -border, -border);
+    const QRect desk = screen()->availableGeometry();
+    const QMargins around = border();
+    const QSize room = desk.size().shrunkBy(around);
     const int bar = style()->pixelMetric(QStyle::PM_ScrollBarExtent);
     // A scroll bar takes room itself: where the content is too high it needs more width, and the other way round.
     QSize size = content;
-    if (!resizable && room.height() < size.height())
+    if (!isResizable_ && room.height() < size.height())
         size.rwidth() += bar;
-    if (!resizable && room.width() < size.width() && room.height() >= content.height() + bar)
+    if (!isResizable_ && room.width() < size.width() && room.height() >= content.height() + bar)
         size.rheight() += bar;
-    size = size.boundedTo(room.size());
+    size = size.boundedTo(room);
     // From here on the window fits the screen. It is moved as far as needed for all of it to show.
-    isResizable_ = resizable;
-    if (resizable)
+    if (isResizable_)
         resize(size);
     else
         setFixedSize(size);
-    move(std::max(room.left(), std::min(place.x(), room.right() + 1 - size.width())),
-         std::max(room.top(), std::min(place.y(), room.bottom() + 1 - size.height())));
+    const QSize whole = size.grownBy(around);
+    move(std::max(desk.left(), std::min(place.x(), desk.right() + 1 - whole.width())),
+         std::max(desk.top(), std::min(place.y(), desk.bottom() + 1 - whole.height())));
+}
+
+void WindowWidget::moveEvent(QMoveEvent* event)
+{
+    QScrollArea::moveEvent(event);
+    // The desktop has put its borders around the window, or it has come to another screen. Where it stands is the
+    // person's business, but no part of it may be too large for the screen.
+    const QSize whole = frameGeometry().size();
+    const QSize desk = screen()->availableGeometry().size();
+    if (isVisible() && (whole.width() > desk.width() || whole.height() > desk.height()))
+        giveWay();
 }
 
 void WindowWidget::makeModal(const QWidget* below)

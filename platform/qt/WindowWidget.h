@@ -15,7 +15,10 @@ public:
 
     /// Gives the window the size `content` at `place`, or what of it fits on the screen, moved up and left until it
     /// does. One that is resizable takes its content along, which needs no scroll bars.
-    void fitTo(QPoint place, QSize content, bool resizable);
+    void fitTo(QPoint place, QSize content);
+    void setResizable(bool isResizable) { isResizable_ = isResizable; }
+    /// Asks the window to make do with the room that the screen has, if that is too little for it.
+    void giveWay();
     /// To be called before the window shows. It stays in front of `below`, which may be null.
     void makeModal(const QWidget* below);
     /// Calls `action` when the key is pressed with `modifiers` of InterfaceDefs.h, once however long it is held, after
@@ -25,8 +28,12 @@ public:
 protected:
     void closeEvent(QCloseEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
+    void moveEvent(QMoveEvent* event) override;
 
 private:
+    /// What the desktop puts around the window.
+    QMargins border() const;
+
     BWindow& window_;
-    bool isResizable_ = false;
+    bool isResizable_ = true;
 };

@@ -531,7 +531,7 @@ int main(int argc, char** argv)
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv))
         return 2;
-    setenv("QT_QPA_PLATFORM", "offscreen", 0);
+    setenv("QT_QPA_PLATFORM", "offscreen:configfile=" PELORIN_SCREEN, 0); // with room for the whole window
     folder = std::make_unique<GeneratedFiles>();
     FigureReporter reporter;
     benchmark::RunSpecifiedBenchmarks(&reporter);

@@ -97,6 +97,9 @@ TEST_F(ImportWindowTest, AStatementIsAssignedShownAndBookedInOneStepAndRemembere
                                                 "4.5.2024;Spende;;;;;7,50\n5.5.2024;Einzahlung;Notgroschen;;;;5,00\n"
                                                 "6.5.2024;Gabe;;;;;1,00\n"));
     ASSERT_NE(dialog(), nullptr);
+    constexpr int kLow = 400; // of a small screen, for this sheet and those that follow
+    BWindow::newest()->GiveWay(static_cast<float>(dialog()->width()), kLow);
+    EXPECT_EQ(dialog()->height(), kLow);
     EXPECT_THAT(line("txtImportNote"),
                 StartsWith("No line has the headings of a statement: there is no column for date"));
     EXPECT_FALSE(canImport());
@@ -116,6 +119,9 @@ TEST_F(ImportWindowTest, AStatementIsAssignedShownAndBookedInOneStepAndRemembere
     answer({{"importType", "Charge"}, {"importCurrency", "EUR"}, {"importWord", "Gabe"}, {"importType", "Income"}});
     EXPECT_THAT(line("txtImport"), HasSubstr("5 new operations, 0 already there, 0 refused"));
     EXPECT_THAT(table("lstImportCash"), ElementsAre("Cash\tEUR\t0.00\t788.15", "Notgroschen\tEUR\t0.00\t5.00"));
+    EXPECT_GE(part<QAbstractItemView>("lstImport")->viewport()->height(), 3 * 18);
+    const auto* import = part<QWidget>("btnImport");
+    EXPECT_EQ(import->visibleRegion().boundingRect(), import->rect());
     importAndReturn(before, "Import operations from may.csv");
     show(kOperationPage);
     EXPECT_THAT(rows("lstOperations"), Contains(HasSubstr("Charge")));

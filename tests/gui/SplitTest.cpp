@@ -53,6 +53,10 @@ TEST_F(SplitTest, WhatWasShownIsDoneInOneStep)
                 ElementsAre("Before\t10\t12.50\t\t\t125.00", "After\t12\t10.00\t1/2\t5.00\t125.00"));
     EXPECT_THAT(line("txtSettlement"), HasSubstr("brings 5.00 EUR, rate cost paid, to Cash"));
     EXPECT_EQ(part<QWidget>("txtWarning"), nullptr);
+    constexpr int kLow = 310; // of a small screen
+    BWindow::newest()->GiveWay(static_cast<float>(dialog()->width()), kLow);
+    EXPECT_EQ(dialog()->height(), kLow);
+    EXPECT_EQ(dialog()->focusWidget()->visibleRegion().boundingRect(), dialog()->focusWidget()->rect());
     QTest::keyClick(dialog()->focusWidget(), Qt::Key_Return);
     settle();
     ASSERT_EQ(dialog(), nullptr);
