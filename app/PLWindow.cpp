@@ -197,53 +197,34 @@ const BRect kNoticeFrame(8, kHeight - kNoticeAbove, kWidth - 8, kHeight - kNotic
 } // namespace
 
 PLWindow::PLWindow(BRect frame, const DataFolder& folder)
-    : BWindow(frame, "Pelorin", B_TITLED_WINDOW, B_NOT_RESIZABLE, B_CURRENT_WORKSPACE)
+    : BWindow(frame, "Pelorin", B_TITLED_WINDOW, B_NOT_RESIZABLE, B_CURRENT_WORKSPACE), folder_(folder),
+      wallet_(std::make_unique<Wallet>())
 {
-    makePages();
+    makeTabs();
     SetMessage("No Company...");
-    // All that commands are handed on to is made before the first message can come.
     files_ = std::make_unique<DataFiles>(*this, *tabView_, folder);
-    companyQuotes_ = std::make_unique<QuoteEditor<Company>>(*this, *companyView_, "You must first select a company");
-    currencyQuotes_ =
-        std::make_unique<QuoteEditor<Currency>>(*this, *currencyView_, "You must first select a currency");
-    events_ = std::make_unique<EventEditor>(*this, *companyView_);
-    operations_ = std::make_unique<OperationEditor>(*this, *operationView_, *companyView_);
-    returns_ = std::make_unique<PageReturns>(*this, *walletView_);
-    split_ = std::make_unique<SplitAssistant>(*this, *companyView_, *operationView_);
-    import_ = std::make_unique<ImportAssistant>(*this, *tabView_, *companyView_, *currencyView_, folder);
-    tabView_->SetSelectionHook([this] { importButton_->SetEnabled(import_->isPossible()); });
-    export_ = std::make_unique<ExportAssistant>(
-        *this, *tabView_, *files_, folder,
-        ExportOffers(*this, *files_, *companyView_, *currencyView_, *walletView_, *operationView_));
-    report_ = std::make_unique<ReportAssistant>(*this, *tabView_, *files_, folder);
-    makeCompletions();
     shortcuts_ = std::make_unique<Shortcuts>(*this, *tabView_);
     guide_.addKey(*this);
-    walletView_->setDate(today());
-    ReinitWallet(); // from here on there is a wallet, always
-    history_ = std::make_unique<History>(moment(), files_->names());
-    showHistory();
-    rescue_ = std::make_unique<Rescue>(*this, *files_, folder);
     firstSteps_ = std::make_unique<FirstSteps>(*this, *tabView_, *files_, folder);
 }
 
 PLWindow::~PLWindow() = default;
 
-void PLWindow::makePages()
+void PLWindow::makeTabs()
 {
     tabView_ = new BTabView({0, 0, kWidth, kHeight}, "TabView", B_WIDTH_AS_USUAL, B_FOLLOW_ALL_SIDES);
-    const auto add = [this](BView* page, const char* label) {
-        auto* tab = new BTab(page);
+    companyView_ = new CompanyView(kPageFrame, "CompanyView", this); // in front
+    // In the order of `Tab`.
+    for (const char* label : {"Company", "Currency", "PortoFolio", "Operations", "Parameters"}) {
+        auto* tab = new BTab;
         tab->SetLabel(label);
         tab->SetToolTip(("Alt+" + std::to_string(tabView_->CountTabs() + 1)).c_str());
-        tabView_->AddTab(page, tab);
-    };
-    // In the order of `Tab`.
-    add(companyView_ = new CompanyView(kPageFrame, "CompanyView", this), "Company");
-    add(currencyView_ = new CurrencyView(kPageFrame, "CurrencyView", this), "Currency");
-    add(walletView_ = new WalletView(kPageFrame, "WalletView", this), "PortoFolio");
-    add(operationView_ = new OperationView(kPageFrame, "OperationView", this), "Operations");
-    add(parameterView_ = new ParameterView(kPageFrame, "ParameterView", this), "Parameters");
+        tabView_->AddTab(tabView_->CountTabs() == kCompanyTab ? companyView_ : nullptr, tab);
+    }
+    tabView_->SetSelectionHook([this] {
+        makeOtherPages();
+        importButton_->SetEnabled(import_->isPossible());
+    });
     messageView_ = new MessageView({0, kHeight - kStatusHeight, kWidth, kHeight}, "MessageView", this);
     AddChild(tabView_);
     AddChild(messageView_);
@@ -252,13 +233,47 @@ void PLWindow::makePages()
     AddChild(noticeLine_ = new NoticeLine(kNoticeFrame)); // last: in front of the edges of both
 }
 
+void PLWindow::makeOtherPages()
+{
+    if (currencyView_ != nullptr)
+        return;
+    tabView_->FillTab(kCurrencyTab, currencyView_ = new CurrencyView(kPageFrame, "CurrencyView", this));
+    tabView_->FillTab(kPortoFolioTab, walletView_ = new WalletView(kPageFrame, "WalletView", this));
+    tabView_->FillTab(kOperationTab, operationView_ = new OperationView(kPageFrame, "OperationView", this));
+    tabView_->FillTab(kParameterTab, parameterView_ = new ParameterView(kPageFrame, "ParameterView", this));
+    if (roomGiven_)
+        GiveWay(roomGiven_->Width(), roomGiven_->Height()); // they give way, too
+    companyQuotes_ = std::make_unique<QuoteEditor<Company>>(*this, *companyView_, "You must first select a company");
+    currencyQuotes_ =
+        std::make_unique<QuoteEditor<Currency>>(*this, *currencyView_, "You must first select a currency");
+    events_ = std::make_unique<EventEditor>(*this, *companyView_);
+    operations_ = std::make_unique<OperationEditor>(*this, *operationView_, *companyView_);
+    returns_ = std::make_unique<PageReturns>(*this, *walletView_);
+    split_ = std::make_unique<SplitAssistant>(*this, *companyView_, *operationView_);
+    import_ = std::make_unique<ImportAssistant>(*this, *tabView_, *companyView_, *currencyView_, folder_);
+    export_ = std::make_unique<ExportAssistant>(
+        *this, *tabView_, *files_, folder_,
+        ExportOffers(*this, *files_, *companyView_, *currencyView_, *walletView_, *operationView_));
+    report_ = std::make_unique<ReportAssistant>(*this, *tabView_, *files_, folder_);
+    makeCompletions();
+    walletView_->setDate(today());
+    ReinitWallet(); // shows it on all pages
+    history_ = std::make_unique<History>(moment(), files_->names());
+    showHistory();
+    rescue_ = std::make_unique<Rescue>(*this, *files_, folder_);
+    // From here on every command finds all that it works on.
+}
+
 void PLWindow::GiveWay(float width, float height)
 {
+    roomGiven_ = {0, 0, width, height};
     const float top = tabView_->TabHeight();
     const auto shrinkPages = [this](float room) {
         float highest = 0;
-        for (int32 i = 0; i < tabView_->CountTabs(); ++i)
-            highest = std::max(highest, static_cast<PageView*>(tabView_->TabAt(i)->View())->shrinkTo(room));
+        for (int32 i = 0; i < tabView_->CountTabs(); ++i) {
+            if (auto* page = static_cast<PageView*>(tabView_->TabAt(i)->View()))
+                highest = std::max(highest, page->shrinkTo(room));
+        }
         return highest;
     };
     height = std::min(height, kHeight);
@@ -345,6 +360,12 @@ void PLWindow::makeCompletions()
     completions_->offerCurrencies(*walletView_, "txtAccountCurrency");
     completions_->offerMarkets(*operationView_, "txtMarketName");
     completions_->offerCompanies(*operationView_, "txtCompanyAbbreviation", "txtMarketName");
+}
+
+void PLWindow::DispatchMessage(BMessage* message, BHandler* handler)
+{
+    makeOtherPages();
+    BWindow::DispatchMessage(message, handler);
 }
 
 void PLWindow::MessageReceived(BMessage* message)

@@ -51,7 +51,9 @@ public:
     explicit PLWindow(BRect frame, const DataFolder& folder = DataFolder());
     ~PLWindow() override;
 
+    void DispatchMessage(BMessage* message, BHandler* handler) override;
     void MessageReceived(BMessage* message) override;
+    void Painted() override { makeOtherPages(); }
     /// Ends the program. Intended: nothing is saved and nothing asked; saving is the user's own act.
     bool QuitRequested() override;
     void GiveWay(float width, float height) override;
@@ -70,6 +72,10 @@ public:
     void pressNotice(BMessage* message);
     /// Asks in an alert titled "Warning", in which Enter and Escape cancel. @return true for "Continue".
     static bool confirm(const char* question);
+
+    /// Makes the pages that are not in front, and what works on them, unless they are there. The window starts without,
+    /// which nobody sees: they are made once it is painted, or before the first message, and before another tab shows.
+    void makeOtherPages();
 
     // The model.
     Wallet* getWallet() const { return wallet_.get(); }
@@ -223,7 +229,7 @@ private:
 
     static constexpr const char* kDoneNotice = "done";
 
-    void makePages();
+    void makeTabs();
     void makeTableButtons();
     /// The page in front.
     BView& front() const;
@@ -252,10 +258,12 @@ private:
     /// Null, after a message, when there is none.
     Account* selectedAccount();
 
+    DataFolder folder_;
     Catalogue catalogue_;
     std::unique_ptr<Wallet> wallet_;
     State* state_ = nullptr; // in the wallet
-    // The window's views own each other.
+    // The window's views own each other. The pages but the first are null until `makeOtherPages`, and so is what stands
+    // behind `files_` but for what the front page needs.
     MessageView* messageView_ = nullptr;
     NoticeLine* noticeLine_ = nullptr;
     BTabView* tabView_ = nullptr;
@@ -268,6 +276,7 @@ private:
     BButton* undoButton_ = nullptr;
     BButton* redoButton_ = nullptr;
     BButton* importButton_ = nullptr;
+    std::optional<BRect> roomGiven_;   // what the screen has, where that is too little
     std::unique_ptr<History> history_; // null while the window is made
     RepeatGuard repeats_;
     std::optional<std::string> formerMessage_; // while progress is shown

@@ -18,7 +18,8 @@ void PLWindow::makeUndoButtons()
     constexpr float kRight = 792;
     const auto add = [this](float left, const char* name, const char* label, uint32 code) {
         auto* button = new BButton({left, 1, left + kWidth, 1 + kHeight}, name, label, new BMessage(code));
-        AddChild(button); // which the window owns
+        button->SetEnabled(false); // nothing has been done yet
+        AddChild(button);          // which the window owns
         return button;
     };
     undoButton_ = add(kRight - 2 * kWidth - 3, "btnUndo", "Undo", 'HUnd');

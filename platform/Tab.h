@@ -7,8 +7,8 @@ class BView;
 /// One tab of a tab view: its label, and the view that it shows.
 class BTab {
 public:
-    /// Owns `contents` once it stands in a tab view.
-    explicit BTab(BView* contents) : view_(contents) {}
+    /// `contents` may be null until `SetView`; the tab view that the tab stands in owns it.
+    explicit BTab(BView* contents = nullptr) : view_(contents) {}
 
     void SetLabel(const char* label) { label_ = label; }
     const char* Label() const { return label_.c_str(); }
@@ -16,6 +16,8 @@ public:
     void SetToolTip(const char* text) { toolTip_ = text; }
     const char* ToolTip() const { return toolTip_.c_str(); }
     BView* View() const { return view_; }
+    /// For the tab view's own use; see `BTabView::FillTab`.
+    void SetView(BView* contents) { view_ = contents; }
 
 private:
     BView* view_;

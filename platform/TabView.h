@@ -17,14 +17,17 @@ public:
     ~BTabView() override;
 
     /// Takes ownership of both. The view keeps its frame, counted from below the tabs; what does not fit is cut off.
+    /// Without one the tab shows nothing until it is filled.
     void AddTab(BView* target, BTab* tab);
+    /// Gives the tab of that index, which has none yet, its view, as if it had been added with it.
+    void FillTab(int32 index, BView* target);
     int32 CountTabs() const { return static_cast<int32>(tabs_.size()); }
     BTab* TabAt(int32 index) const;
     virtual void Select(int32 index);
     /// `hook` is called whenever another tab was chosen, in whatever way. The kits have `Select` do that.
     void SetSelectionHook(const std::function<void()>& hook);
     float TabHeight() const;
-    /// From here on what does not fit is scrolled, of the views that have tabs by now. The kits leave it to the views.
+    /// From here on what does not fit is scrolled. The kits leave it to the views.
     void ScrollTabs();
     /// Index of the tab that is shown, negative without any.
     int32 Selection() const;
@@ -33,6 +36,7 @@ public:
 
 private:
     QTabWidget& tabWidget() const;
+    void scroll(BView& view);
 
     std::vector<std::unique_ptr<BTab>> tabs_;
     bool areScrolled_ = false;

@@ -56,6 +56,9 @@ public:
     /// kits leave it to the program to ask for the screen.
     virtual void GiveWay(float /*width*/, float /*height*/) {}
     virtual void FrameResized(float /*width*/, float /*height*/) {}
+    /// Hook: the window has come to the screen for the first time. What a person does not see yet can be made now. The
+    /// kits have no such hook.
+    virtual void Painted() {}
     /// Destroys the window, which has been made with `new`, and its views.
     virtual void Quit() { delete this; }
     /// `B_QUIT_REQUESTED` closes the window as by hand.

@@ -13,6 +13,7 @@
 
 namespace {
 
+constexpr const char* kNoFile = "No file";
 constexpr const char* kBookingLabels[] = {PageView::kAddLabel, PageView::kUpdateLabel, "Split"};
 
 /// A button whose command takes the numbers of its box.
@@ -47,7 +48,7 @@ private:
 } // namespace
 
 PageView::PageView(BRect frame, const char* name)
-    : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_WILL_DRAW | B_FRAME_EVENTS)
+    : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_FRAME_EVENTS)
 {
     SetViewColor(look::kPanel);
 }
@@ -118,7 +119,7 @@ void PageView::explain(BView& page, std::initializer_list<Tip> tips)
 
 void PageView::addOpenFile(BView* page, BRect frame)
 {
-    auto* line = new BStringView(frame, "txtOpenFile", "");
+    auto* line = new BStringView(frame, "txtOpenFile", kNoFile);
     line->SetAlignment(B_ALIGN_RIGHT);
     page->AddChild(line);
 }
@@ -132,7 +133,7 @@ std::string PageView::fileName(const String& path)
 
 void PageView::SetOpenFile(const String& path, unsigned changes)
 {
-    std::string text = path.isUndefined() ? "No file" : fileName(path);
+    std::string text = path.isUndefined() ? kNoFile : fileName(path);
     if (changes > 0)
         text += " - " + countText(static_cast<int>(changes)) + (changes == 1 ? " change" : " changes") + " not saved";
     auto* line = static_cast<BStringView*>(FindView("txtOpenFile"));

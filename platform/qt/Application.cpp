@@ -8,9 +8,7 @@
 #include "platform/qt/EndSignals.h"
 
 #include <QApplication>
-#include <QDir>
 #include <QFont>
-#include <QIcon>
 #include <QLoggingCategory>
 #include <QPalette>
 #include <QStyle>
@@ -76,16 +74,6 @@ protected:
     }
 };
 
-/// The icon of the program `name` in all sizes that were built in, without one if there are none.
-QIcon iconOf(const QString& name)
-{
-    QIcon icon;
-    const QDir icons(":/icons");
-    for (const QString& file : icons.entryList({name + "-*.png"}))
-        icon.addFile(icons.filePath(file));
-    return icon;
-}
-
 } // namespace
 
 void BApplication::UseNoDisplay()
@@ -108,7 +96,6 @@ BApplication::BApplication(const char* signature) : BLooper(signature), signatur
         const QString name = QString::fromStdString(signature_.substr(signature_.find_last_of("./") + 1));
         QApplication::setApplicationName(name);
         QApplication::setDesktopFileName(name.toLower());
-        QApplication::setWindowIcon(iconOf(name.toLower()));
     }
     QApplication::setPalette(panelColors());
     setLook();

@@ -54,7 +54,13 @@ void Canvas::paint(const std::function<void(QPainter&)>& draw)
         draw(*painter_);
         return;
     }
-    fit();
+    // What is drawn anew before somebody looks at it would cover this. The picture is up to date otherwise.
+    if (!hasNoGround())
+        fit();
+    if (hasNoGround() || stale_) {
+        widget_.update();
+        return;
+    }
     QPainter painter(&picture_);
     draw(painter);
     // The painter has to let go of the picture before somebody shows it.
@@ -67,7 +73,7 @@ void Canvas::drawAll(const std::function<void()>& draw)
     fit();
     // Before the drawing, so that a view which asks inside `Draw` to be drawn again will be.
     stale_ = false;
-    picture_.fill(state_.view != B_TRANSPARENT_COLOR ? toQt(state_.view) : QColor(Qt::transparent));
+    picture_.fill(hasNoGround() ? QColor(Qt::transparent) : toQt(state_.view));
     QPainter painter(&picture_);
     drawWith(painter, draw);
 }

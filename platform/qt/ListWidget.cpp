@@ -101,6 +101,25 @@ QSize ListRows::sizeHint(const QStyleOptionViewItem&, const QModelIndex&) const
     return {std::max(static_cast<int>(list_.RowWidth()), 1), static_cast<int>(list_.RowHeight())};
 }
 
+namespace {
+
+/// An empty groove while there is nothing to scroll; what Fusion paints then looks as if it could be moved.
+class QuietScrollBar final : public QScrollBar {
+public:
+    using QScrollBar::QScrollBar;
+
+protected:
+    void paintEvent(QPaintEvent* event) override
+    {
+        if (maximum() > minimum())
+            return QScrollBar::paintEvent(event);
+        QPainter painter(this);
+        painter.fillRect(rect(), palette().color(QPalette::Window));
+    }
+};
+
+} // namespace
+
 ListWidget::ListWidget(BListView& list) : list_(list), rows_(list), painter_(list)
 {
     // The widget then asks one row for its size, and not 100,000.
@@ -112,6 +131,7 @@ ListWidget::ListWidget(BListView& list) : list_(list), rows_(list), painter_(lis
     QObject::connect(horizontalScrollBar(), &QScrollBar::valueChanged, [this] { list_.ScrolledSideways(); });
     // Always, so that the columns keep their width, which the pages have reckoned with.
     setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOn);
+    setVerticalScrollBar(new QuietScrollBar(this)); // which the widget owns
     // By whole rows, as `TopRow` and `SetTopRow` count them.
     setVerticalScrollMode(QAbstractItemView::ScrollPerItem);
     setEditTriggers(QAbstractItemView::NoEditTriggers);

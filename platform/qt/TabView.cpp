@@ -10,6 +10,21 @@
 
 #include <utility>
 
+namespace {
+
+/// `whole` and what stands in it, in the order in which the Tab key goes through them.
+QWidgetList inFocusOrder(QWidget& whole)
+{
+    QWidgetList widgets{&whole};
+    for (QWidget* next = whole.nextInFocusChain(); next != &whole; next = next->nextInFocusChain()) {
+        if (whole.isAncestorOf(next))
+            widgets.append(next);
+    }
+    return widgets;
+}
+
+} // namespace
+
 BTabView::BTabView(BRect frame, const char* name, button_width, uint32 resizingMode, uint32 flags)
     : BView(frame, name, resizingMode, flags, new QTabWidget)
 {
@@ -46,10 +61,27 @@ QTabWidget& BTabView::tabWidget() const
 void BTabView::AddTab(BView* target, BTab* tab)
 {
     tabs_.emplace_back(tab);
-    // `AddChild` puts the view into the new page. The former ones keep what they have.
-    host_ = new QWidget;
-    tabWidget().setTabToolTip(tabWidget().addTab(host_, labelText(tab->Label())), QString::fromUtf8(tab->ToolTip()));
+    const int index = tabWidget().addTab(new QWidget, labelText(tab->Label()));
+    tabWidget().setTabToolTip(index, QString::fromUtf8(tab->ToolTip()));
+    if (target != nullptr)
+        FillTab(index, target);
+}
+
+void BTabView::FillTab(int32 index, BView* target)
+{
+    TabAt(index)->SetView(target);
+    // `AddChild` puts the view into that page. The others keep what they have.
+    host_ = tabWidget().widget(index);
     AddChild(target);
+    if (areScrolled_)
+        scroll(*target);
+    // However late it comes, the Tab key finds it in its page's place, before what stands beside the tabs.
+    QWidget* last = host_;
+    for (QWidget* widget : inFocusOrder(*target->widget())) {
+        if (last->nextInFocusChain() != widget)
+            QWidget::setTabOrder(last, widget);
+        last = widget;
+    }
 }
 
 BTab* BTabView::TabAt(int32 index) const
@@ -72,16 +104,21 @@ void BTabView::ScrollTabs()
     if (std::exchange(areScrolled_, true))
         return;
     for (const auto& tab : tabs_) {
-        QWidget* view = tab->View()->widget();
-        auto* area = new QScrollArea;
-        area->setFrameShape(QFrame::NoFrame);
-        area->setFocusPolicy(Qt::NoFocus); // what is in it has the keyboard, and is scrolled into sight
-        auto* room = new QVBoxLayout(view->parentWidget()); // which owns both
-        room->setContentsMargins(0, 0, 0, 0);
-        room->addWidget(area);
-        area->setWidget(view);
-        view->show();
+        if (tab->View() != nullptr)
+            scroll(*tab->View());
     }
+}
+
+void BTabView::scroll(BView& view)
+{
+    auto* area = new QScrollArea;
+    area->setFrameShape(QFrame::NoFrame);
+    area->setFocusPolicy(Qt::NoFocus); // what is in it has the keyboard, and is scrolled into sight
+    auto* room = new QVBoxLayout(view.widget()->parentWidget()); // which owns both
+    room->setContentsMargins(0, 0, 0, 0);
+    room->addWidget(area);
+    area->setWidget(view.widget());
+    view.widget()->show();
 }
 
 float BTabView::TabHeight() const

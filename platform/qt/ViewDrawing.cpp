@@ -67,8 +67,16 @@ const QPixmap& BView::picture()
 
 void BView::paintOn(QPainter& screen)
 {
-    // First the picture, which is as `Draw` has left it, and above it what comes and goes.
-    screen.drawPixmap(0, 0, picture());
+    const bool draws = (flags_ & B_WILL_DRAW) != 0;
+    if (canvas_->hasNoGround()) {
+        if (draws)
+            canvas_->drawWith(screen, [this] { Draw(Bounds()); });
+    } else if (draws || canvas_->hasPicture()) {
+        screen.drawPixmap(0, 0, picture()); // as `Draw` has left it
+    } else {
+        screen.fillRect(widget_->rect(), toQt(state_.view)); // all that there is
+    }
+    // Above it what comes and goes.
     canvas_->drawWith(screen, [this] { DrawOver(Bounds()); });
 }
 

@@ -25,7 +25,7 @@ std::vector<BWindow*>& windows()
 /// The view around a window's views, of the window's size.
 class RootView final : public BView {
 public:
-    explicit RootView(BRect frame) : BView(frame, "", B_FOLLOW_ALL, B_WILL_DRAW) { SetViewColor(kPanelGrey); }
+    explicit RootView(BRect frame) : BView(frame, "", B_FOLLOW_ALL, 0) { SetViewColor(kPanelGrey); }
 };
 
 } // namespace

@@ -5,13 +5,35 @@
 #include "platform/qt/Access.h"
 #include "platform/qt/HeldKey.h"
 
+#include <QApplication>
 #include <QCloseEvent>
+#include <QDir>
+#include <QIcon>
 #include <QScreen>
 #include <QShortcut>
 #include <QStyle>
+#include <QTimer>
 #include <QWindow>
 
 #include <algorithm>
+#include <chrono>
+#include <utility>
+
+namespace {
+
+/// Gives the program its icon, in all sizes that were built in, if it has one and does not show it yet.
+void showIcon()
+{
+    if (!QApplication::windowIcon().isNull())
+        return;
+    QIcon icon;
+    const QDir icons(":/icons");
+    for (const QString& file : icons.entryList({QApplication::desktopFileName() + "-*.png"}))
+        icon.addFile(icons.filePath(file));
+    QApplication::setWindowIcon(icon);
+}
+
+} // namespace
 
 WindowWidget::WindowWidget(BWindow& window) : window_(window)
 {
@@ -109,6 +131,31 @@ void WindowWidget::makeModal(const QWidget* below)
     // No child of that window's widget, which would destroy this one along with itself.
     if (below != nullptr)
         windowHandle()->setTransientParent(below->window()->windowHandle());
+}
+
+void WindowWidget::showEvent(QShowEvent* event)
+{
+    QScrollArea::showEvent(event);
+    if (!std::exchange(wasShown_, true))
+        windowHandle()->installEventFilter(this); // until it is on the screen
+}
+
+bool WindowWidget::eventFilter(QObject* watched, QEvent* event)
+{
+    if (watched == windowHandle() && event->type() == QEvent::Expose && windowHandle()->isExposed()) {
+        watched->removeEventFilter(this);
+        // It is painted now. Soon after the desktop gives it the keyboard, and that is painted first, too.
+        QMetaObject::invokeMethod(
+            this, [this] { QTimer::singleShot(std::chrono::milliseconds(10), this, &WindowWidget::tellPainted); },
+            Qt::QueuedConnection);
+    }
+    return QScrollArea::eventFilter(watched, event);
+}
+
+void WindowWidget::tellPainted()
+{
+    showIcon();
+    window_.Painted();
 }
 
 void WindowWidget::closeEvent(QCloseEvent* event)

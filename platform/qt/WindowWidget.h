@@ -26,6 +26,8 @@ public:
     void addShortcut(int key, uint32 modifiers, const std::function<void()>& action);
 
 protected:
+    void showEvent(QShowEvent* event) override;
+    bool eventFilter(QObject* watched, QEvent* event) override;
     void closeEvent(QCloseEvent* event) override;
     void resizeEvent(QResizeEvent* event) override;
     void moveEvent(QMoveEvent* event) override;
@@ -33,7 +35,9 @@ protected:
 private:
     /// What the desktop puts around the window.
     QMargins border() const;
+    void tellPainted();
 
     BWindow& window_;
     bool isResizable_ = true;
+    bool wasShown_ = false;
 };

@@ -167,6 +167,7 @@ protected:
     {
         auto* window = new PLWindow({50, 50, 850, 850}, DataFolder(data_));
         window->Show();
+        window->makeOtherPages();
         auto* button = window->widget().findChild<QAbstractButton*>("btnNotice1");
         EXPECT_TRUE(button->isVisible());
         QTest::mouseClick(button, Qt::LeftButton);

@@ -53,6 +53,7 @@ void WindowTest::open()
 {
     window_ = make_({50, 50, 850, 850}, DataFolder(folder_));
     window_->Show();
+    window_->makeOtherPages(); // which a person would wait for without noticing
     activate();
 }
 
