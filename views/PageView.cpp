@@ -47,8 +47,7 @@ private:
 
 } // namespace
 
-PageView::PageView(BRect frame, const char* name)
-    : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_FRAME_EVENTS)
+PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_FRAME_EVENTS)
 {
     SetViewColor(look::kPanel);
 }

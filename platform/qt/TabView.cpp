@@ -12,15 +12,27 @@
 
 namespace {
 
-/// `whole` and what stands in it, in the order in which the Tab key goes through them.
-QWidgetList inFocusOrder(QWidget& whole)
+bool takesFocus(const QWidget& widget)
 {
-    QWidgetList widgets{&whole};
-    for (QWidget* next = whole.nextInFocusChain(); next != &whole; next = next->nextInFocusChain()) {
-        if (whole.isAncestorOf(next))
-            widgets.append(next);
+    return widget.focusPolicy() != Qt::NoFocus;
+}
+
+/// Has the Tab key come to what stands in `view` behind `place`, which may stand far before it.
+void setTabOrder(QWidget& place, const QWidget& view)
+{
+    QWidgetList inner;
+    for (QWidget* next = view.nextInFocusChain(); next != &view; next = next->nextInFocusChain()) {
+        if (view.isAncestorOf(next) && takesFocus(*next))
+            inner.append(next);
     }
-    return widgets;
+    // Qt moves one behind another only when both have the keyboard at times.
+    QWidget* last = &place;
+    while (!takesFocus(*last) && last->previousInFocusChain() != &place)
+        last = last->previousInFocusChain();
+    for (QWidget* widget : inner) {
+        QWidget::setTabOrder(last, widget);
+        last = widget;
+    }
 }
 
 } // namespace
@@ -76,12 +88,8 @@ void BTabView::FillTab(int32 index, BView* target)
     if (areScrolled_)
         scroll(*target);
     // However late it comes, the Tab key finds it in its page's place, before what stands beside the tabs.
-    QWidget* last = host_;
-    for (QWidget* widget : inFocusOrder(*target->widget())) {
-        if (last->nextInFocusChain() != widget)
-            QWidget::setTabOrder(last, widget);
-        last = widget;
-    }
+    if (host_->nextInFocusChain() != target->widget())
+        setTabOrder(*host_, *target->widget());
 }
 
 BTab* BTabView::TabAt(int32 index) const

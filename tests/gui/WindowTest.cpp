@@ -7,6 +7,7 @@
 #include "market/Currency.h"
 #include "market/Market.h"
 #include "platform/StringView.h"
+#include "platform/TextControl.h"
 #include "portfolio/Share.h"
 #include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"
@@ -64,6 +65,50 @@ TEST_F(MainWindowTest, EveryControlHasANameARoleAndItsLabelAndIsReachedByTab)
                 EXPECT_NE(button->focusPolicy() & Qt::TabFocus, 0) << button->objectName().toStdString();
             }
     }
+}
+
+/// Beside the fixture's window, another one as a start leaves it.
+class StartTest : public MainWindowTest {
+protected:
+    StartTest()
+    {
+        started_->Show();
+        [[maybe_unused]] const bool isExposed = QTest::qWaitForWindowExposed(&desktop());
+    }
+
+    PLWindow& started() { return *started_; }
+    QWidget& desktop() { return started_->widget(); }
+
+private:
+    std::unique_ptr<PLWindow, void (*)(PLWindow*)> started_{new PLWindow({50, 50, 850, 850}, DataFolder("/nowhere")),
+                                                            [](PLWindow* window) { window->Quit(); }};
+};
+
+TEST_F(StartTest, OtherPagesComeAfterThePictureWithoutAChangeInIt)
+{
+    ASSERT_EQ(started().FindView("WalletView"), nullptr);
+    const QImage first = desktop().grab().toImage();
+    ASSERT_TRUE(QTest::qWaitFor([this] { return started().FindView("ParameterView") != nullptr; }));
+    settle();
+    EXPECT_EQ(desktop().grab().toImage(), first);
+    // As if all had been there from the start, the Tab key leads from page to page, and then to what is beside them.
+    const QWidget* at = &desktop();
+    for (const char* name : {"lstCompanies", "lstCurrencies", "lstAccounts", "lstOperations", "btnUndo"}) {
+        do
+            at = at->nextInFocusChain();
+        while (at != &desktop() && at->objectName() != name);
+        ASSERT_NE(at, &desktop()) << name << " comes before the one that it should follow";
+    }
+}
+
+TEST_F(StartTest, WhoIsFasterFindsThemAll)
+{
+    QTest::keyClick(&desktop(), Qt::Key_3, Qt::AltModifier);
+    QApplication::sendPostedEvents();
+    ASSERT_NE(started().FindView("WalletView"), nullptr);
+    const auto* date = dynamic_cast<BTextControl*>(started().FindView("WalletView")->FindView("txtDate"));
+    EXPECT_STREQ(date->Text(), "21/11/2024");
+    EXPECT_TRUE(date->widget()->isVisible());
 }
 
 TEST_F(MainWindowTest, StatusLineIsOnTheScreenWhileItsCommandStillRuns)
