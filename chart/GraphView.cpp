@@ -311,12 +311,12 @@ ChartContents GraphView::readContents()
     contents.isDateBased = xDateBased_;
     contents.xLegend = std::string(xLegend_.bytes());
     contents.yLegend = std::string(yLegend_.bytes());
-    contents.labelFont = fontOf(minMaxSize_);
     contents.legendFont = fontOf(legendSize_);
     if (buttons_ != nullptr)
         contents.controls = buttons_->frame();
     if (contents.series.empty())
         return contents;
+    contents.labelFont = fontOf(minMaxSize_); // there is nothing to label otherwise
     placeFlagsOf(contents);
     takeRange(contents);
     return contents;
