@@ -241,8 +241,8 @@ void PLWindow::makeOtherPages()
     tabView_->FillTab(kPortoFolioTab, walletView_ = new WalletView(kPageFrame, "WalletView", this));
     tabView_->FillTab(kOperationTab, operationView_ = new OperationView(kPageFrame, "OperationView", this));
     tabView_->FillTab(kParameterTab, parameterView_ = new ParameterView(kPageFrame, "ParameterView", this));
-    if (roomGiven_)
-        GiveWay(roomGiven_->Width(), roomGiven_->Height()); // they give way, too
+    if (roomHeight_ > 0)
+        GiveWay(roomWidth_, roomHeight_); // they give way, too
     companyQuotes_ = std::make_unique<QuoteEditor<Company>>(*this, *companyView_, "You must first select a company");
     currencyQuotes_ =
         std::make_unique<QuoteEditor<Currency>>(*this, *currencyView_, "You must first select a currency");
@@ -266,7 +266,8 @@ void PLWindow::makeOtherPages()
 
 void PLWindow::GiveWay(float width, float height)
 {
-    roomGiven_ = {0, 0, width, height};
+    roomWidth_ = width;
+    roomHeight_ = height;
     const float top = tabView_->TabHeight();
     const auto shrinkPages = [this](float room) {
         float highest = 0;

@@ -262,8 +262,8 @@ private:
     Catalogue catalogue_;
     std::unique_ptr<Wallet> wallet_;
     State* state_ = nullptr; // in the wallet
-    // The window's views own each other. The pages but the first are null until `makeOtherPages`, and so is what stands
-    // behind `files_` but for what the front page needs.
+    // The window's views own each other. The pages but the first are null until `makeOtherPages`, and so is all behind
+    // `files_` but `guide_`, `shortcuts_` and `firstSteps_`.
     MessageView* messageView_ = nullptr;
     NoticeLine* noticeLine_ = nullptr;
     BTabView* tabView_ = nullptr;
@@ -276,7 +276,8 @@ private:
     BButton* undoButton_ = nullptr;
     BButton* redoButton_ = nullptr;
     BButton* importButton_ = nullptr;
-    std::optional<BRect> roomGiven_;   // what the screen has, where that is too little
+    float roomWidth_ = 0; // what the screen has, where that is too little; 0 otherwise
+    float roomHeight_ = 0;
     std::unique_ptr<History> history_; // null while the window is made
     RepeatGuard repeats_;
     std::optional<std::string> formerMessage_; // while progress is shown

@@ -135,7 +135,7 @@ void PLWindow::showHistory()
          history_->canRedo() ? "Redo: " + history_->redoLabel() + "  Ctrl+Shift+Z" : "Nothing to redo");
     const std::array unsaved{unsavedChanges(FileKind::kMarkets), unsavedChanges(FileKind::kWallet)};
     for (int32 i = 0; i < tabView_->CountTabs(); ++i) {
-        // The first two pages are about the market data; see `makePages`.
+        // The first two pages are about the market data; see `makeTabs`.
         const FileKind kind = i < 2 ? FileKind::kMarkets : FileKind::kWallet;
         static_cast<PageView*>(tabView_->TabAt(i)->View())
             ->SetOpenFile(files_->names().of(kind).path, unsaved[static_cast<std::size_t>(kind)]);

@@ -37,6 +37,8 @@ public:
 private:
     QTabWidget& tabWidget() const;
     void scroll(BView& view);
+    /// Has the Tab key come to all that stands in the tabs before what stands beside them: buttons and the like.
+    void putFirst();
 
     std::vector<std::unique_ptr<BTab>> tabs_;
     bool areScrolled_ = false;

@@ -87,7 +87,7 @@ private:
 
 } // namespace
 
-OperationView::OperationView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
+OperationView::OperationView(BRect frame, const char* name, BWindow*) : PageView(frame, name, B_WILL_DRAW)
 {
     prevision_ = addCheckBox(this, {kMargin, kMargin, kMargin + 150, kMargin + kFieldHeight}, "cbxPrevision",
                              "With Previsions", 'OCPr');

@@ -47,7 +47,8 @@ private:
 
 } // namespace
 
-PageView::PageView(BRect frame, const char* name) : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_FRAME_EVENTS)
+PageView::PageView(BRect frame, const char* name, uint32 flags)
+    : BView(frame, name, B_FOLLOW_LEFT | B_FOLLOW_TOP, B_FRAME_EVENTS | flags)
 {
     SetViewColor(look::kPanel);
 }

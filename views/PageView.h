@@ -25,7 +25,8 @@ public:
     /// And of the one that removes the selected row.
     static constexpr const char* kRemoveLabel = "Remove";
 
-    PageView(BRect frame, const char* name);
+    /// A page that draws something itself, between its controls, says so by `B_WILL_DRAW` in `flags`.
+    PageView(BRect frame, const char* name, uint32 flags = 0);
     ~PageView() override;
 
     /// Takes the page to `height`, less than it was laid out for: lists and charts give way. @return its height now,

@@ -170,7 +170,7 @@ private:
     const Plan* plan_ = nullptr;
 };
 
-ParameterView::ParameterView(BRect frame, const char* name, BWindow*) : PageView(frame, name)
+ParameterView::ParameterView(BRect frame, const char* name, BWindow*) : PageView(frame, name, B_WILL_DRAW)
 {
     addOpenFile(this, {kRight, 2, look::kPageWidth - look::kMargin, 2 + kHeight});
     for (std::size_t i = 0; i < fields_.size(); ++i) {

@@ -54,18 +54,16 @@ void Canvas::paint(const std::function<void(QPainter&)>& draw)
         draw(*painter_);
         return;
     }
-    // What is drawn anew before somebody looks at it would cover this. The picture is up to date otherwise.
-    if (!hasNoGround())
-        fit();
-    if (hasNoGround() || stale_) {
-        widget_.update();
+    widget_.update();
+    if (hasNoGround())
         return;
-    }
+    fit();
+    if (stale_)
+        return; // it is drawn anew before somebody looks, and that would cover this
     QPainter painter(&picture_);
     draw(painter);
     // The painter has to let go of the picture before somebody shows it.
     painter.end();
-    widget_.update();
 }
 
 void Canvas::drawAll(const std::function<void()>& draw)
@@ -73,7 +71,7 @@ void Canvas::drawAll(const std::function<void()>& draw)
     fit();
     // Before the drawing, so that a view which asks inside `Draw` to be drawn again will be.
     stale_ = false;
-    picture_.fill(hasNoGround() ? QColor(Qt::transparent) : toQt(state_.view));
+    picture_.fill(toQt(state_.view));
     QPainter painter(&picture_);
     drawWith(painter, draw);
 }

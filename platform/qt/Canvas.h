@@ -44,8 +44,6 @@ public:
     /// Whether the view is seen through where it does not draw. It is drawn whenever it is looked at: a picture of its
     /// size, most of which is empty, would cost more.
     bool hasNoGround() const { return state_.view == B_TRANSPARENT_COLOR; }
-    /// Whether anything has asked for it by now.
-    bool hasPicture() const { return !picture_.isNull(); }
     void markStale() { stale_ = true; }
 
     QColor color(pattern p) const { return color(p == B_SOLID_HIGH ? state_.high : state_.low); }

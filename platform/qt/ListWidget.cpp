@@ -103,7 +103,8 @@ QSize ListRows::sizeHint(const QStyleOptionViewItem&, const QModelIndex&) const
 
 namespace {
 
-/// An empty groove while there is nothing to scroll; what Fusion paints then looks as if it could be moved.
+/// An empty groove while there is nothing to scroll. What the style paints then looks as if it could be moved, and is
+/// the dearest of all controls: a start has four of them.
 class QuietScrollBar final : public QScrollBar {
 public:
     using QScrollBar::QScrollBar;

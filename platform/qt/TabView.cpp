@@ -10,33 +10,6 @@
 
 #include <utility>
 
-namespace {
-
-bool takesFocus(const QWidget& widget)
-{
-    return widget.focusPolicy() != Qt::NoFocus;
-}
-
-/// Has the Tab key come to what stands in `view` behind `place`, which may stand far before it.
-void setTabOrder(QWidget& place, const QWidget& view)
-{
-    QWidgetList inner;
-    for (QWidget* next = view.nextInFocusChain(); next != &view; next = next->nextInFocusChain()) {
-        if (view.isAncestorOf(next) && takesFocus(*next))
-            inner.append(next);
-    }
-    // Qt moves one behind another only when both have the keyboard at times.
-    QWidget* last = &place;
-    while (!takesFocus(*last) && last->previousInFocusChain() != &place)
-        last = last->previousInFocusChain();
-    for (QWidget* widget : inner) {
-        QWidget::setTabOrder(last, widget);
-        last = widget;
-    }
-}
-
-} // namespace
-
 BTabView::BTabView(BRect frame, const char* name, button_width, uint32 resizingMode, uint32 flags)
     : BView(frame, name, resizingMode, flags, new QTabWidget)
 {
@@ -87,9 +60,25 @@ void BTabView::FillTab(int32 index, BView* target)
     AddChild(target);
     if (areScrolled_)
         scroll(*target);
-    // However late it comes, the Tab key finds it in its page's place, before what stands beside the tabs.
-    if (host_->nextInFocusChain() != target->widget())
-        setTabOrder(*host_, *target->widget());
+    putFirst();
+}
+
+void BTabView::putFirst()
+{
+    QWidget* last = tabWidget().tabBar();
+    QWidgetList beside;
+    for (QWidget* next = last->nextInFocusChain(); next != tabWidget().tabBar(); next = next->nextInFocusChain()) {
+        if (next->focusPolicy() == Qt::NoFocus)
+            continue;
+        if (tabWidget().isAncestorOf(next))
+            last = next;
+        else
+            beside.append(next);
+    }
+    for (QWidget* widget : beside) {
+        QWidget::setTabOrder(last, widget);
+        last = widget;
+    }
 }
 
 BTab* BTabView::TabAt(int32 index) const

@@ -71,7 +71,7 @@ void BView::paintOn(QPainter& screen)
     if (canvas_->hasNoGround()) {
         if (draws)
             canvas_->drawWith(screen, [this] { Draw(Bounds()); });
-    } else if (draws || canvas_->hasPicture()) {
+    } else if (draws) {
         screen.drawPixmap(0, 0, picture()); // as `Draw` has left it
     } else {
         screen.fillRect(widget_->rect(), toQt(state_.view)); // all that there is

@@ -30,6 +30,9 @@ protected:
 
     /// Closes the window, and opens another one on the same folder.
     void restart();
+    /// The page in front.
+    BView& pageView();
+    QWidget& page();
     PLWindow& window() { return *window_; }
     Wallet& wallet() { return *window_->getWallet(); }
     const std::string& folder() const { return folder_; }
@@ -124,8 +127,6 @@ private:
     void activate();
     /// What has the keyboard, or gets it back when the window does.
     QWidget& keyboard();
-    BView& pageView();
-    QWidget& page();
     void watchForAlert();
 
     std::unique_ptr<QTemporaryDir> temporary_;

@@ -208,6 +208,7 @@ void tourRescue(TourHand& hand)
 
 void tourGuide(TourHand& hand)
 {
+    hand.picture("guide-first", {0, 0, 800, 800});
     makeFirstPortfolio(hand);
     addDollars(hand);
     showImport(hand);
