@@ -94,11 +94,12 @@ void NoticeLine::MessageReceived(BMessage* message)
         update();
         break;
     case kDismissed:
-        removeFront();
+        if (isSeen())
+            removeFront();
         break;
     case kKeyPressed:
         message->FindInt32("button", &button);
-        if (front() != nullptr && button < static_cast<int32>(front()->buttons.size()))
+        if (isSeen() && button < static_cast<int32>(front()->buttons.size()))
             buttons_[static_cast<std::size_t>(button)]->Invoke();
         break;
     default:
@@ -156,6 +157,7 @@ void NoticeLine::press(BMessage* message)
 
 void NoticeLine::Draw(BRect)
 {
+    seen_ = shown_;
     SetHighColor(kEdge);
     StrokeRect(Bounds());
 }
@@ -194,6 +196,7 @@ void NoticeLine::update()
     }
     text_->ResizeTo(placeButtons(*notice) - 2 * kInset, Bounds().Height());
     text_->setText(notice->text);
+    Invalidate();
     Show();
 }
 

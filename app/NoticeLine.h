@@ -43,6 +43,9 @@ public:
 private:
     /// Null without one.
     const Notice* front() const;
+    /// Whether there is one, and it is the one on the screen: a key that is pressed while another one comes up is meant
+    /// for what stood there before.
+    bool isSeen() const { return front() != nullptr && seen_ == shown_; }
     void removeFront();
     /// Shows what stands in front now.
     void update();
@@ -54,6 +57,7 @@ private:
     std::chrono::steady_clock::time_point passingSince_;
     std::unique_ptr<BMessageRunner> expiry_; // of `passing_`
     int32 shown_ = 0;                        // counts what was shown, so that a late press does not meet another notice
+    int32 seen_ = 0;                         // the one of these that was drawn last
     NoticeText* text_ = nullptr;
     std::vector<BButton*> buttons_;
 };

@@ -66,6 +66,13 @@ TEST_F(NoticeTest, SeveralQueueAndAClickBringsTheNext)
     QTest::keyClick(QApplication::focusWidget(), Qt::Key_6, Qt::AltModifier);
     settle();
     EXPECT_EQ(pressed + notice(), "OnGo");
+    window().showNotice({"e", "just come", {button("Unread")}});
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_6, Qt::AltModifier);
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_0, Qt::AltModifier);
+    settle();
+    EXPECT_EQ(pressed + notice(), "OnGojust come") << "not for what nobody has seen";
+    key(Qt::Key_6, Qt::AltModifier);
+    EXPECT_EQ(pressed + notice(), "OnGoUnread");
     window().showNotice({"c", "third", {}});
     window().showNotice({"a", "last", {}});
     window().dropNotice("c");
