@@ -82,6 +82,7 @@ PLWindow* inNewWindow(const DataFolder& folder, const std::string& pictures, con
 {
     auto* window = new PLWindow({50, 50, 850, 850}, folder); // the application closes it
     window->Show();
+    window->makeOtherPages();
     handle_pending_messages();
     TourHand hand(*window, pictures);
     tour(hand);
