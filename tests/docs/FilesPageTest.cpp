@@ -35,11 +35,11 @@ TEST(FilesPageTest, ExamplesAreReadWholeAndWrittenAgain)
     const Date saved(5, 5, 1999);
     Catalogue catalogue;
     ASSERT_EQ(catalogue.rd(BytesFile(pages[0])), 0);
-    EXPECT_EQ(pages[0], written([&](FILE* file) { catalogue.wrt(file, saved); }));
+    EXPECT_EQ(pages[0], bytesWritten(catalogue, saved));
     Wallet wallet;
     wallet.setCatalogue(catalogue);
     Date stamp;
     ASSERT_EQ(wallet.rd(BytesFile(pages[1]), &stamp), 0);
-    EXPECT_EQ(pages[1], written([&](FILE* file) { wallet.wrt(file, saved); }));
+    EXPECT_EQ(pages[1], bytesWritten(wallet, saved));
     EXPECT_EQ(stamp, saved);
 }

@@ -52,8 +52,8 @@ public:
         for (int i = 0; i < Wallet::kParameterCount; ++i)
             wallet.setParameter(static_cast<Wallet::Parameter>(i),
                                 i == Wallet::kInvestementPeriod ? static_cast<float>(below(900)) - 90 : amount());
-        marketFile = written([&](FILE* file) { EXPECT_EQ(catalogue.wrt(file, kStart), 0); });
-        portfolioFile = written([&](FILE* file) { EXPECT_EQ(wallet.wrt(file, kStart), 0); });
+        marketFile = bytesWritten(catalogue, kStart);
+        portfolioFile = bytesWritten(wallet, kStart);
     }
 
     std::string marketFile, portfolioFile;
@@ -135,14 +135,8 @@ struct Loaded {
         wallet.setCatalogue(catalogue);
         EXPECT_EQ(wallet.rd(BytesFile(files.portfolioFile), nullptr), 0);
     }
-    std::string market() const
-    {
-        return written([&](FILE* file) { EXPECT_EQ(catalogue.wrt(file, kStart), 0); });
-    }
-    std::string portfolio() const
-    {
-        return written([&](FILE* file) { EXPECT_EQ(wallet.wrt(file, kStart), 0); });
-    }
+    std::string market() const { return bytesWritten(catalogue, kStart); }
+    std::string portfolio() const { return bytesWritten(wallet, kStart); }
 
     Catalogue catalogue;
     Wallet wallet;
@@ -333,11 +327,9 @@ TEST(JournalTest, WhatReplayAndNamesHaveOfOddThingsComesOutTheSame)
     transfer(main, second, 1, 5000.7F)->setFromCurrencyQuote(0.9F);
     transfer(main, savings, 1, 20)->setCost(30); // the sender pays 30
     transfer(main, old, 2, 100)->setRateCost(0.01F);
-    for (const auto& [amount, rateCost, cost] : {std::tuple(0.0F, 0.0F, -12.3F), {4.56F, 1.0F, 0.0F}, {7, 0.5F, 1}}) {
-        TransferAccountOperation* own = transfer(savings, savings, 3, amount); // income, a charge, and neither
-        own->setRateCost(rateCost);
-        own->setCost(cost);
-    }
+    // Income, a charge, and neither.
+    for (const auto& [amount, rateCost, cost] : {std::tuple(0.0F, 0.0F, -12.3F), {4.56F, 1.0F, 0.0F}, {7, 0.5F, 1}})
+        withTerms(transfer(savings, savings, 3, amount), rateCost, cost);
     // Tickers that are two companies', a currency's, none, too short, words and signs; with quotes up to the fifth day.
     int n = 0;
     for (const char* ticker : {"AC", "USD", "", "F", "s", "TRUE", "x \"y\";z", "BRK.B", "\xC3\xA9t\xC3\xA9", "AC\\"}) {

@@ -322,8 +322,8 @@ TEST_F(StatementTest, TheProgramBooksAllOrNothingAndKeepsTheFormerFile)
     unsetenv("XDG_CONFIG_HOME");
     p_.wallet.setBuyRateCost(0);
     p_.wallet.setSellRateCost(0.5F);
-    folder_.write("m", written([&](FILE* file) { p_.catalogue.wrt(file, kStart); }));
-    const std::string empty = written([&](FILE* file) { p_.wallet.wrt(file, kStart); });
+    folder_.write("m", bytesWritten(p_.catalogue, kStart));
+    const std::string empty = bytesWritten(p_.wallet, kStart);
     const std::string portfolio = folder_.write("p", empty);
     folder_.write("s.csv", "Valuta;Was;Ticker;St\xC3\xBC"
                            "ck;Betrag\n1.2.2026;Ein;;;1.000,50\n"

@@ -13,11 +13,6 @@
 
 namespace {
 
-std::string bytesOf(const Catalogue& catalogue, const Date& stamp)
-{
-    return written([&](FILE* file) { catalogue.wrt(file, stamp); });
-}
-
 void readRecords(const std::string& path)
 {
     unsigned long last = 0;
@@ -70,22 +65,22 @@ std::size_t sum(const MarketPlan::Counts& counts)
 void import(const std::string& path, unsigned kind)
 {
     const FuzzedPortfolio p;
-    const std::string before = bytesOf(p.catalogue, kStart);
+    const std::string before = bytesWritten(p.catalogue, kStart);
     const MemoryTable formerFile(before);
     MarketFile file(formerFile.path());
     Date day;
     std::optional<MarketPlan> plan = planOf(path, kind, file.catalogue(), &day);
-    require(bytesOf(file.catalogue(), kStart) == before, "a plan changes nothing");
+    require(bytesWritten(file.catalogue(), kStart) == before, "a plan changes nothing");
     if (!plan)
         return;
     const bool isNew = !plan->newMarkets.empty() || !plan->newCompanies.empty();
     const std::size_t quotes = sum(plan->quoteCounts);
     const MarketPlan::Owners changed = plan->carryOut(file.catalogue());
-    const std::string after = bytesOf(file.catalogue(), day);
+    const std::string after = bytesWritten(file.catalogue(), day);
     require(written([&](FILE* to) { require(file.write(to, changed, day) == 0, "it is written"); }) == after,
             "the file is written as the catalogue is");
     Catalogue again;
-    require(again.rd(BytesFile(after)) == 0 && bytesOf(again, day) == after, "what was imported is read back");
+    require(again.rd(BytesFile(after)) == 0 && bytesWritten(again, day) == after, "what was imported is read back");
     // A row without a market may mean another company once there is a second one of its ticker.
     plan = planOf(path, kind, file.catalogue(), &day);
     require(isNew || (plan && plan->isEmpty() && plan->quoteCounts.equal == quotes),

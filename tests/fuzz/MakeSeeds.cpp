@@ -57,10 +57,9 @@ int main(int argc, char** argv)
     const char* statement =
         "Bank\n\nDatum;Art;Zielkonto;Titel;Menge;Kurs;Betrag;Kosten\n01.02.1999;Kauf;;Alpha;5;7,25;;1\n"
         "02.02.1999;Transfer;Side;;;;1.000,50;\n13.02.1999;Zinsen;;;;;0,05;\nSumme;;;;;;1;\n";
-    if (argc == 2 && save(written([&p](FILE* file) { p.catalogue.wrt(file, kStart); }), folder / "market") &&
-        save(written([&p](FILE* file) { p.wallet.wrt(file, kStart); }), folder / "wallet") &&
-        save(latest, folder / "latest") && save(history, folder / "history") && saveTables(folder / "table") &&
-        save(statement, folder / "statement"))
+    if (argc == 2 && save(bytesWritten(p.catalogue, kStart), folder / "market") &&
+        save(bytesWritten(p.wallet, kStart), folder / "wallet") && save(latest, folder / "latest") &&
+        save(history, folder / "history") && saveTables(folder / "table") && save(statement, folder / "statement"))
         return 0;
     std::fputs("usage: fuzz_seeds FOLDER, one that can be written into\n", stderr);
     return 1;

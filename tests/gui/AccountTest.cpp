@@ -1,7 +1,5 @@
 // The account commands, by their controls on the portfolio page.
 
-#include "portfolio/DepositAccountOperation.h"
-#include "portfolio/TransferAccountOperation.h"
 #include "tests/gui/CatalogueFixture.h"
 #include "tests/support/ToolRun.h"
 

@@ -1,13 +1,7 @@
 #pragma once
 
-#include "market/Company.h"
-#include "market/Currency.h"
-#include "market/Market.h"
-#include "portfolio/Account.h"
-#include "portfolio/Share.h"
-#include "portfolio/ShareOperation.h"
-#include "portfolio/Wallet.h"
 #include "tests/gui/WindowFixture.h"
+#include "tests/support/SmallPortfolio.h"
 
 /// Tests of the commands, with their market data.
 class CatalogueTest : public WindowTest {
@@ -61,15 +55,23 @@ protected:
         new CompanyQuote(new Company(markets[1], "Beta", "BBB"), Date(1, 11, 2024), 10);
         window().UpdateState();
     }
+    Company* beta() { return window().catalogue().getMarkets()[1]->companies().front(); }
     /// A purchase of ten shares of the company, on the operation page's list.
     void buy(Company* company)
     {
-        auto* account = new Account("Cash");
-        account->setWallet(&wallet());
-        account->setCurrency(window().getReferenceCurrency());
+        Account* account = addAccount(wallet(), "Cash", window().getReferenceCurrency());
         auto* share = new Share(&wallet(), company);
         (new ShareOperation(Date(2, 3, 2024), share, true, 10, 11, false, 0))->setAccount(account);
         window().UpdateState();
+    }
+    /// Has the operation page's menus follow, as the account commands do, and shows it.
+    void showAccounts()
+    {
+        show(kPortoFolioPage);
+        window().UpdateState();
+        select("lstAccounts", 0);
+        click("btnUpdateQuote");
+        show(kOperationPage);
     }
     Company* company()
     {

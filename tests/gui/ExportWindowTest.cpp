@@ -1,6 +1,6 @@
 #include "foundation/NumberText.h"
 #include "platform/DialogAnswers.h"
-#include "tests/gui/WindowFixture.h"
+#include "tests/gui/CatalogueFixture.h"
 #include "tests/support/ToolRun.h"
 #include "views/ColumnListView.h"
 
@@ -27,7 +27,7 @@ Lines linesOf(const std::string& text)
     return lines;
 }
 
-class ExportWindowTest : public WindowTest {
+class ExportWindowTest : public CatalogueTest {
 protected:
     ~ExportWindowTest() override { DialogAnswers::current().panel = nullptr; }
 
@@ -56,15 +56,8 @@ protected:
         QTest::keyClick(menu, Qt::Key_Return);
         settle();
     }
-    /// The notice behind an export to `path`, which a person chooses in the panel.
+    /// The notice behind an export to `path`, whatever is there.
     std::string exportTo(const std::string& path, const std::string& label)
-    {
-        chooseExport(label);
-        answerPanel("SavePanel", path);
-        return notice();
-    }
-    /// The same where the panel has asked already, if it had to.
-    std::string exportOver(const std::string& path, const std::string& label)
     {
         DialogAnswers::current().panel = [&](const BFilePanel&) { return path; };
         chooseExport(label);
@@ -151,7 +144,9 @@ TEST_F(ExportWindowTest, WhatIsWrittenIsWhatTheCommandLineWrites)
         }
         show(kPortoFolioPage);
         // The second time over the tables of the first one.
-        EXPECT_EQ(exportTo(folder / "folder", "All tables into a folder..."), "11 tables written to folder");
+        chooseExport("All tables into a folder...");
+        answerPanel("SavePanel", folder / "folder");
+        EXPECT_EQ(notice(), "11 tables written to folder");
         EXPECT_EQ(ToolRun("diff", "-r -x '*.ledger' -x '*.beancount' all folder", folder).out, "");
     };
     expectAll(false);
@@ -165,16 +160,12 @@ TEST_F(ExportWindowTest, WhatIsWrittenIsWhatTheCommandLineWrites)
 
 TEST_F(ExportWindowTest, TheMenuOffersWhatThereIsAndEscapeLeavesIt)
 {
-    const auto expectNothing = [this] {
-        EXPECT_THAT(offered(kCompanyPage), ElementsAre("(Quotes of a company...)", "(Events of a company...)",
-                                                       "(Companies of a market...)", "(All quotes...)"));
-        EXPECT_THAT(offered(kCurrencyPage),
-                    ElementsAre("(Rates of a currency...)", "(All rates...)", "(Currencies...)"));
-        EXPECT_THAT(offered(kOperationPage),
-                    ElementsAre("(Operations shown...)", "(All operations...)", "-", "Report on paper..."));
-        EXPECT_THAT(offered(kParameterPage), ElementsAre("Parameters..."));
-    };
-    expectNothing();
+    EXPECT_THAT(offered(kCompanyPage), ElementsAre("(Quotes of a company...)", "(Events of a company...)",
+                                                   "(Companies of a market...)", "(All quotes...)"));
+    EXPECT_THAT(offered(kCurrencyPage), ElementsAre("(Rates of a currency...)", "(All rates...)", "(Currencies...)"));
+    EXPECT_THAT(offered(kOperationPage),
+                ElementsAre("(Operations shown...)", "(All operations...)", "-", "Report on paper..."));
+    EXPECT_THAT(offered(kParameterPage), ElementsAre("Parameters..."));
     EXPECT_THAT(offered(kPortoFolioPage),
                 ElementsAre("(Holdings at 21/11/2024...)", "(Accounts at 21/11/2024...)", "(Evolution...)", "-",
                             "(All tables into a folder...)", "(Journal for ledger and hledger...)",
@@ -258,7 +249,7 @@ TEST_F(ExportWindowTest, NothingIsReplacedUnaskedAndAFailureLeavesAllAsItWas)
     window().showNotice({"other", "a notice that waits for its time", {}});
     for (const auto& c : cases) {
         show(c.page);
-        EXPECT_THAT(exportOver(c.path, c.label), HasSubstr(std::string("Not written: ") + c.reason)) << c.path;
+        EXPECT_THAT(exportTo(c.path, c.label), HasSubstr(std::string("Not written: ") + c.reason)) << c.path;
     }
     EXPECT_TRUE(contentOf(marketFile()) == market);
     std::vector<std::string> left;
@@ -269,7 +260,7 @@ TEST_F(ExportWindowTest, NothingIsReplacedUnaskedAndAFailureLeavesAllAsItWas)
     window().dropNotice("other");
     // A success takes the notice of the failure away.
     show(kPortoFolioPage);
-    EXPECT_THAT(exportOver(place / "accounts.csv", "Accounts at 21/11/2024..."), HasSubstr("4 accounts"));
+    EXPECT_THAT(exportTo(place / "accounts.csv", "Accounts at 21/11/2024..."), HasSubstr("4 accounts"));
     press("txtNotice");
     EXPECT_EQ(notice(), "");
 }
@@ -279,32 +270,27 @@ TEST_F(ExportWindowTest, TheReportOfAYearIsWhatTheCommandLineMakes)
     loadSample();
     show(kOperationPage);
     click("cbxPrevision"); // which is no part of it
-    const auto press = [](const char* name) {
-        QTest::mouseClick(QApplication::activeModalWidget()->findChild<QWidget*>(name), Qt::LeftButton);
-        settle();
-    };
     const TemporaryFolder place("pelorin-gui-report");
     const auto save = [&](const std::string& path) {
         DialogAnswers::current().panel = [&](const BFilePanel& panel) {
             EXPECT_EQ(panel.SaveText(), "Sample 2024-11-21.pdf");
             return path;
         };
-        press("btnSavePdf");
-        return QApplication::activeModalWidget()->findChild<QWidget*>("txtReport")->accessibleName().toStdString();
+        pressPart("btnSavePdf");
+        return line("txtReport");
     };
     QTest::keyClick(&window().widget(), Qt::Key_P, Qt::ControlModifier);
     settle();
-    auto* dialog = QApplication::activeModalWidget();
-    ASSERT_NE(dialog, nullptr);
-    QTest::keyClicks(dialog->findChild<QWidget*>("reportYear"), "2023");
-    QTest::keyClicks(dialog->findChild<QWidget*>("reportPaper"), "L");
+    ASSERT_NE(dialog(), nullptr);
+    QTest::keyClicks(part<QWidget>("reportYear"), "2023");
+    QTest::keyClicks(part<QWidget>("reportPaper"), "L");
     settle();
     const std::string market = contentOf(marketFile());
     EXPECT_EQ(save(marketFile()), "Not written: Sample is a file that is open here");
     EXPECT_TRUE(contentOf(marketFile()) == market);
     EXPECT_EQ(save(place / "window.pdf"), "Report written to window.pdf");
-    press("btnCloseReport");
-    EXPECT_EQ(QApplication::activeModalWidget(), nullptr);
+    pressPart("btnCloseReport");
+    EXPECT_EQ(dialog(), nullptr);
     EXPECT_EQ(notice(), "Report written to window.pdf");
 
     const std::string files = "'" + marketFile() + "' '" + walletFile() + "'";

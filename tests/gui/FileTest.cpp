@@ -4,8 +4,6 @@
 #include "platform/Entry.h"
 #include "platform/FilePanel.h"
 #include "platform/Message.h"
-#include "platform/StringView.h"
-#include "platform/TabView.h"
 #include "portfolio/Account.h"
 #include "portfolio/Share.h"
 #include "portfolio/Wallet.h"
@@ -15,7 +13,6 @@
 #include <filesystem>
 #include <fstream>
 #include <functional>
-#include <sstream>
 #include <sys/stat.h>
 
 namespace {
@@ -56,35 +53,6 @@ protected:
     }
 };
 
-/// With one blank where there are several.
-std::string squeezed(const std::string& text)
-{
-    std::string squeezed;
-    for (const char c : text)
-        if (c != ' ' || !squeezed.ends_with(' '))
-            squeezed += c;
-    return squeezed;
-}
-
-/// The lines that the gains of pelorin-value have for a row of the holdings; none for one without.
-std::string gainsOf(const std::string& row)
-{
-    std::istringstream rest(row + '\t'); // the last cell may be empty
-    std::vector<std::string> cells;
-    for (std::string cell; std::getline(rest, cell, '\t');)
-        cells.push_back(cell);
-    constexpr std::size_t kOwn = 10, kSums = 6;
-    if (cells[kOwn].empty())
-        return {}; // nothing has happened yet
-    std::string own = cells[1], reference;
-    for (std::size_t i = kOwn; i < kOwn + kSums; ++i) {
-        own += ' ' + cells[i].substr(0, cells[i].find(' '));
-        reference += ' ' + cells[i + kSums];
-    }
-    const std::string symbol = cells[kOwn].substr(cells[kOwn].find(' '));
-    return squeezed(own + symbol + '\n' + (symbol == " EUR" ? "" : reference + " EUR\n"));
-}
-
 TEST_F(FileTest, SampleComesInThroughTheButtonsAndIsSavedUnchanged)
 {
     loadSample();
@@ -92,9 +60,6 @@ TEST_F(FileTest, SampleComesInThroughTheButtonsAndIsSavedUnchanged)
                          TemporaryFolder("pelorin-gui-value"));
     const std::string total = text("txtTotalValue");
     EXPECT_THAT(valued.out, testing::HasSubstr(total.substr(0, total.find(' '))));
-    EXPECT_NE(gainsOf(rows("lstShares")[0]), "");
-    for (const std::string& row : rows("lstShares"))
-        EXPECT_THAT(squeezed(valued.out), testing::HasSubstr(gainsOf(row)));
     const auto market = std::filesystem::file_size(marketFile());
     const auto portfolio = std::filesystem::file_size(walletFile());
     follow({{{}, "btnSavePortoFolio", "Wallet successfully saved..."}});
@@ -135,9 +100,8 @@ TEST_F(FileTest, AnEmptyWindowOffersTheSampleAndTheFilesThatWereSavedLast)
     QTest::keyClick(&window().widget(), Qt::Key_O, Qt::ControlModifier | Qt::ShiftModifier);
     settle();
     EXPECT_EQ(text("txtTotalDeposit"), "93,000.00 EUR");
-    auto& tabs = dynamic_cast<BTabView&>(*window().FindView("TabView"));
-    const auto* openFile = tabs.TabAt(kPortoFolioPage)->View()->FindView("txtOpenFile");
-    EXPECT_STREQ(dynamic_cast<const BStringView&>(*openFile).Text(), "Mine");
+    show(kPortoFolioPage);
+    EXPECT_EQ(openFile(), "Mine");
     answerNextAlert("Cancel");
     QTest::keyClick(&window().widget(), Qt::Key_O, Qt::ControlModifier | Qt::ShiftModifier);
     settle();
@@ -230,12 +194,8 @@ TEST_F(FileTest, DamagedMarketFileKeepsWhatWasReadAndIsNotSavedOver)
     loadMarkets(damaged);
     EXPECT_EQ(message(), "Failed to load the markets");
     EXPECT_GT(window().catalogue().getNbrCurrencies(), 0U);
-    click("btnSaveMarket");
-    EXPECT_EQ(panelFolder("SavePanel"), folder() + "/Companies");
-    answerPanel("SavePanel", "");
-    EXPECT_EQ(contentOf(damaged).size(), whole.size() / 2);
 
-    // Nor do the remains go into the place of the file that was loaded before, until a name is given.
+    // The remains do not go into the place of the file that was loaded before either, until a name is given.
     loadMarkets(marketFile());
     loadMarkets(damaged);
     click("btnSaveMarket");
@@ -375,28 +335,16 @@ TEST_F(FileTest, OtherSavesAreSilent)
     EXPECT_EQ(notice(), "");
 }
 
-TEST_F(FileTest, SavePanelComesWithTheOldNameAndWithoutOneForANewPortfolio)
+TEST_F(FileTest, ANewPortfolioComesToThePanelWithoutAName)
 {
     loadSample();
-    write(walletFile(), contentOf(walletFile()));
-    const auto panelName = [] {
-        for (QWidget* widget : QApplication::topLevelWidgets())
-            if (widget->objectName() == "SavePanel")
-                return widget->findChild<QLineEdit*>("fileNameEdit")->text().toStdString();
-        return std::string("no panel");
-    };
-    click("btnSavePortoFolio");
-    EXPECT_EQ(panelName(), "Sample");
-    answerPanel("SavePanel", "Other.2026");
-    EXPECT_TRUE(std::filesystem::exists(folder() + "/PortoFolios/Other.2026"));
     follow({{{}, "btnReinitPortoFolio", ""}});
     EXPECT_EQ(text("txtTotalDeposit"), "0.00 EUR");
+    EXPECT_EQ(savedTo("btnSavePortoFolio", ""), folder() + "/PortoFolios/");
     click("btnSavePortoFolio");
-    EXPECT_EQ(panelName(), "");
-    EXPECT_EQ(panelFolder("SavePanel"), folder() + "/PortoFolios");
-    answerPanel("SavePanel", "New");
+    answerPanel("SavePanel", "New.2026");
     EXPECT_EQ(message(), "Wallet successfully saved...");
-    const std::string file = folder() + "/PortoFolios/New";
+    const std::string file = folder() + "/PortoFolios/New.2026";
     EXPECT_TRUE(std::filesystem::remove(file)) << "no ending is added";
     std::filesystem::create_directory(file);
     follow({{{}, "btnSavePortoFolio", "Failed to open the file."}}); // its path is known now

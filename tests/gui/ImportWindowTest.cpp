@@ -74,12 +74,12 @@ protected:
         press("btnRedo");
         EXPECT_EQ(bytes(), after);
     }
-    void addAccount(const char* name)
+    void addCatalogueAndCash()
     {
-        auto* account = new Account(name);
-        account->setWallet(&wallet());
-        account->setCurrency(window().getReferenceCurrency());
+        addSmallCatalogue();
+        addAccount(wallet(), "Cash", window().getReferenceCurrency());
         window().showWallet();
+        window().noteStep();
     }
 };
 
@@ -87,9 +87,7 @@ protected:
 
 TEST_F(ImportWindowTest, AStatementIsAssignedShownAndBookedInOneStepAndRememberedForTheNext)
 {
-    addSmallCatalogue();
-    addAccount("Cash");
-    window().noteStep();
+    addCatalogueAndCash();
     // Neither the heading of the dates nor the word for a charge is known, nor the second account there.
     const std::string head = "Bank\nTag;Typ;Depot;Symbol;Stück;Kurs;Summe\n";
     const std::string before = bytes();
@@ -139,9 +137,7 @@ TEST_F(ImportWindowTest, AStatementIsAssignedShownAndBookedInOneStepAndRemembere
 
 TEST_F(ImportWindowTest, NothingIsBookedUnlessAPersonSaysSoForWhatIsThere)
 {
-    addSmallCatalogue();
-    addAccount("Cash");
-    window().noteStep();
+    addCatalogueAndCash();
     const std::string before = bytes();
     const std::string path =
         file("s.csv", "Date,Type,Account,Amount\n2024-05-02,Deposit,Cash,5\n2024-05-03,Deposit,Cash,no\n");

@@ -60,8 +60,7 @@ protected:
     void noteState(std::optional<FileKind> saving = {})
     {
         const auto sum = [](const std::string& bytes) { return std::to_string(checksumOf(bytes)) + ' '; };
-        std::string line = sum(written([this](FILE* file) { window().catalogue().wrt(file, today()); })) +
-                           sum(written([this](FILE* file) { wallet().wrt(file, today()); }));
+        std::string line = sum(bytesWritten(window().catalogue(), today())) + sum(bytesWritten(wallet(), today()));
         for (const FileKind kind : {FileKind::kMarkets, FileKind::kWallet})
             line += kind != saving && window().unsavedChanges(kind) > 0 ? "1 " : "0 ";
         if (line != std::exchange(last_, line))
@@ -175,7 +174,7 @@ protected:
         const auto* notice = window->widget().findChild<QWidget*>("txtNotice");
         EXPECT_FALSE(notice->isVisible()) << notice->accessibleName().toStdString();
         if (marketSum) {
-            EXPECT_EQ(checksumOf(written([&](FILE* out) { window->catalogue().wrt(out, today()); })), *marketSum);
+            EXPECT_EQ(checksumOf(bytesWritten(window->catalogue(), today())), *marketSum);
         }
         ++restored_;
         window->Quit();

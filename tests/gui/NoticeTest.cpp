@@ -85,9 +85,8 @@ TEST_F(NoticeTest, SeveralQueueAndAClickBringsTheNext)
 TEST_F(NoticeTest, SimulatedSalesAreToldOfAndTakenBack)
 {
     addTwoMarkets();
-    Company* beta = window().catalogue().getMarkets()[1]->companies().front();
-    new CompanyQuote(beta, Date(1, 1, 2024), 10); // a trend that neither limit meets
-    buy(beta);                                    // on 02/03/2024, for 90 days
+    new CompanyQuote(beta(), Date(1, 1, 2024), 10); // a trend that neither limit meets
+    buy(beta());                                    // on 02/03/2024, for 90 days
     show(kPortoFolioPage);
     enter("txtDate", "1/4/2024");
     const auto before = rows("lstShares");
@@ -102,10 +101,10 @@ TEST_F(NoticeTest, SimulatedSalesAreToldOfAndTakenBack)
     EXPECT_EQ(notice(), "") << "who has dismissed it knows";
     enter("txtDate", "1/4/2024");
     ASSERT_EQ(shown("btnNotice1"), "Take Back");
-    EXPECT_EQ(beta->shares()[0]->getNbrShareOperations(), 2U);
+    EXPECT_EQ(beta()->shares()[0]->getNbrShareOperations(), 2U);
     press("btnNotice1");
     EXPECT_EQ(notice(), "");
-    EXPECT_EQ(beta->shares()[0]->getNbrShareOperations(), 1U);
+    EXPECT_EQ(beta()->shares()[0]->getNbrShareOperations(), 1U);
     EXPECT_EQ(rows("lstShares"), before);
     show(kOperationPage);
     EXPECT_FALSE(find<QCheckBox>("cbxPrevision").isChecked());

@@ -2,7 +2,6 @@
 
 #include "market/NoteCompanyEvent.h"
 #include "tests/gui/CatalogueFixture.h"
-#include "tests/support/SmallPortfolio.h"
 #include "valuation/AccountState.h"
 #include "valuation/State.h"
 
@@ -30,17 +29,8 @@ protected:
         addAccount(wallet(), "Broker", currencies[1]);
         addAccount(wallet(), "Dollars", currencies[0]);
         showAccounts();
-        show(kOperationPage);
     }
 
-    /// Has the menus follow, as the account commands do.
-    void showAccounts()
-    {
-        show(kPortoFolioPage);
-        window().UpdateState();
-        select("lstAccounts", 0);
-        click("btnUpdateQuote");
-    }
     /// Values the portfolio on another day.
     void valueOn(const char* day)
     {
@@ -49,21 +39,10 @@ protected:
         show(kOperationPage);
     }
     std::string menuText(const char* name) { return find<QComboBox>(name).currentText().toStdString(); }
-    Company* beta()
-    {
-        Company* found;
-        wallet().getCompany("Paris", "BBB", &found);
-        return found;
-    }
     /// A purchase of BBB, in no account yet.
     ShareOperation* buy(const Date& date, int quantity, float quote)
     {
         return new ShareOperation(date, new Share(&wallet(), beta()), true, quantity, quote, false, 0);
-    }
-    const Share& firstShare()
-    {
-        unsigned n;
-        return *wallet().getAllShares(&n)[0];
     }
     int selectedRow() { return list("lstOperations").CurrentSelection(); }
     unsigned countOperations()
@@ -155,11 +134,8 @@ TEST_F(OperationTest, AnUpdateReplacesAndWithoutSelectionAdds)
 TEST_F(OperationTest, ASelectionFillsTheFieldsOfItsTypeAndHidesTheOthers)
 {
     auto* deposited = new DepositAccountOperation(Date(1, 2, 2024), cash_, -12.5F, false);
-    auto* moved = new TransferAccountOperation(Date(2, 2, 2024), cash_, wallet().getAccount(2), 9, false);
-    moved->setCost(1);
-    moved->setRateCost(0.0017F);
-    moved->setFromCurrencyQuote(2);
-    moved->setToCurrencyQuote(3);
+    withTerms(new TransferAccountOperation(Date(2, 2, 2024), cash_, wallet().getAccount(2), 9, false), 0.0017F, 1, 2,
+              3);
     buy(Date(3, 2, 2024), 1234, 2.5F)->setAccount(cash_);
     (new ShareOperation(Date(4, 2, 2024), nullptr, false, 2, 3, false, 8))->setAccount(cash_);
     auto* earned = new TransferAccountOperation(Date(5, 2, 2024), cash_, cash_, 0, false);
@@ -281,7 +257,7 @@ TEST_F(AutomaticOperationTest, CanBeReplacedByAnotherOneWhichIsGoneBeforeItIsLis
     EXPECT_THAT(notice(), Not(HasSubstr("Transferred"))) << "it is gone";
     click(kAdd);
     EXPECT_EQ(countOperations(), 1U);
-    EXPECT_EQ(firstShare().getNbrShareOperations(), 2U) << "the sale stays with its holding";
+    EXPECT_EQ(wallet().shares()[0]->getNbrShareOperations(), 2U) << "the sale stays with its holding";
 }
 
 TEST_F(OperationTest, OffersFollowWhatIsTypedButNeverOverwriteIt)
@@ -368,7 +344,6 @@ TEST_F(OperationTest, ANewOperationStartsWithTheAccountThatIsLikely)
     addTwoMarkets();
     addAccount(wallet(), "Only", window().catalogue().getCurrencies()[0]);
     showAccounts();
-    show(kOperationPage);
     EXPECT_EQ(chosen(), "Only");
 }
 

@@ -148,9 +148,7 @@ protected:
                 EXPECT_EQ(menu.Menu()->ItemAt(i)->Label(), accounts[static_cast<std::size_t>(i)]->getName().bytes());
         }
     }
-    int valuesCompared() const { return valuesCompared_; }
 
-private:
     int valuesCompared_ = 0;
 };
 
@@ -177,7 +175,7 @@ TEST_P(RandomCommandsTest, LinksListsAndFileAgreeAfterEachCommand)
     }
     EXPECT_GT(mostMarkets, 4U) << "else there was little to go wrong";
     if (areNamesUnique()) {
-        EXPECT_GT(valuesCompared(), 4);
+        EXPECT_GT(valuesCompared_, 4);
     }
 }
 

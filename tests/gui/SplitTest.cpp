@@ -26,13 +26,7 @@ protected:
     }
     ShareOperation& trade(unsigned i) { return *wallet().shares()[0]->getShareOperation(i); }
     unsigned trades() { return wallet().shares()[0]->getNbrShareOperations(); }
-    std::vector<float> quotes()
-    {
-        std::vector<float> values;
-        for (const CompanyQuote* quote : company()->quotes())
-            values.push_back(quote->getValue());
-        return values;
-    }
+    std::vector<float> quotes() { return valuesOf(*company()); }
 };
 
 } // namespace

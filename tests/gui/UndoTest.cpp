@@ -5,7 +5,6 @@
 #include "platform/Entry.h"
 #include "platform/ListItem.h"
 #include "platform/Message.h"
-#include "platform/StringView.h"
 #include "platform/TabView.h"
 #include "tests/gui/RandomCommands.h"
 
@@ -157,12 +156,6 @@ TEST_P(UndoTest, TheWayBackAndOnPassesTheSameMoments)
 
 class UndoStepTest : public WindowTest {
 protected:
-    std::string openFile() { return dynamic_cast<BStringView&>(*viewOf("txtOpenFile")).Text(); }
-    BView* viewOf(const char* name)
-    {
-        auto& tabs = dynamic_cast<BTabView&>(*window().FindView("TabView"));
-        return tabs.TabAt(tabs.Selection())->View()->FindView(name);
-    }
     std::string tip(const char* button) { return window().FindView(button)->widget()->toolTip().toStdString(); }
     void addMarket(const std::string& name)
     {

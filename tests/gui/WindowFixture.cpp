@@ -77,8 +77,7 @@ void WindowTest::makeSample() const
 
 std::string WindowTest::bytes()
 {
-    return written([this](FILE* file) { window().catalogue().wrt(file, today()); }) + "\n--\n" +
-           written([this](FILE* file) { wallet().wrt(file, today()); });
+    return bytesWritten(window().catalogue(), today()) + "\n--\n" + bytesWritten(wallet(), today());
 }
 
 void WindowTest::settle()

@@ -92,6 +92,8 @@ protected:
 
     /// What the status line shows.
     std::string message() const;
+    /// What the page says of its file.
+    std::string openFile() { return find<QWidget>("txtOpenFile").accessibleName().toStdString(); }
     /// Takes away what an empty window offers.
     void dismissOffer() { window().dropNotice("first steps"); }
     void clearMessage() { window().SetMessage(""); }

@@ -8,15 +8,6 @@ namespace {
 
 using Rates = std::vector<float>;
 
-/// The rates in date order.
-Rates rates(const Currency& currency)
-{
-    Rates result;
-    for (const CurrencyQuote* quote : all(currency, &Currency::getAllQuotes))
-        result.push_back(quote->getValue());
-    return result;
-}
-
 Currency* addCurrency(Catalogue& catalogue, const char* symbol, const std::vector<std::pair<short, float>>& rates)
 {
     auto* currency = new Currency(symbol, symbol, catalogue.getReferenceCurrency());
@@ -38,18 +29,18 @@ TEST(CurrencyTest, ANewReferenceDividesTheOtherRatesByItsOwnOfTheDay)
     Currency* c = addCurrency(catalogue, "C", {{2, 6}, {3, 7}});
     EXPECT_EQ(a->getPente(), 0);
     catalogue.rebaseOn(a);
-    EXPECT_EQ(rates(*a), Rates(3, 1.0F)) << "the first reference changes no rate";
-    EXPECT_EQ(rates(*b), (Rates{2, 3})) << "nor does the present one";
+    EXPECT_EQ(valuesOf(*a), Rates(3, 1.0F)) << "the first reference changes no rate";
+    EXPECT_EQ(valuesOf(*b), (Rates{2, 3})) << "nor does the present one";
 
     catalogue.rebaseOn(b);
     EXPECT_EQ(catalogue.getReferenceCurrency(), b);
-    EXPECT_EQ(rates(*a), (Rates{0.5F, 1.0F / 3, 0.25F})) << "B is at 2, 3, and by its line at 4";
-    EXPECT_EQ(rates(*b), Rates(2, 1.0F));
-    EXPECT_EQ(rates(*c), (Rates{3, 7.0F / 3})) << "between its rates B keeps the last, 2";
+    EXPECT_EQ(valuesOf(*a), (Rates{0.5F, 1.0F / 3, 0.25F})) << "B is at 2, 3, and by its line at 4";
+    EXPECT_EQ(valuesOf(*b), Rates(2, 1.0F));
+    EXPECT_EQ(valuesOf(*c), (Rates{3, 7.0F / 3})) << "between its rates B keeps the last, 2";
     EXPECT_FLOAT_EQ(a->getPente(), -0.0625F) << "the trend follows";
 
     catalogue.rebaseOn(addCurrency(catalogue, "D", {}));
-    EXPECT_EQ(rates(*b), Rates(2, INFINITY)) << "a rate of 0 is not guarded against";
+    EXPECT_EQ(valuesOf(*b), Rates(2, INFINITY)) << "a rate of 0 is not guarded against";
 }
 
 TEST(CurrencyTest, ARemovedCurrencyLeavesItsPlaceToTheLastAndNoPointerBehind)
@@ -66,11 +57,11 @@ TEST(CurrencyTest, ARemovedCurrencyLeavesItsPlaceToTheLastAndNoPointerBehind)
     };
     removed(b);
     EXPECT_EQ(catalogue.getCurrencies(), (std::vector<Currency*>{a, d, c}));
-    EXPECT_EQ(rates(*d), Rates{8}) << "the reference stays";
+    EXPECT_EQ(valuesOf(*d), Rates{8}) << "the reference stays";
     removed(a);
     EXPECT_EQ(catalogue.getCurrencies(), (std::vector<Currency*>{c, d}));
     EXPECT_EQ(catalogue.getReferenceCurrency(), c);
-    EXPECT_EQ(rates(*d), Rates{2}) << "in the new reference";
+    EXPECT_EQ(valuesOf(*d), Rates{2}) << "in the new reference";
     Currency *ofC, *ofD;
     EXPECT_EQ(c->getReferenceCurrency(&ofC) + d->getReferenceCurrency(&ofD), 0);
     EXPECT_TRUE(ofC == c && ofD == c) << "without a stored one a currency is its own";

@@ -49,11 +49,7 @@ void fill(SmallPortfolio& p)
     Account* main = addAccount(p.wallet, "Main", p.euro);
     Account* side = addAccount(p.wallet, "Side", p.dollar);
     main->setDefaultTransferAccount(true);
-    TransferAccountOperation* sent = transfer(main, side, 1, 200);
-    sent->setRateCost(0.25F);
-    sent->setCost(5);
-    sent->setFromCurrencyQuote(1.5F);
-    sent->setToCurrencyQuote(2);
+    withTerms(transfer(main, side, 1, 200), 0.25F, 5, 1.5F, 2);
     deposit(main, 1, 1000);
     trade(share, main, 3, -1, 2, 0.5F)->setQuantity(-3);
     trade(share, main, 0, 10, 1.5F, 2);
@@ -244,6 +240,9 @@ TEST(WalletFileTest, AFailedReadIsToldAllThatIsMissingOrWhereTheFileEnds)
          "Mine needs Lyons / AC (0 operations) and the currency Yuan" + sample + "has neither; " + place + "account 1"},
         {replaced(bytesOfPieces(), "'S' 'N' 05000000 'Paris'", "'S' 'N' 05000000 'Lyons'"),
          "the file has operations on what it does not list as a holding: Lyons / AC (1 operation)"},
+        {replaced(bytesOfPieces(), "'Paris'", "'Lyons'"), "Mine needs Lyons / AC (0 operations)" + sample +
+                                                              "does not have it; the file has operations on what it "
+                                                              "does not list as a holding: Paris / AC (2 operations)"},
         {"", "the file is empty"},
         {upTo(0, 9), place + "its head"},
         {upTo(0, 15), place + "holding 1"},

@@ -145,6 +145,7 @@ public:
             [&] { trade(share, day == 0 ? nullptr : account, day, below(3) - 1, 1); },
             [&] { new State(wallet, daysAfterStart(day), true); },
             [&] { account->setWallet(wallet); },
+            [&] { share->setWallet(wallet); },
             [&] { account->setCurrency(pick(now.currencies)); },
             [&] { operation->setAccount(account); },
             [&] { operation->setDate(daysAfterStart(day)); },

@@ -115,12 +115,8 @@ TEST_F(DurableSaveTest, AFileThatIsNoLongerTheFormerOneStays)
     const std::string path = folder_.write("files/f", "old");
     const auto former = FileStamp::of(path);
     EXPECT_EQ(save_.save(path, writeNew, former).outcome, kSaved);
-    EXPECT_EQ(save_
-                  .save(
-                      path, [](FILE*) { return 0; }, former)
-                  .outcome,
-              kWriteFailed)
-        << "it is the new one by now";
+    const auto empty = [](FILE*) { return 0; };
+    EXPECT_EQ(save_.save(path, empty, former).outcome, kWriteFailed) << "it is the new one by now";
     EXPECT_EQ(folder_.content("files/f"), "new");
     EXPECT_EQ(names("f"), "f 1");
 }

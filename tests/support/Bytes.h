@@ -36,11 +36,11 @@ std::string written(Write write)
     return bytes;
 }
 
-/// What `object.wrt` puts into a file.
-template <class Object>
-std::string bytesWritten(const Object& object)
+/// What `object.wrt` puts into a file; whole files have a stamp besides.
+template <class Object, class... Stamp>
+std::string bytesWritten(const Object& object, const Stamp&... stamp)
 {
-    return written([&object](FILE* file) { object.wrt(file); });
+    return written([&](FILE* file) { object.wrt(file, stamp...); });
 }
 
 /// A file of these bytes, open for reading.

@@ -42,6 +42,15 @@ std::vector<Element*> all(const Owner& owner, Element** (Declarer::*getAll)(unsi
     return {elements, elements + n};
 }
 
+/// The values of a series, in date order.
+std::vector<float> valuesOf(const auto& series)
+{
+    std::vector<float> values;
+    for (const auto* quote : series.quotes())
+        values.push_back(quote->getValue());
+    return values;
+}
+
 // Each of these is owned by the objects it is linked to.
 
 inline Account* addAccount(Wallet& wallet, const char* name, Currency* currency)
@@ -60,6 +69,17 @@ inline void deposit(Account* account, int day, float amount, bool automatic = fa
 inline TransferAccountOperation* transfer(Account* from, Account* to, int day, float amount, bool automatic = false)
 {
     return new TransferAccountOperation(daysAfterStart(day), from, to, amount, automatic);
+}
+
+/// The same transfer, with its costs and rates.
+inline TransferAccountOperation* withTerms(TransferAccountOperation* sent, float rateCost, float cost,
+                                           float fromQuote = 1, float toQuote = 1)
+{
+    sent->setRateCost(rateCost);
+    sent->setCost(cost);
+    sent->setFromCurrencyQuote(fromQuote);
+    sent->setToCurrencyQuote(toQuote);
+    return sent;
 }
 
 /// A purchase of `quantity` shares, or a sale of -`quantity`.

@@ -17,8 +17,8 @@ protected:
     /// What stands in the report, line by line, with single blanks.
     std::string report(const std::string& options)
     {
-        folder_.write("market", written([this](FILE* file) { catalogue.wrt(file, kStart); }));
-        folder_.write("wallet", written([this](FILE* file) { wallet.wrt(file, kStart); }));
+        folder_.write("market", bytesWritten(catalogue, kStart));
+        folder_.write("wallet", bytesWritten(wallet, kStart));
         const ToolRun run(PELORIN_REPORT, "market wallet --force --out r.pdf " + options, folder_);
         EXPECT_EQ(run.status, 0);
         EXPECT_EQ(run.err + run.out, "");
@@ -36,9 +36,8 @@ protected:
     /// What an income or a charge is for the file.
     static void move(Account* account, int day, float income)
     {
-        TransferAccountOperation* moved = transfer(account, account, day, income < 0 ? -income : 0);
-        moved->setRateCost(income < 0 ? 1 : 0);
-        moved->setCost(income < 0 ? 0 : -income);
+        const bool isCharge = income < 0;
+        withTerms(transfer(account, account, day, isCharge ? -income : 0), isCharge ? 1 : 0, isCharge ? 0 : -income);
     }
 
     TemporaryFolder folder_{"pelorin-report-test"};

@@ -43,14 +43,6 @@ TEST_F(SampleTest, SameDateGivesTheSameFilesOnEveryRun)
     EXPECT_EQ(valuation.totals().totalDeposit, 93000);
 }
 
-TEST_F(SampleTest, FilesThatAreThereAreLeftAlone)
-{
-    folder_.write("a/Companies/Sample", "mine");
-    EXPECT_THAT(make("a").out, HasSubstr("a/Companies/Sample: is there and left as it is\n"));
-    EXPECT_EQ(folder_.content("a/Companies/Sample"), "mine");
-    EXPECT_GT(fs::file_size(folder_ / "a/PortoFolios/Sample"), 1000U);
-}
-
 TEST_F(SampleTest, WithoutAFolderItIsTheUsersAndTellsOnlyNewsWhenAsked)
 {
     folder_.write("config/user-dirs.dirs", "XDG_DOCUMENTS_DIR=\"$HOME/Texte\"\n");
@@ -65,8 +57,11 @@ TEST_F(SampleTest, WithoutAFolderItIsTheUsersAndTellsOnlyNewsWhenAsked)
     EXPECT_EQ(told("--quiet --quotes tables"), "");
     EXPECT_FALSE(fs::is_empty(folder_ / "tables"));
     fs::remove(portfolio);
+    folder_.write("Texte/Pelorin/Companies/Sample", "mine");
     EXPECT_EQ(told("--only-news"), market + ": is there and left as it is\n" + portfolio + ": written\n");
     EXPECT_THAT(told(""), HasSubstr(market + ": is there and left as it is\n"));
+    EXPECT_EQ(contentOf(market), "mine");
+    EXPECT_GT(fs::file_size(portfolio), 1000U);
 }
 
 TEST(SampleDataTest, NothingIsEverOverdrawnOrSoldShort)

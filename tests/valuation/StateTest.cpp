@@ -39,11 +39,8 @@ TEST(StateTest, ATransferTakesTheLargerOfAmountAndCostAndGivesWhatIsLeft)
                  {100, 0, 15, 1, 1, 0, 0, true}}; // destroyed before the state is built
     for (const auto& c : cases) {
         OneHolding p;
-        auto* sent = transfer(p.account, addAccount(p.wallet, "to", p.dollar), 1, c.amount, c.automatic);
-        sent->setRateCost(c.rateCost);
-        sent->setCost(c.cost);
-        sent->setFromCurrencyQuote(c.from);
-        sent->setToCurrencyQuote(c.to);
+        Account* to = addAccount(p.wallet, "to", p.dollar);
+        withTerms(transfer(p.account, to, 1, c.amount, c.automatic), c.rateCost, c.cost, c.from, c.to);
         EXPECT_EQ(p.cash(1, 0), -c.taken) << c.amount;
         EXPECT_EQ(p.cash(1, 1), c.received) << c.amount;
     }
@@ -100,11 +97,8 @@ TEST(StateTest, ATransferWithinAnAccountIsIncomeOrChargeWhenItsValuesSaySo)
         for (const bool isWithin : {true, false}) {
             OneHolding p;
             Account* other = addAccount(p.wallet, "Other", p.dollar);
-            auto* sent = transfer(p.account, isWithin ? p.account : other, 1, c.amount);
-            sent->setRateCost(c.rateCost);
-            sent->setCost(c.cost);
-            sent->setFromCurrencyQuote(c.from);
-            sent->setToCurrencyQuote(c.to);
+            const auto* sent = withTerms(transfer(p.account, isWithin ? p.account : other, 1, c.amount), c.rateCost,
+                                         c.cost, c.from, c.to);
             EXPECT_EQ(kindOf(*sent), isWithin ? c.kind : kTransfer) << c.amount << ' ' << c.cost;
             if (isWithin) {
                 EXPECT_EQ(cashMove(*sent, *p.account), c.move) << c.amount << ' ' << c.cost;
