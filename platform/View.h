@@ -31,8 +31,7 @@ struct DrawingState {
 /// What a view draws goes into a picture of its own, so drawing is allowed at any time and stays until the next `Draw`;
 /// `Sync` puts it on the screen at once. Two kinds of views have none, and only what `Draw` draws shows: those of the
 /// colour `B_TRANSPARENT_COLOR`, whose `Draw` is called whenever they are looked at, and those without `B_WILL_DRAW`,
-/// which are their ground and nothing else. Coordinates are the view's own: (0, 0) is its left
-/// top corner.
+/// which are their ground and nothing else. Coordinates are the view's own: (0, 0) is its left top corner.
 ///
 /// Owns its children, and the widget that shows it. A view that stands in a window or in another view is owned by that.
 class BView : public BHandler {
