@@ -144,7 +144,8 @@ bool WindowWidget::eventFilter(QObject* watched, QEvent* event)
 {
     if (watched == windowHandle() && event->type() == QEvent::Expose && windowHandle()->isExposed()) {
         watched->removeEventFilter(this);
-        // It is painted now. Soon after the desktop gives it the keyboard, and that is painted first, too.
+        // It is painted by what handles this event next. Soon after the desktop gives it the keyboard, which is to show
+        // before anything else is done.
         QMetaObject::invokeMethod(
             this, [this] { QTimer::singleShot(std::chrono::milliseconds(10), this, &WindowWidget::tellPainted); },
             Qt::QueuedConnection);
